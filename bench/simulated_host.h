@@ -1,0 +1,31 @@
+// A simulated host with a given number of two-port FC HBAs and the module loaded on it.
+#pragma once
+
+#include "cimserver/broker/module.h"
+#include "cimserver/module_operations.h"
+
+#include <memory>
+
+namespace bench
+{
+
+// The path of the built module.
+extern const char* const module_path;
+
+// Replaces the simulated host: `adapters` two-port FC HBAs. A module loaded before keeps what it saw at load.
+void simulate(int adapters);
+
+// The module loaded on such a host and the operations it answers.
+class Simulated_Host
+{
+public:
+    explicit Simulated_Host(int adapters);
+
+    cimserver::Operations& operations() { return *_operations; }
+
+private:
+    std::unique_ptr<cimserver::Module> _module;
+    std::unique_ptr<cimserver::Module_Operations> _operations;
+};
+
+} // namespace bench

@@ -1,0 +1,41 @@
+#include "cimserver/broker/conversion.h"
+#include "cimserver/broker/objects.h"
+
+namespace cimserver
+{
+namespace
+{
+
+CMPIStatus add_arg(const CMPIArgs* self, const char* name, const CMPIValue* value, CMPIType type) noexcept
+{
+    return answer([&] { put(object<Args_Object>(self).args, name, from_cmpi(value, type)); });
+}
+
+CMPIData get_arg(const CMPIArgs* self, const char* name, CMPIStatus* status) noexcept
+{
+    return answer(status, no_data(), [&] { return data_named(object<Args_Object>(self).args, name); });
+}
+
+CMPIData get_arg_at(const CMPIArgs* self, CMPICount index, CMPIString** name, CMPIStatus* status) noexcept
+{
+    return answer(status, no_data(), [&] { return data_at(object<Args_Object>(self).args, index, name); });
+}
+
+CMPICount get_arg_count(const CMPIArgs* self, CMPIStatus* status) noexcept
+{
+    return answer<CMPICount>(status, 0, [&] { return static_cast<CMPICount>(object<Args_Object>(self).args.size()); });
+}
+
+} // namespace
+
+const CMPIArgsFT Args_Object::table = {
+    .ftVersion = 100,
+    .release = release<Args_Object>,
+    .clone = clone<Args_Object>,
+    .addArg = add_arg,
+    .getArg = get_arg,
+    .getArgAt = get_arg_at,
+    .getArgCount = get_arg_count,
+};
+
+} // namespace cimserver

@@ -1,0 +1,38 @@
+// CIM names are compared without regard to the case of ASCII letters: the comparison, and a hash that agrees with it.
+#pragma once
+
+#include <cstddef>
+#include <string>
+#include <string_view>
+#include <unordered_map>
+#include <vector>
+
+namespace cimserver
+{
+
+bool equal_names(std::string_view a, std::string_view b);
+std::string lower_name(std::string_view name); // the one spelling that all equal names share
+
+struct Name_Hash
+{
+    std::size_t operator()(std::string_view name) const;
+};
+
+struct Name_Equal
+{
+    bool operator()(std::string_view a, std::string_view b) const { return equal_names(a, b); }
+};
+
+// Looks up by name; the texts behind the keys must outlive the map.
+template <class T> using Name_Map = std::unordered_map<std::string_view, T, Name_Hash, Name_Equal>;
+
+// The element of a list of named things that has the name, or null.
+template <class List> auto find_named(List& list, std::string_view name) -> decltype(list.data())
+{
+    for (auto& element : list)
+        if (equal_names(element.name, name))
+            return &element;
+    return nullptr;
+}
+
+} // namespace cimserver

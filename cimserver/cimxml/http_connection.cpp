@@ -1,0 +1,57 @@
+#include "cimserver/cimxml/http_connection.h"
+
+#include <charconv>
+#include <cstdint>
+
+namespace cimserver
+{
+
+namespace
+{
+
+void add_headers(MHD_Response* response, const Http_Answer& answer)
+{
+    if (answer.status == MHD_HTTP_OK)
+    {
+        MHD_add_response_header(response, "Content-Type", "application/xml; charset=\"utf-8\"");
+        MHD_add_response_header(response, "CIMOperation", "MethodResponse");
+    }
+    if (!answer.cim_error.empty())
+        MHD_add_response_header(response, "CIMError", answer.cim_error.c_str());
+    if (answer.status == MHD_HTTP_METHOD_NOT_ALLOWED)
+        MHD_add_response_header(response, "Allow", "POST");
+    if (answer.status == MHD_HTTP_SERVICE_UNAVAILABLE)
+        MHD_add_response_header(response, "Retry-After", "1");
+}
+
+} // namespace
+
+std::string header_of(MHD_Connection* connection, const char* name)
+{
+    const char* value = MHD_lookup_connection_value(connection, MHD_HEADER_KIND, name);
+    return value ? value : "";
+}
+
+bool announces_more_than(MHD_Connection* connection, std::size_t limit)
+{
+    const std::string length = header_of(connection, "Content-Length");
+    if (length.empty())
+        return false;
+    std::uint64_t bytes = 0;
+    const auto result = std::from_chars(length.data(), length.data() + length.size(), bytes);
+    return result.ec == std::errc::result_out_of_range || bytes > limit;
+}
+
+MHD_Result reply(MHD_Connection* connection, const Http_Answer& answer)
+{
+    MHD_Response* response =
+        MHD_create_response_from_buffer(answer.body.size(), const_cast<char*>(answer.body.data()), MHD_RESPMEM_PERSISTENT);
+    if (!response)
+        return MHD_NO;
+    add_headers(response, answer);
+    const MHD_Result result = MHD_queue_response(connection, answer.status, response);
+    MHD_destroy_response(response);
+    return result;
+}
+
+} // namespace cimserver

@@ -1,0 +1,277 @@
+#include "cimserver/cimxml/http_server.h"
+
+#include "cimserver/cimxml/connection_watch.h"
+#include "cimserver/cimxml/http_connection.h"
+#include "cimserver/cimxml/listener.h"
+#include "cimserver/cimxml/worker_pool.h"
+
+#include <microhttpd.h>
+#include <unistd.h>
+
+#include <atomic>
+#include <cerrno>
+#include <condition_variable>
+#include <mutex>
+#include <optional>
+#include <string_view>
+#include <system_error>
+#include <utility>
+
+namespace cimserver
+{
+
+namespace
+{
+
+using Clock = std::chrono::steady_clock;
+
+// Room for the head of a request; a longer head is refused by the HTTP library.
+constexpr std::size_t head_bytes = 32 * 1024;
+
+// Connections that are being cut still count until the library closes them.
+constexpr unsigned spare_connections = 64;
+
+// One request on its way: filled by the byte mover, answered by a worker while the connection is suspended.
+struct Exchange
+{
+    Http_Request request;
+    bool too_large = false;
+    bool submitted = false;
+    std::optional<Http_Answer> answer;
+
+    void receive(std::string_view bytes, std::size_t limit)
+    {
+        too_large = too_large || bytes.size() > limit - request.body.size();
+        if (too_large)
+            request.body = {};
+        else
+            request.body.append(bytes);
+    }
+};
+
+} // namespace
+
+class Http_Server::Daemon
+{
+public:
+    Daemon(std::uint16_t port, const Http_Limits& limits, Http_Handler handler);
+    ~Daemon();
+
+    std::uint16_t port() const { return _listener.port; }
+    bool stop(Clock::time_point deadline);
+
+private:
+    // What the HTTP library calls. No exception leaves them.
+    static MHD_Result on_request(void* self, MHD_Connection* connection, const char* url, const char* method,
+                                 const char* http_version, const char* data, std::size_t* size, void** context) noexcept;
+    static void on_completed(void* self, MHD_Connection* connection, void** context, MHD_RequestTerminationCode) noexcept;
+    static void on_connection(void* self, MHD_Connection* connection, void** context,
+                              MHD_ConnectionNotificationCode code) noexcept;
+
+    MHD_Result begin(MHD_Connection* connection, std::string_view method, void** context);
+    MHD_Result finish(MHD_Connection* connection, Exchange& exchange);
+    void submit(MHD_Connection* connection, Exchange& exchange);
+    void work(MHD_Connection* connection, Exchange& exchange) noexcept;
+    void enter(MHD_Connection* connection, Connection_Watch::Phase phase);
+    void close_listener();
+    bool wait_for_answers(Clock::time_point deadline);
+
+    const Http_Limits _limits;
+    const Http_Handler _handler;
+    const Listener _listener;
+    std::atomic<bool> _stopping = false;
+    bool _listening = true;
+
+    std::mutex _mutex;
+    std::condition_variable _answered;
+    std::size_t _unanswered = 0; // submitted, the answer not yet sent
+
+    Connection_Watch _watch;
+    Worker_Pool _pool;
+    MHD_Daemon* _http = nullptr;
+};
+
+Http_Server::Daemon::Daemon(std::uint16_t port, const Http_Limits& limits, Http_Handler handler)
+    : _limits(limits)
+    , _handler(std::move(handler))
+    , _listener(listen_on_loopback(port))
+    , _watch({limits.connections, limits.receive, limits.send})
+    , _pool(limits.workers, limits.waiting_requests)
+{
+    const unsigned flags = MHD_USE_EPOLL_INTERNAL_THREAD | MHD_ALLOW_SUSPEND_RESUME;
+    // clang-format off
+    _http = MHD_start_daemon(flags, 0, nullptr, nullptr, on_request, this,
+                             MHD_OPTION_LISTEN_SOCKET, _listener.socket,
+                             MHD_OPTION_CONNECTION_LIMIT, static_cast<unsigned>(limits.connections) + spare_connections,
+                             MHD_OPTION_CONNECTION_MEMORY_LIMIT, head_bytes,
+                             MHD_OPTION_STRICT_FOR_CLIENT, 1,
+                             MHD_OPTION_NOTIFY_COMPLETED, on_completed, this,
+                             MHD_OPTION_NOTIFY_CONNECTION, on_connection, this,
+                             MHD_OPTION_END);
+    // clang-format on
+    if (!_http)
+    {
+        close(_listener.socket);
+        throw std::system_error(errno, std::generic_category(), "cannot start the HTTP server");
+    }
+}
+
+Http_Server::Daemon::~Daemon()
+{
+    while (!stop(Clock::now() + std::chrono::hours(1)))
+    {
+    }
+}
+
+bool Http_Server::Daemon::stop(Clock::time_point deadline)
+{
+    if (!_http)
+        return true;
+    _stopping = true;
+    close_listener();
+    if (!_pool.stop(deadline))
+        return false;
+    wait_for_answers(deadline);
+    MHD_stop_daemon(_http);
+    _http = nullptr;
+    return true;
+}
+
+void Http_Server::Daemon::close_listener()
+{
+    if (!_listening)
+        return;
+    _listening = false;
+    MHD_quiesce_daemon(_http);
+    close(_listener.socket);
+}
+
+// A client that does not take its answer does not keep the server from stopping.
+bool Http_Server::Daemon::wait_for_answers(Clock::time_point deadline)
+{
+    std::unique_lock lock(_mutex);
+    return _answered.wait_until(lock, deadline, [this] { return _unanswered == 0; });
+}
+
+MHD_Result Http_Server::Daemon::on_request(void* self, MHD_Connection* connection, const char*, const char* method, const char*,
+                                           const char* data, std::size_t* size, void** context) noexcept
+{
+    auto& daemon = *static_cast<Daemon*>(self);
+    try
+    {
+        if (!*context)
+            return daemon.begin(connection, method, context);
+        auto& exchange = *static_cast<Exchange*>(*context);
+        if (*size == 0)
+            return daemon.finish(connection, exchange);
+        exchange.receive({data, *size}, daemon._limits.request_bytes);
+        *size = 0;
+        return MHD_YES;
+    }
+    catch (...)
+    {
+        return MHD_NO; // closes the connection
+    }
+}
+
+void Http_Server::Daemon::on_completed(void* self, MHD_Connection* connection, void** context,
+                                       MHD_RequestTerminationCode) noexcept
+{
+    auto& daemon = *static_cast<Daemon*>(self);
+    const std::unique_ptr<Exchange> exchange(static_cast<Exchange*>(*context));
+    *context = nullptr;
+    daemon.enter(connection, Connection_Watch::Phase::receiving);
+    if (!exchange || !exchange->submitted)
+        return;
+    const std::lock_guard lock(daemon._mutex);
+    --daemon._unanswered;
+    daemon._answered.notify_all();
+}
+
+void Http_Server::Daemon::on_connection(void* self, MHD_Connection* connection, void** context,
+                                        MHD_ConnectionNotificationCode code) noexcept
+{
+    auto& daemon = *static_cast<Daemon*>(self);
+    if (code == MHD_CONNECTION_NOTIFY_STARTED)
+        *context = daemon._watch.add(MHD_get_connection_info(connection, MHD_CONNECTION_INFO_CONNECTION_FD)->connect_fd);
+    else
+        daemon._watch.remove(static_cast<Connection_Watch::Connection*>(*context));
+}
+
+// The head of a request has arrived: refuse it, or go on to its body.
+MHD_Result Http_Server::Daemon::begin(MHD_Connection* connection, std::string_view method, void** context)
+{
+    if (method != MHD_HTTP_METHOD_POST)
+        return reply(connection, {MHD_HTTP_METHOD_NOT_ALLOWED, "", ""});
+    if (announces_more_than(connection, _limits.request_bytes))
+        return reply(connection, {MHD_HTTP_CONTENT_TOO_LARGE, "", ""});
+    enter(connection, Connection_Watch::Phase::receiving);
+    auto exchange = std::make_unique<Exchange>();
+    exchange->request.cim_operation = header_of(connection, "CIMOperation");
+    *context = exchange.release();
+    return MHD_YES;
+}
+
+// Called when the body is complete, and again when the answer is there.
+MHD_Result Http_Server::Daemon::finish(MHD_Connection* connection, Exchange& exchange)
+{
+    if (!exchange.answer && exchange.too_large)
+        exchange.answer = {MHD_HTTP_CONTENT_TOO_LARGE, "", ""};
+    if (!exchange.answer)
+    {
+        submit(connection, exchange);
+        return MHD_YES;
+    }
+    enter(connection, Connection_Watch::Phase::sending);
+    return reply(connection, *exchange.answer);
+}
+
+// The connection is suspended first: a worker may resume it before submit() returns.
+void Http_Server::Daemon::submit(MHD_Connection* connection, Exchange& exchange)
+{
+    enter(connection, Connection_Watch::Phase::working);
+    MHD_suspend_connection(connection);
+    exchange.submitted = true;
+    {
+        const std::lock_guard lock(_mutex);
+        ++_unanswered;
+    }
+    if (_pool.submit([this, connection, &exchange] { work(connection, exchange); }))
+        return;
+    exchange.answer = {MHD_HTTP_SERVICE_UNAVAILABLE, "", ""};
+    MHD_resume_connection(connection);
+}
+
+void Http_Server::Daemon::work(MHD_Connection* connection, Exchange& exchange) noexcept
+{
+    exchange.answer = {MHD_HTTP_SERVICE_UNAVAILABLE, "", ""};
+    try
+    {
+        if (!_stopping)
+            exchange.answer = _handler(exchange.request);
+    }
+    catch (...)
+    {
+        exchange.answer = {MHD_HTTP_INTERNAL_SERVER_ERROR, "", ""};
+    }
+    MHD_resume_connection(connection);
+}
+
+void Http_Server::Daemon::enter(MHD_Connection* connection, Connection_Watch::Phase phase)
+{
+    void* context = MHD_get_connection_info(connection, MHD_CONNECTION_INFO_SOCKET_CONTEXT)->socket_context;
+    _watch.enter(static_cast<Connection_Watch::Connection*>(context), phase);
+}
+
+Http_Server::Http_Server(std::uint16_t port, const Http_Limits& limits, Http_Handler handler)
+    : _daemon(std::make_unique<Daemon>(port, limits, std::move(handler)))
+{
+}
+
+Http_Server::~Http_Server() = default;
+
+std::uint16_t Http_Server::port() const { return _daemon->port(); }
+
+bool Http_Server::stop(std::chrono::milliseconds grace) { return _daemon->stop(Clock::now() + grace); }
+
+} // namespace cimserver

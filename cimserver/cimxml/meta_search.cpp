@@ -1,0 +1,29 @@
+#include "cimserver/cimxml/meta_search.h"
+
+#include "cimserver/broker/names.h"
+
+namespace cimserver
+{
+
+unsigned feature_index(const zmlr::Meta_Class& meta_class, std::string_view name)
+{
+    for (unsigned i = 0; i < meta_class.num_meta_features; ++i)
+        if (equal_names(meta_class.meta_features[i]->name, name))
+            return i;
+    return meta_class.num_meta_features;
+}
+
+const zmlr::Meta_Class* origin_of(const zmlr::Meta_Class& meta_class, std::string_view feature)
+{
+    for (const zmlr::Meta_Class* ancestor = &meta_class; ancestor; ancestor = ancestor->super_meta_class)
+    {
+        const unsigned index = feature_index(*ancestor, feature);
+        if (index == ancestor->num_meta_features)
+            return nullptr;
+        if (is_local(*ancestor, index))
+            return ancestor;
+    }
+    return nullptr;
+}
+
+} // namespace cimserver

@@ -1,0 +1,21 @@
+// Where the features of a class come from. Works on the plain meta-data records, without the module's own functions.
+#pragma once
+
+#include "runtime/meta.h"
+
+#include <string_view>
+
+namespace cimserver
+{
+
+// The index of a feature in the class's list, num_meta_features when it has none of that name.
+unsigned feature_index(const zmlr::Meta_Class& meta_class, std::string_view name);
+
+// Whether the class itself declares or overrides its feature at the index.
+inline bool is_local(const zmlr::Meta_Class& meta_class, unsigned index) { return meta_class.locals[index].local != 0; }
+
+// The class that declares a feature or last overrides it: the class itself or its nearest ancestor. Null when the class has
+// no such feature.
+const zmlr::Meta_Class* origin_of(const zmlr::Meta_Class& meta_class, std::string_view feature);
+
+} // namespace cimserver

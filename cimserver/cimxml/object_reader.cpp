@@ -1,0 +1,146 @@
+#include "cimserver/cimxml/object_reader.h"
+
+#include "cimserver/broker/names.h"
+
+#include <charconv>
+
+namespace cimserver
+{
+
+namespace
+{
+
+[[noreturn]] void fail(const std::string& description) { throw Cim_Error(CIM_ERR_INVALID_PARAMETER, description); }
+
+std::string_view trimmed(std::string_view text)
+{
+    constexpr std::string_view blanks = " \t\r\n";
+    const std::size_t first = text.find_first_not_of(blanks);
+    return first == std::string_view::npos ? std::string_view() : text.substr(first, text.find_last_not_of(blanks) - first + 1);
+}
+
+// Decimal or hexadecimal integers and decimal reals (DSP0201).
+bool is_number(std::string_view text)
+{
+    if (!text.empty() && (text.front() == '+' || text.front() == '-'))
+        text.remove_prefix(1);
+    if (text.starts_with("0x") || text.starts_with("0X"))
+        return text.size() > 2 && text.find_first_not_of("0123456789abcdefABCDEF", 2) == std::string_view::npos;
+    if (text.empty() || text.front() == '+' || text.front() == '-')
+        return false;
+    double number = 0;
+    const auto result = std::from_chars(text.data(), text.data() + text.size(), number);
+    return result.ec == std::errc() && result.ptr == text.data() + text.size();
+}
+
+Value text_value(std::string text) { return Value{CMPI_string, std::move(text)}; }
+
+Value read_key_value(const Xml_Element& element)
+{
+    const std::string* value_type = element.attribute("VALUETYPE");
+    if (!value_type || *value_type == "string")
+        return text_value(element.text);
+    if (*value_type == "boolean")
+        return Value{CMPI_boolean, read_boolean(element.text)};
+    if (*value_type != "numeric")
+        fail("unknown VALUETYPE of a key: " + *value_type);
+    const std::string_view number = trimmed(element.text);
+    if (!is_number(number))
+        fail("not a number: " + element.text);
+    return text_value(std::string(number));
+}
+
+Value read_key(const Xml_Element& element, const std::string& name_space)
+{
+    if (element.name == "KEYVALUE")
+        return read_key_value(element);
+    return Value{CMPI_ref, std::make_shared<const Object_Path>(read_path(element, name_space))};
+}
+
+bool has_key(const Object_Path& path, std::string_view name)
+{
+    for (const Named_Value& key : path.keys)
+        if (equal_names(key.name, name))
+            return true;
+    return false;
+}
+
+void add_key(Object_Path& path, const Xml_Element& binding)
+{
+    if (binding.name != "KEYBINDING")
+        fail("more than one unnamed key");
+    const std::string& name = *binding.attribute("NAME");
+    if (name.empty() || has_key(path, name))
+        fail("key without a name of its own: " + name);
+    path.keys.push_back({name, read_key(binding.children.front(), path.name_space)});
+}
+
+Object_Path read_instance_name(const Xml_Element& element, const std::string& name_space)
+{
+    Object_Path path;
+    path.name_space = name_space;
+    path.class_name = *element.attribute("CLASSNAME");
+    if (element.children.size() == 1 && element.children.front().name != "KEYBINDING")
+    {
+        path.keys.push_back({"", read_key(element.children.front(), name_space)});
+        return path;
+    }
+    for (const Xml_Element& binding : element.children)
+        add_key(path, binding);
+    return path;
+}
+
+Object_Path read_class_name(const Xml_Element& element, const std::string& name_space)
+{
+    Object_Path path;
+    path.name_space = name_space;
+    path.class_name = *element.attribute("NAME");
+    return path;
+}
+
+// CLASSPATH, INSTANCEPATH and their local forms: where, then what.
+Object_Path read_full_path(const Xml_Element& element)
+{
+    const Xml_Element& where = element.children.front();
+    const Xml_Element& what = element.children.back();
+    const Xml_Element& local = where.name == "NAMESPACEPATH" ? where.children.back() : where;
+    if (local.name != "LOCALNAMESPACEPATH" || what.name == where.name)
+        fail("malformed " + element.name);
+    Object_Path path = read_path(what, read_name_space(local));
+    if (where.name == "NAMESPACEPATH")
+        path.host = where.children.front().text;
+    return path;
+}
+
+} // namespace
+
+std::string read_name_space(const Xml_Element& element)
+{
+    std::string name_space;
+    for (const Xml_Element& part : element.children)
+        name_space += (name_space.empty() ? "" : "/") + *part.attribute("NAME");
+    return name_space;
+}
+
+Object_Path read_path(const Xml_Element& element, const std::string& name_space)
+{
+    if (element.name == "CLASSNAME")
+        return read_class_name(element, name_space);
+    if (element.name == "INSTANCENAME")
+        return read_instance_name(element, name_space);
+    if (element.name == "VALUE.REFERENCE")
+        return read_path(element.children.front(), name_space);
+    return read_full_path(element);
+}
+
+bool read_boolean(std::string_view text)
+{
+    const std::string_view word = trimmed(text);
+    if (equal_names(word, "true"))
+        return true;
+    if (!equal_names(word, "false"))
+        fail("neither true nor false: " + std::string(text));
+    return false;
+}
+
+} // namespace cimserver

@@ -1,0 +1,205 @@
+#include "cimserver/cimxml/object_writer.h"
+
+#include "cimserver/cimxml/meta_search.h"
+#include "cimserver/cimxml/value_text.h"
+
+#include <optional>
+
+namespace cimserver
+{
+
+namespace
+{
+
+using Reference = std::shared_ptr<const Object_Path>;
+using Embedded = std::shared_ptr<const Instance>;
+
+// Each level of embedding escapes the one below it once more.
+constexpr int max_embedding = 4;
+
+void write_local_name_space(Xml_Writer& writer, const std::string& name_space)
+{
+    writer.start("LOCALNAMESPACEPATH");
+    for (std::size_t first = 0; first <= name_space.size();)
+    {
+        const std::size_t slash = std::min(name_space.find('/', first), name_space.size());
+        writer.start("NAMESPACE").attribute("NAME", name_space.substr(first, slash - first)).end();
+        first = slash + 1;
+    }
+    writer.end();
+}
+
+const char* value_type_of(CMPIType type)
+{
+    if (type == CMPI_boolean)
+        return "boolean";
+    return (type & (CMPI_REAL | CMPI_INTEGER)) != 0 && (type & CMPI_ENC) == 0 ? "numeric" : "string";
+}
+
+void write_key_value(Xml_Writer& writer, const Value& value)
+{
+    const std::optional<std::string> text = value_text(value);
+    writer.start("KEYVALUE").attribute("VALUETYPE", value_type_of(value.type));
+    // A key that clients could refuse as a datetime still names its instance as a text.
+    if (text)
+        writer.attribute("TYPE", cim_type_name(value.type)).text(*text);
+    else if (const auto* raw = std::get_if<std::string>(&value.content))
+        writer.text(*raw);
+    writer.end();
+}
+
+void write_key(Xml_Writer& writer, const Named_Value& key)
+{
+    const auto* reference = std::get_if<Reference>(&key.value.content);
+    if (key.value.null() || (reference && !*reference))
+        return;
+    writer.start("KEYBINDING").attribute("NAME", key.name);
+    if (reference)
+        write_reference(writer, **reference);
+    else
+        write_key_value(writer, key.value);
+    writer.end();
+}
+
+void write_local_path(Xml_Writer& writer, const Object_Path& path)
+{
+    writer.start("LOCALINSTANCEPATH");
+    write_local_name_space(writer, path.name_space);
+    write_instance_name(writer, path);
+    writer.end();
+}
+
+void write_full_path(Xml_Writer& writer, const Object_Path& path)
+{
+    writer.start("INSTANCEPATH").start("NAMESPACEPATH").element("HOST", path.host);
+    write_local_name_space(writer, path.name_space);
+    writer.end();
+    write_instance_name(writer, path);
+    writer.end();
+}
+
+void write_instance_at(Xml_Writer& writer, const Instance& instance, const zmlr::Meta_Class* origins, int depth);
+
+std::optional<std::string> embedded_text(const Embedded& instance, int depth)
+{
+    if (!instance || depth >= max_embedding)
+        return std::nullopt;
+    Xml_Writer writer;
+    write_instance_at(writer, *instance, nullptr, depth + 1);
+    return writer.take();
+}
+
+std::optional<std::string> scalar_text(const Value& value, int depth)
+{
+    const auto* embedded = std::get_if<Embedded>(&value.content);
+    return embedded ? embedded_text(*embedded, depth) : value_text(value);
+}
+
+// The texts of an array's elements; nothing when one of them cannot be sent. A null text is sent as an empty one: clients
+// know no null inside an array.
+std::optional<std::vector<std::string>> element_texts(const std::vector<Value>& elements, bool texts, int depth)
+{
+    std::vector<std::string> result;
+    result.reserve(elements.size());
+    for (const Value& element : elements)
+    {
+        std::optional<std::string> text = scalar_text(element, depth);
+        if (!text && !(texts && element.null()))
+            return std::nullopt;
+        result.push_back(text ? std::move(*text) : std::string());
+    }
+    return result;
+}
+
+void write_array(Xml_Writer& writer, const std::vector<Value>& elements, CMPIType type, int depth)
+{
+    const CMPIType element_type = type & static_cast<CMPIType>(~CMPI_ARRAY);
+    const auto texts = element_texts(elements, element_type == CMPI_string || element_type == CMPI_chars, depth);
+    if (!texts)
+        return;
+    writer.start("VALUE.ARRAY");
+    for (const std::string& text : *texts)
+        writer.element("VALUE", text);
+    writer.end();
+}
+
+void write_value_at(Xml_Writer& writer, const Value& value, int depth)
+{
+    if (const auto* elements = std::get_if<std::vector<Value>>(&value.content))
+        write_array(writer, *elements, value.type, depth);
+    else if (const std::optional<std::string> text = scalar_text(value, depth))
+        writer.element("VALUE", *text);
+}
+
+// What all three kinds of property begin with.
+void start_property(Xml_Writer& writer, const char* element, const Named_Value& property, const zmlr::Meta_Class* origins)
+{
+    writer.start(element).attribute("NAME", property.name);
+    if (property.value.type != CMPI_ref)
+        writer.attribute("TYPE", cim_type_name(property.value.type));
+    const zmlr::Meta_Class* origin = origins ? origin_of(*origins, property.name) : nullptr;
+    if (origin)
+        writer.attribute("CLASSORIGIN", origin->name);
+}
+
+void write_reference_property(Xml_Writer& writer, const Named_Value& property, const zmlr::Meta_Class* origins)
+{
+    const auto* reference = std::get_if<Reference>(&property.value.content);
+    start_property(writer, "PROPERTY.REFERENCE", property, origins);
+    if (reference && *reference)
+        write_reference(writer, **reference);
+    writer.end();
+}
+
+void write_property(Xml_Writer& writer, const Named_Value& property, const zmlr::Meta_Class* origins, int depth)
+{
+    const CMPIType type = property.value.type;
+    if (!cim_type_name(type) || type == (CMPI_ref | CMPI_ARRAY))
+        return;
+    if (type == CMPI_ref)
+        return write_reference_property(writer, property, origins);
+    start_property(writer, (type & CMPI_ARRAY) != 0 ? "PROPERTY.ARRAY" : "PROPERTY", property, origins);
+    if (type == CMPI_instance)
+        writer.attribute("EmbeddedObject", "instance");
+    write_value_at(writer, property.value, depth);
+    writer.end();
+}
+
+void write_instance_at(Xml_Writer& writer, const Instance& instance, const zmlr::Meta_Class* origins, int depth)
+{
+    writer.start("INSTANCE").attribute("CLASSNAME", instance.path.class_name);
+    for (const Named_Value& property : instance.properties)
+        write_property(writer, property, origins, depth);
+    writer.end();
+}
+
+} // namespace
+
+void write_instance_name(Xml_Writer& writer, const Object_Path& path)
+{
+    writer.start("INSTANCENAME").attribute("CLASSNAME", path.class_name);
+    for (const Named_Value& key : path.keys)
+        write_key(writer, key);
+    writer.end();
+}
+
+void write_reference(Xml_Writer& writer, const Object_Path& path)
+{
+    writer.start("VALUE.REFERENCE");
+    if (path.name_space.empty())
+        write_instance_name(writer, path);
+    else if (path.host.empty())
+        write_local_path(writer, path);
+    else
+        write_full_path(writer, path);
+    writer.end();
+}
+
+void write_instance(Xml_Writer& writer, const Instance& instance, const zmlr::Meta_Class* origins)
+{
+    write_instance_at(writer, instance, origins, 0);
+}
+
+void write_value(Xml_Writer& writer, const Value& value) { write_value_at(writer, value, 0); }
+
+} // namespace cimserver

@@ -1,0 +1,100 @@
+#include "cimserver/cimxml/parameters.h"
+
+#include "cimserver/broker/names.h"
+#include "cimserver/cimxml/object_reader.h"
+
+#include <algorithm>
+
+namespace cimserver
+{
+
+namespace
+{
+
+[[noreturn]] void fail(std::string_view what, std::string_view name)
+{
+    throw Cim_Error(CIM_ERR_INVALID_PARAMETER, std::string(what) + ": " + std::string(name));
+}
+
+bool is_parameter(const Xml_Element& element) { return element.name == "IPARAMVALUE"; }
+
+const std::string& name_of(const Xml_Element& parameter) { return *parameter.attribute("NAME"); }
+
+} // namespace
+
+Parameters::Parameters(const Cimxml_Request& request, std::span<const std::string_view> known) : _request(request)
+{
+    for (const Xml_Element& parameter : request.call.children)
+    {
+        if (!is_parameter(parameter))
+            continue;
+        const std::string& name = name_of(parameter);
+        if (std::ranges::none_of(known, [&](std::string_view candidate) { return equal_names(candidate, name); }))
+            fail("unknown parameter", name);
+        if (find(name) != &parameter)
+            fail("parameter given twice", name);
+    }
+}
+
+std::string Parameters::class_name(std::string_view name) const
+{
+    std::string class_name = optional_class_name(name);
+    if (class_name.empty())
+        fail("missing parameter", name);
+    return class_name;
+}
+
+std::string Parameters::optional_class_name(std::string_view name) const
+{
+    const Xml_Element* value = value_of(name, "CLASSNAME");
+    return value ? *value->attribute("NAME") : std::string();
+}
+
+Object_Path Parameters::instance_name(std::string_view name) const
+{
+    const Xml_Element* value = value_of(name, "INSTANCENAME");
+    if (!value)
+        fail("missing parameter", name);
+    return read_path(*value, name_space());
+}
+
+bool Parameters::boolean(std::string_view name, bool default_value) const
+{
+    const Xml_Element* value = value_of(name, "VALUE");
+    return value ? read_boolean(value->text) : default_value;
+}
+
+Property_List Parameters::property_list(std::string_view name) const
+{
+    const Xml_Element* value = value_of(name, "VALUE.ARRAY");
+    if (!value)
+        return std::nullopt;
+    std::vector<std::string> names;
+    for (const Xml_Element& element : value->children)
+    {
+        if (element.name != "VALUE")
+            fail("null in a list of names", name);
+        names.push_back(element.text);
+    }
+    return names;
+}
+
+const Xml_Element* Parameters::find(std::string_view name) const
+{
+    for (const Xml_Element& parameter : _request.call.children)
+        if (is_parameter(parameter) && equal_names(name_of(parameter), name))
+            return &parameter;
+    return nullptr;
+}
+
+const Xml_Element* Parameters::value_of(std::string_view name, std::string_view element) const
+{
+    const Xml_Element* parameter = find(name);
+    if (!parameter || parameter->children.empty())
+        return nullptr;
+    if (parameter->children.front().name != element)
+        fail("parameter of another type than " + std::string(element), name);
+    return &parameter->children.front();
+}
+
+} // namespace cimserver

@@ -1,0 +1,18 @@
+// Writes the qualifiers of classes and their features: those that the meta-data's flags stand for, and the texts of the
+// qualifier table (DSP0004, DSP0201).
+#pragma once
+
+#include "cimserver/cimxml/xml_writer.h"
+#include "runtime/meta.h"
+
+namespace cimserver
+{
+
+// A row of the table that stands at an ancestor holds for the class and its features unless a nearer class has its own.
+void write_class_qualifiers(Xml_Writer& writer, const zmlr::Meta_Class& meta_class);
+void write_feature_qualifiers(Xml_Writer& writer, const zmlr::Meta_Class& meta_class, unsigned feature_index);
+
+// A parameter's direction and flags.
+void write_parameter_qualifiers(Xml_Writer& writer, const zmlr::Meta_Feature& parameter);
+
+} // namespace cimserver

@@ -1,0 +1,8 @@
+#include "cimserver/cimxml/version.h"
+
+namespace cimserver
+{
+
+const char* version() { return ZMLR_VERSION; }
+
+} // namespace cimserver

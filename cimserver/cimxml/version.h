@@ -1,0 +1,9 @@
+#pragma once
+
+namespace cimserver
+{
+
+// The project's version, "major.minor.patch".
+const char* version();
+
+} // namespace cimserver

@@ -1,0 +1,107 @@
+// One call of a provider: the objects that go in, and the sinks that take what comes out.
+#pragma once
+
+#include "cimserver/broker/repository.h"
+#include "cimserver/broker/request.h"
+
+#include <memory>
+#include <string>
+#include <vector>
+
+namespace cimserver
+{
+
+// A property list as a provider takes it: only names of properties of its class. No list is a null pointer. The texts are
+// those of the list, which must outlive it.
+class Name_List
+{
+public:
+    Name_List(const Property_List& properties, const Property_Layout& layout);
+
+    const char** names() { return _absent ? nullptr : _names.data(); }
+
+private:
+    bool _absent;
+    std::vector<const char*> _names;
+};
+
+// Which properties an answer shows: those that the client listed and, if a class is named, that it has. Both must outlive
+// the selection.
+class Selection
+{
+public:
+    Selection(const Property_List& properties, const Property_Layout* named_class)
+        : _properties(properties)
+        , _named_class(named_class)
+    {
+    }
+
+    // The flags of a layout's slots; null when all are shown. They hold until the next call with another layout.
+    const std::vector<bool>* flags(const std::shared_ptr<const Property_Layout>& layout);
+
+private:
+    void hide_others();
+
+    const Property_List& _properties;
+    const Property_Layout* _named_class;
+    std::shared_ptr<const Property_Layout> _layout; // of the flags
+    std::vector<bool> _flags;
+};
+
+// Collects the paths of an enumeration of names. A path that has no name space gets the request's.
+class Path_Sink : public Result_Sink
+{
+public:
+    explicit Path_Sink(std::string name_space) : _name_space(std::move(name_space)) {}
+
+    void take_path(const Object_Path& path) override;
+
+    std::vector<Object_Path> found;
+
+private:
+    const std::string _name_space;
+};
+
+// Collects instances, less the properties that the selection leaves out. A path that has no name space gets the request's,
+// one without keys gets them from the instance.
+class Instance_Sink : public Result_Sink
+{
+public:
+    Instance_Sink(std::string name_space, const Property_List& properties, const Property_Layout* named_class)
+        : _name_space(std::move(name_space))
+        , _selection(properties, named_class)
+    {
+    }
+
+    void take_instance(const Instance_Object& instance) override;
+
+    std::vector<Instance> found;
+
+private:
+    const std::string _name_space;
+    Selection _selection;
+};
+
+// The context, the result and the path of a call; what the provider makes lives as long as this. The path names the
+// provider's own class.
+class Provider_Call
+{
+public:
+    Provider_Call(const Class_Entry& provider, std::string name_space, Result_Sink& sink, CMPIFlags flags,
+                  std::vector<Named_Value> keys = {});
+
+    const CMPIContext* context() { return _request.context(); }
+    const CMPIResult* result() const { return _result; }
+    const CMPIObjectPath* path() const { return _path; }
+
+    // Throws the Cim_Error that a status other than OK means.
+    void check(const CMPIStatus& status) const;
+
+private:
+    const Class_Entry& _provider;
+    Request _request;
+    CMPIResult* _result;
+    CMPIObjectPath* _path;
+};
+
+} // namespace cimserver

@@ -1,0 +1,23 @@
+// The qualifiers that clients ask for and the module does not carry: Description, ValueMap, Values.
+//
+// Generated from the MOF. Rows are sorted by class and feature name (ASCII, lower case); an inherited feature's row stands
+// at the class that declares it.
+#pragma once
+
+namespace cimserver
+{
+
+struct Qualifier_Row
+{
+    const char* class_name;
+    const char* feature_name; // "" for the class itself
+    const char* name;         // "Description", "ValueMap", "Values"
+    bool array;
+    const char* const* values; // string values; one unless array
+    unsigned num_values;
+};
+
+extern const Qualifier_Row qualifier_table[];
+extern const unsigned qualifier_table_size;
+
+} // namespace cimserver

@@ -1,0 +1,179 @@
+#include "cmpi/cmpi_containers.h"
+
+#include "cmpi/cmpi_objects.h"
+#include "cmpi/converter.h"
+#include "runtime/log.h"
+
+namespace zmlr
+{
+
+namespace
+{
+
+constexpr const char* log_source = "CMPI_Containers";
+
+// Where a container's items come from.
+struct Source
+{
+    const Meta_Repository* repository;
+    const CMPIBroker* broker;
+    const char* name_space;
+};
+
+int to_value(const Source& source, const CMPIData& data, const char* name, Value::Type expected, Value& value)
+{
+    if (cmpi_to_cimple_value(source.repository, source.broker, source.name_space, data, value) != 0)
+    {
+        ZMLR_LOG(LL_WARN, "cmpi_to_cimple_value() failed");
+        return -1;
+    }
+    if (value.type() != expected)
+    {
+        ZMLR_LOG(LL_WARN, "type mismatch on %s: %s/%s", name, name_of(expected), name_of(value.type()));
+        return -1;
+    }
+    return 0;
+}
+
+int to_data(const Source& source, const char* name, const Value& value, uint32 flags, CMPI_Data& data)
+{
+    if (_to_cmpi_data(source.repository, source.broker, source.name_space, value, flags, data) == 0)
+        return 0;
+    ZMLR_LOG(LL_WARN, "_to_cmpi_data() failed: feature=%s", name);
+    return -1;
+}
+
+bool in_bounds(uint32 index, uint32 size)
+{
+    if (index < size)
+        return true;
+    ZMLR_LOG(LL_WARN, "bounds error");
+    return false;
+}
+
+// The name that came with an item; false when there is none.
+bool take_name(const CMPIString* cmpi_name, String& name)
+{
+    const char* text = chars_of(cmpi_name);
+    if (!text)
+        return false;
+    name = text;
+    return true;
+}
+
+} // namespace
+
+// ---- instances ----
+
+CMPIInstance_Container::CMPIInstance_Container(const Meta_Repository* repository, const CMPIBroker* broker,
+                                               const char* name_space, const CMPIInstance* instance)
+    : Container(repository)
+    , _broker(broker)
+    , _name_space(name_space)
+    , _instance(instance)
+{
+}
+
+uint32 CMPIInstance_Container::get_size() { return CMGetPropertyCount(_instance, nullptr); }
+
+int CMPIInstance_Container::fetch(uint32 index, CMPIData& data, String& name)
+{
+    const uint32 size = get_size();
+    if (!in_bounds(index, size))
+        return -1;
+    try
+    {
+        CMPIStatus status = {CMPI_RC_OK, nullptr};
+        CMPIString* cmpi_name = nullptr;
+        data = CMGetPropertyAt(_instance, index, &cmpi_name, &status);
+        if (okay(status) && take_name(cmpi_name, name))
+            return 0;
+        ZMLR_LOG(LL_WARN, "CMGetPropertyAt() failed");
+    }
+    catch (...)
+    {
+        ZMLR_LOG(LL_WARN, "CMGetPropertyAt() threw exception: index=%u size=%u", index, size);
+    }
+    return -1;
+}
+
+int CMPIInstance_Container::get_name(uint32 index, String& name)
+{
+    CMPIData data;
+    return fetch(index, data, name);
+}
+
+int CMPIInstance_Container::get_value(uint32 index, Value::Type expected, Value& value)
+{
+    CMPIData data;
+    String name;
+    if (fetch(index, data, name) != 0)
+        return -1;
+    return to_value({repository(), _broker, _name_space.c_str()}, data, name.c_str(), expected, value);
+}
+
+int CMPIInstance_Container::set_value(const char* name, const Value& value, uint32 flags)
+{
+    CMPI_Data data;
+    if (to_data({repository(), _broker, _name_space.c_str()}, name, value, flags, data) != 0)
+        return -1;
+    if (okay(CMSetProperty(_instance, name, data.value(), data.type())))
+        return 0;
+    ZMLR_LOG(LL_WARN, "CMSetProperty() failed: %s", name);
+    return -1;
+}
+
+// ---- object paths ----
+
+CMPIObjectPath_Container::CMPIObjectPath_Container(const Meta_Repository* repository, const CMPIBroker* broker,
+                                                   const char* name_space, const CMPIObjectPath* path)
+    : Container(repository)
+    , _broker(broker)
+    , _name_space(name_space)
+    , _path(path)
+{
+}
+
+uint32 CMPIObjectPath_Container::get_size() { return CMGetKeyCount(_path, nullptr); }
+
+int CMPIObjectPath_Container::fetch(uint32 index, CMPIData& data, String& name)
+{
+    if (!in_bounds(index, get_size()))
+        return -1;
+    CMPIStatus status = {CMPI_RC_OK, nullptr};
+    CMPIString* cmpi_name = nullptr;
+    data = CMGetKeyAt(_path, index, &cmpi_name, &status);
+    if (okay(status) && take_name(cmpi_name, name))
+        return 0;
+    ZMLR_LOG(LL_WARN, "CMGetKeyAt() failed");
+    return -1;
+}
+
+int CMPIObjectPath_Container::get_name(uint32 index, String& name)
+{
+    CMPIData data;
+    return fetch(index, data, name);
+}
+
+int CMPIObjectPath_Container::get_value(uint32 index, Value::Type expected, Value& value)
+{
+    CMPIData data;
+    String name;
+    if (fetch(index, data, name) != 0)
+        return -1;
+    return to_value({repository(), _broker, _name_space.c_str()}, data, name.c_str(), expected, value);
+}
+
+int CMPIObjectPath_Container::set_value(const char* name, const Value& value, uint32 flags)
+{
+    CMPI_Data data;
+    if (to_data({repository(), _broker, _name_space.c_str()}, name, value, flags, data) != 0)
+        return -1;
+    // Only paths that we made, which are not constant, are written.
+    if (okay(CMAddKey(const_cast<CMPIObjectPath*>(_path), name, data.value(), data.type())))
+        return 0;
+    ZMLR_LOG(LL_WARN, "CMAddKey() failed");
+    return -1;
+}
+
+} // namespace zmlr

@@ -1,0 +1,52 @@
+// The containers around CMPI objects: an instance's properties and an object path's keys.
+//
+// A container borrows the object it wraps. `name_space` is where references without a name space of their own point to.
+#pragma once
+
+#include "cmpi/container.h"
+
+#include <cmpift.h>
+
+namespace zmlr
+{
+
+class CMPIInstance_Container : public Container
+{
+public:
+    CMPIInstance_Container(const Meta_Repository* repository, const CMPIBroker* broker, const char* name_space,
+                           const CMPIInstance* instance);
+
+    uint32 get_size() override;
+    int get_name(uint32 index, String& name) override;
+    int get_value(uint32 index, Value::Type expected, Value& value) override;
+    int set_value(const char* name, const Value& value, uint32 flags) override;
+
+private:
+    int fetch(uint32 index, CMPIData& data, String& name);
+
+    const CMPIBroker* _broker;
+    String _name_space;
+    const CMPIInstance* _instance;
+};
+
+// A container for a constant path may only be read.
+class CMPIObjectPath_Container : public Container
+{
+public:
+    CMPIObjectPath_Container(const Meta_Repository* repository, const CMPIBroker* broker, const char* name_space,
+                             const CMPIObjectPath* path);
+
+    uint32 get_size() override;
+    int get_name(uint32 index, String& name) override;
+    int get_value(uint32 index, Value::Type expected, Value& value) override;
+    int set_value(const char* name, const Value& value, uint32 flags) override;
+
+private:
+    int fetch(uint32 index, CMPIData& data, String& name);
+
+    const CMPIBroker* _broker;
+    String _name_space;
+    const CMPIObjectPath* _path;
+};
+
+} // namespace zmlr

@@ -1,0 +1,91 @@
+#include "cmpi/cmpi_data.h"
+
+namespace zmlr
+{
+
+void CMPI_Data::set(CMPIType type, const CMPIValue& value)
+{
+    release();
+    _data = {type, CMPI_goodValue, value};
+}
+
+void CMPI_Data::set_null(CMPIType type)
+{
+    release();
+    _data = {type, CMPI_nullValue, {}};
+}
+
+void CMPI_Data::own(CMPIType type, const CMPIValue& value)
+{
+    set(type, value);
+    _owner = true;
+}
+
+bool CMPI_Data::adopt(CMPIString* string)
+{
+    if (!string)
+        return false;
+    CMPIValue value = {};
+    value.string = string;
+    own(CMPI_string, value);
+    return true;
+}
+
+bool CMPI_Data::adopt(CMPIDateTime* datetime)
+{
+    if (!datetime)
+        return false;
+    CMPIValue value = {};
+    value.dateTime = datetime;
+    own(CMPI_dateTime, value);
+    return true;
+}
+
+bool CMPI_Data::adopt(CMPIObjectPath* path)
+{
+    if (!path)
+        return false;
+    CMPIValue value = {};
+    value.ref = path;
+    own(CMPI_ref, value);
+    return true;
+}
+
+bool CMPI_Data::adopt(CMPIInstance* instance)
+{
+    if (!instance)
+        return false;
+    CMPIValue value = {};
+    value.inst = instance;
+    own(CMPI_instance, value);
+    return true;
+}
+
+bool CMPI_Data::adopt(CMPIArray* array, CMPIType element_type)
+{
+    if (!array)
+        return false;
+    CMPIValue value = {};
+    value.array = array;
+    own(static_cast<CMPIType>(element_type | CMPI_ARRAY), value);
+    return true;
+}
+
+void CMPI_Data::release()
+{
+    if (!_owner)
+        return;
+    _owner = false;
+    if (CMIsArray(_data))
+        CMRelease(_data.value.array);
+    else if (_data.type == CMPI_string)
+        CMRelease(_data.value.string);
+    else if (_data.type == CMPI_dateTime)
+        CMRelease(_data.value.dateTime);
+    else if (_data.type == CMPI_ref)
+        CMRelease(_data.value.ref);
+    else
+        CMRelease(_data.value.inst);
+}
+
+} // namespace zmlr

@@ -1,0 +1,42 @@
+// Container: a sequence of named CMPI values, and the walk that carries it into an instance and back, feature by feature.
+//
+// A bad item never fails a whole conversion: it is logged and leaves its feature null (or its item out).
+#pragma once
+
+#include "runtime/instance.h"
+#include "runtime/string.h"
+#include "runtime/value.h"
+
+namespace zmlr
+{
+
+class Container
+{
+public:
+    explicit Container(const Meta_Repository* repository) : _repository(repository) {}
+    virtual ~Container() = default;
+    Container(const Container&) = delete;
+    Container& operator=(const Container&) = delete;
+
+    // Each of these answers 0, or -1 and a log line.
+    virtual uint32 get_size() = 0;
+    virtual int get_name(uint32 index, String& name) = 0;
+    virtual int get_value(uint32 index, Value::Type expected, Value& value) = 0;
+    virtual int set_value(const char* name, const Value& value, uint32 flags) = 0; // flags: of the feature
+
+    // Carries the items into `instance`, which is made of meta_class when it is empty: every property that no item names is
+    // null. With a mask only features with one of its flags are set. Returns 0.
+    int convert(const Meta_Class* meta_class, uint32 mask, Ref<Instance>& instance);
+
+    // Carries the non-null properties and references into the container; with a mask only features with one of its flags.
+    // Returns 0, or -1 for a null instance.
+    int convert(const Instance* instance, uint32 mask);
+
+protected:
+    const Meta_Repository* repository() const { return _repository; }
+
+private:
+    const Meta_Repository* _repository;
+};
+
+} // namespace zmlr

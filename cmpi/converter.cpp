@@ -1,0 +1,102 @@
+#include "cmpi/converter.h"
+
+#include "cmpi/cmpi_containers.h"
+#include "runtime/log.h"
+
+#include <vector>
+
+namespace zmlr
+{
+
+namespace
+{
+
+constexpr const char* log_source = "Converter";
+
+CMPIrc set_property_filter(CMPIInstance* cmpi_instance, const Meta_Class* meta_class, const char** properties)
+{
+    std::vector<const char*> keys;
+    keys.reserve(meta_class->num_keys + 1);
+    for (uint32 i = 0; i < meta_class->num_meta_features; ++i)
+    {
+        if (is_key(meta_class->meta_features[i]))
+            keys.push_back(meta_class->meta_features[i]->name);
+    }
+    keys.push_back(nullptr);
+    return CMSetPropertyFilter(cmpi_instance, properties, keys.data()).rc;
+}
+
+} // namespace
+
+CMPIrc make_cmpi_object_path(const CMPIBroker* broker, const Instance* instance, const char* name_space,
+                             CMPI_Ptr<CMPIObjectPath>& path)
+{
+    CMPIStatus status = {CMPI_RC_OK, nullptr};
+    CMPI_Ptr<CMPIObjectPath> made(CMNewObjectPath(broker, name_space, instance->meta_class->name, &status));
+    if (!made || !okay(status))
+        return CMPI_RC_ERR_FAILED;
+    CMPIObjectPath_Container container(instance->meta_class->meta_repository, broker, name_space, made.get());
+    if (container.convert(instance, Flag_Key) != 0)
+        return CMPI_RC_ERR_FAILED;
+    path = std::move(made);
+    return CMPI_RC_OK;
+}
+
+CMPIrc make_cmpi_instance(const CMPIBroker* broker, const Instance* instance, const char* name_space, const CMPIObjectPath* path,
+                          const char** properties, CMPI_Ptr<CMPIInstance>& cmpi_instance)
+{
+    CMPI_Ptr<CMPIObjectPath> own_path;
+    if (!path)
+    {
+        ZMLR_LOG(LL_WARN, "No ObjectPath built before call to make_CMPI_instance");
+        if (make_cmpi_object_path(broker, instance, name_space, own_path) != CMPI_RC_OK)
+            return CMPI_RC_ERR_FAILED;
+        path = own_path.get();
+    }
+
+    CMPIStatus status = {CMPI_RC_OK, nullptr};
+    CMPI_Ptr<CMPIInstance> made(CMNewInstance(broker, path, &status));
+    if (!made || !okay(status))
+        return CMPI_RC_ERR_FAILED;
+    if (properties)
+    {
+        const CMPIrc rc = set_property_filter(made.get(), instance->meta_class, properties);
+        if (rc != CMPI_RC_OK)
+            return rc;
+    }
+    CMPIInstance_Container container(instance->meta_class->meta_repository, broker, name_space, made.get());
+    if (container.convert(instance, 0) != 0)
+        return CMPI_RC_ERR_FAILED;
+    cmpi_instance = std::move(made);
+    return CMPI_RC_OK;
+}
+
+CMPIrc make_cimple_instance(const CMPIBroker* broker, const Meta_Class* meta_class, const CMPIObjectPath* path,
+                            const CMPIInstance* cmpi_instance, Ref<Instance>& instance)
+{
+    if (!cmpi_instance)
+        return CMPI_RC_ERR_FAILED;
+    const String name_space = name_space_of(path);
+    CMPIInstance_Container container(meta_class->meta_repository, broker, name_space.c_str(), cmpi_instance);
+    Ref<Instance> made;
+    if (container.convert(meta_class, 0, made) != 0)
+        return CMPI_RC_ERR_FAILED;
+    __set_name_space_recursive(made.ptr(), name_space.c_str(), false);
+    instance = std::move(made);
+    return CMPI_RC_OK;
+}
+
+CMPIrc make_cimple_reference(const CMPIBroker* broker, const Meta_Class* meta_class, const CMPIObjectPath* path,
+                             Ref<Instance>& instance)
+{
+    const String name_space = name_space_of(path);
+    CMPIObjectPath_Container container(meta_class->meta_repository, broker, name_space.c_str(), path);
+    Ref<Instance> made;
+    if (container.convert(meta_class, Flag_Key, made) != 0)
+        return CMPI_RC_ERR_FAILED;
+    __set_name_space_recursive(made.ptr(), name_space.c_str(), false);
+    instance = std::move(made);
+    return CMPI_RC_OK;
+}
+
+} // namespace zmlr

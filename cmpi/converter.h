@@ -1,0 +1,44 @@
+// Conversion between CMPI objects and instances, and between CMPI data and values.
+//
+// The make functions answer CMPI_RC_OK, or CMPI_RC_ERR_FAILED with nothing made; the value functions answer 0 or -1. What
+// goes wrong is logged at LL_WARN. `name_space` serves where an instance has no name space of its own.
+#pragma once
+
+#include "cmpi/cmpi_data.h"
+#include "cmpi/cmpi_objects.h"
+#include "runtime/instance.h"
+#include "runtime/value.h"
+
+#include <cmpidt.h>
+
+namespace zmlr
+{
+
+// The path with the instance's keys.
+CMPIrc make_cmpi_object_path(const CMPIBroker* broker, const Instance* instance, const char* name_space,
+                             CMPI_Ptr<CMPIObjectPath>& path);
+
+// The whole instance under a path (null: the one of its keys, which is logged). A property list is installed as the
+// instance's property filter; the code of a failing filter call is answered as it is.
+CMPIrc make_cmpi_instance(const CMPIBroker* broker, const Instance* instance, const char* name_space, const CMPIObjectPath* path,
+                          const char** properties, CMPI_Ptr<CMPIInstance>& cmpi_instance);
+
+// An instance of meta_class with the properties of a CMPI instance. It and what it references get the path's name space
+// where they have none.
+CMPIrc make_cimple_instance(const CMPIBroker* broker, const Meta_Class* meta_class, const CMPIObjectPath* path,
+                            const CMPIInstance* cmpi_instance, Ref<Instance>& instance);
+
+// The same with the keys of a path; every other property is null.
+CMPIrc make_cimple_reference(const CMPIBroker* broker, const Meta_Class* meta_class, const CMPIObjectPath* path,
+                             Ref<Instance>& instance);
+
+// Data become a value of the matching type; a null value if their state says so. References become instances with the keys
+// of the referenced object, embedded objects whole instances: their classes are looked up in the repository.
+int cmpi_to_cimple_value(const Meta_Repository* repository, const CMPIBroker* broker, const char* name_space,
+                         const CMPIData& data, Value& value);
+
+// A value becomes data. `flags` are those of its feature: they tell an embedded object from a reference.
+int _to_cmpi_data(const Meta_Repository* repository, const CMPIBroker* broker, const char* name_space, const Value& value,
+                  uint32 flags, CMPI_Data& data);
+
+} // namespace zmlr

@@ -1,0 +1,84 @@
+#include "cmpi/entry.h"
+
+#include "cmpi/cmpi_trace.h"
+#include "cmpi/shell.h"
+
+#include <memory>
+#include <mutex>
+
+namespace zmlr
+{
+
+namespace
+{
+
+// Recursive: a provider that loads may call into the server, which may ask for another provider of this module.
+constinit std::recursive_mutex life_lock;
+
+template <class MI, class FT> MI* hand_out(MI& mi, FT& ft, CMPI_Static_Data* sd)
+{
+    mi.hdl = sd;
+    mi.ft = &ft;
+    return &mi;
+}
+
+void* interface_of(CMPI_Static_Data* sd, char kind)
+{
+    switch (kind)
+    {
+    case 'I':
+        return hand_out(sd->instance_mi, sd->instance_ft, sd);
+    case 'M':
+        return hand_out(sd->method_mi, sd->method_ft, sd);
+    case 'A':
+        return hand_out(sd->association_mi, sd->association_ft, sd);
+    case 'N':
+        return hand_out(sd->indication_mi, sd->indication_ft, sd);
+    default:
+        return nullptr;
+    }
+}
+
+} // namespace
+
+CMPIrc cleanup(CMPI_Adapter* adapter, bool terminating)
+{
+    const std::lock_guard guard(life_lock);
+    if (!terminating && !adapter->allow_unload)
+        return CMPI_RC_DO_NOT_UNLOAD;
+    if (adapter->load_count != 1)
+    {
+        --adapter->load_count;
+        return CMPI_RC_OK;
+    }
+    const std::unique_ptr<CMPI_Adapter> last(adapter);
+    const auto unload = [&]
+    {
+        last->unload();
+        return CMPI_RC_OK;
+    };
+    shielded("unload", unload); // the adapter goes in any case: nobody asks for the status
+    return CMPI_RC_OK;
+}
+
+} // namespace zmlr
+
+int cimple_cmpi_adapter(char, zmlr::CMPI_Static_Data* sd, const zmlr::Registration* registration, const CMPIBroker* broker,
+                        const CMPIContext* context, const char* provider_name, char kind, void** mi) noexcept
+{
+    using namespace zmlr;
+    *mi = nullptr;
+    const auto attach = [&]
+    {
+        const std::lock_guard guard(life_lock);
+        if (sd->adapter)
+            ++sd->adapter->load_count;
+        else
+            static_cast<void>(new CMPI_Adapter(broker, context, provider_name, registration, sd)); // kept in the static data
+        ent("cimple_cmpi_adapter");
+        *mi = interface_of(sd, kind);
+        ret("cimple_cmpi_adapter");
+        return CMPI_RC_OK;
+    };
+    return shielded("cimple_cmpi_adapter", attach) == CMPI_RC_OK ? 0 : -1;
+}

@@ -1,0 +1,46 @@
+// The frame of every request handler: adapter, thread context, lock, traces, and the shell that keeps exceptions in.
+#pragma once
+
+#include "cmpi/adapter.h"
+#include "cmpi/cmpi_trace.h"
+#include "cmpi/entry.h"
+#include "cmpi/shell.h"
+#include "cmpi/thread_context.h"
+
+namespace zmlr
+{
+
+// Runs work(adapter), which answers a CMPIrc, as the handler `name` of the interface.
+template <class MI, class Work> CMPIStatus serve(const char* name, MI* mi, const CMPIContext* context, Work work) noexcept
+{
+    const auto request = [&]
+    {
+        CMPI_Adapter* adapter = CMPI_Adapter::of(mi);
+        const CMPI_Thread_Context_Pusher pusher(adapter->broker, context, adapter);
+        const Auto_Mutex guard(adapter->lock);
+        ent(name);
+        const CMPIrc answer = shielded(name, [&] { return work(*adapter); });
+        ret(name, answer);
+        return answer;
+    };
+    return {shielded(name, request), nullptr};
+}
+
+// Runs the common cleanup as the cleanup function `name` of the interface, under a thread context. The lock is not taken:
+// the adapter may end here, and a provider that unloads may wait for a thread that needs it.
+template <class MI>
+CMPIStatus serve_cleanup(const char* name, MI* mi, const CMPIContext* context, CMPIBoolean terminating) noexcept
+{
+    const auto request = [&]
+    {
+        CMPI_Adapter* adapter = CMPI_Adapter::of(mi);
+        const CMPI_Thread_Context_Pusher pusher(adapter->broker, context, adapter);
+        ent(name);
+        const CMPIrc answer = cleanup(adapter, terminating != 0);
+        ret(name, answer);
+        return answer;
+    };
+    return {shielded(name, request), nullptr};
+}
+
+} // namespace zmlr

@@ -1,0 +1,37 @@
+// The frame of the library: start and end, the last error, status texts, checksums.
+#pragma once
+
+#include "hxal/records/status.h"
+#include "hxal/records/types.h"
+
+#ifdef __cplusplus
+extern "C"
+{
+#endif
+
+    // Stores the identity under which the driver queues events for this program. Returns 0. Opens nothing.
+    int hxal_libinit(hxa_aen_app_t app);
+
+    // Ends the use of the library. There is nothing to release.
+    void hxal_libexit(void);
+
+    // The last error, one cell for the process: the scans and the adapter naming set it, nothing clears it. The last writer
+    // wins, so read it right after the call that failed.
+    void hxal_set_last_error(hxa_status_t status);
+    hxa_status_t hxal_get_last_error(void);
+
+    // The message text of a status, ending in one blank; "Unknown Failure" for every number that is no status.
+    const char* hxal_status_to_string(int code);
+
+    // The status that stands for an errno value; HXA_STATUS_FAILED for those without one of their own.
+    hxa_status_t hxal_get_status(int error);
+
+    // The byte that makes the sum of all bytes and itself 0 modulo 256. 0 for no bytes.
+    uint32_t hxal_checksum_u8(const uint8_t* bytes, uint32_t count);
+
+    // The exclusive-or of the 32-bit words in `size` bytes; up to three bytes left over do not count.
+    uint32_t hxa_checksum_u32(const uint32_t* words, int size);
+
+#ifdef __cplusplus
+}
+#endif

@@ -1,0 +1,30 @@
+// The adapter access library: everything a program needs to reach the FC host bus adapters and converged network
+// adapters of this host through their kernel drivers, from C11 or C++.
+//
+//     hxal_libinit(hxa_aen_app_cim);
+//     int count = hxal_adapter_scan();
+//     for (int ad = 1; ad <= count; ++ad)
+//         puts(hxal_adapter_open_idx(ad)->model_descr);
+//
+// A client calls hxal_libinit() once, then hxal_adapter_scan(), which also scans the I/O controllers (IOCs), and at the
+// end hxal_libexit(). When the scan answers 0, hxal_get_last_error() tells why: HXA_STATUS_NO_DRIVER (no driver node could
+// be opened), HXA_STATUS_VERSION_FAIL (the driver refused this library), anything else: a general failure.
+//
+// Statuses.  A request returns HXA_STATUS_OK or says what failed: the call to the driver (a status mapped from errno; the
+//            caller's buffer is untouched) or the driver itself (its own status, unchanged; the buffer is filled all the
+//            same). No request is repeated, also not an interrupted one (HXA_STATUS_EINTR). A null pointer where a
+//            request needs a handle or a buffer is HXA_STATUS_EINVAL, without a request.
+// Ownership. The library owns every handle, adapter record and text it returns. They stay valid until the next scan.
+// Look-ups.  A null or out-of-range argument finds nothing; each look-up names its answer for "none". Texts are compared
+//            byte by byte: "Blue" is not "blue".
+// Threads.   No list is locked. Requests and look-ups may run on any number of threads, but the calls that store what
+//            they read (hxal_adapter_get_name, hxal_ioc_get_current_mac, hxal_adapter_update_ioc) one at a time for an
+//            adapter or handle, and a scan alone: it replaces what the others are looking at.
+// Messages.  The few messages of the library go to standard output.
+#pragma once
+
+#include "hxal/adapter.h"
+#include "hxal/frame.h"
+#include "hxal/ioc.h"
+#include "hxal/port.h"
+#include "hxal/texts.h"

@@ -1,0 +1,12 @@
+// What the adapter look-ups need to know of the scan.
+#pragma once
+
+#include "hxal/internal/ioc_list.h"
+
+namespace hxal
+{
+
+// The first adapter of the last scan; none: null.
+hxal_adapter_t* adapter_list();
+
+} // namespace hxal

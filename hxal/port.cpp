@@ -1,0 +1,20 @@
+#include "hxal/port.h"
+
+#include "hxal/internal/request.h"
+#include "hxal/texts.h"
+
+hxa_status_t hxal_port_get_attr(const hxal_t* ioc, hxa_pport_attr_t* attr)
+{
+    if (!ioc || !attr)
+        return HXA_STATUS_EINVAL;
+    auto record = hxal::request_for<hxa_ioctl_port_attr_t>(*ioc);
+    if (const hxa_status_t sent = hxal::send(*ioc, "IOCMD_PORT_GET_ATTR", record); sent != HXA_STATUS_OK)
+        return sent;
+    *attr = record.attr;
+    return record.status;
+}
+
+const char* hxal_port_get_state_name(uint32_t state)
+{
+    return state < HXA_PPORT_ST_MAX_STATE ? hxal_pport_states_to_string(state) : "Unknown";
+}

@@ -1,0 +1,27 @@
+// FCHBAManager: the way from providers to the helpers that build the instances of hosts, adapters, ports and services.
+#pragma once
+
+#include "inventory/class_id.h"
+#include "runtime/instance.h"
+#include "runtime/string.h"
+
+namespace zmlr
+{
+
+class FCHBAManager
+{
+public:
+    static const FCHBAManager& getFCHBAManager();
+
+    // All instances of the class, new objects that the caller owns. Empty when there are none, when the class needs the
+    // adapters and the driver gate is closed, or when no helper builds the class.
+    Instance_Array getInstances(classId_t id) const;
+
+    // The ZEMLAR_FCPort instances of the adapter with this MAC address or node WWN.
+    Instance_Array getFCPortInstancesByAdapter(const String& address) const;
+
+private:
+    FCHBAManager();
+};
+
+} // namespace zmlr

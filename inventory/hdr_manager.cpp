@@ -1,0 +1,31 @@
+#include "inventory/hdr_manager.h"
+
+#include "inventory/dispatch.h"
+#include "runtime/log.h"
+
+namespace zmlr
+{
+
+namespace
+{
+
+constexpr const char* log_source = "HDRManager";
+
+constexpr Route routes[] = {
+    {CLASSID_StorageExtent, CLASSID_StorageExtent, Gate::checked, nullptr},
+    {CLASSID_TapeDrive, CLASSID_TapeDrive, Gate::checked, nullptr},
+};
+
+} // namespace
+
+HDRManager::HDRManager() { ZMLR_LOG(LL_INFO, "Inside HDRManager Constructor"); }
+
+const HDRManager& HDRManager::getHDRManager()
+{
+    static const HDRManager manager;
+    return manager;
+}
+
+Instance_Array HDRManager::getInstances(classId_t id) const { return dispatch(log_source, routes, id); }
+
+} // namespace zmlr

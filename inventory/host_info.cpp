@@ -1,0 +1,151 @@
+#include "inventory/provider_util.h"
+#include "runtime/log.h"
+#include "runtime/trace.h"
+
+#include <arpa/inet.h>
+#include <netdb.h>
+#include <sys/stat.h>
+#include <sys/utsname.h>
+#include <unistd.h>
+
+#include <cerrno>
+#include <cstring>
+#include <vector>
+
+namespace zmlr
+{
+
+namespace
+{
+
+constexpr const char* log_source = "ProviderUtil";
+constexpr std::size_t name_size = 255;
+constexpr std::size_t dotted_size = INET_ADDRSTRLEN;
+
+// A name as the system gives it, with a terminator also where the system cut it.
+struct Name
+{
+    char text[name_size + 1] = {};
+};
+
+bool read_host_name(Name& name) { return gethostname(name.text, name_size) == 0; }
+bool read_domain_name(Name& name) { return getdomainname(name.text, name_size) == 0; }
+
+// The IPv4 addresses of a host, with the memory they live in.
+class Address_List
+{
+public:
+    explicit Address_List(const char* host)
+    {
+        hostent* found = nullptr;
+        for (std::size_t size = 1024; size <= size_limit; size *= 2)
+        {
+            int error = 0;
+            _memory.resize(size);
+            if (gethostbyname_r(host, &_entry, _memory.data(), size, &found, &error) != ERANGE)
+                break;
+            found = nullptr;
+        }
+        if (found && found->h_addrtype == AF_INET && found->h_length == sizeof(in_addr))
+            _next = found->h_addr_list;
+    }
+
+    bool empty() const { return !_next || !*_next; }
+
+    // Writes the next address in dotted form; false at the end.
+    bool next(char (&dotted)[dotted_size]) { return !empty() && inet_ntop(AF_INET, *_next++, dotted, dotted_size); }
+
+private:
+    static constexpr std::size_t size_limit = 64 * 1024;
+
+    hostent _entry = {};
+    std::vector<char> _memory;
+    char** _next = nullptr;
+};
+
+Host_Info give(char* buf, std::size_t size, const char* text, Host_Info kind)
+{
+    strlcpy(buf, text, size);
+    return kind;
+}
+
+Host_Info give_bare_name(char* buf, std::size_t size, const Name& host)
+{
+    ZMLR_LOG(LL_INFO, "gethostbyname() FAILED. hostString will have hostname instead of ipAddress");
+    return give(buf, size, host.text, HOST_NAME);
+}
+
+// For a host that only has loopback addresses.
+Host_Info give_full_name(char* buf, std::size_t size, Name host)
+{
+    strlcpy(buf, host.text, size);
+    if (!read_host_name(host))
+    {
+        ZMLR_LOG(LL_WARN, "gethostname() failed");
+        return HOST_NAME;
+    }
+    strlcpy(buf, host.text, size);
+
+    Name domain;
+    if (!read_domain_name(domain))
+    {
+        ZMLR_LOG(LL_WARN, "getdomainname() failed");
+        return HOST_NAME;
+    }
+    strlcat(buf, ".", size);
+    strlcat(buf, domain.text, size);
+    if (std::strcmp(buf, "localhost") != 0 && std::strcmp(domain.text, "(none)") != 0)
+        return HOST_FULL_NAME;
+    return give_bare_name(buf, size, host);
+}
+
+} // namespace
+
+String ProviderUtil::getHostName()
+{
+    const Scope_Trace trace(log_source);
+    utsname system = {};
+    return uname(&system) == 0 ? String(system.nodename) : String("localhost");
+}
+
+Host_Info ProviderUtil::getHostInfo(char* buf, int len)
+{
+    const Scope_Trace trace(log_source);
+    const std::size_t size = len > 0 ? static_cast<std::size_t>(len) : 0;
+
+    Name host;
+    if (!read_host_name(host))
+    {
+        ZMLR_LOG(LL_INFO, "gethostname() FAILED. hostString will be filled with localhost");
+        return give(buf, size, "localhost", HOST_LOCALHOST);
+    }
+
+    Address_List addresses(host.text);
+    if (addresses.empty())
+        return give_bare_name(buf, size, host);
+
+    char dotted[dotted_size];
+    while (addresses.next(dotted))
+    {
+        if (std::strncmp(dotted, "127", 3) != 0)
+            return give(buf, size, dotted, HOST_IP_ADDRESS);
+    }
+    return give_full_name(buf, size, host);
+}
+
+String ProviderUtil::updateNamespacePath(const String& path)
+{
+    const Scope_Trace trace(log_source);
+    char host[name_size + 1] = {};
+    getHostInfo(host, name_size);
+    return String("//") + host + "/root/zemlar:" + path;
+}
+
+bool ProviderUtil::IsFileExist(const char* path)
+{
+    const Scope_Trace trace(log_source);
+    struct stat status;
+    return stat(path, &status) == 0;
+}
+
+} // namespace zmlr

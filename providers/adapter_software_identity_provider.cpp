@@ -1,0 +1,33 @@
+#include "providers/ZEMLAR_AdapterSoftwareIdentity_Provider_Skeleton.h"
+#include "providers/enumerate.h"
+
+namespace zmlr
+{
+
+namespace
+{
+
+constexpr Enumeration source = {
+    .log_source = "ZEMLAR_AdapterSoftwareIdentity_Provider",
+    .id = CLASSID_AdapterSoftwareIdentity,
+    .get_instances = from_fchba_manager,
+    .empty_message = "No Adapter Found!",
+};
+
+class ZEMLAR_AdapterSoftwareIdentity_Provider final : public ZEMLAR_AdapterSoftwareIdentity_Provider_Skeleton
+{
+public:
+    Enum_Instances_Status enum_instances(const Class*, Enum_Instances_Handler<Class>& handler) override
+    {
+        return enumerate(source, handler);
+    }
+};
+
+} // namespace
+
+ZEMLAR_AdapterSoftwareIdentity_Provider_Skeleton* create_ZEMLAR_AdapterSoftwareIdentity_Provider()
+{
+    return new ZEMLAR_AdapterSoftwareIdentity_Provider;
+}
+
+} // namespace zmlr

@@ -1,0 +1,35 @@
+#include "providers/ZEMLAR_HBASoftwareInstallationServiceCapabilities_Provider_Skeleton.h"
+#include "providers/enumerate.h"
+
+namespace zmlr
+{
+
+namespace
+{
+
+constexpr Enumeration source = {
+    .log_source = "ZEMLAR_HBASoftwareInstallationServiceCapabilities_Provider",
+    .id = CLASSID_HBASoftwareInstallationServiceCapabilities,
+    .get_instances = from_fchba_manager,
+    .empty_message = "Error: Invalid mapping information",
+};
+
+class ZEMLAR_HBASoftwareInstallationServiceCapabilities_Provider final
+    : public ZEMLAR_HBASoftwareInstallationServiceCapabilities_Provider_Skeleton
+{
+public:
+    Enum_Instances_Status enum_instances(const Class*, Enum_Instances_Handler<Class>& handler) override
+    {
+        return enumerate(source, handler);
+    }
+};
+
+} // namespace
+
+ZEMLAR_HBASoftwareInstallationServiceCapabilities_Provider_Skeleton*
+create_ZEMLAR_HBASoftwareInstallationServiceCapabilities_Provider()
+{
+    return new ZEMLAR_HBASoftwareInstallationServiceCapabilities_Provider;
+}
+
+} // namespace zmlr

@@ -1,0 +1,33 @@
+#include "providers/ZEMLAR_SCSIProtocolEndpoint_Provider_Skeleton.h"
+#include "providers/enumerate.h"
+
+namespace zmlr
+{
+
+namespace
+{
+
+constexpr Enumeration source = {
+    .log_source = "ZEMLAR_SCSIProtocolEndpoint_Provider",
+    .id = CLASSID_SCSIProtocolEndpoint,
+    .get_instances = from_fchba_manager,
+    .empty_message = "No FC Ports Found!",
+};
+
+class ZEMLAR_SCSIProtocolEndpoint_Provider final : public ZEMLAR_SCSIProtocolEndpoint_Provider_Skeleton
+{
+public:
+    Enum_Instances_Status enum_instances(const Class*, Enum_Instances_Handler<Class>& handler) override
+    {
+        return enumerate(source, handler);
+    }
+};
+
+} // namespace
+
+ZEMLAR_SCSIProtocolEndpoint_Provider_Skeleton* create_ZEMLAR_SCSIProtocolEndpoint_Provider()
+{
+    return new ZEMLAR_SCSIProtocolEndpoint_Provider;
+}
+
+} // namespace zmlr

@@ -1,0 +1,42 @@
+#include "runtime/ascii.h"
+#include "runtime/string.h"
+
+#include <algorithm>
+#include <cstring>
+
+namespace zmlr
+{
+
+bool eqi(const char* a, const char* b)
+{
+    // Most names that do not match differ in their first letter.
+    if (ascii::to_lower(*a) != ascii::to_lower(*b))
+        return false;
+
+    while (*a && ascii::to_lower(*a) == ascii::to_lower(*b))
+    {
+        ++a;
+        ++b;
+    }
+    return ascii::to_lower(*a) == ascii::to_lower(*b);
+}
+
+std::size_t strlcpy(char* dst, const char* src, std::size_t size)
+{
+    const std::size_t length = std::strlen(src);
+    if (size > 0)
+    {
+        const std::size_t n = std::min(length, size - 1);
+        std::memcpy(dst, src, n);
+        dst[n] = '\0';
+    }
+    return length;
+}
+
+std::size_t strlcat(char* dst, const char* src, std::size_t size)
+{
+    const std::size_t used = strnlen(dst, size);
+    return used == size ? size : used + strlcpy(dst + used, src, size - used);
+}
+
+} // namespace zmlr

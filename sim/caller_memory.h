@@ -1,0 +1,13 @@
+// The caller's record, reached as a kernel reaches user memory: a bad address is an answer (false), not a crash.
+#pragma once
+
+#include <cstdint>
+#include <span>
+
+namespace hxasim
+{
+
+bool copy_from_caller(std::span<std::uint8_t> to, const void* from);
+bool copy_to_caller(void* to, std::span<const std::uint8_t> from);
+
+} // namespace hxasim

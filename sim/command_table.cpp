@@ -1,0 +1,84 @@
+#include "sim/command_table.h"
+
+#include <algorithm>
+#include <cstring>
+#include <type_traits>
+
+namespace hxasim
+{
+
+namespace
+{
+
+constexpr const hxal::Command* catalogued(std::string_view name)
+{
+    for (const auto& command : hxal::catalogue)
+        if (command.name == name)
+            return &command;
+    throw "no such command in the catalogue";
+}
+
+template <auto> struct Answer_Record;
+template <typename Record, void (*function)(Call&, Record&)> struct Answer_Record<function>
+{
+    using type = Record;
+};
+
+template <typename Record> consteval std::optional<std::size_t> status_offset()
+{
+    if constexpr (requires(Record record) { record.status; })
+        return offsetof(Record, status);
+    else
+        return std::nullopt;
+}
+
+template <auto function> void answer_with(Call& call, std::span<std::uint8_t> bytes)
+{
+    typename Answer_Record<function>::type record;
+    static_assert(std::is_trivially_copyable_v<decltype(record)> && sizeof(record) <= max_record_size);
+    std::memcpy(&record, bytes.data(), sizeof(record));
+    function(call, record);
+    std::memcpy(bytes.data(), &record, sizeof(record));
+}
+
+template <auto function> consteval Row row(std::string_view name, Target target, std::array<Field, 4> inputs = {})
+{
+    using Record = typename Answer_Record<function>::type;
+    const auto* command = catalogued(name);
+    if (command->record != &hxal::record_tag<Record>)
+        throw "the catalogue has another record for this command";
+    return {.command = command,
+            .target = target,
+            .status = status_offset<Record>(),
+            .inputs = inputs,
+            .answer = answer_with<function>};
+}
+
+constexpr std::array<Field, 4> application_input{Field{.offset = offsetof(hxa_ioctl_aen_t, app_id), .size = 4}};
+
+// clang-format off
+constexpr std::array rows{
+    row<answer_version>        ("IOCMD_IOC_GET_VERSION", Target::driver),
+    row<answer_instances>      ("IOCMD_IOC_GET_INST",    Target::driver),
+    row<answer_ioc_attributes> ("IOCMD_IOC_GET_ATTR",    Target::ioc),
+    row<answer_ioc_info>       ("IOCMD_IOC_GET_INFO",    Target::ioc),
+    row<answer_event_sync>     ("IOCMD_AEN_SYNC",        Target::driver, application_input),
+    row<answer_port_attributes>("IOCMD_PORT_GET_ATTR",   Target::ioc),
+};
+// clang-format on
+
+} // namespace
+
+const Row* row_of(const hxal::Command& command)
+{
+    auto found = std::find_if(rows.begin(), rows.end(), [&](const Row& row) { return row.command == &command; });
+    return found == rows.end() ? nullptr : &*found;
+}
+
+const Row* row_named(std::string_view name)
+{
+    auto found = std::find_if(rows.begin(), rows.end(), [&](const Row& row) { return row.command->name == name; });
+    return found == rows.end() ? nullptr : &*found;
+}
+
+} // namespace hxasim

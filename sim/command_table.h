@@ -1,0 +1,83 @@
+// The commands that the simulated drivers answer: one row each, with what the sender may put into the record.
+//
+// To add a command: write its answer (a function that fills the record in place) beside its family, and add its row.
+#pragma once
+
+#include "sim/host.h"
+
+#include "hxal/records/commands.h"
+
+#include <array>
+#include <optional>
+#include <span>
+#include <string>
+
+namespace hxasim
+{
+
+// An open node.
+struct Descriptor
+{
+    Node node;
+    std::uint64_t host_number;                     // of the host that it was opened on
+    std::optional<std::uint32_t> application = {}; // as synchronised
+};
+
+// One request while it is answered. The answer sets `status` in its record, or refuses the whole call.
+struct Call
+{
+    Host& host;
+    Descriptor& descriptor;
+    Ioc* ioc;             // null for a request to the driver as a whole
+    int error = 0;        // errno that the call fails with
+    std::string why = {}; // what was wrong with it
+
+    void refuse(int errno_value, std::string reason)
+    {
+        error = errno_value;
+        why = std::move(reason);
+    }
+};
+
+struct Field
+{
+    std::size_t offset = 0;
+    std::size_t size = 0;
+};
+
+// Whom a request is for.
+enum class Target : std::uint8_t
+{
+    driver,
+    ioc
+};
+
+using Answer = void (*)(Call& call, std::span<std::uint8_t> record);
+
+struct Row
+{
+    const hxal::Command* command;
+    Target target;
+    std::optional<std::size_t> status; // where the record keeps its status
+    std::array<Field, 4> inputs;       // what the sender sets besides the instance; all other bytes come in as 0
+    Answer answer;
+};
+
+// Where requests to one IOC carry its instance.
+inline constexpr Field instance_field{.offset = 4, .size = 2};
+
+constexpr std::size_t max_record_size = 4096;
+
+// Null when no row has it.
+const Row* row_of(const hxal::Command& command);
+const Row* row_named(std::string_view name);
+
+// The answers, by the file that holds them.
+void answer_version(Call& call, hxa_ioctl_ioc_get_version_t& record); // driver_commands.cpp
+void answer_instances(Call& call, hxa_ioctl_ioc_get_inst_t& record);
+void answer_event_sync(Call& call, hxa_ioctl_aen_t& record);
+void answer_ioc_info(Call& call, hxa_ioctl_ioc_info_t& record); // ioc_commands.cpp
+void answer_ioc_attributes(Call& call, hxa_ioctl_ioc_attr_t& record);
+void answer_port_attributes(Call& call, hxa_ioctl_port_attr_t& record); // port_commands.cpp
+
+} // namespace hxasim

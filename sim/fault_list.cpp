@@ -1,0 +1,79 @@
+#include "sim/fault_list.h"
+
+#include "sim/json_object.h"
+
+#include <algorithm>
+
+namespace hxasim
+{
+
+namespace
+{
+
+bool fits(const Patch& patch, const Row& row)
+{
+    return patch.offset <= row.command->size && patch.bytes.size() <= row.command->size - patch.offset;
+}
+
+bool can_strike(const Fault& fault, const Row& row)
+{
+    return (fault.status == 0 || row.status) &&
+           std::all_of(fault.answer.begin(), fault.answer.end(), [&](const Patch& patch) { return fits(patch, row); });
+}
+
+bool matches(const Fault& fault, const Row& row, Node node, int instance)
+{
+    return (fault.command.empty() || fault.command == row.command->name) && (fault.node.empty() || fault.node == path_of(node)) &&
+           (!fault.instance || *fault.instance == instance) && can_strike(fault, row);
+}
+
+void check_against(const Row& row, const Fault& fault, const std::string& place)
+{
+    if (fault.status != 0 && !row.status)
+        refuse(place + ".status", fault.command + " carries no status");
+    for (const auto& patch : fault.answer)
+        if (!fits(patch, row))
+            refuse(place + ".answer", "beyond the " + std::to_string(row.command->size) + " bytes of " + fault.command);
+}
+
+} // namespace
+
+void check_fault(const Fault& fault, const std::string& place)
+{
+    const Row* row = row_named(fault.command);
+    if (!fault.command.empty() && !row)
+        refuse(place + ".command", "no such command: " + fault.command);
+    if (!fault.node.empty() && std::none_of(node_paths.begin(), node_paths.end(), [&](auto path) { return fault.node == path; }))
+        refuse(place + ".node", "no such node: " + fault.node);
+    if (fault.error == 0 && fault.status == 0 && fault.answer.empty())
+        refuse(place, "needs an error, a status or an answer");
+    if (row)
+        check_against(*row, fault, place);
+}
+
+const Fault* Fault_List::strike(const Row& row, Node node, int instance)
+{
+    for (auto& fault : _faults)
+    {
+        if (!matches(fault, row, node, instance))
+            continue;
+        if (fault.skip > 0)
+            --fault.skip;
+        else if (fault.times < 0)
+            return &fault;
+        else if (fault.times > 0)
+        {
+            --fault.times;
+            return &fault;
+        }
+    }
+    return nullptr;
+}
+
+void overwrite(const std::vector<Patch>& patches, std::span<std::uint8_t> record)
+{
+    for (const auto& patch : patches)
+        std::copy(patch.bytes.begin(), patch.bytes.end(), record.begin() + static_cast<std::ptrdiff_t>(patch.offset));
+}
+
+} // namespace hxasim

@@ -1,0 +1,33 @@
+// The injected faults, and which of them strikes a request.
+#pragma once
+
+#include "sim/command_table.h"
+
+#include <string>
+#include <vector>
+
+namespace hxasim
+{
+
+// Throws std::runtime_error "PLACE.member: ..." for a fault that could never do what it says.
+void check_fault(const Fault& fault, const std::string& place);
+
+class Fault_List
+{
+public:
+    void add(const Fault& fault) { _faults.push_back(fault); }
+    void assign(const std::vector<Fault>& faults) { _faults = faults; }
+    void clear() { _faults.clear(); }
+
+    // The fault that strikes this request, or null. Every fault asked counts the request against its `skip` or `times`.
+    // The pointer is good until the list changes.
+    const Fault* strike(const Row& row, Node node, int instance);
+
+private:
+    std::vector<Fault> _faults;
+};
+
+// Overwrites the patched bytes of an answered record.
+void overwrite(const std::vector<Patch>& patches, std::span<std::uint8_t> record);
+
+} // namespace hxasim

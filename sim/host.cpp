@@ -1,0 +1,63 @@
+#include "sim/host.h"
+
+#include "hxal/records/ioc.h"
+#include "hxal/records/port.h"
+
+#include <algorithm>
+
+namespace hxasim
+{
+
+Host::Host(Scenario scenario) : _scenario(std::move(scenario))
+{
+    for (auto& adapter : _scenario.adapters)
+        for (std::size_t number = 0; number < adapter.ports.size(); ++number)
+            add_port(adapter, static_cast<std::uint8_t>(number));
+}
+
+void Host::add_port(Adapter& adapter, std::uint8_t number)
+{
+    auto& port = adapter.ports[number];
+    add({.node = Node::hxa,
+         .type = adapter.converged() ? HXA_IOC_TYPE_FCoE : HXA_IOC_TYPE_FC,
+         .instance = port.fc_instance,
+         .adapter = &adapter,
+         .port = &port,
+         .port_number = number,
+         .pci_function = number,
+         .state = &port.ioc_state});
+    if (!adapter.converged())
+        return;
+    add({.node = Node::hxn,
+         .type = HXA_IOC_TYPE_LL,
+         .instance = port.eth_instance,
+         .adapter = &adapter,
+         .port = &port,
+         .port_number = number,
+         .pci_function = static_cast<std::uint32_t>(adapter.ports.size()) + number,
+         .state = &port.eth_ioc_state});
+}
+
+Ioc* Host::find(Node node, std::uint32_t instance)
+{
+    auto& iocs = _iocs[static_cast<std::size_t>(node)];
+    auto found = std::find_if(iocs.begin(), iocs.end(), [&](const Ioc& ioc) { return ioc.instance == instance; });
+    return found == iocs.end() ? nullptr : &*found;
+}
+
+std::uint32_t port_state(const Ioc& ioc)
+{
+    switch (*ioc.state)
+    {
+    case HXA_IOC_OPERATIONAL:
+        return ioc.port->state;
+    case HXA_IOC_DISABLED:
+        return HXA_PPORT_ST_IOCDIS;
+    case HXA_IOC_FWMISMATCH:
+        return HXA_PPORT_ST_FWMISMATCH;
+    default:
+        return HXA_PPORT_ST_IOCDOWN;
+    }
+}
+
+} // namespace hxasim

@@ -1,0 +1,49 @@
+// The simulated host at work: its IOCs by driver instance, and the state that requests read and change.
+#pragma once
+
+#include "sim/scenario.h"
+
+#include <array>
+#include <vector>
+
+namespace hxasim
+{
+
+// One I/O controller: one PCI function, seen by one driver.
+struct Ioc
+{
+    Node node;
+    std::uint32_t type; // hxa_ioc_type_e
+    std::uint32_t instance;
+    const Adapter* adapter;
+    Port* port;
+    std::uint8_t port_number;   // on its adapter
+    std::uint32_t pci_function; // FC functions first, then the Ethernet functions
+    std::uint32_t* state;       // hxa_ioc_state_t
+};
+
+class Host
+{
+public:
+    explicit Host(Scenario scenario);
+    Host(const Host&) = delete;
+    Host& operator=(const Host&) = delete;
+
+    const Driver& driver(Node node) const { return _scenario.drivers[static_cast<std::size_t>(node)]; }
+    const std::vector<Ioc>& iocs(Node node) const { return _iocs[static_cast<std::size_t>(node)]; }
+    const std::vector<Fault>& faults() const { return _scenario.faults; }
+
+    Ioc* find(Node node, std::uint32_t instance); // null when there is none
+
+private:
+    void add(const Ioc& ioc) { _iocs[static_cast<std::size_t>(ioc.node)].push_back(ioc); }
+    void add_port(Adapter& adapter, std::uint8_t number);
+
+    Scenario _scenario;
+    std::array<std::vector<Ioc>, 2> _iocs; // in the order of the scenario
+};
+
+// What the port reports through this IOC: its own state while the IOC runs, else that the IOC is down.
+std::uint32_t port_state(const Ioc& ioc);
+
+} // namespace hxasim

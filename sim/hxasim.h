@@ -1,0 +1,80 @@
+// The simulated driver as tests see it: load a host, look at the requests it was sent, make requests fail.
+//
+// A program that links libhxasim has its "/dev/hxa" and "/dev/hxn" answered by the loaded scenario; all other files and
+// descriptors go to libc. Without a scenario (neither HXASIM_SCENARIO nor load()) both nodes go to libc as well.
+// Every function may be called from any thread. Failures to read a scenario throw std::runtime_error that names the place
+// in it; the host that was loaded before then stays. HXASIM_SCENARIO is looked at once, at the first use of a node or of a
+// function below; a scenario that cannot be read is told on standard error, and opening a node answers ENODEV.
+#pragma once
+
+#include <cstddef>
+#include <cstdint>
+#include <optional>
+#include <string>
+#include <vector>
+
+#pragma GCC visibility push(default)
+
+namespace hxasim
+{
+
+// One ioctl as the driver saw it.
+struct Request
+{
+    std::string node;                   // "/dev/hxa" or "/dev/hxn"
+    unsigned long command = 0;          // the whole request code
+    std::string name;                   // "IOCMD_PORT_GET_ATTR"; empty when the driver does not know the command
+    int instance = -1;                  // -1 where the record carries none
+    std::vector<std::uint8_t> sent;     // the record as it came in
+    std::vector<std::uint8_t> answered; // the record as it went out
+    int error = 0;                      // the errno the call failed with, 0 when it succeeded
+};
+
+// Bytes that overwrite a part of an answered record: how a test gets a count that lies or a text that does not end.
+struct Patch
+{
+    std::size_t offset = 0; // from the start of the whole record
+    std::vector<std::uint8_t> bytes;
+};
+
+// Makes matching requests go wrong. Unset members match everything. The first fault in the order of injection that fires
+// decides; later ones do not see the request. A record status leaves the rest of the record as it was sent.
+struct Fault
+{
+    std::string command = {};         // by name; empty: every command
+    std::string node = {};            // empty: both
+    std::optional<int> instance = {}; // unset: every instance
+    int error = 0;                    // fail the call with this errno ...
+    std::uint32_t status = 0;         // ... or answer with this record status
+    int skip = 0;                     // let this many matching requests pass first
+    int times = -1;                   // then fail this many, -1: always
+    std::vector<Patch> answer = {};   // without an error: overwrite these bytes of the answered record
+};
+
+// Replaces the simulated host by a scenario: a shipped one by name ("mixed") or a JSON file by path; or JSON text.
+// Descriptors that are open on the old host answer ENODEV. Clears faults and recorded requests.
+void load(const std::string& name_or_path);
+void load_text(const std::string& json);
+void unload();
+
+// Returns and forgets the recorded requests, oldest first. Only the newest are kept: 100,000 of them, 128 MiB of records.
+std::vector<Request> take_requests();
+
+// Throws std::runtime_error for a fault that could never do what it says: an unknown command or node, a status for a record
+// that carries none, bytes beyond the record, nothing to do at all.
+void inject(const Fault& fault);
+void clear_faults();
+
+// Requests that no driver would accept (unknown command, wrong size, dirty reserved field, bad instance), since load():
+// one text each, at most the first 1,000.
+std::vector<std::string> violations();
+
+// Open descriptors on the simulated nodes.
+int open_descriptors();
+
+// The application identity that was last synchronised with the driver on this descriptor; none before that.
+std::optional<std::uint32_t> application_of(int descriptor);
+
+} // namespace hxasim
+
+#pragma GCC visibility pop

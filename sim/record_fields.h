@@ -1,0 +1,24 @@
+// Putting values into the fixed fields of records.
+#pragma once
+
+#include "hxal/records/types.h"
+
+#include <algorithm>
+#include <array>
+#include <cstring>
+#include <string_view>
+
+namespace hxasim
+{
+
+// A text that fills its field has no terminator; the rest of the field becomes 0.
+template <std::size_t size> void put_text(char (&field)[size], std::string_view text)
+{
+    std::memset(field, 0, size);
+    std::memcpy(field, text.data(), std::min(size, text.size()));
+}
+
+inline void put_address(wwn_t& field, const std::array<std::uint8_t, 8>& wwn) { std::memcpy(&field, wwn.data(), wwn.size()); }
+inline void put_address(mac_t& field, const std::array<std::uint8_t, 6>& mac) { std::memcpy(field.mac, mac.data(), mac.size()); }
+
+} // namespace hxasim

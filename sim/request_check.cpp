@@ -1,0 +1,69 @@
+#include "sim/request_check.h"
+
+#include <algorithm>
+#include <cerrno>
+#include <cstring>
+
+namespace hxasim
+{
+
+namespace
+{
+
+constexpr std::uint32_t size_bits = 0x3FFF'0000;
+
+std::uint32_t code_on(Node node, const hxal::Command& command)
+{
+    return hxal::command_code(command, node == Node::hxa ? command.family.fc : command.family.ll);
+}
+
+template <typename Predicate> const hxal::Command* first_command(Predicate matches)
+{
+    auto found = std::find_if(hxal::catalogue.begin(), hxal::catalogue.end(), matches);
+    return found == hxal::catalogue.end() ? nullptr : &*found;
+}
+
+bool covers(const Field& field, std::size_t at) { return at >= field.offset && at - field.offset < field.size; }
+
+bool may_be_set(const Row& row, std::size_t at)
+{
+    return (row.target == Target::ioc && covers(instance_field, at)) ||
+           std::any_of(row.inputs.begin(), row.inputs.end(), [&](const Field& field) { return covers(field, at); });
+}
+
+} // namespace
+
+// The whole code is tried first: on one node two commands may differ by their record size alone.
+Identified identify(Node node, std::uint32_t code)
+{
+    if (auto* exact = first_command([&](const auto& command) { return code_on(node, command) == code; }))
+        return {.command = exact};
+    auto other = node == Node::hxa ? Node::hxn : Node::hxa;
+    if (auto* elsewhere = first_command([&](const auto& command) { return code_on(other, command) == code; }))
+        return {.command = elsewhere, .error = ENOTTY, .why = std::string("belongs on ") + path_of(other)};
+    auto but_for_size = [&](const auto& command) { return ((code_on(node, command) ^ code) & ~size_bits) == 0; };
+    if (auto* resized = first_command(but_for_size))
+        return {.command = resized,
+                .error = EINVAL,
+                .why = "record of " + std::to_string(record_size(code)) + " bytes, must be " + std::to_string(resized->size)};
+    return {.error = ENOTTY, .why = "unknown command"};
+}
+
+std::string find_dirt(const Row& row, std::span<const std::uint8_t> record)
+{
+    for (std::size_t at = 0; at < record.size(); ++at)
+        if (record[at] != 0 && !may_be_set(row, at))
+            return "byte " + std::to_string(at) + " is " + std::to_string(record[at]) + ", must be 0";
+    return {};
+}
+
+int instance_of(const Row& row, std::span<const std::uint8_t> record)
+{
+    if (row.target == Target::driver)
+        return -1;
+    std::uint16_t instance = 0;
+    std::memcpy(&instance, &record[instance_field.offset], sizeof(instance));
+    return instance;
+}
+
+} // namespace hxasim

@@ -1,0 +1,262 @@
+#include "sim/scenario.h"
+
+#include "sim/fault_list.h"
+#include "sim/json_object.h"
+#include "sim/product_line.h"
+#include "sim/scenario_words.h"
+
+#include <bitset>
+#include <limits>
+
+namespace hxasim
+{
+
+namespace
+{
+
+using nlohmann::json;
+
+constexpr std::uint32_t max_u32 = std::numeric_limits<std::uint32_t>::max();
+constexpr std::size_t max_ports = 8;
+
+// The instance numbers of one node as they are given away.
+class Instance_Numbers
+{
+public:
+    explicit Instance_Numbers(Node node) : _node(node) {}
+
+    std::uint32_t take(Json_Object& port, std::string_view key)
+    {
+        auto instance = port.number(key, max_instances - 1, _next);
+        if (instance >= max_instances)
+            refuse(port.place(), "more than " + std::to_string(max_instances) + " IOCs on " + path_of(_node));
+        if (_taken[instance])
+            refuse(port.place_of(key), "instance " + std::to_string(instance) + " of " + path_of(_node) + " is taken");
+        _taken.set(instance);
+        _next = instance + 1;
+        return instance;
+    }
+
+private:
+    Node _node;
+    std::bitset<max_instances> _taken;
+    std::uint32_t _next = 0;
+};
+
+class Scenario_Reader
+{
+public:
+    Scenario read(const json& root);
+
+private:
+    void read_drivers(Json_Object& drivers);
+    void read_adapter(Json_Object& object);
+    void read_vpd(Json_Object& object, Adapter& adapter);
+    void read_port(Json_Object& object, Adapter& adapter);
+    void read_addresses(Json_Object& object, Port& port, bool converged);
+    void generate(Json_Object& object);
+    void read_fault(Json_Object& object);
+
+    Scenario _scenario;
+    Instance_Numbers _fc_instances{Node::hxa};
+    Instance_Numbers _eth_instances{Node::hxn};
+    std::size_t _eth_ports = 0;
+};
+
+Driver read_driver(Json_Object object)
+{
+    Driver driver;
+    driver.present = object.boolean("present", driver.present);
+    driver.version = object.number("version", max_u32, driver.version);
+    driver.version_status = object.number("version_status", max_u32, driver.version_status);
+    driver.instance_count = object.number("instance_count", max_u32);
+    object.done();
+    return driver;
+}
+
+void Scenario_Reader::read_drivers(Json_Object& drivers)
+{
+    if (auto hxa = drivers.object("hxa"))
+        _scenario.driver(Node::hxa) = read_driver(*hxa);
+    if (auto hxn = drivers.object("hxn"))
+        _scenario.driver(Node::hxn) = read_driver(*hxn);
+    drivers.done();
+}
+
+// Longest texts are the sizes of their record fields.
+void read_texts(Json_Object& object, Adapter& adapter)
+{
+    // clang-format off
+    adapter.serial             = object.text("serial",              12, adapter.serial);
+    adapter.name               = object.text("name",                64, adapter.name);
+    adapter.model              = object.text("model",               16, adapter.model);
+    adapter.model_descr        = object.text("model_descr",        128, adapter.model_descr);
+    adapter.manufacturer       = object.text("manufacturer",         8, adapter.manufacturer);
+    adapter.hwpath             = object.text("hwpath",              29, adapter.hwpath);
+    adapter.hw_version         = object.text("hw_version",          64, adapter.hw_version);
+    adapter.firmware_version   = object.text("firmware_version",    64, adapter.firmware_version);
+    adapter.fc_driver_version  = object.text("fc_driver_version",   64, adapter.fc_driver_version);
+    adapter.eth_driver_version = object.text("eth_driver_version",  64, adapter.eth_driver_version);
+    adapter.bios_version       = object.text("bios_version",        64, adapter.bios_version);
+    adapter.efi_version        = object.text("efi_version",         64, adapter.efi_version);
+    adapter.fcode_version      = object.text("fcode_version",       64, adapter.fcode_version);
+    adapter.os_type            = object.text("os_type",             64, adapter.os_type);
+    // clang-format on
+}
+
+void Scenario_Reader::read_vpd(Json_Object& object, Adapter& adapter)
+{
+    if (auto vpd = object.object("vpd"))
+    {
+        adapter.vpd.version = static_cast<std::uint8_t>(vpd->number("version", 255, adapter.vpd.version));
+        adapter.vpd.vendor = static_cast<std::uint8_t>(vpd->number("vendor", 255, adapter.vpd.vendor));
+        adapter.vpd.data = vpd->bytes("data", sizeof(hxa_mfg_vpd_t::data));
+        vpd->done();
+        return;
+    }
+    auto usual_fru = "FRU-" + adapter.serial;
+    adapter.vpd.data = build_vpd(adapter, object.text("fru_number", 16, usual_fru));
+}
+
+void Scenario_Reader::read_adapter(Json_Object& object)
+{
+    auto kind = static_cast<Adapter_Kind>(object.word("kind", kind_words));
+    auto index = _scenario.adapters.size();
+    auto adapter = usual_adapter(product_of(kind, object.text("model", 16, "")), index);
+    read_texts(object, adapter);
+    adapter.device_id = static_cast<std::uint16_t>(object.number("device_id", 0xFFFF, adapter.device_id));
+    adapter.max_speed = static_cast<std::uint8_t>(object.number("max_speed", 255, adapter.max_speed));
+    adapter.cna_capable = object.boolean("cna_capable", adapter.cna_capable);
+    adapter.is_mezz = object.boolean("is_mezz", adapter.is_mezz);
+    read_vpd(object, adapter);
+
+    static const json usual = json::parse(R"({"ports": [{}, {}]})");
+    auto usual_object = Json_Object(usual, object.place());
+    for (auto& port : (object.has("ports") ? object : usual_object).objects("ports", max_ports))
+        read_port(port, adapter);
+    object.done();
+    _scenario.adapters.push_back(std::move(adapter));
+}
+
+void Scenario_Reader::read_addresses(Json_Object& object, Port& port, bool converged)
+{
+    port.pwwn = object.address("pwwn", port.pwwn);
+    port.nwwn = object.address("nwwn", port.nwwn);
+    port.factory_pwwn = object.address("factory_pwwn", port.pwwn);
+    port.factory_nwwn = object.address("factory_nwwn", port.nwwn);
+    if (!converged)
+        return;
+    port.mac = object.address("mac", port.mac);
+    port.factory_mac = object.address("factory_mac", port.mac);
+    port.current_mac = object.address("current_mac", port.mac);
+    port.fcoe_mac = object.address("fcoe_mac", port.fcoe_mac);
+    port.fcoe_factory_mac = object.address("fcoe_factory_mac", port.fcoe_mac);
+    port.eth_name = object.text("eth_name", 64, port.eth_name);
+}
+
+void Scenario_Reader::read_port(Json_Object& object, Adapter& adapter)
+{
+    auto number = adapter.ports.size();
+    auto port = usual_port(adapter, _scenario.adapters.size(), number, _eth_ports);
+    read_addresses(object, port, adapter.converged());
+    port.name = object.text("name", 64, port.name);
+    port.symbolic_name = object.text("symbolic_name", 256, port.symbolic_name);
+    port.state = object.choice("state", port_state_words, max_u32, port.state);
+    port.speed_supported = object.number("speed_supported", max_u32, port.speed_supported);
+    port.speed = object.number("speed", max_u32, port.speed_supported);
+    port.type = object.choice("type", port_type_words, max_u32, port.type);
+    port.topology = object.choice("topology", topology_words, max_u32, port.topology);
+    port.address = object.number("address", 0xFFFFFF, port.address);
+    port.max_frame_size = static_cast<std::uint16_t>(object.number("max_frame_size", 0xFFFF, port.max_frame_size));
+    port.beacon = object.boolean("beacon", port.beacon);
+    port.ioc_state = object.choice("ioc_state", ioc_state_words, max_u32, port.ioc_state);
+    port.fc_instance = _fc_instances.take(object, "fc_instance");
+    if (adapter.converged())
+    {
+        port.eth_ioc_state = object.choice("eth_ioc_state", ioc_state_words, max_u32, port.ioc_state);
+        port.eth_instance = _eth_instances.take(object, "eth_instance");
+        ++_eth_ports;
+    }
+    object.done();
+    adapter.ports.push_back(std::move(port));
+}
+
+void Scenario_Reader::generate(Json_Object& object)
+{
+    auto count = object.number("adapters", max_instances, 1);
+    auto ports = object.number("ports", max_ports, 2);
+    object.word("kind", kind_words);
+    json usual = json::object();
+    if (object.has("model"))
+        usual["model"] = object.text("model", 16, "");
+    usual["ports"] = json::array();
+    for (std::uint32_t port = 0; port < ports; ++port)
+        usual["ports"].push_back(json::object());
+    usual["kind"] = object.text("kind", 16, "");
+    object.done();
+    for (std::uint32_t adapter = 0; adapter < count; ++adapter)
+    {
+        auto generated = Json_Object(usual, object.place_of("adapters[" + std::to_string(adapter) + "]"));
+        read_adapter(generated);
+    }
+}
+
+Patch read_patch(Json_Object object)
+{
+    Patch patch{.offset = object.number("offset", max_record_size, 0), .bytes = object.bytes("bytes", max_record_size)};
+    object.done();
+    return patch;
+}
+
+void Scenario_Reader::read_fault(Json_Object& object)
+{
+    Fault fault;
+    fault.command = object.text("command", 64, "");
+    fault.node = object.text("node", 64, "");
+    if (auto instance = object.number("instance", 0xFFFF))
+        fault.instance = static_cast<int>(*instance);
+    fault.error = static_cast<int>(object.choice("error", errno_words, 4095, 0));
+    fault.status = object.number("status", max_u32, 0);
+    fault.skip = static_cast<int>(object.number("skip", 1'000'000'000, 0));
+    if (auto times = object.number("times", 1'000'000'000))
+        fault.times = static_cast<int>(*times);
+    for (auto& patch : object.objects("answer", 64))
+        fault.answer.push_back(read_patch(patch));
+    object.done();
+    check_fault(fault, object.place());
+    _scenario.faults.push_back(std::move(fault));
+}
+
+Scenario Scenario_Reader::read(const json& root)
+{
+    Json_Object object(root, "");
+    object.text("description", 4096, "");
+    if (auto drivers = object.object("drivers"))
+        read_drivers(*drivers);
+    for (auto& adapter : object.objects("adapters", max_instances))
+        read_adapter(adapter);
+    if (auto generated = object.object("generate"))
+        generate(*generated);
+    for (auto& fault : object.objects("faults", 1000))
+        read_fault(fault);
+    object.done();
+    return std::move(_scenario);
+}
+
+} // namespace
+
+Scenario parse_scenario(const std::string& text)
+{
+    json root;
+    try
+    {
+        root = json::parse(text);
+    }
+    catch (const json::exception& error)
+    {
+        refuse("scenario", error.what());
+    }
+    return Scenario_Reader().read(root);
+}
+
+} // namespace hxasim

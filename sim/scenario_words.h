@@ -1,0 +1,85 @@
+// The words that a scenario may write for the numbers of the drivers.
+#pragma once
+
+#include "sim/json_object.h"
+#include "sim/scenario.h"
+
+#include "hxal/records/ioc.h"
+#include "hxal/records/port.h"
+
+#include <array>
+#include <cerrno>
+
+namespace hxasim
+{
+
+// clang-format off
+inline constexpr std::array kind_words{
+    Choice{"fc-hba",    static_cast<std::uint32_t>(Adapter_Kind::fc_hba)},
+    Choice{"cna",       static_cast<std::uint32_t>(Adapter_Kind::cna)},
+    Choice{"mezzanine", static_cast<std::uint32_t>(Adapter_Kind::mezzanine)},
+};
+
+inline constexpr std::array ioc_state_words{
+    Choice{"reset",       HXA_IOC_RESET},
+    Choice{"semwait",     HXA_IOC_SEMWAIT},
+    Choice{"hwinit",      HXA_IOC_HWINIT},
+    Choice{"getattr",     HXA_IOC_GETATTR},
+    Choice{"operational", HXA_IOC_OPERATIONAL},
+    Choice{"initfail",    HXA_IOC_INITFAIL},
+    Choice{"hbfail",      HXA_IOC_HBFAIL},
+    Choice{"disabling",   HXA_IOC_DISABLING},
+    Choice{"disabled",    HXA_IOC_DISABLED},
+    Choice{"fwmismatch",  HXA_IOC_FWMISMATCH},
+};
+
+inline constexpr std::array port_state_words{
+    Choice{"uninit",           HXA_PPORT_ST_UNINIT},
+    Choice{"enabling-qwait",   HXA_PPORT_ST_ENABLING_QWAIT},
+    Choice{"enabling",         HXA_PPORT_ST_ENABLING},
+    Choice{"linkdown",         HXA_PPORT_ST_LINKDOWN},
+    Choice{"linkup",           HXA_PPORT_ST_LINKUP},
+    Choice{"disabling-qwait",  HXA_PPORT_ST_DISABLING_QWAIT},
+    Choice{"disabling",        HXA_PPORT_ST_DISABLING},
+    Choice{"disabled",         HXA_PPORT_ST_DISABLED},
+    Choice{"stopped",          HXA_PPORT_ST_STOPPED},
+    Choice{"iocdown",          HXA_PPORT_ST_IOCDOWN},
+    Choice{"iocdis",           HXA_PPORT_ST_IOCDIS},
+    Choice{"fwmismatch",       HXA_PPORT_ST_FWMISMATCH},
+    Choice{"preboot-disabled", HXA_PPORT_ST_PREBOOT_DISABLED},
+};
+
+inline constexpr std::array port_type_words{
+    Choice{"unknown", HXA_PPORT_TYPE_UNKNOWN},
+    Choice{"trunked", HXA_PPORT_TYPE_TRUNKED},
+    Choice{"nport",   HXA_PPORT_TYPE_NPORT},
+    Choice{"nlport",  HXA_PPORT_TYPE_NLPORT},
+    Choice{"lport",   HXA_PPORT_TYPE_LPORT},
+    Choice{"p2p",     HXA_PPORT_TYPE_P2P},
+    Choice{"vport",   HXA_PPORT_TYPE_VPORT},
+};
+
+inline constexpr std::array topology_words{
+    Choice{"none", HXA_PPORT_TOPOLOGY_NONE},
+    Choice{"p2p",  HXA_PPORT_TOPOLOGY_P2P},
+    Choice{"loop", HXA_PPORT_TOPOLOGY_LOOP},
+    Choice{"auto", HXA_PPORT_TOPOLOGY_AUTO},
+};
+
+inline constexpr std::array errno_words{
+    Choice{"EINTR",  EINTR},
+    Choice{"EIO",    EIO},
+    Choice{"ENXIO",  ENXIO},
+    Choice{"EBADF",  EBADF},
+    Choice{"EAGAIN", EAGAIN},
+    Choice{"ENOMEM", ENOMEM},
+    Choice{"EACCES", EACCES},
+    Choice{"EFAULT", EFAULT},
+    Choice{"EBUSY",  EBUSY},
+    Choice{"ENODEV", ENODEV},
+    Choice{"EINVAL", EINVAL},
+    Choice{"ENOTTY", ENOTTY},
+};
+// clang-format on
+
+} // namespace hxasim

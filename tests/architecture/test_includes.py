@@ -1,0 +1,59 @@
+"""Data goes one way: each folder includes only what lies below it in the house."""
+
+import re
+from pathlib import Path
+
+import pytest
+
+ROOT = Path(__file__).resolve().parents[2]
+
+# folder: the folders (or single files) of ours that it may include besides itself
+MAY_INCLUDE = {
+    "runtime": [],
+    "schema": ["runtime"],
+    "hxal": [],
+    "cmpi": ["runtime", "providers/providers.def"],
+    "inventory": ["schema", "runtime", "hxal"],
+    "profiles": ["schema", "runtime", "hxal", "inventory"],
+    "diagnostics": ["schema", "runtime", "hxal", "inventory"],
+    "indications": ["schema", "runtime", "hxal", "inventory"],
+    "providers": [
+        "inventory",
+        "profiles",
+        "diagnostics",
+        "indications",
+        "schema",
+        "cmpi/provider.h",
+        "cmpi/handlers.h",
+        "cmpi/status.h",
+        "runtime",
+    ],
+    "cimserver": ["cmpi/standard", "cmpi/registration.h", "runtime/meta.h"],
+    "sim": ["hxal/records", "hxal/commands.h"],
+}
+
+
+def includes(folder):
+    """(file, line number, included name) of every quoted include below a folder."""
+    for path in sorted((ROOT / folder).rglob("*")):
+        if path.suffix in {".h", ".cpp", ".c", ".def"}:
+            for number, line in enumerate(path.read_text(encoding="utf-8").splitlines(), 1):
+                included = re.match(r'\s*#\s*include\s+"([^"]+)"', line)
+                if included:
+                    yield path.relative_to(ROOT), number, included[1]
+
+
+@pytest.mark.parametrize("folder", MAY_INCLUDE)
+def test_folder_includes_only_what_lies_below_it(folder):
+    allowed = (f"{folder}/", *(name if "." in name else f"{name}/" for name in MAY_INCLUDE[folder]))
+    strays = [
+        f"{path}:{number} includes {name}"
+        for path, number, name in includes(folder)
+        if not name.startswith(allowed)
+    ]
+    assert strays == []
+
+
+def test_every_folder_of_the_table_exists_and_says_what_it_is():
+    folders = [*MAY_INCLUDE, "hxal/config", "cmpi/standard", "packaging", "tests", "bench", "fuzz", "script", "docs", "tools"]
+    assert [folder for folder in folders if not (ROOT / folder / "README.md").is_file()] == []

@@ -1,0 +1,180 @@
+// Golden texts of values, paths and instances, and what becomes of bytes and values that clients refuse.
+#include "cimserver/cimxml/object_writer.h"
+#include "cimserver/cimxml/value_text.h"
+
+#include "test_classes.h"
+
+#include <gtest/gtest.h>
+
+#include <cmath>
+#include <limits>
+
+using namespace cimserver;
+
+namespace
+{
+
+std::string escaped(std::string_view text)
+{
+    Xml_Writer writer;
+    return writer.text(text).take();
+}
+
+std::string text_of(CMPIType type, Value::Content content) { return value_text({type, std::move(content)}).value_or("(null)"); }
+
+constexpr std::uint64_t operator""_u(unsigned long long number) { return number; }
+
+Object_Path path_to(const std::string& host, const std::string& name_space)
+{
+    return {host, name_space, "A", {{"K", {CMPI_string, std::string("1")}}}};
+}
+
+std::string reference_to(const Object_Path& path)
+{
+    Xml_Writer writer;
+    write_reference(writer, path);
+    return writer.take();
+}
+
+} // namespace
+
+TEST(xml_writer, replaces_what_no_document_can_carry)
+{
+    const std::pair<std::string, std::string> rows[] = {
+        {"<a href=\"x\">'&'</a>", "&lt;a href=&quot;x&quot;&gt;&apos;&amp;&apos;&lt;/a&gt;"},
+        {std::string("\0\x01\x1F\x7F", 4), "???\x7F"},
+        {"\t\r\n", "\t\r\n"},
+        {"\xC3\xA9 \xE2\x82\xAC \xF0\x9F\x98\x80 \xF4\x8F\xBF\xBF", "\xC3\xA9 \xE2\x82\xAC \xF0\x9F\x98\x80 \xF4\x8F\xBF\xBF"},
+        {"\xC0\x80 \xE0\x80\x80 \xF0\x80\x80\x80", "?? ??? ????"}, // overlong
+        {"\xED\xA0\x80 \xED\x9F\xBF", "??? \xED\x9F\xBF"},         // surrogates and the last one before them
+        {"\xEF\xBF\xBE \xEF\xBF\xBF \xEF\xBF\xBD", "??? ??? \xEF\xBF\xBD"},
+        {"\xF4\x90\x80\x80 \xF5\xFF\xFE", "???? ???"}, // beyond Unicode
+        {"a\x80"
+         "b\xC3",
+         "a?b?"},
+        {"\xE2\x82", "??"}, // cut short
+        {"\xE2\x28\xA1", "?(?"},
+        {"", ""},
+    };
+    for (const auto& [bytes, text] : rows)
+        EXPECT_EQ(escaped(bytes), text);
+}
+
+TEST(xml_writer, keeps_attributes_on_one_line_and_never_self_closes)
+{
+    Xml_Writer writer("head:");
+    writer.start("A").attribute("N", "\"\t\r\n\x02<").start("B").end().element("C", "").end();
+    EXPECT_EQ(writer.take(), "head:<A N=\"&quot;   ?&lt;\"><B></B><C></C></A>");
+}
+
+TEST(value_text, writes_numbers_within_their_type_only)
+{
+    EXPECT_EQ(text_of(CMPI_uint8, 255_u), "255");
+    EXPECT_EQ(text_of(CMPI_uint8, 256_u), "(null)");
+    EXPECT_EQ(text_of(CMPI_uint64, std::numeric_limits<std::uint64_t>::max()), "18446744073709551615");
+    EXPECT_EQ(text_of(CMPI_sint8, std::int64_t{-128}), "-128");
+    EXPECT_EQ(text_of(CMPI_sint8, std::int64_t{-129}), "(null)");
+    EXPECT_EQ(text_of(CMPI_sint16, std::int64_t{32768}), "(null)");
+    EXPECT_EQ(text_of(CMPI_sint64, std::numeric_limits<std::int64_t>::min()), "-9223372036854775808");
+    EXPECT_EQ(text_of(CMPI_uint32, std::int64_t{-1}), "(null)");
+    EXPECT_EQ(text_of(CMPI_real32, 0.1), "0.1");
+    EXPECT_EQ(text_of(CMPI_real64, 2.0), "2.0");
+    EXPECT_EQ(text_of(CMPI_real64, 1e300), "1.0e+300");
+    EXPECT_EQ(text_of(CMPI_real64, std::nan("")), "NaN");
+    EXPECT_EQ(text_of(CMPI_real64, -HUGE_VAL), "-INF");
+    EXPECT_EQ(text_of(CMPI_boolean, false), "false");
+    EXPECT_EQ(text_of(CMPI_char16, 0x20AC_u), "\xE2\x82\xAC");
+    EXPECT_EQ(text_of(CMPI_char16, 0xE9_u), "\xC3\xA9");
+    for (std::uint64_t code : {0_u, 0x1F_u, 0xD800_u, 0xDFFF_u, 0xFFFE_u, 0x10000_u})
+        EXPECT_EQ(text_of(CMPI_char16, code), "(null)") << code;
+    EXPECT_EQ(text_of(CMPI_string, {}), "(null)");
+}
+
+TEST(value_text, passes_only_datetimes_that_clients_read)
+{
+    for (const char* good : {"20240229235959.123456-300", "00010101000000.000000+999", "99991231235959.999999+000",
+                             "00000000000000.000000:000", "99999999235959.999999:000"})
+        EXPECT_TRUE(is_readable_datetime(good)) << good;
+    for (const char* bad :
+         {"", "00000000000000.000000+000", "20230229000000.000000+000", "20241301000000.000000+000", "20240101240000.000000+000",
+          "20240101006000.000000+000", "20240101000060.000000+000", "20240101000000.000000+0000", "20240101000000,000000+000",
+          "2024010100000a.000000+000", "20240101000000.0000-0+000", "20240101000000.000000*000", "00000000000000.000000:001",
+          "20240101000000.000000+-12"})
+        EXPECT_FALSE(is_readable_datetime(bad)) << bad;
+}
+
+TEST(object_writer, writes_every_kind_of_property)
+{
+    const auto target = std::make_shared<const Object_Path>(path_to("", ""));
+    const auto inner = std::make_shared<const Instance>(Instance{{}, {{"X", {CMPI_string, std::string("<")}}}});
+    Instance instance;
+    instance.path.class_name = "TST_Port";
+    instance.properties = {
+        {"Name", {CMPI_string, std::string("a\nb")}},
+        {"Status", {CMPI_string, {}}},
+        {"Empty", {CMPI_string, std::string()}},
+        {"When", {CMPI_dateTime, std::string("00000000000000.000000+000")}},
+        {"List", {CMPI_uint16 | CMPI_ARRAY, std::vector<Value>{{CMPI_uint16, 1_u}, {CMPI_uint16, 2_u}}}},
+        {"Broken", {CMPI_uint8 | CMPI_ARRAY, std::vector<Value>{{CMPI_uint8, 1_u}, {CMPI_uint8, 999_u}}}},
+        {"Texts", {CMPI_string | CMPI_ARRAY, std::vector<Value>{{CMPI_string, std::string("x")}, {CMPI_string, {}}}}},
+        {"None", {CMPI_string | CMPI_ARRAY, std::vector<Value>{}}},
+        {"Null", {CMPI_string | CMPI_ARRAY, {}}},
+        {"Ref", {CMPI_ref, target}},
+        {"NoRef", {CMPI_ref, {}}},
+        {"Refs", {CMPI_ref | CMPI_ARRAY, std::vector<Value>{}}},
+        {"Inner", {CMPI_instance, inner}},
+        {"Unknown", {CMPI_null, {}}},
+    };
+    Xml_Writer writer;
+    write_instance(writer, instance, &test::TST_Port);
+    EXPECT_EQ(writer.take(),
+              "<INSTANCE CLASSNAME=\"TST_Port\">"
+              "<PROPERTY NAME=\"Name\" TYPE=\"string\" CLASSORIGIN=\"TST_Port\"><VALUE>a\nb</VALUE></PROPERTY>"
+              "<PROPERTY NAME=\"Status\" TYPE=\"string\" CLASSORIGIN=\"TST_Element\"></PROPERTY>"
+              "<PROPERTY NAME=\"Empty\" TYPE=\"string\"><VALUE></VALUE></PROPERTY>"
+              "<PROPERTY NAME=\"When\" TYPE=\"datetime\"></PROPERTY>"
+              "<PROPERTY.ARRAY NAME=\"List\" TYPE=\"uint16\"><VALUE.ARRAY><VALUE>1</VALUE><VALUE>2</VALUE></VALUE.ARRAY>"
+              "</PROPERTY.ARRAY>"
+              "<PROPERTY.ARRAY NAME=\"Broken\" TYPE=\"uint8\"></PROPERTY.ARRAY>"
+              "<PROPERTY.ARRAY NAME=\"Texts\" TYPE=\"string\"><VALUE.ARRAY><VALUE>x</VALUE><VALUE></VALUE></VALUE.ARRAY>"
+              "</PROPERTY.ARRAY>"
+              "<PROPERTY.ARRAY NAME=\"None\" TYPE=\"string\"><VALUE.ARRAY></VALUE.ARRAY></PROPERTY.ARRAY>"
+              "<PROPERTY.ARRAY NAME=\"Null\" TYPE=\"string\"></PROPERTY.ARRAY>"
+              "<PROPERTY.REFERENCE NAME=\"Ref\"><VALUE.REFERENCE><INSTANCENAME CLASSNAME=\"A\"><KEYBINDING NAME=\"K\">"
+              "<KEYVALUE VALUETYPE=\"string\" TYPE=\"string\">1</KEYVALUE></KEYBINDING></INSTANCENAME></VALUE.REFERENCE>"
+              "</PROPERTY.REFERENCE>"
+              "<PROPERTY.REFERENCE NAME=\"NoRef\"></PROPERTY.REFERENCE>"
+              "<PROPERTY NAME=\"Inner\" TYPE=\"string\" EmbeddedObject=\"instance\"><VALUE>&lt;INSTANCE "
+              "CLASSNAME=&quot;&quot;&gt;&lt;PROPERTY NAME=&quot;X&quot; TYPE=&quot;string&quot;&gt;&lt;VALUE&gt;&amp;lt;"
+              "&lt;/VALUE&gt;&lt;/PROPERTY&gt;&lt;/INSTANCE&gt;</VALUE></PROPERTY>"
+              "</INSTANCE>");
+}
+
+TEST(object_writer, writes_paths_as_far_as_they_are_known)
+{
+    const std::string name = "<INSTANCENAME CLASSNAME=\"A\"><KEYBINDING NAME=\"K\"><KEYVALUE VALUETYPE=\"string\" "
+                             "TYPE=\"string\">1</KEYVALUE></KEYBINDING></INSTANCENAME>";
+    const std::string local = "<LOCALNAMESPACEPATH><NAMESPACE NAME=\"a\"></NAMESPACE><NAMESPACE NAME=\"b\"></NAMESPACE>"
+                              "</LOCALNAMESPACEPATH>";
+    const std::string end = "</VALUE.REFERENCE>";
+    EXPECT_EQ(reference_to(path_to("", "")), "<VALUE.REFERENCE>" + name + end);
+    EXPECT_EQ(reference_to(path_to("", "a/b")),
+              "<VALUE.REFERENCE><LOCALINSTANCEPATH>" + local + name + "</LOCALINSTANCEPATH>" + end);
+    EXPECT_EQ(reference_to(path_to("h", "a/b")), "<VALUE.REFERENCE><INSTANCEPATH><NAMESPACEPATH><HOST>h</HOST>" + local +
+                                                     "</NAMESPACEPATH>" + name + "</INSTANCEPATH>" + end);
+
+    Xml_Writer writer;
+    write_instance_name(writer, {"",
+                                 "",
+                                 "A",
+                                 {{"N", {CMPI_uint32, 7_u}},
+                                  {"B", {CMPI_boolean, true}},
+                                  {"D", {CMPI_dateTime, std::string("bad")}},
+                                  {"Null", {CMPI_string, {}}}}});
+    EXPECT_EQ(writer.take(),
+              "<INSTANCENAME CLASSNAME=\"A\">"
+              "<KEYBINDING NAME=\"N\"><KEYVALUE VALUETYPE=\"numeric\" TYPE=\"uint32\">7</KEYVALUE></KEYBINDING>"
+              "<KEYBINDING NAME=\"B\"><KEYVALUE VALUETYPE=\"boolean\" TYPE=\"boolean\">true</KEYVALUE></KEYBINDING>"
+              "<KEYBINDING NAME=\"D\"><KEYVALUE VALUETYPE=\"string\">bad</KEYVALUE></KEYBINDING>"
+              "</INSTANCENAME>");
+}

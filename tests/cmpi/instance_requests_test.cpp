@@ -1,0 +1,344 @@
+// The instance interface as a server calls it.
+#include "runtime/thread_context.h"
+#include "tests/cmpi/served_provider.h"
+
+#include <gmock/gmock.h>
+
+#include <stdexcept>
+#include <thread>
+
+using namespace test;
+using testing::ElementsAre;
+using testing::IsEmpty;
+using testing::SizeIs;
+
+namespace
+{
+
+class Instance_Requests : public Served_Provider
+{
+protected:
+    template <class... Names> void offer(Names... names) { (script.instances.emplace_back(full_thing(names).steal()), ...); }
+
+    CMPIrc enumerate_names(const CMPIObjectPath* object)
+    {
+        result.clear();
+        return CMPI_Adapter::enumInstanceNames(mi, request.context(), result.face(), object).rc;
+    }
+    CMPIrc enumerate(const CMPIObjectPath* object, const char** properties = nullptr)
+    {
+        result.clear();
+        return CMPI_Adapter::enumInstances(mi, request.context(), result.face(), object, properties).rc;
+    }
+    CMPIrc get(const CMPIObjectPath* object, const char** properties = nullptr)
+    {
+        result.clear();
+        return CMPI_Adapter::getInstance(mi, request.context(), result.face(), object, properties).rc;
+    }
+
+    // The names of the model's non-null properties.
+    std::vector<std::string> asked_for() const
+    {
+        std::vector<std::string> names;
+        const Meta_Class* meta_class = script.model->meta_class;
+        for (uint32 i = 0; i < meta_class->num_meta_features; ++i)
+        {
+            const Meta_Property* property = as_property(meta_class->meta_features[i]);
+            if (!null_of(static_cast<const Instance*>(script.model.ptr()), property))
+                names.emplace_back(property->name);
+        }
+        return names;
+    }
+
+    static std::vector<std::string> names(const cimserver::Instance& instance)
+    {
+        std::vector<std::string> result_names;
+        for (const auto& property : instance.properties)
+            result_names.push_back(property.name);
+        return result_names;
+    }
+
+    CMPIInstanceMI* mi = things();
+    Recorded_Result result;
+};
+
+TEST_F(Instance_Requests, enumerate_names_in_the_requests_name_space)
+{
+    offer("a", "b");
+    script.instances[1]->__name_space = "root/other";
+    EXPECT_EQ(enumerate_names(path("test_thing")), CMPI_RC_OK);
+    ASSERT_THAT(result.paths, SizeIs(2));
+    EXPECT_EQ(result.paths[1].name_space, name_space);
+    EXPECT_EQ(result.paths[1].class_name, "Test_Thing");
+    EXPECT_THAT(result.paths[1].keys, SizeIs(1));
+    EXPECT_EQ(text(result.paths[1].keys, "Name"), "b");
+    EXPECT_EQ(result.done, 1);
+    EXPECT_EQ(script.model->__name_space, name_space);
+
+    EXPECT_EQ(enumerate_names(thing_path("a")), CMPI_RC_OK);
+    EXPECT_THAT(asked_for(), ElementsAre("Name"));
+}
+
+TEST_F(Instance_Requests, enumerate_whole_instances_or_what_a_list_names)
+{
+    offer("a", "b");
+    EXPECT_EQ(enumerate(path("Test_Thing")), CMPI_RC_OK);
+    EXPECT_THAT(asked_for(), IsEmpty());
+    ASSERT_THAT(result.instances, SizeIs(2));
+    EXPECT_EQ(text(result.instances[1].path.keys, "Name"), "b");
+    EXPECT_EQ(text(result.instances[1].properties, "When"), "00000000013000.000007:000");
+    EXPECT_EQ(result.done, 1);
+
+    const char* list[] = {"uint8", "Unknown", nullptr};
+    EXPECT_EQ(enumerate(thing_path("a"), list), CMPI_RC_OK);
+    EXPECT_THAT(asked_for(), ElementsAre("Name", "Uint8"));
+    ASSERT_THAT(result.instances, SizeIs(2));
+    EXPECT_THAT(names(result.instances[0]), ElementsAre("Name", "Uint8"));
+
+    const char* nothing[] = {nullptr};
+    EXPECT_EQ(enumerate(path("Test_Thing"), nothing), CMPI_RC_OK);
+    EXPECT_THAT(names(result.instances[0]), ElementsAre("Name"));
+}
+
+TEST_F(Instance_Requests, answer_each_enumeration_status)
+{
+    struct Row
+    {
+        Enum_Instances_Status status;
+        CMPIrc rc;
+        int names_done;
+        int instances_done;
+    };
+    const Row rows[] = {
+        {ENUM_INSTANCES_OK, CMPI_RC_OK, 1, 1},
+        {ENUM_INSTANCES_FAILED, CMPI_RC_ERR_FAILED, 0, 0},
+        {ENUM_INSTANCES_ACCESS_DENIED, CMPI_RC_ERR_ACCESS_DENIED, 0, 0},
+        {static_cast<Enum_Instances_Status>(-1), CMPI_RC_OK, 0, 1},
+    };
+    for (const Row& row : rows)
+    {
+        script.enum_instances = row.status;
+        EXPECT_EQ(enumerate_names(path("Test_Thing")), row.rc);
+        EXPECT_EQ(result.done, row.names_done) << row.status;
+        EXPECT_EQ(enumerate(path("Test_Thing")), row.rc);
+        EXPECT_EQ(result.done, row.instances_done) << row.status;
+    }
+}
+
+TEST_F(Instance_Requests, get_what_the_provider_finds_or_enumerates)
+{
+    offer("a", "b");
+    EXPECT_EQ(get(thing_path("b")), CMPI_RC_OK);
+    EXPECT_THAT(asked_for(), SizeIs(28));
+    ASSERT_THAT(result.instances, SizeIs(1));
+    EXPECT_EQ(text(result.instances[0].properties, "Name"), "b");
+    EXPECT_EQ(result.done, 1);
+
+    const char* list[] = {"Strings", nullptr};
+    EXPECT_EQ(get(thing_path("b"), list), CMPI_RC_OK);
+    EXPECT_THAT(asked_for(), ElementsAre("Name", "Strings"));
+    EXPECT_THAT(names(result.instances.at(0)), ElementsAre("Name", "Strings"));
+
+    EXPECT_EQ(get(thing_path("c")), CMPI_RC_ERR_NOT_FOUND);
+    EXPECT_THAT(result.instances, IsEmpty());
+}
+
+TEST_F(Instance_Requests, answer_each_get_status)
+{
+    const std::pair<Get_Instance_Status, CMPIrc> rows[] = {
+        {GET_INSTANCE_OK, CMPI_RC_OK},
+        {GET_INSTANCE_NOT_FOUND, CMPI_RC_ERR_NOT_FOUND},
+        {GET_INSTANCE_INVALID_PARAMETER, CMPI_RC_ERR_INVALID_PARAMETER},
+        {GET_INSTANCE_ACCESS_DENIED, CMPI_RC_ERR_ACCESS_DENIED},
+        {GET_INSTANCE_FAILED, CMPI_RC_ERR_FAILED},
+        {static_cast<Get_Instance_Status>(-1), CMPI_RC_ERR_FAILED},
+    };
+    offer("a");
+    for (const auto& [status, rc] : rows)
+    {
+        script.get_instance = status;
+        EXPECT_EQ(get(thing_path("a")), rc);
+        EXPECT_EQ(result.done, rc == CMPI_RC_OK ? 1 : 0) << status;
+    }
+    script.instances.clear();
+    script.get_instance = GET_INSTANCE_OK;
+    EXPECT_EQ(get(thing_path("a")), CMPI_RC_ERR_FAILED) << "a success without an instance is none";
+}
+
+TEST_F(Instance_Requests, create_modify_and_delete)
+{
+    using cimserver::Instance_Object;
+    auto& object = cimserver::make<Instance_Object>(classes.find("Test_Thing")->layout, cimserver::Object_Path{});
+    object.set("Name", {CMPI_string, std::string("new")});
+    object.set("Uint8", {CMPI_uint8, std::uint64_t{7}});
+    const char* list[] = {"Uint8", nullptr};
+    const CMPIObjectPath* object_path = thing_path("new");
+
+    const auto create_it = [&]
+    { return CMPI_Adapter::createInstance(mi, request.context(), result.face(), object_path, object.face()).rc; };
+    const auto modify = [&](const char** properties)
+    { return CMPI_Adapter::modifyInstance(mi, request.context(), result.face(), object_path, object.face(), properties).rc; };
+    const auto remove = [&] { return CMPI_Adapter::deleteInstance(mi, request.context(), result.face(), object_path).rc; };
+
+    script.create_instance = CREATE_INSTANCE_OK;
+    EXPECT_EQ(create_it(), CMPI_RC_OK);
+    EXPECT_EQ(text(result.paths.at(0).keys, "Name"), "new");
+    EXPECT_EQ(cast<Test_Thing>(script.instance.ptr())->Uint8.value, 7);
+    EXPECT_EQ(script.instance->__name_space, name_space);
+
+    script.modify_instance = MODIFY_INSTANCE_OK;
+    EXPECT_EQ(modify(list), CMPI_RC_OK);
+    EXPECT_THAT(asked_for(), ElementsAre("Name", "Uint8"));
+    EXPECT_EQ(text(result.paths.at(1).keys, "Name"), "new");
+
+    script.delete_instance = DELETE_INSTANCE_OK;
+    EXPECT_EQ(remove(), CMPI_RC_OK);
+    EXPECT_STREQ(cast<Test_Thing>(script.instance.ptr())->Name.value.c_str(), "new");
+    EXPECT_EQ(result.done, 3);
+
+    const std::pair<Create_Instance_Status, CMPIrc> creations[] = {
+        {CREATE_INSTANCE_DUPLICATE, CMPI_RC_ERR_ALREADY_EXISTS},
+        {CREATE_INSTANCE_UNSUPPORTED, CMPI_RC_ERR_NOT_SUPPORTED},
+        {CREATE_INSTANCE_INVALID_PARAMETER, CMPI_RC_ERR_INVALID_PARAMETER},
+        {CREATE_INSTANCE_ACCESS_DENIED, CMPI_RC_ERR_ACCESS_DENIED},
+        {CREATE_INSTANCE_FAILED, CMPI_RC_ERR_FAILED},
+        {static_cast<Create_Instance_Status>(-1), CMPI_RC_OK},
+    };
+    for (const auto& [status, rc] : creations)
+    {
+        script.create_instance = status;
+        EXPECT_EQ(create_it(), rc) << status;
+    }
+    const std::pair<Modify_Instance_Status, CMPIrc> modifications[] = {
+        {MODIFY_INSTANCE_NOT_FOUND, CMPI_RC_ERR_NOT_FOUND},
+        {MODIFY_INSTANCE_UNSUPPORTED, CMPI_RC_ERR_NOT_SUPPORTED},
+        {MODIFY_INSTANCE_INVALID_PARAMETER, CMPI_RC_ERR_INVALID_PARAMETER},
+        {MODIFY_INSTANCE_ACCESS_DENIED, CMPI_RC_ERR_ACCESS_DENIED},
+        {MODIFY_INSTANCE_FAILED, CMPI_RC_ERR_FAILED},
+    };
+    for (const auto& [status, rc] : modifications)
+    {
+        script.modify_instance = status;
+        EXPECT_EQ(modify(nullptr), rc) << status;
+    }
+    const std::pair<Delete_Instance_Status, CMPIrc> deletions[] = {
+        {DELETE_INSTANCE_NOT_FOUND, CMPI_RC_ERR_NOT_FOUND},
+        {DELETE_INSTANCE_UNSUPPORTED, CMPI_RC_ERR_NOT_SUPPORTED},
+        {DELETE_INSTANCE_ACCESS_DENIED, CMPI_RC_ERR_ACCESS_DENIED},
+        {DELETE_INSTANCE_FAILED, CMPI_RC_ERR_FAILED},
+    };
+    for (const auto& [status, rc] : deletions)
+    {
+        script.delete_instance = status;
+        EXPECT_EQ(remove(), rc) << status;
+    }
+    EXPECT_THAT(result.paths, SizeIs(2));
+    EXPECT_EQ(result.done, 3);
+    EXPECT_EQ(CMPI_Adapter::createInstance(mi, request.context(), result.face(), object_path, nullptr).rc, CMPI_RC_ERR_FAILED);
+}
+
+TEST_F(Instance_Requests, fail_for_a_class_that_the_provider_does_not_serve)
+{
+    for (const char* class_name : {"Test_Unknown", "Test_Link", ""})
+    {
+        EXPECT_EQ(enumerate_names(path(class_name)), CMPI_RC_ERR_FAILED) << class_name;
+        EXPECT_EQ(enumerate(path(class_name)), CMPI_RC_ERR_FAILED) << class_name;
+        EXPECT_EQ(get(path(class_name)), CMPI_RC_ERR_FAILED) << class_name;
+    }
+    EXPECT_EQ(get(nullptr), CMPI_RC_ERR_FAILED);
+    EXPECT_EQ(script.enumerations, 0);
+}
+
+TEST_F(Instance_Requests, take_a_superclass_for_the_served_class)
+{
+    static const Registration disk_registration = {
+        "Test_Module", "Test_Disk_Provider",
+        [](const Registration* r, int operation, void* a0, void* a1, void* a2, void* a3, void* a4, void* a5, void* a6, void* a7)
+        {
+            const int answer = thing_registration.provider_proc(r, operation, a0, a1, a2, a3, a4, a5, a6, a7);
+            if (operation == OPERATION_GET_META_CLASS)
+                *static_cast<const Meta_Class**>(a0) = &Test_Disk::static_meta_class;
+            return answer;
+        },
+        &Test_Disk::static_meta_class, nullptr};
+    CMPI_Static_Data disk_data = {};
+    mi = interface<CMPIInstanceMI>('I', disk_data, disk_registration);
+    EXPECT_EQ(enumerate(thing_path("a", "Test_Thing")), CMPI_RC_OK);
+    EXPECT_EQ(script.model->meta_class, &Test_Disk::static_meta_class);
+    EXPECT_EQ(mi->ft->cleanup(mi, request.context(), 1).rc, CMPI_RC_OK);
+}
+
+TEST_F(Instance_Requests, are_over_after_an_exception)
+{
+    offer("a");
+    script.on_enum = [] { throw std::runtime_error("driver"); };
+    EXPECT_EQ(enumerate(path("Test_Thing")), CMPI_RC_ERR_FAILED);
+    EXPECT_EQ(result.done, 0);
+    EXPECT_EQ(Thread_Context::top(), nullptr);
+
+    script.on_enum = nullptr;
+    std::thread other(
+        [&]
+        {
+            cimserver::Request own;
+            Recorded_Result own_result;
+            EXPECT_EQ(CMPI_Adapter::enumInstanceNames(mi, own.context(), own_result.face(), path("Test_Thing")).rc, CMPI_RC_OK);
+            EXPECT_THAT(own_result.paths, SizeIs(1));
+        });
+    other.join();
+}
+
+TEST_F(Instance_Requests, that_cannot_be_answered_in_full_are_no_success)
+{
+    static int paths_left = 0;
+    CMPIBrokerEncFT poor_table = *broker.face()->eft;
+    poor_table.newObjectPath = [](const CMPIBroker* b, const char* ns, const char* class_name, CMPIStatus* rc)
+    { return paths_left-- > 0 ? cimserver::encapsulation_table.newObjectPath(b, ns, class_name, rc) : nullptr; };
+    CMPIBroker poor = *broker.face();
+    poor.eft = &poor_table;
+    thing_data.adapter->broker = &poor;
+
+    offer("a", "b", "c");
+    for (const bool deaf : {false, true})
+    {
+        script.deaf = deaf;
+        paths_left = 1;
+        EXPECT_EQ(enumerate_names(path("Test_Thing")), CMPI_RC_ERR_FAILED);
+        EXPECT_THAT(result.paths, SizeIs(1));
+        EXPECT_EQ(result.done, 0);
+        paths_left = 0;
+        EXPECT_EQ(enumerate(path("Test_Thing")), CMPI_RC_ERR_FAILED);
+        EXPECT_EQ(result.done, 0);
+    }
+}
+
+TEST_F(Instance_Requests, may_come_back_from_within_a_request)
+{
+    offer("a");
+    script.on_enum = [&]
+    {
+        script.on_enum = nullptr;
+        Recorded_Result inner;
+        EXPECT_EQ(CMPI_Adapter::enumInstanceNames(mi, request.context(), inner.face(), path("Test_Thing")).rc, CMPI_RC_OK);
+        EXPECT_THAT(inner.paths, SizeIs(1));
+    };
+    EXPECT_EQ(enumerate(path("Test_Thing")), CMPI_RC_OK);
+    EXPECT_THAT(result.instances, SizeIs(1));
+}
+
+TEST_F(Instance_Requests, are_traced_with_their_answer)
+{
+    EXPECT_THAT(logged([&] { get(thing_path("a")); }, "DBG"),
+                ElementsAre("CMPI_Adapter: enter: getInstance()", "CMPI_Adapter: return: getInstance(): CMPI_RC_ERR_NOT_FOUND"));
+    script.on_enum = [] { throw std::runtime_error("driver"); };
+    EXPECT_THAT(logged([&] { enumerate(path("Test_Thing")); }, "ERR"),
+                ElementsAre("CMPI_Adapter: enumInstances(): unexpected exception: driver"));
+}
+
+TEST_F(Instance_Requests, do_not_serve_queries)
+{
+    EXPECT_EQ(CMPI_Adapter::execQuery(mi, request.context(), result.face(), path("Test_Thing"), "", "WQL").rc,
+              CMPI_RC_ERR_NOT_SUPPORTED);
+}
+
+} // namespace

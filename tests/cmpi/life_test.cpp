@@ -1,0 +1,161 @@
+// The life of an adapter: made by the first factory call, shared by all interfaces, gone with the last cleanup.
+#include "cmpi/cmpi_trace.h"
+#include "cmpi/thread_context.h"
+#include "tests/cmpi/served_provider.h"
+
+#include <gmock/gmock.h>
+
+#include <stdexcept>
+#include <thread>
+
+using namespace test;
+
+namespace
+{
+
+class Life : public Served_Provider
+{
+protected:
+    template <class MI> CMPIrc clean_up(MI* mi, bool terminating = false)
+    {
+        return mi->ft->cleanup(mi, request.context(), terminating).rc;
+    }
+};
+
+TEST_F(Life, all_interfaces_share_one_adapter_and_one_loaded_provider)
+{
+    auto* instances = links();
+    auto* methods = interface<CMPIMethodMI>('M', link_data, link_registration);
+    auto* associations = interface<CMPIAssociationMI>('A', link_data, link_registration);
+    auto* indications = interface<CMPIIndicationMI>('N', link_data, link_registration);
+
+    ASSERT_TRUE(link_data.adapter);
+    EXPECT_EQ(link_data.adapter->load_count, 4U);
+    EXPECT_EQ(link_data.adapter->mc, &Test_Link::static_meta_class);
+    EXPECT_EQ(script.loads, 1);
+    EXPECT_EQ(script.providers, 1);
+    for (void* hdl : {instances->hdl, methods->hdl, associations->hdl, indications->hdl})
+        EXPECT_EQ(hdl, &link_data);
+
+    EXPECT_STREQ(instances->ft->miName, "instanceTest_Link_Provider");
+    EXPECT_STREQ(methods->ft->miName, "methodTest_Link_Provider");
+    EXPECT_STREQ(associations->ft->miName, "associationTest_Link_Provider");
+    EXPECT_STREQ(indications->ft->miName, "indicationTest_Link_Provider");
+    EXPECT_EQ(instances->ft->ftVersion, 100);
+    EXPECT_EQ(indications->ft->miVersion, 100);
+}
+
+TEST_F(Life, interface_names_are_cut_to_their_room)
+{
+    const std::string long_name(300, 'x');
+    Registration registration = thing_registration;
+    registration.provider_name = long_name.c_str();
+    EXPECT_EQ(interface<CMPIInstanceMI>('I', thing_data, registration)->ft->miName, "instance" + std::string(247, 'x'));
+}
+
+TEST_F(Life, the_last_cleanup_unloads_and_the_next_factory_call_begins_afresh)
+{
+    for (int round = 1; round <= 2; ++round)
+    {
+        auto* instances = things();
+        auto* methods = interface<CMPIMethodMI>('M', thing_data, thing_registration);
+        EXPECT_EQ(script.loads, round);
+
+        EXPECT_EQ(clean_up(methods), CMPI_RC_OK);
+        EXPECT_EQ(script.unloads, round - 1);
+        EXPECT_EQ(thing_data.adapter->load_count, 1U);
+
+        EXPECT_EQ(clean_up(instances), CMPI_RC_OK);
+        EXPECT_EQ(script.unloads, round);
+        EXPECT_EQ(script.providers, 0);
+        EXPECT_EQ(thing_data.adapter, nullptr);
+        EXPECT_EQ(thing_data.magic, 0xDDDDDDDD);
+    }
+}
+
+TEST_F(Life, an_adapter_that_may_not_unload_stays_until_the_server_ends)
+{
+    auto* associations = interface<CMPIAssociationMI>('A', link_data, link_registration);
+    auto* indications = interface<CMPIIndicationMI>('N', link_data, link_registration);
+    link_data.adapter->allow_unload = false;
+    EXPECT_EQ(clean_up(associations), CMPI_RC_DO_NOT_UNLOAD);
+    EXPECT_EQ(clean_up(indications), CMPI_RC_DO_NOT_UNLOAD);
+    EXPECT_EQ(link_data.adapter->load_count, 2U);
+    EXPECT_EQ(clean_up(associations, true), CMPI_RC_OK);
+    EXPECT_EQ(clean_up(indications, true), CMPI_RC_OK);
+    EXPECT_EQ(script.providers, 0);
+}
+
+TEST_F(Life, exceptions_of_a_provider_reach_nobody)
+{
+    script.on_load = [] { throw std::runtime_error("load"); };
+    EXPECT_EQ(things(), nullptr);
+    EXPECT_EQ(thing_data.adapter, nullptr);
+    EXPECT_EQ(script.providers, 0);
+    EXPECT_EQ(Thread_Context::top(), nullptr);
+
+    script.on_load = nullptr;
+    script.on_unload = [] { throw 1; };
+    EXPECT_EQ(clean_up(things()), CMPI_RC_OK);
+    EXPECT_EQ(script.providers, 0);
+}
+
+TEST_F(Life, an_unknown_kind_has_no_interface) { EXPECT_EQ(interface<void>('P', thing_data, thing_registration), nullptr); }
+
+TEST_F(Life, a_provider_loads_in_a_thread_context_of_its_server)
+{
+    const CMPI_Thread_Context* seen = nullptr;
+    script.on_load = [&]
+    {
+        seen = dynamic_cast<CMPI_Thread_Context*>(Thread_Context::top());
+        ASSERT_TRUE(seen);
+        EXPECT_EQ(seen->cmpi_broker(), broker.face());
+        EXPECT_EQ(seen->cmpi_context(), request.context());
+    };
+    things();
+    EXPECT_TRUE(seen);
+    EXPECT_EQ(Thread_Context::top(), nullptr);
+}
+
+TEST_F(Life, factories_may_race)
+{
+    constexpr unsigned num_threads = 8;
+    std::vector<std::thread> threads;
+    for (unsigned i = 0; i < num_threads; ++i)
+        threads.emplace_back([this] { things(); });
+    for (std::thread& thread : threads)
+        thread.join();
+    EXPECT_EQ(thing_data.adapter->load_count, num_threads);
+    EXPECT_EQ(script.loads, 1);
+}
+
+using Life_Death_Test = Life;
+
+TEST_F(Life_Death_Test, a_broken_interface_is_an_internal_error)
+{
+    auto* mi = things();
+    const auto call = [&](CMPIInstanceMI* broken)
+    { CMPI_Adapter::execQuery(broken, request.context(), nullptr, nullptr, "", ""); };
+    CMPIInstanceMI empty = {nullptr, nullptr};
+    EXPECT_DEATH(call(nullptr), "assert: mi != 0\n\n");
+    EXPECT_DEATH(call(&empty), "assert: sd != 0\n\n");
+    EXPECT_DEATH(CMPI_Adapter::execQuery(mi, nullptr, nullptr, nullptr, "", ""), "assert: cmpi_context\n\n");
+
+    CMPI_Adapter* adapter = thing_data.adapter;
+    EXPECT_DEATH((thing_data.adapter = nullptr, call(mi)), "assert: sd->adapter\n\n");
+    EXPECT_DEATH((thing_data.adapter = nullptr, delete adapter), "assert: sd->adapter == this\n\n");
+    EXPECT_DEATH((thing_data.magic = 0, call(mi)), "assert: sd->magic == STATIC_DATA_MAGIC\n\n");
+    EXPECT_DEATH((thing_data.magic = 0, delete adapter), "assert: sd->magic == STATIC_DATA_MAGIC\n\n");
+    EXPECT_DEATH((adapter->magic.~Magic(), call(mi)), "assert: sd->adapter->magic\n\n");
+}
+
+TEST(Return_Codes, have_their_names)
+{
+    EXPECT_STREQ(_rc_to_str(CMPI_RC_OK), "CMPI_RC_OK");
+    EXPECT_STREQ(_rc_to_str(CMPI_RC_ERR_FAILED), "CMPI_RC_ERR_FAILED");
+    EXPECT_STREQ(_rc_to_str(CMPI_RC_DO_NOT_UNLOAD), "CMPI_RC_DO_NOT_UNLOAD");
+    EXPECT_STREQ(_rc_to_str(CMPI_RC_ERROR), "CMPI_RC_ERROR");
+    EXPECT_STREQ(_rc_to_str(static_cast<CMPIrc>(18)), "CMPI_RC_ERR_FAILED");
+}
+
+} // namespace

@@ -1,0 +1,75 @@
+// A provider served by an adapter, and a broker to call it with.
+#pragma once
+
+#include "cimserver/broker/broker.h"
+#include "cimserver/broker/model.h"
+#include "cimserver/broker/request.h"
+#include "cmpi/entry.h"
+#include "tests/cmpi/test_providers.h"
+
+#include <gtest/gtest.h>
+
+#include <functional>
+#include <string>
+#include <vector>
+
+namespace test
+{
+
+inline constexpr const char* name_space = "root/zemlar";
+
+// A result that keeps what it is given.
+class Recorded_Result
+{
+public:
+    Recorded_Result();
+    Recorded_Result(const Recorded_Result&) = delete;
+    Recorded_Result& operator=(const Recorded_Result&) = delete;
+    const CMPIResult* face() const { return &_face; }
+    void clear();
+
+    std::vector<cimserver::Object_Path> paths;
+    std::vector<cimserver::Instance> instances;
+    int done = 0;
+
+private:
+    CMPIResult _face;
+};
+
+// The adapter of a provider while it exists. Each test has a broker and a request around it, and no instance may be left
+// over at its end.
+class Served_Provider : public testing::Test
+{
+protected:
+    void TearDown() override;
+
+    // Factory calls: the interfaces of either provider.
+    template <class MI> MI* interface(char kind, CMPI_Static_Data& sd, const Registration& registration)
+    {
+        void* mi = nullptr;
+        cimple_cmpi_adapter('C', &sd, &registration, broker.face(), request.context(), registration.provider_name, kind, &mi);
+        return static_cast<MI*>(mi);
+    }
+    CMPIInstanceMI* things() { return interface<CMPIInstanceMI>('I', thing_data, thing_registration); }
+    CMPIInstanceMI* links() { return interface<CMPIInstanceMI>('I', link_data, link_registration); }
+
+    // Objects of the broker, which the request owns.
+    CMPIObjectPath* path(const char* class_name) const;
+    CMPIObjectPath* thing_path(const char* name, const char* class_name = "Test_Thing") const;
+
+    // The value of an item of a recorded path or instance; a failure when there is none.
+    static const cimserver::Value& value(const std::vector<cimserver::Named_Value>& items, const char* name);
+    static std::string text(const std::vector<cimserver::Named_Value>& items, const char* name);
+
+    // What the work logs at a level ("WARN"), as "source: message".
+    static std::vector<std::string> logged(const std::function<void()>& work, const std::string& level = "WARN");
+
+    Script& script = Script::fresh();
+    const cimserver::Repository classes{&link_registration};
+    cimserver::Broker broker{classes};
+    cimserver::Request request;
+    CMPI_Static_Data thing_data = {};
+    CMPI_Static_Data link_data = {};
+};
+
+} // namespace test

@@ -1,0 +1,171 @@
+#include "tests/cmpi/test_classes.h"
+
+#include <cstddef>
+#include <iterator>
+
+// Records are laid out by the compiler and located by offset, as generated ones are.
+#pragma GCC diagnostic ignored "-Winvalid-offsetof"
+
+namespace test
+{
+
+namespace
+{
+
+constexpr Meta_Property property(Type type, const char* name, std::size_t offset, bool array = false, uint32 flags = 0)
+{
+    return {{{0}, Flag_Property | flags, name, nullptr, 0},
+            static_cast<uint16>(type),
+            static_cast<sint16>(array ? -1 : 0),
+            static_cast<uint32>(offset),
+            nullptr};
+}
+
+constexpr Meta_Reference reference(const char* name, std::size_t offset, bool array, uint32 flags)
+{
+    return {{{0}, Flag_Reference | flags, name, nullptr, 0},
+            static_cast<uint16>(array),
+            &Test_Thing::static_meta_class,
+            static_cast<uint32>(offset)};
+}
+
+// clang-format off
+constexpr Meta_Property thing_properties[] = {
+    property(STRING,   "Name",     offsetof(Test_Thing, Name), false, Flag_Key),
+    property(BOOLEAN,  "Boolean",  offsetof(Test_Thing, Boolean)),
+    property(UINT8,    "Uint8",    offsetof(Test_Thing, Uint8)),
+    property(SINT8,    "Sint8",    offsetof(Test_Thing, Sint8)),
+    property(UINT16,   "Uint16",   offsetof(Test_Thing, Uint16)),
+    property(SINT16,   "Sint16",   offsetof(Test_Thing, Sint16)),
+    property(UINT32,   "Uint32",   offsetof(Test_Thing, Uint32)),
+    property(SINT32,   "Sint32",   offsetof(Test_Thing, Sint32)),
+    property(UINT64,   "Uint64",   offsetof(Test_Thing, Uint64)),
+    property(SINT64,   "Sint64",   offsetof(Test_Thing, Sint64)),
+    property(REAL32,   "Real32",   offsetof(Test_Thing, Real32)),
+    property(REAL64,   "Real64",   offsetof(Test_Thing, Real64)),
+    property(CHAR16,   "Char16",   offsetof(Test_Thing, Char16)),
+    property(DATETIME, "When",     offsetof(Test_Thing, When)),
+    property(BOOLEAN,  "Booleans", offsetof(Test_Thing, Booleans), true),
+    property(UINT8,    "Uint8s",   offsetof(Test_Thing, Uint8s),   true),
+    property(SINT8,    "Sint8s",   offsetof(Test_Thing, Sint8s),   true),
+    property(UINT16,   "Uint16s",  offsetof(Test_Thing, Uint16s),  true),
+    property(SINT16,   "Sint16s",  offsetof(Test_Thing, Sint16s),  true),
+    property(UINT32,   "Uint32s",  offsetof(Test_Thing, Uint32s),  true),
+    property(SINT32,   "Sint32s",  offsetof(Test_Thing, Sint32s),  true),
+    property(UINT64,   "Uint64s",  offsetof(Test_Thing, Uint64s),  true),
+    property(SINT64,   "Sint64s",  offsetof(Test_Thing, Sint64s),  true),
+    property(REAL32,   "Real32s",  offsetof(Test_Thing, Real32s),  true),
+    property(REAL64,   "Real64s",  offsetof(Test_Thing, Real64s),  true),
+    property(CHAR16,   "Char16s",  offsetof(Test_Thing, Char16s),  true),
+    property(STRING,   "Strings",  offsetof(Test_Thing, Strings),  true),
+    property(DATETIME, "Whens",    offsetof(Test_Thing, Whens),    true),
+};
+// clang-format on
+constexpr uint32 num_thing_properties = std::size(thing_properties);
+
+constexpr Meta_Property link_note = property(STRING, "Note", offsetof(Test_Link, Note));
+constexpr Meta_Reference link_references[] = {
+    reference("Antecedent", offsetof(Test_Link, Antecedent), false, Flag_Key),
+    reference("Dependent", offsetof(Test_Link, Dependent), false, Flag_Key),
+    reference("Detail", offsetof(Test_Link, Detail), false, Flag_EmbeddedInstance),
+    reference("Others", offsetof(Test_Link, Others), true, 0),
+    reference("Details", offsetof(Test_Link, Details), true, Flag_EmbeddedInstance),
+};
+
+struct Thing_Features
+{
+    const Meta_Feature* features[num_thing_properties];
+    constexpr Thing_Features() : features()
+    {
+        for (uint32 i = 0; i < num_thing_properties; ++i)
+            features[i] = &thing_properties[i];
+    }
+};
+
+constexpr Thing_Features thing_features;
+constexpr const Meta_Feature* link_features[] = {&link_references[0], &link_references[1], &link_note,
+                                                 &link_references[2], &link_references[3], &link_references[4]};
+constexpr Meta_Feature_Local locals[num_thing_properties] = {};
+
+// A class whose count is not 0 is counted: one is the class itself.
+constexpr Meta_Class make(uint32 flags, const char* name, const Meta_Feature* const* features, uint32 count, std::size_t size,
+                          const Meta_Class* super, uint32 num_keys)
+{
+    return {{{{1}, Flag_Class | flags, name, nullptr, 0}, features, count, static_cast<uint32>(size)},
+            locals,
+            super,
+            num_keys,
+            &repository};
+}
+
+constexpr const Meta_Class* classes[] = {&Test_Thing::static_meta_class, &Test_Disk::static_meta_class,
+                                         &Test_Link::static_meta_class};
+
+} // namespace
+
+constinit Meta_Class Test_Thing::static_meta_class =
+    make(0, "Test_Thing", thing_features.features, num_thing_properties, sizeof(Test_Thing), nullptr, 1);
+constinit Meta_Class Test_Disk::static_meta_class =
+    make(0, "Test_Disk", thing_features.features, num_thing_properties, sizeof(Test_Disk), &Test_Thing::static_meta_class, 1);
+constinit Meta_Class Test_Link::static_meta_class =
+    make(Flag_Association, "Test_Link", link_features, std::size(link_features), sizeof(Test_Link), nullptr, 2);
+
+constinit const Meta_Repository repository = {classes, std::size(classes)};
+
+Ref<Test_Thing> thing(const char* name)
+{
+    Ref<Test_Thing> result(create<Test_Thing>());
+    result->Name.set(name);
+    return result;
+}
+
+Ref<Test_Thing> full_thing(const char* name)
+{
+    Ref<Test_Thing> t = thing(name);
+    t->Boolean.set(true);
+    t->Uint8.set(0xFF);
+    t->Sint8.set(-0x80);
+    t->Uint16.set(0xFFFF);
+    t->Sint16.set(-0x8000);
+    t->Uint32.set(0xFFFFFFFF);
+    t->Sint32.set(-0x7FFFFFFF - 1);
+    t->Uint64.set(0xFFFFFFFFFFFFFFFF);
+    t->Sint64.set(-0x7FFFFFFFFFFFFFFF - 1);
+    t->Real32.set(0.1F);
+    t->Real64.set(-1.5e300);
+    t->Char16.set(char16(0x20AC));
+    t->When.set(Datetime(90 * Datetime::MIN + 7));
+    t->Booleans.set({true, false, true});
+    t->Uint8s.set({0, 0xFF});
+    t->Sint8s.set({-0x80, 0x7F});
+    t->Uint16s.set({0, 0xFFFF});
+    t->Sint16s.set({-0x8000, 0x7FFF});
+    t->Uint32s.set({0xFFFFFFFF});
+    t->Sint32s.set({-1, 1});
+    t->Uint64s.set({0xFFFFFFFFFFFFFFFF, 1});
+    t->Sint64s.set({-1});
+    t->Real32s.set({0.1F, -0.0F});
+    t->Real64s.set({1e-300});
+    t->Char16s.set({char16('a'), char16(0xFFFF)});
+    t->Strings.set({"", "one", "zw\xC3\xB6lf"});
+    t->Whens.set({Datetime(), Datetime(Datetime::DAY)});
+    return t;
+}
+
+Ref<Test_Link> make_link(const char* antecedent, const char* dependent)
+{
+    Ref<Test_Link> result(create<Test_Link>());
+    result->Antecedent = thing(antecedent).steal();
+    result->Dependent = thing(dependent).steal();
+    return result;
+}
+
+unsigned live_instances()
+{
+    unsigned count = 0;
+    for (const Meta_Class* meta_class : classes)
+        count += Atomic_get(&meta_class->refs) - 1;
+    return count;
+}
+
+} // namespace test

@@ -1,0 +1,74 @@
+// Three classes with meta-data written by hand: a Test_Thing with a property of every type, a Test_Disk derived from it, and
+// a Test_Link that associates two things. Their instances are counted.
+#pragma once
+
+#include "runtime/instance.h"
+
+#include <utility>
+
+namespace test
+{
+
+using namespace zmlr;
+
+struct Test_Thing : Instance
+{
+    Property<String> Name; // key
+    Property<boolean> Boolean;
+    Property<uint8> Uint8;
+    Property<sint8> Sint8;
+    Property<uint16> Uint16;
+    Property<sint16> Sint16;
+    Property<uint32> Uint32;
+    Property<sint32> Sint32;
+    Property<uint64> Uint64;
+    Property<sint64> Sint64;
+    Property<real32> Real32;
+    Property<real64> Real64;
+    Property<char16> Char16;
+    Property<Datetime> When;
+    Property<Array<boolean>> Booleans;
+    Property<Array<uint8>> Uint8s;
+    Property<Array<sint8>> Sint8s;
+    Property<Array<uint16>> Uint16s;
+    Property<Array<sint16>> Sint16s;
+    Property<Array<uint32>> Uint32s;
+    Property<Array<sint32>> Sint32s;
+    Property<Array<uint64>> Uint64s;
+    Property<Array<sint64>> Sint64s;
+    Property<Array<real32>> Real32s;
+    Property<Array<real64>> Real64s;
+    Property<Array<char16>> Char16s;
+    Property<Array<String>> Strings;
+    Property<Array<Datetime>> Whens;
+
+    static Meta_Class static_meta_class;
+};
+
+struct Test_Disk : Test_Thing
+{
+    static Meta_Class static_meta_class;
+};
+
+struct Test_Link : Instance
+{
+    Test_Thing* Antecedent; // key
+    Test_Thing* Dependent;  // key
+    Property<String> Note;
+    Test_Thing* Detail;                 // embedded
+    Property<Array<Instance*>> Others;  // references
+    Property<Array<Instance*>> Details; // embedded
+
+    static Meta_Class static_meta_class;
+};
+
+extern const Meta_Repository repository;
+
+Ref<Test_Thing> thing(const char* name);
+Ref<Test_Thing> full_thing(const char* name); // every property has a value
+Ref<Test_Link> make_link(const char* antecedent, const char* dependent);
+
+// Instances alive, of all three classes.
+unsigned live_instances();
+
+} // namespace test

@@ -1,0 +1,53 @@
+"""Servers and clients for the end-to-end tests. ZMLR_BUILD_DIR names the build under test."""
+
+import json
+import sys
+from pathlib import Path
+
+import pytest
+import pywbem
+
+sys.path.insert(0, str(Path(__file__).resolve().parents[2]))
+
+from tools.simulated_server import SimulatedServer  # noqa: E402
+from tools.wbemcli import Wbemcli  # noqa: E402
+
+NAME_SPACE = "root/zemlar"
+
+
+class Host:
+    """A simulated host with its server and a client of each kind."""
+
+    def __init__(self, server):
+        self.server = server
+        self.pywbem = pywbem.WBEMConnection(server.url, default_namespace=NAME_SPACE, timeout=60)
+        self.wbemcli = Wbemcli(server.port)
+
+    def device_ids(self, class_name="ZEMLAR_FCPort"):
+        return [instance["DeviceID"] for instance in self.pywbem.EnumerateInstances(class_name)]
+
+
+@pytest.fixture(scope="session")
+def mixed():
+    """The scenario with a CNA, an FC HBA and a mezzanine card; shared by all tests that change nothing."""
+    with SimulatedServer("mixed") as server:
+        yield Host(server)
+
+
+@pytest.fixture
+def start(tmp_path):
+    """start(scenario): a server of the test's own; a dict is written to a scenario file first."""
+    servers = []
+
+    def start_server(scenario, environment=None):
+        if isinstance(scenario, dict):
+            path = tmp_path / f"scenario{len(servers)}.json"
+            path.write_text(json.dumps(scenario), encoding="utf-8")
+            scenario = str(path)
+        server = SimulatedServer(scenario, environment)
+        servers.append(server)
+        return Host(server)
+
+    yield start_server
+    for server in servers:
+        server.stop()

@@ -1,0 +1,143 @@
+"""What wbemcli and pywbem see of the mixed host through every operation that is served."""
+
+import pywbem
+import pytest
+
+FC_PORT_KEYS = ["SystemCreationClassName", "SystemName", "CreationClassName", "DeviceID"]
+
+
+def test_class_names(mixed):
+    served = [name for name in mixed.wbemcli.enumerate_class_names() if name.startswith("ZEMLAR_")]
+    assert len(served) == 0, "only the roots of the tree stand at the top"
+    everything = mixed.pywbem.EnumerateClassNames(DeepInheritance=True)
+    assert len(everything) == 177
+    assert sum(name.startswith("ZEMLAR_") for name in everything) == 76
+    assert mixed.pywbem.EnumerateClassNames("CIM_FCPort") == ["ZEMLAR_FCPort"]
+    assert set(mixed.wbemcli.enumerate_class_names()) == set(mixed.pywbem.EnumerateClassNames())
+
+
+def test_classes(mixed):
+    tops = mixed.pywbem.EnumerateClasses()
+    assert all(top.superclass is None for top in tops)
+    everything = mixed.pywbem.EnumerateClasses(DeepInheritance=True, LocalOnly=False)
+    assert len(everything) == 177
+
+    port = mixed.pywbem.GetClass("zemlar_fcport", LocalOnly=False, IncludeClassOrigin=True)
+    assert port.classname == "ZEMLAR_FCPort"
+    assert port.superclass == "CIM_FCPort"
+    assert [name for name, prop in port.properties.items() if "Key" in prop.qualifiers] == FC_PORT_KEYS
+    assert port.properties["DeviceID"].class_origin == "CIM_LogicalDevice"
+    assert port.properties["Speed"].type == "uint64"
+    assert port.properties["OperationalStatus"].is_array
+    assert port.properties["EnabledDefault"].value == 2
+    status = port.properties["OperationalStatus"].qualifiers
+    meaning = dict(zip(status["ValueMap"].value, status["Values"].value))
+    assert meaning["11"] == "In Service"
+    change = port.methods["RequestStateChange"]
+    assert change.return_type == "uint32"
+    assert change.parameters["Job"].reference_class == "CIM_ConcreteJob"
+
+    local = mixed.pywbem.GetClass("ZEMLAR_PhysicalPackage", LocalOnly=True)
+    assert list(local.properties) == ["FRUNumber"]
+    association = mixed.pywbem.GetClass("ZEMLAR_FCPortSystemDevice", LocalOnly=False)
+    assert association.qualifiers["Association"].value is True
+    assert association.properties["PartComponent"].reference_class == "ZEMLAR_FCPort"
+    assert any("ZEMLAR_FCPort" in line for line in mixed.wbemcli.get_class("ZEMLAR_FCPort"))
+
+
+def test_every_served_class_enumerates(mixed):
+    for name in mixed.pywbem.EnumerateClassNames(DeepInheritance=True):
+        if name.startswith("ZEMLAR_"):
+            names = mixed.pywbem.EnumerateInstanceNames(name)
+            paths = [instance.path for instance in mixed.pywbem.EnumerateInstances(name)]
+            for path in paths:
+                path.host = path.namespace = None
+            for path in names:
+                path.host = path.namespace = None
+            assert names == paths, f"keys of {name} differ between names and instances"
+
+
+@pytest.mark.parametrize("class_name", ["ZEMLAR_ComputerSystem", "ZEMLAR_PortController", "ZEMLAR_FCPort"])
+def test_both_clients_see_the_same_instances(mixed, class_name):
+    seen = mixed.pywbem.EnumerateInstances(class_name)
+    other = mixed.wbemcli.enumerate_instances(class_name)
+    assert len(seen) == len(other) > 0
+    for instance, printed in zip(seen, other):
+        for name, value in instance.items():
+            if isinstance(value, str) and name in printed:
+                assert printed[name] == value
+    assert len(mixed.wbemcli.enumerate_instance_names(class_name)) == len(seen)
+    for path, instance in zip(mixed.wbemcli.enumerate_instance_names(class_name), seen):
+        assert mixed.wbemcli.get_instance(path)["ElementName"] == instance["ElementName"]
+
+
+def test_get_instance_returns_what_enumeration_returned(mixed):
+    for port in mixed.pywbem.EnumerateInstances("ZEMLAR_FCPort"):
+        again = mixed.pywbem.GetInstance(port.path)
+        assert dict(again) == dict(port)
+        assert port["CreationClassName"] == "ZEMLAR_FCPort"
+        assert port["Name"].endswith(":" + port["DeviceID"])
+
+
+def test_property_lists(mixed):
+    some = mixed.pywbem.EnumerateInstances("ZEMLAR_FCPort", PropertyList=["speed", "PortNumber", "NoSuchProperty"])
+    assert all({name.lower() for name in port.keys()} == {"speed", "portnumber"} for port in some)
+    assert all(port.path["DeviceID"] for port in some), "paths carry the keys whatever was asked for"
+    one = mixed.pywbem.GetInstance(some[0].path, PropertyList=["DeviceID"])
+    assert dict(one) == {"DeviceID": some[0].path["DeviceID"]}
+    none = mixed.pywbem.GetInstance(some[0].path, PropertyList=[])
+    assert dict(none) == {}
+    printed = mixed.wbemcli.get_instance(mixed.wbemcli.enumerate_instance_names("ZEMLAR_FCPort")[0], "Speed")
+    assert set(printed) == {"__path", "Speed"} or set(printed) == {"Speed"}
+
+
+def test_superclass_is_the_union_of_its_served_subclasses(mixed):
+    ports = {port["DeviceID"] for port in mixed.pywbem.EnumerateInstances("ZEMLAR_FCPort")}
+    assert {port["DeviceID"] for port in mixed.pywbem.EnumerateInstances("CIM_FCPort")} == ports
+    devices = mixed.pywbem.EnumerateInstances("CIM_LogicalDevice")
+    assert {"ZEMLAR_FCPort", "ZEMLAR_PortController"} <= {device.classname for device in devices}
+    assert len({str(device.path) for device in devices}) == len(devices)
+    named = mixed.pywbem.EnumerateInstanceNames("CIM_LogicalDevice")
+    assert [path["DeviceID"] for path in named] == [device["DeviceID"] for device in devices]
+    shallow = mixed.pywbem.EnumerateInstances("CIM_LogicalDevice", DeepInheritance=False)
+    assert all("PortNumber" not in device for device in shallow)
+
+
+def test_flags_are_accepted(mixed):
+    for flag in (True, False):
+        ports = mixed.pywbem.EnumerateInstances("ZEMLAR_FCPort", LocalOnly=flag, DeepInheritance=flag, IncludeClassOrigin=flag)
+        origins = {port.properties["DeviceID"].class_origin for port in ports}
+        assert origins == ({"CIM_LogicalDevice"} if flag else {None})
+
+
+def test_class_names_are_compared_without_regard_to_case(mixed):
+    path = mixed.pywbem.EnumerateInstanceNames("zemlar_FCPORT")[0]
+    path.keybindings = {name.upper(): value for name, value in path.keybindings.items()}
+    path.classname = "zemlar_fcport"
+    assert mixed.pywbem.GetInstance(path)["PortNumber"] is not None
+
+
+def errors():
+    wrong = pywbem.CIMInstanceName
+    good = dict(zip(FC_PORT_KEYS, ["ZEMLAR_ComputerSystem", "nowhere", "ZEMLAR_FCPort", "0000000000000000"]))
+    yield "unknown class", lambda c: c.EnumerateInstances("ZEMLAR_Nothing"), pywbem.CIM_ERR_INVALID_CLASS
+    yield "unknown class, get class", lambda c: c.GetClass("CIM_Nothing"), pywbem.CIM_ERR_INVALID_CLASS
+    yield "unknown class, names", lambda c: c.EnumerateClassNames("CIM_Nothing"), pywbem.CIM_ERR_INVALID_CLASS
+    yield "unknown name space", lambda c: c.EnumerateInstances("ZEMLAR_FCPort", "root/nowhere"), pywbem.CIM_ERR_INVALID_NAMESPACE
+    yield "no such instance", lambda c: c.GetInstance(wrong("ZEMLAR_FCPort", good)), pywbem.CIM_ERR_NOT_FOUND
+    yield "missing key", lambda c: c.GetInstance(wrong("ZEMLAR_FCPort", {"DeviceID": "1"})), pywbem.CIM_ERR_INVALID_PARAMETER
+    yield "unknown key", lambda c: c.GetInstance(wrong("ZEMLAR_FCPort", {**good, "X": "1"})), pywbem.CIM_ERR_INVALID_PARAMETER
+    yield "ill-typed key", lambda c: c.GetInstance(wrong("ZEMLAR_FCPort", {**good, "DeviceID": True})), (
+        pywbem.CIM_ERR_INVALID_PARAMETER
+    )
+    yield "unknown method", lambda c: c.InvokeMethod("Explode", wrong("ZEMLAR_FCPort", good)), pywbem.CIM_ERR_METHOD_NOT_FOUND
+    yield "pull operation", lambda c: c.OpenEnumerateInstances("ZEMLAR_FCPort"), pywbem.CIM_ERR_NOT_SUPPORTED
+    yield "delete", lambda c: c.DeleteInstance(wrong("ZEMLAR_FCPort", good)), pywbem.CIM_ERR_NOT_SUPPORTED
+
+
+@pytest.mark.parametrize("_name,call,code", [pytest.param(*case, id=case[0]) for case in errors()])
+def test_errors(mixed, _name, call, code):
+    with pytest.raises(pywbem.CIMError) as caught:
+        call(mixed.pywbem)
+    assert caught.value.status_code == code
+    assert caught.value.status_description

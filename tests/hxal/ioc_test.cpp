@@ -1,0 +1,101 @@
+#include "simulated_host.h"
+
+namespace
+{
+
+// Indexes: 0 FC (one-port HBA), 1 and 2 FCoE, 3 and 4 Ethernet.
+class Ioc : public Simulated_Host
+{
+protected:
+    Ioc()
+    {
+        host(R"({"adapters": [{"kind": "fc-hba", "name": "red", "hwpath": "0000:01:00", "ports": [{"name": "r0"}]},
+                              {"kind": "cna", "name": "blue", "hwpath": "0000:02:00", "serial": "ABC",
+                               "ports": [{"name": "b0"}, {"name": "b1"}]}]})");
+        hxal_adapter_scan();
+        hxasim::take_requests();
+    }
+    ~Ioc() override { EXPECT_THAT(requests(), testing::IsEmpty()); }
+
+    static int id(const hxal_t* ioc) { return ioc ? ioc->id : -1; }
+};
+
+TEST_F(Ioc, is_found_by_index_address_name_path_and_instance)
+{
+    EXPECT_EQ(id(hxal_ioc_open_idx(4)), 4);
+    EXPECT_EQ(id(hxal_ioc_open_pwwn(port_wwn(1, 1))), 2);
+    EXPECT_EQ(id(hxal_ioc_open_name("blue")), 1);
+    EXPECT_EQ(id(hxal_ioc_open_hwpath("0000:02:00.3")), 4);
+    EXPECT_EQ(id(hxal_ioc_get_by_eth_name("eth1")), 4);
+    EXPECT_EQ(id(hxal_ioc_get_by_inst(1)), 1);
+
+    EXPECT_EQ(hxal_ioc_get_idx_by_pwwn(port_wwn(0, 0)), 0);
+    EXPECT_EQ(hxal_ioc_get_idx_by_mac(fcoe_mac(1, 1)), 2);
+    EXPECT_EQ(hxal_ioc_get_idx_by_mac(eth_mac(1, 0)), 3);
+    EXPECT_EQ(hxal_ioc_get_fc_idx_by_name("r0"), 0);
+    EXPECT_EQ(hxal_ioc_get_fc_idx_by_name("b1"), 2);
+    EXPECT_EQ(hxal_ioc_get_eth_idx_by_name("b1"), 4);
+    EXPECT_EQ(hxal_ioc_get_idx_by_name("b1", HXA_IOC_TYPE_FCoE), 2);
+    EXPECT_EQ(hxal_ioc_get_fc_idx_by_hwpath("0000:02:00.0"), 1);
+    EXPECT_EQ(hxal_ioc_get_eth_idx_by_hwpath("0000:02:00.2"), 3);
+
+    EXPECT_EQ(hxal_ioc_get_inst_num_by_pwwn(port_wwn(1, 1)), 2);
+    EXPECT_EQ(hxal_ioc_get_inst_num_by_mac(eth_mac(1, 1)), 1);
+}
+
+TEST_F(Ioc, is_not_found_by_what_nobody_or_another_kind_has)
+{
+    for (int idx : {-1, 5, INT_MAX})
+        EXPECT_EQ(hxal_ioc_open_idx(idx), nullptr) << idx;
+    EXPECT_EQ(hxal_ioc_open_pwwn(0), nullptr); // the Ethernet IOCs' own
+    EXPECT_EQ(hxal_ioc_open_name("green"), nullptr);
+    EXPECT_EQ(hxal_ioc_open_name("Blue"), nullptr);
+    EXPECT_EQ(hxal_ioc_open_name(nullptr), nullptr);
+    EXPECT_EQ(hxal_ioc_open_hwpath(nullptr), nullptr);
+    EXPECT_EQ(hxal_ioc_get_by_eth_name(nullptr), nullptr);
+    EXPECT_EQ(hxal_ioc_get_by_inst(3), nullptr);
+
+    EXPECT_EQ(hxal_ioc_get_idx_by_pwwn(node_wwn(1, 1)), -1);
+    EXPECT_EQ(hxal_ioc_get_idx_by_mac(mac_t{{1}}), -1);
+    EXPECT_EQ(hxal_ioc_get_idx_by_mac(mac_t{}), -1); // the FC IOC's own
+    EXPECT_EQ(hxal_ioc_get_idx_by_name("r0", HXA_IOC_TYPE_FCoE), -1);
+    EXPECT_EQ(hxal_ioc_get_eth_idx_by_name("r0"), -1);
+    EXPECT_EQ(hxal_ioc_get_fc_idx_by_name(nullptr), -1);
+    EXPECT_EQ(hxal_ioc_get_fc_idx_by_hwpath("0000:02:00.2"), -1);
+    EXPECT_EQ(hxal_ioc_get_eth_idx_by_hwpath(nullptr), -1);
+    EXPECT_EQ(hxal_ioc_get_inst_num_by_pwwn(0), -1);
+    EXPECT_EQ(hxal_ioc_get_inst_num_by_mac(fcoe_mac(1, 0)), -1);
+}
+
+TEST_F(Ioc, tells_its_fields)
+{
+    const hxal_t* ioc = hxal_ioc_open_idx(4);
+    EXPECT_STREQ(hxal_ioc_get_name(ioc), "b1");
+    EXPECT_STREQ(hxal_ioc_get_eth_name(ioc), "eth1");
+    EXPECT_STREQ(hxal_ioc_get_sn(ioc), "ABC");
+    EXPECT_EQ(hxal_ioc_get_port_num(ioc), 1);
+    EXPECT_EQ(hxal_ioc_get_ioc_type(ioc), HXA_IOC_TYPE_LL);
+    EXPECT_EQ(hxal_ioc_get_mac(ioc).mac[3], 0x20);
+    EXPECT_EQ(hxal_ioc_get_nwwn(ioc), 0u);
+    EXPECT_EQ(hxal_ioc_get_nwwn(hxal_ioc_open_idx(1)), node_wwn(1, 0));
+    EXPECT_EQ(hxal_ioc_get_mac(hxal_ioc_open_idx(0)).mac[1], 0); // an FC IOC has none
+
+    char devpath[256], hwpath[32], adapter_hwpath[32];
+    hxal_ioc_get_path(ioc, devpath, hwpath, adapter_hwpath);
+    EXPECT_STREQ(devpath, "/dev/hxn");
+    EXPECT_STREQ(hwpath, "0000:02:00.3");
+    EXPECT_STREQ(adapter_hwpath, "0000:02:00");
+    hxal_ioc_get_path_by_idx(0, devpath);
+    EXPECT_STREQ(devpath, "/dev/hxa");
+    hxal_ioc_get_path_by_idx(5, devpath);
+    EXPECT_STREQ(devpath, "/dev/hxa");
+
+    EXPECT_EQ(hxal_ioc_get_name(nullptr), nullptr);
+    EXPECT_EQ(hxal_ioc_get_pwwn(nullptr), 0u);
+    EXPECT_EQ(hxal_ioc_get_port_num(nullptr), -1);
+    EXPECT_EQ(int{hxal_ioc_get_ioc_type(nullptr)}, 0);
+    hxal_ioc_get_path(nullptr, devpath, hwpath, adapter_hwpath);
+    hxal_ioc_close(nullptr);
+}
+
+} // namespace

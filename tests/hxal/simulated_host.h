@@ -1,0 +1,73 @@
+// A test on a simulated host: the library under test, the drivers behind it, and the check that it sent nothing they refuse.
+#pragma once
+
+#include "hxal/hxal.h"
+#include "sim/hxasim.h"
+
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+
+#include <cstring>
+#include <string>
+
+// Instances 0 and 1 of both drivers.
+inline const std::string one_cna = R"({"adapters": [{"kind": "cna"}]})";
+
+class Simulated_Host : public testing::Test
+{
+protected:
+    Simulated_Host()
+    {
+        hxal_libinit(hxa_aen_app_cim);
+        hxal_set_last_error(HXA_STATUS_OK);
+    }
+
+    ~Simulated_Host() override
+    {
+        EXPECT_THAT(hxasim::violations(), testing::IsEmpty());
+        hxasim::load_text("{}");
+        hxal_adapter_scan();
+        hxasim::unload();
+    }
+
+    static void host(const std::string& json) { hxasim::load_text(json); }
+
+    static void fail(const std::string& command, int error, std::optional<int> instance = {})
+    {
+        hxasim::inject({.command = command, .instance = instance, .error = error});
+    }
+
+    // The driver's record goes out with these bytes in it.
+    static void distort(const std::string& command, std::size_t offset, std::vector<std::uint8_t> bytes,
+                        std::optional<int> instance = {}, const std::string& node = "/dev/hxa")
+    {
+        hxasim::inject({.command = command, .node = node, .instance = instance, .answer = {{offset, std::move(bytes)}}});
+    }
+
+    static std::vector<std::string> requests()
+    {
+        std::vector<std::string> names;
+        for (const auto& request : hxasim::take_requests())
+            names.push_back(request.name);
+        return names;
+    }
+};
+
+// WWNs and MACs as the simulated product line numbers them.
+inline wwn_t port_wwn(uint8_t adapter, uint8_t port)
+{
+    const uint8_t bytes[] = {0x10, 0, 0, 0x05, 0x1E, 0x10, adapter, port};
+    wwn_t wwn;
+    std::memcpy(&wwn, bytes, sizeof wwn);
+    return wwn;
+}
+
+inline wwn_t node_wwn(uint8_t adapter, uint8_t port)
+{
+    wwn_t wwn = port_wwn(adapter, port);
+    *reinterpret_cast<uint8_t*>(&wwn) = 0x20;
+    return wwn;
+}
+
+inline mac_t eth_mac(uint8_t adapter, uint8_t port) { return {{0x00, 0x05, 0x1E, 0x20, adapter, port}}; }
+inline mac_t fcoe_mac(uint8_t adapter, uint8_t port) { return {{0x00, 0x05, 0x1E, 0x30, adapter, port}}; }

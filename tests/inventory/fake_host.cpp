@@ -1,0 +1,74 @@
+#include "tests/inventory/fake_host.h"
+
+#include <arpa/inet.h>
+#include <netdb.h>
+#include <unistd.h>
+
+#include <cerrno>
+#include <cstring>
+
+namespace zmlr
+{
+
+Fake_Host fake_host;
+
+namespace
+{
+
+int answer(const std::optional<std::string>& text, char* out, size_t size)
+{
+    if (!text)
+        return -1;
+    std::strncpy(out, text->c_str(), size);
+    return 0;
+}
+
+// The addresses in the form of a host entry; empty texts stand for nothing.
+std::vector<in_addr> addresses;
+std::vector<char*> address_list;
+
+void fill(hostent& entry)
+{
+    addresses.assign(fake_host.addresses.size(), in_addr());
+    address_list.clear();
+    for (size_t i = 0; i < addresses.size(); i++)
+    {
+        inet_pton(AF_INET, fake_host.addresses[i].c_str(), &addresses[i]);
+        address_list.push_back(reinterpret_cast<char*>(&addresses[i]));
+    }
+    address_list.push_back(nullptr);
+    entry = {};
+    entry.h_addrtype = AF_INET;
+    entry.h_length = sizeof(in_addr);
+    entry.h_addr_list = address_list.data();
+}
+
+} // namespace
+
+} // namespace zmlr
+
+extern "C" int gethostname(char* out, size_t size) noexcept
+{
+    if (zmlr::fake_host.name_answers == 0)
+        return -1;
+    if (zmlr::fake_host.name_answers > 0)
+        zmlr::fake_host.name_answers--;
+    return zmlr::answer(zmlr::fake_host.name, out, size);
+}
+
+extern "C" int getdomainname(char* out, size_t size) noexcept { return zmlr::answer(zmlr::fake_host.domain, out, size); }
+
+extern "C" int gethostbyname_r(const char*, hostent* entry, char*, size_t size, hostent** result, int* error)
+{
+    zmlr::fake_host.lookups++;
+    *result = nullptr;
+    *error = NETDB_INTERNAL;
+    if (size < zmlr::fake_host.memory_needed)
+        return ERANGE;
+    *error = HOST_NOT_FOUND;
+    if (zmlr::fake_host.addresses.empty())
+        return 0;
+    zmlr::fill(*entry);
+    *result = entry;
+    return 0;
+}

@@ -1,0 +1,181 @@
+#include "tests/inventory/inventory_fixture.h"
+
+#include "hxal/hxal.h"
+#include "runtime/value.h"
+
+#include <cstdlib>
+#include <filesystem>
+#include <fstream>
+#include <regex>
+#include <sstream>
+
+namespace zmlr
+{
+
+namespace
+{
+
+// Before any static object: the first of them already probes the driver and logs.
+[[gnu::constructor(101)]] void prepare_home()
+{
+    static char home[] = "/tmp/zmlr-inventory-XXXXXX";
+    if (!mkdtemp(home))
+        std::abort();
+    setenv("HOME", home, 1);
+    setenv("HXASIM_SCENARIO", "mixed", 0);
+
+    FILE* options = std::fopen((std::string(home) + "/.cimplerc").c_str(), "w");
+    if (!options)
+        std::abort();
+    std::fputs("LOG_LEVEL=DBG\n", options);
+    std::fclose(options);
+}
+
+std::filesystem::path home() { return std::getenv("HOME"); }
+
+class Home_Removal : public testing::Environment
+{
+public:
+    void TearDown() override { std::filesystem::remove_all(home()); }
+};
+
+[[maybe_unused]] const testing::Environment* home_removal = testing::AddGlobalTestEnvironment(new Home_Removal);
+
+std::string text_of(boolean x) { return x ? "true" : "false"; }
+std::string text_of(const String& x) { return '"' + std::string(x.c_str(), x.size()) + '"'; }
+template <class T>
+requires std::is_integral_v<T> std::string text_of(T x) { return std::to_string(x); }
+
+template <class T> std::string text_of(const Array<T>& array)
+{
+    std::string text;
+    for (const T& x : array)
+        text += (text.empty() ? "" : ", ") + text_of(x);
+    return '{' + text + '}';
+}
+
+template <class... T> std::string text_of_any(const Value& value)
+{
+    std::string text = "?";
+    const auto take = [&text](const auto* x)
+    {
+        if (x)
+            text = text_of(*x);
+    };
+    (take(value.get_if<T>()), ...);
+    return text;
+}
+
+std::string text_of(const Instance* instance, const Meta_Feature* feature)
+{
+    Value value;
+    if (value.set(instance, feature) != 0 || value.null())
+        return {};
+    return text_of_any<boolean, uint8, uint16, uint32, uint64, String, Array<uint16>, Array<String>>(value);
+}
+
+} // namespace
+
+void Inventory_Test::SetUp()
+{
+    fake_host = Fake_Host();
+    plug("mixed");
+}
+
+void Inventory_Test::TearDown() { EXPECT_THAT(hxasim::violations(), testing::IsEmpty()); }
+
+void Inventory_Test::rescan()
+{
+    hxal_adapter_scan();
+    requests();
+    log();
+}
+
+void Inventory_Test::plug(const std::string& scenario)
+{
+    hxasim::load(scenario);
+    rescan();
+}
+
+void Inventory_Test::plug_text(const std::string& json)
+{
+    hxasim::load_text(json);
+    rescan();
+}
+
+void Inventory_Test::fail(const char* command, const char* node, std::optional<int> instance, int error)
+{
+    hxasim::Fault fault;
+    fault.command = command;
+    fault.node = node;
+    fault.instance = instance;
+    fault.error = error;
+    hxasim::inject(fault);
+}
+
+void Inventory_Test::refuse(const char* command, const char* node, std::optional<int> instance, uint32 status)
+{
+    hxasim::Fault fault;
+    fault.command = command;
+    fault.node = node;
+    fault.instance = instance;
+    fault.status = status;
+    hxasim::inject(fault);
+}
+
+std::vector<std::string> Inventory_Test::requests()
+{
+    std::vector<std::string> texts;
+    for (const hxasim::Request& request : hxasim::take_requests())
+        texts.push_back(request.name + ' ' + request.node + ' ' + std::to_string(request.instance));
+    return texts;
+}
+
+std::vector<std::string> Inventory_Test::log()
+{
+    static std::ifstream messages;
+    if (!messages.is_open())
+        messages.open(home() / ".cimple/messages");
+    messages.clear();
+
+    static const std::regex form(R"(\S+ \S+ (\w+): (\w+)\(\d+\): (.*))");
+    std::vector<std::string> lines;
+    for (std::string line; std::getline(messages, line);)
+    {
+        std::smatch part;
+        if (!std::regex_match(line, part, form))
+            lines.push_back(line);
+        else if (!part[3].str().starts_with("Entering: ") && !part[3].str().starts_with("Returning: "))
+            lines.push_back(part[1].str() + ' ' + part[2].str() + ": " + part[3].str());
+    }
+    return lines;
+}
+
+std::string value_of(const Instance* instance, const char* property)
+{
+    return text_of(instance, find_property(instance->meta_class, property));
+}
+
+std::string describe(const Instance* instance)
+{
+    const Meta_Class* meta_class = instance->meta_class;
+    std::string text = std::string(meta_class->name) + '\n';
+    for (uint32 i = 0; i < meta_class->num_meta_features; i++)
+    {
+        const Meta_Feature* feature = meta_class->meta_features[i];
+        const std::string value = is_property(feature) ? text_of(instance, feature) : std::string();
+        if (!value.empty())
+            text += std::string("    ") + feature->name + " = " + value + '\n';
+    }
+    return text;
+}
+
+std::string describe(const Instance_Array& instances)
+{
+    std::string text;
+    for (const Instance* instance : instances)
+        text += describe(instance);
+    return text;
+}
+
+} // namespace zmlr

@@ -1,0 +1,41 @@
+// A host with simulated adapters, a log of its own, and instances as texts.
+#pragma once
+
+#include "runtime/instance.h"
+#include "sim/hxasim.h"
+#include "tests/inventory/fake_host.h"
+
+#include <gmock/gmock.h>
+
+#include <string>
+#include <vector>
+
+namespace zmlr
+{
+
+// The program's log level is LL_DBG; its home is a new directory that is removed at the end. Its driver gate is what the scenario
+// in HXASIM_SCENARIO ("mixed" when unset) made it when the program was loaded.
+class Inventory_Test : public testing::Test
+{
+protected:
+    void SetUp() override;
+    void TearDown() override; // fails on requests that no driver would accept
+
+    void plug(const std::string& scenario); // replaces the host by a shipped one and scans it
+    void plug_text(const std::string& json);
+    void rescan();
+    void fail(const char* command, const char* node, std::optional<int> instance, int error);       // with an errno
+    void refuse(const char* command, const char* node, std::optional<int> instance, uint32 status); // with a status
+
+    std::vector<std::string> requests(); // "COMMAND node instance", since the last call
+    std::vector<std::string> log();      // "LEVEL Source: message", since the last call, without entries and exits
+};
+
+// The class name, then a line for each property that is not null, in the order of the class.
+std::string describe(const Instance* instance);
+std::string describe(const Instance_Array& instances);
+
+// The first instance's property in the form that describe() gives it; empty when it is null.
+std::string value_of(const Instance* instance, const char* property);
+
+} // namespace zmlr

@@ -1,0 +1,138 @@
+#include "inventory/fchba_manager.h"
+#include "tests/inventory/inventory_fixture.h"
+
+#include <cerrno>
+
+using namespace zmlr;
+using testing::Contains;
+using testing::ElementsAre;
+using testing::IsEmpty;
+
+namespace
+{
+
+class Adapters : public Inventory_Test
+{
+protected:
+    static Instance_Array controllers() { return FCHBAManager::getFCHBAManager().getInstances(CLASSID_PortController); }
+
+    static std::vector<std::string> values(const char* property)
+    {
+        std::vector<std::string> texts;
+        for (const Instance* controller : controllers())
+            texts.push_back(value_of(controller, property));
+        return texts;
+    }
+};
+
+} // namespace
+
+TEST_F(Adapters, Are_Port_Controllers)
+{
+    const Instance_Array all = controllers();
+    ASSERT_EQ(all.size(), 4U);
+    EXPECT_EQ(describe(all[0]), R"(ZEMLAR_PortController
+    Caption = "Zemlar CNA"
+    Description = "Zemlar CNA"
+    ElementName = "ZMC2000456"
+    Name = "ZMC2000456"
+    OperationalStatus = {11}
+    StatusDescriptions = {"The adapter is in service"}
+    EnabledState = 2
+    RequestedState = 12
+    EnabledDefault = 2
+    TransitioningToState = 12
+    SystemCreationClassName = "ZEMLAR_ComputerSystem"
+    SystemName = "192.0.2.10"
+    CreationClassName = "ZEMLAR_PortController"
+    DeviceID = "00051E300000"
+    ControllerType = 1
+    OtherControllerType = "CNA - FC and Ethernet types"
+)");
+    EXPECT_EQ(describe(all[3]), R"(ZEMLAR_PortController
+    Caption = "Zemlar FC HBA"
+    Description = "Zemlar FC HBA"
+    ElementName = "ZMF8500042"
+    Name = "ZMF8500042"
+    OperationalStatus = {10}
+    StatusDescriptions = {"The adapter is disabled"}
+    EnabledState = 3
+    RequestedState = 12
+    EnabledDefault = 2
+    TransitioningToState = 12
+    SystemCreationClassName = "ZEMLAR_ComputerSystem"
+    SystemName = "192.0.2.10"
+    CreationClassName = "ZEMLAR_PortController"
+    DeviceID = "200000051E100300"
+    ControllerType = 4
+)");
+    EXPECT_THAT(values("DeviceID"),
+                ElementsAre(R"("00051E300000")", R"("200000051E100100")", R"("00051E300200")", R"("200000051E100300")"));
+}
+
+TEST_F(Adapters, Are_Disabled_When_Every_IOC_Is)
+{
+    plug_text(R"({"adapters": [
+        {"kind": "cna", "ports": [{"ioc_state": "disabled"}, {"ioc_state": "disabled"}]},
+        {"kind": "fc-hba", "ports": [{"ioc_state": "disabled"}, {}]}]})");
+    EXPECT_THAT(values("OperationalStatus"), ElementsAre("{10}", "{11}"));
+    EXPECT_THAT(values("EnabledState"), ElementsAre("3", "2"));
+    EXPECT_THAT(values("StatusDescriptions"), ElementsAre(R"({"The adapter is disabled"})", R"({"The adapter is in service"})"));
+}
+
+TEST_F(Adapters, Are_Looked_Up_By_Name_Once)
+{
+    plug_text(R"({"generate": {"adapters": 5, "kind": "fc-hba"}})");
+    EXPECT_EQ(controllers().size(), 5U);
+    EXPECT_EQ(fake_host.lookups, 1);
+}
+
+TEST_F(Adapters, Cost_The_Requests_Of_Port_0_And_Of_The_State)
+{
+    plug_text(R"({"adapters": [{"kind": "cna", "ports": [{}]}, {"kind": "fc-hba"}]})");
+    controllers();
+    EXPECT_THAT(requests(),
+                ElementsAre("IOCMD_IOC_GET_ATTR /dev/hxn 0", "IOCMD_IOC_GET_ATTR /dev/hxa 0", "IOCMD_IOC_GET_INFO /dev/hxa 0",
+                            "IOCMD_IOC_GET_ATTR /dev/hxa 0", "IOCMD_IOC_GET_ATTR /dev/hxa 1", "IOCMD_IOC_GET_ATTR /dev/hxa 1"));
+}
+
+// One half of a CNA that answers is enough for the card; the MAC address then comes from the scan.
+TEST_F(Adapters, Are_Read_From_What_Answers)
+{
+    plug_text(R"({"adapters": [{"kind": "cna", "serial": "SERIAL"}]})");
+    const std::string whole = describe(controllers());
+
+    fail("IOCMD_IOC_GET_ATTR", "/dev/hxn", 0, EIO);
+    log();
+    EXPECT_EQ(describe(controllers()), whole);
+    EXPECT_THAT(log(), Contains("ERR AdapterHelper: hxal_ioc_get_attr call to fill eth attributes failed for Adapter id 1"));
+
+    hxasim::clear_faults();
+    fail("IOCMD_IOC_GET_ATTR", "/dev/hxa", 0, EIO);
+    fail("IOCMD_IOC_GET_INFO", "/dev/hxa", 0, EIO);
+    EXPECT_EQ(describe(controllers()), whole);
+    const std::vector<std::string> lines = log();
+    EXPECT_THAT(lines, Contains("ERR AdapterHelper: hxal_ioc_get_attr call to fill fc attributes failed for Adapter id 1"));
+    EXPECT_THAT(lines, Contains("WARN AdapterHelper: hxal_ioc_get_info() failed"));
+    EXPECT_THAT(lines, Contains("INFO AdapterHelper: Using hxal_ioc_get_mac() to get Mac address"));
+}
+
+TEST_F(Adapters, Are_Skipped_One_By_One_When_They_Fail)
+{
+    plug_text(R"({"generate": {"adapters": 3, "kind": "fc-hba", "ports": 1}})");
+    fail("IOCMD_IOC_GET_ATTR", "/dev/hxa", 1, ENODEV);
+    EXPECT_THAT(values("Name"), ElementsAre(R"("ZMF0000001")", R"("ZMF0000003")"));
+    const std::vector<std::string> lines = log();
+    EXPECT_THAT(lines, Contains("WARN AdapterHelper: hxal_ioc_get_attr falied for both fc and eth"));
+    EXPECT_THAT(lines, Contains("INFO AdapterHelper: Number of instances: 2"));
+
+    fail("IOCMD_IOC_GET_ATTR", "/dev/hxa", 0, EINTR);
+    fail("IOCMD_IOC_GET_ATTR", "/dev/hxa", 2, ENOTTY);
+    EXPECT_THAT(values("Name"), IsEmpty());
+}
+
+TEST_F(Adapters, Have_Texts_As_Long_As_Their_Fields)
+{
+    plug_text(R"({"adapters": [{"kind": "fc-hba", "serial": "123456789AB\u0007", "ports": [{}]}]})");
+    EXPECT_THAT(values("Name"), ElementsAre(R"("123456789AB?")"));
+}

@@ -1,0 +1,83 @@
+#include "providers/enumerate.h"
+#include "schema/ZEMLAR_ComputerSystem.h"
+#include "schema/ZEMLAR_FCPort.h"
+#include "tests/inventory/inventory_fixture.h"
+
+using namespace zmlr;
+using testing::ElementsAre;
+using testing::IsEmpty;
+
+namespace
+{
+
+Ref<Instance> port(const char* device_id)
+{
+    ZEMLAR_FCPort* made = ZEMLAR_FCPort::create();
+    made->DeviceID.set(device_id);
+    return Ref<Instance>(made);
+}
+
+// What a manager may hand out at its worst.
+Instance_Array mixed_bag(classId_t)
+{
+    Instance_Array instances;
+    instances.adopt(port("1"));
+    instances.adopt(Ref<Instance>());
+    instances.adopt(Ref<Instance>(ZEMLAR_ComputerSystem::create()));
+    instances.adopt(port("2"));
+    instances.adopt(port("3"));
+    return instances;
+}
+
+Instance_Array nothing(classId_t) { return Instance_Array(); }
+
+// Takes what a provider hands over, and has enough after a number of instances.
+class Enumerate : public Inventory_Test
+{
+protected:
+    std::vector<std::string> run(Get_Instances source, int enough = 100, const char* remark = nullptr)
+    {
+        taken.clear();
+        wanted = enough;
+        Enum_Instances_Handler<ZEMLAR_FCPort> handler(take, this);
+        EXPECT_EQ(enumerate({.log_source = "Test_Provider",
+                             .id = CLASSID_FCPort,
+                             .get_instances = source,
+                             .empty_message = "No FC Ports Found!",
+                             .empty_remark = remark},
+                            handler),
+                  ENUM_INSTANCES_OK);
+        return taken;
+    }
+
+private:
+    static bool take(Instance* instance, Enum_Instances_Status, void* test)
+    {
+        auto& self = *static_cast<Enumerate*>(test);
+        self.taken.push_back(value_of(instance, "DeviceID"));
+        unref(instance);
+        return --self.wanted > 0;
+    }
+
+    std::vector<std::string> taken;
+    int wanted = 0;
+};
+
+} // namespace
+
+TEST_F(Enumerate, Hands_Over_The_Instances_Of_The_Class_In_Order)
+{
+    EXPECT_THAT(run(mixed_bag), ElementsAre("\"1\"", "\"2\"", "\"3\""));
+    EXPECT_THAT(log(), ElementsAre("DBG Test_Provider: Returning instances"));
+}
+
+TEST_F(Enumerate, Stops_When_The_Handler_Has_Enough) { EXPECT_THAT(run(mixed_bag, 2), ElementsAre("\"1\"", "\"2\"")); }
+
+TEST_F(Enumerate, Says_That_There_Is_Nothing)
+{
+    EXPECT_THAT(run(nothing), IsEmpty());
+    EXPECT_THAT(log(), ElementsAre("ERR Test_Provider: No FC Ports Found!"));
+    run(nothing, 1, "Warning: No service is available");
+    EXPECT_THAT(log(),
+                ElementsAre("ERR Test_Provider: No FC Ports Found!", "ERR Test_Provider: Warning: No service is available"));
+}

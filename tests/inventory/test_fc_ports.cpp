@@ -1,0 +1,177 @@
+#include "inventory/fchba_manager.h"
+#include "inventory/port_helper.h"
+#include "tests/inventory/inventory_fixture.h"
+
+#include <cerrno>
+
+using namespace zmlr;
+using testing::Contains;
+using testing::ElementsAre;
+using testing::IsEmpty;
+
+namespace
+{
+
+class FC_Ports : public Inventory_Test
+{
+protected:
+    static Instance_Array ports() { return FCHBAManager::getFCHBAManager().getInstances(CLASSID_FCPort); }
+
+    static std::vector<std::string> values(const Instance_Array& instances, const char* property)
+    {
+        std::vector<std::string> texts;
+        for (const Instance* port : instances)
+            texts.push_back(value_of(port, property));
+        return texts;
+    }
+    static std::vector<std::string> values(const char* property) { return values(ports(), property); }
+};
+
+} // namespace
+
+TEST_F(FC_Ports, Are_Described_Property_By_Property)
+{
+    const Instance_Array all = ports();
+    ASSERT_EQ(all.size(), 8U);
+    EXPECT_EQ(describe(all[1]), R"(ZEMLAR_FCPort
+    Caption = "uplink B"
+    ElementName = "200000051E100001:100000051E100001"
+    Name = "200000051E100001:100000051E100001"
+    OperationalStatus = {13}
+    EnabledState = 6
+    RequestedState = 12
+    EnabledDefault = 2
+    TransitioningToState = 12
+    SystemCreationClassName = "ZEMLAR_ComputerSystem"
+    SystemName = "192.0.2.10"
+    CreationClassName = "ZEMLAR_FCPort"
+    DeviceID = "100000051E100001"
+    Speed = 0
+    MaxSpeed = 10000000000
+    UsageRestriction = 3
+    PortType = 10
+    PortNumber = 1
+    LinkTechnology = 4
+    PermanentAddress = "100000051E100001"
+    SupportedMaximumTransmissionUnit = 2112
+)");
+    EXPECT_EQ(describe(all[2]), R"(ZEMLAR_FCPort
+    Caption = "Zemlar-F25 port 0"
+    ElementName = "200000051E100100:100000051E100100"
+    Name = "200000051E100100:100000051E100100"
+    OperationalStatus = {11}
+    EnabledState = 2
+    RequestedState = 12
+    EnabledDefault = 2
+    TransitioningToState = 12
+    SystemCreationClassName = "ZEMLAR_ComputerSystem"
+    SystemName = "192.0.2.10"
+    CreationClassName = "ZEMLAR_FCPort"
+    DeviceID = "100000051E100100"
+    Speed = 2000000000
+    MaxSpeed = 4000000000
+    UsageRestriction = 3
+    PortType = 11
+    PortNumber = 0
+    LinkTechnology = 4
+    PermanentAddress = "100000051E100100"
+    SupportedMaximumTransmissionUnit = 2112
+)");
+    EXPECT_THAT(values(all, "DeviceID"),
+                ElementsAre(R"("100000051E100000")", R"("100000051E100001")", R"("100000051E100100")", R"("100000051E100101")",
+                            R"("100000051E100200")", R"("100000051E100201")", R"("100000051E100300")", R"("100000051E100301")"));
+}
+
+TEST_F(FC_Ports, Cost_One_Request_Each)
+{
+    plug_text(R"({"adapters": [{"kind": "fc-hba"}]})");
+    EXPECT_EQ(ports().size(), 2U);
+    EXPECT_THAT(requests(), ElementsAre("IOCMD_PORT_GET_ATTR /dev/hxa 0", "IOCMD_PORT_GET_ATTR /dev/hxa 1"));
+    EXPECT_EQ(fake_host.lookups, 1);
+}
+
+TEST_F(FC_Ports, Are_Skipped_One_By_One_When_They_Fail)
+{
+    plug_text(R"({"generate": {"adapters": 2, "kind": "fc-hba"}})");
+    fail("IOCMD_PORT_GET_ATTR", "/dev/hxa", 1, EIO);
+    refuse("IOCMD_PORT_GET_ATTR", "/dev/hxa", 2, 56);
+    EXPECT_THAT(values("DeviceID"), ElementsAre(R"("100000051E100000")", R"("100000051E100101")"));
+    const std::vector<std::string> lines = log();
+    EXPECT_THAT(lines, Contains("INFO PortHelper: hxal_port_get_attr failed. Adapter=1, Port=1 "));
+    EXPECT_THAT(lines, Contains("INFO PortHelper: hxal_port_get_attr failed. Adapter=2, Port=0 "));
+}
+
+TEST_F(FC_Ports, Have_The_States_And_Types_Of_The_Driver)
+{
+    std::string json;
+    for (int state = 0; state <= 14; state++)
+        json +=
+            std::string(json.empty() ? "" : ",") + R"({"kind": "fc-hba", "ports": [{"state": )" + std::to_string(state) + "}]}";
+    plug_text(R"({"adapters": [)" + json + "]}");
+    EXPECT_THAT(values("OperationalStatus"), ElementsAre("{0}", "{0}", "{8}", "{8}", "{13}", "{11}", "{9}", "{9}", "{10}", "{10}",
+                                                         "{6}", "{0}", "{0}", "{0}", "{0}"));
+    EXPECT_THAT(values("EnabledState"), ElementsAre("1", "1", "9", "9", "6", "2", "4", "4", "3", "3", "1", "1", "1", "1", "1"));
+
+    constexpr int types[][2] = {{0, 0}, {1, 0}, {2, 10}, {5, 10}, {6, 11}, {7, 0}, {20, 11}, {21, 10}, {22, 10}, {23, 0}};
+    for (const auto [driver, cim] : types)
+        EXPECT_EQ(PortHelper::getPortType(static_cast<uint32>(driver)), cim) << driver;
+}
+
+TEST_F(FC_Ports, Have_What_A_Hostile_Driver_Says)
+{
+    constexpr std::size_t attributes = 8; // where they begin in the record
+    const std::vector<std::uint8_t> ones(4, 0xFF);
+    plug_text(R"({"adapters": [{"kind": "fc-hba", "ports": [{"symbolic_name": "a\u001bb\u0000c"}]}]})");
+    EXPECT_THAT(values("Caption"), ElementsAre(R"("a?b")"));
+
+    hxasim::Fault hostile;
+    hostile.command = "IOCMD_PORT_GET_ATTR";
+    hostile.answer = {{.offset = attributes + 40, .bytes = std::vector<std::uint8_t>(256, 0xC3)}, // a text without end
+                      {.offset = attributes + 296, .bytes = ones},                                // speed_supported
+                      {.offset = attributes + 310, .bytes = {0xFF, 0xFF}},                        // maxfrsize
+                      {.offset = attributes + 324, .bytes = ones},                                // port_state
+                      {.offset = attributes + 328, .bytes = ones},                                // speed
+                      {.offset = attributes + 352, .bytes = ones}};                               // port_type
+    hxasim::inject(hostile);
+    EXPECT_THAT(values("Caption"), ElementsAre('"' + std::string(255, '?') + '"'));
+    EXPECT_THAT(values("Speed"), ElementsAre("4294967295000000000"));
+    EXPECT_THAT(values("MaxSpeed"), ElementsAre("4294967295000000000"));
+    EXPECT_THAT(values("SupportedMaximumTransmissionUnit"), ElementsAre("65535"));
+    EXPECT_THAT(values("OperationalStatus"), ElementsAre("{0}"));
+    EXPECT_THAT(values("PortType"), ElementsAre("0"));
+}
+
+TEST_F(FC_Ports, Are_Found_By_Their_Adapter)
+{
+    plug_text(R"({"adapters": [{"kind": "cna"}, {"kind": "fc-hba"}]})");
+    const FCHBAManager& manager = FCHBAManager::getFCHBAManager();
+    EXPECT_THAT(values(manager.getFCPortInstancesByAdapter("00051e200001"), "DeviceID"),
+                ElementsAre(R"("100000051E100000")", R"("100000051E100001")"));
+    EXPECT_THAT(values(manager.getFCPortInstancesByAdapter("200000051E100100"), "PortNumber"), ElementsAre("0", "1"));
+    log();
+    EXPECT_THAT(values(manager.getFCPortInstancesByAdapter("00051E999999"), "DeviceID"), IsEmpty());
+    EXPECT_THAT(log(), Contains("WARN PortHelper: Failed to get adapterId"));
+}
+
+TEST_F(FC_Ports, Of_A_Missing_Port_Are_Left_Out)
+{
+    // Port 0 of the adapter has no IOC: the driver says that its only IOC drives port 1.
+    hxasim::load_text(R"({"adapters": [{"kind": "fc-hba", "ports": [{}]}], "faults": [
+        {"command": "IOCMD_IOC_GET_ATTR", "answer": [{"offset": 1600, "bytes": "01"}]}]})");
+    rescan();
+    EXPECT_THAT(values("PortNumber"), ElementsAre("1"));
+    EXPECT_THAT(log(), Contains("WARN PortHelper: Unable to get the handler. Adapter=1, Port=0. "));
+}
+
+TEST_F(FC_Ports, Are_None_Without_Adapters_Or_For_Other_Classes)
+{
+    const PortHelper& helper = PortHelper::getPortHelperObject();
+    EXPECT_TRUE(helper.getInstancesByClass(CLASSID_ComputerSystem).empty());
+    EXPECT_THAT(log(), Contains("INFO PortHelper: Unhandled class support"));
+    EXPECT_TRUE(helper.getInstancesByAdapterId(99, CLASSID_FCPort).empty());
+    EXPECT_THAT(log(), Contains("ERR PortHelper: ERROR: Unable to open handle to Adapter id 99"));
+
+    plug_text(R"({"adapters": []})");
+    EXPECT_TRUE(ports().empty());
+    EXPECT_THAT(log(), Contains("INFO PortHelper: No adapters in the system. "));
+}

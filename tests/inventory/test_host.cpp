@@ -1,0 +1,147 @@
+#include "inventory/fchba_manager.h"
+#include "inventory/provider_util.h"
+#include "tests/inventory/inventory_fixture.h"
+
+#include <netdb.h>
+
+using namespace zmlr;
+using testing::ElementsAre;
+using testing::HasSubstr;
+using testing::IsEmpty;
+
+namespace
+{
+
+class Host : public Inventory_Test
+{
+protected:
+    struct Info
+    {
+        int code;
+        std::string text;
+        friend bool operator==(const Info&, const Info&) = default;
+        friend void PrintTo(const Info& info, std::ostream* out) { *out << info.code << ' ' << info.text; }
+    };
+
+    static Info info(int len = 255)
+    {
+        char buffer[256] = "untouched";
+        const int code = ProviderUtil::getHostInfo(buffer, len);
+        return {code, buffer};
+    }
+};
+
+} // namespace
+
+TEST_F(Host, Info_Tells_The_Best_Text_There_Is)
+{
+    const std::string line = "INFO ProviderUtil: gethostbyname() FAILED. hostString will have hostname instead of ipAddress";
+    const struct
+    {
+        const char* what;
+        Fake_Host host;
+        Info expected;
+        std::vector<std::string> log;
+    } cases[] = {
+        {"an address", {}, {0, "192.0.2.10"}, {}},
+        {"the first address that is no loopback one",
+         {.addresses = {"127.0.1.1", "198.51.100.7", "192.0.2.10"}},
+         {0, "198.51.100.7"},
+         {}},
+        {"no address", {.addresses = {}}, {2, "storage-host"}, {line}},
+        {"loopback and no domain", {.addresses = {"127.0.0.1", "127.0.1.1"}}, {2, "storage-host"}, {line}},
+        {"loopback and a domain", {.addresses = {"127.0.0.1"}, .domain = "example.com"}, {4, "storage-host.example.com"}, {}},
+        {"no domain name at all",
+         {.addresses = {"127.0.0.1"}, .domain = std::nullopt},
+         {2, "storage-host"},
+         {"WARN ProviderUtil: getdomainname() failed"}},
+        {"a name only once",
+         {.name_answers = 1, .addresses = {"127.0.0.1"}},
+         {2, "storage-host"},
+         {"WARN ProviderUtil: gethostname() failed"}},
+        {"no name",
+         {.name = std::nullopt},
+         {3, "localhost"},
+         {"INFO ProviderUtil: gethostname() FAILED. hostString will be filled with localhost"}},
+        {"an address list of 5000 bytes", {.memory_needed = 5000}, {0, "192.0.2.10"}, {}},
+        {"an address list without end", {.memory_needed = std::size_t{1} << 30}, {2, "storage-host"}, {line}},
+    };
+    for (const auto& c : cases)
+    {
+        fake_host = c.host;
+        EXPECT_EQ(info(), c.expected) << c.what;
+        EXPECT_EQ(log(), c.log) << c.what;
+    }
+}
+
+TEST_F(Host, Info_Is_Bounded)
+{
+    EXPECT_EQ(info(5), (Info{0, "192."}));
+    EXPECT_EQ(info(1), (Info{0, ""}));
+    EXPECT_EQ(info(0), (Info{0, "untouched"}));
+    EXPECT_EQ(info(-1), (Info{0, "untouched"}));
+
+    fake_host = {.name = std::string(300, 'n'), .addresses = {"127.0.0.1"}, .domain = std::string(300, 'd')};
+    EXPECT_EQ(info(), (Info{4, std::string(254, 'n')}));
+}
+
+TEST_F(Host, Paths_Begin_With_The_Host)
+{
+    EXPECT_STREQ(ProviderUtil::updateNamespacePath("ZEMLAR_FCPort.DeviceID=\"1\"").c_str(),
+                 "//192.0.2.10/root/zemlar:ZEMLAR_FCPort.DeviceID=\"1\"");
+    EXPECT_FALSE(ProviderUtil::getHostName().empty());
+    EXPECT_TRUE(ProviderUtil::IsFileExist("/"));
+    EXPECT_FALSE(ProviderUtil::IsFileExist("/no/such/file"));
+}
+
+TEST_F(Host, Is_One_Computer_System)
+{
+    EXPECT_EQ(describe(FCHBAManager::getFCHBAManager().getInstances(CLASSID_ComputerSystem)), R"(ZEMLAR_ComputerSystem
+    Caption = "The host with Zemlar's adapters installed."
+    Description = "The host with Zemlar's adapters installed."
+    ElementName = "The host with Zemlar's adapters installed."
+    Name = "192.0.2.10"
+    OperationalStatus = {2}
+    StatusDescriptions = {"The System is in service"}
+    EnabledState = 5
+    RequestedState = 12
+    EnabledDefault = 2
+    TransitioningToState = 12
+    CreationClassName = "ZEMLAR_ComputerSystem"
+    NameFormat = "IP"
+    OtherIdentifyingInfo = {"192.0.2.10"}
+    IdentifyingDescriptions = {"Ipv4 Address"}
+    Dedicated = {0, 14}
+)");
+    EXPECT_THAT(requests(), IsEmpty());
+}
+
+TEST_F(Host, Computer_System_Is_Named_As_The_Info_Says)
+{
+    const std::string remark =
+        "WARN CommonHelper: No host IP / Name  retrived in the function, So function fills localhost for host info.";
+    const struct
+    {
+        Fake_Host host;
+        const char* name;
+        const char* format;
+        const char* description;
+        bool remarked;
+    } cases[] = {
+        {{.addresses = {}}, R"("storage-host")", R"("Other")", R"({"Fully Qualified Domain Name"})", false},
+        {{.name = std::nullopt}, R"("localhost")", R"("Other")", R"({"Fully Qualified Domain Name"})", true},
+        {{.name = "bad\x01name", .addresses = {}}, R"("bad?name")", R"("Other")", R"({"Fully Qualified Domain Name"})", false},
+    };
+    for (const auto& c : cases)
+    {
+        fake_host = c.host;
+        log();
+        const Instance_Array systems = FCHBAManager::getFCHBAManager().getInstances(CLASSID_ComputerSystem);
+        ASSERT_EQ(systems.size(), 1U);
+        EXPECT_EQ(value_of(systems[0], "Name"), c.name);
+        EXPECT_EQ(value_of(systems[0], "NameFormat"), c.format);
+        EXPECT_EQ(value_of(systems[0], "OtherIdentifyingInfo"), std::string("{") + c.name + "}");
+        EXPECT_EQ(value_of(systems[0], "IdentifyingDescriptions"), c.description);
+        EXPECT_EQ(testing::Value(log(), testing::Contains(remark)), c.remarked);
+    }
+}

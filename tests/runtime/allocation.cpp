@@ -1,0 +1,134 @@
+#include "runtime/value.h"
+#include "tests/runtime/sample_classes.h"
+
+#include <gtest/gtest.h>
+
+#include <cstdlib>
+#include <functional>
+#include <new>
+
+// Memory that can run out: every allocation of this program goes through here.
+namespace
+{
+
+long allocations_left = -1; // until one fails; negative: none fails
+long live_allocations = 0;
+
+} // namespace
+
+void* operator new(std::size_t size)
+{
+    void* memory = allocations_left == 0 ? nullptr : std::malloc(size);
+    if (!memory)
+        throw std::bad_alloc();
+    if (allocations_left > 0)
+        --allocations_left;
+    ++live_allocations;
+    return memory;
+}
+
+void operator delete(void* memory) noexcept
+{
+    live_allocations -= memory != nullptr;
+    std::free(memory);
+}
+
+void operator delete(void* memory, std::size_t) noexcept { operator delete(memory); }
+
+using namespace zmlr;
+using namespace sample;
+
+namespace
+{
+
+// Lets each allocation of the work fail in turn, until it succeeds: nothing may leak or break on the way. The number of
+// allocations it takes.
+long fail_each_allocation_of(const std::function<void()>& work)
+{
+    for (long n = 0;; ++n)
+    {
+        const long before = live_allocations;
+        bool failed = false;
+        allocations_left = n;
+        try
+        {
+            work();
+        }
+        catch (const std::bad_alloc&)
+        {
+            failed = true;
+        }
+        allocations_left = -1;
+        EXPECT_EQ(live_allocations, before) << "when allocation " << n << " fails";
+        if (!failed)
+            return n;
+    }
+}
+
+TEST(Memory, RunsOutWithoutALeak)
+{
+    const auto source = linked(element("a"), disk("d"));
+    source->Others.value.append(element("o").steal());
+    const auto other = linked(element("x"), disk("y"));
+    other->Others.value.append(element("z").steal());
+
+    fail_each_allocation_of([] { const Ref<Sample_Element> made(create<Sample_Element>()); });
+    fail_each_allocation_of([&] { const Ref<Sample_Link> made(clone(source.ptr())); });
+    fail_each_allocation_of([&] { const Ref<Instance> made(key_clone(source.ptr())); });
+    fail_each_allocation_of(
+        [&]
+        {
+            const Ref<Sample_Link> dest(clone(other.ptr()));
+            copy(dest.ptr(), source.ptr());
+        });
+    fail_each_allocation_of(
+        [&]
+        {
+            const Ref<Sample_Link> made(create<Sample_Link>());
+            __create_refs(made.ptr());
+            __set_name_space_recursive(made.ptr(), "root/zemlar", true);
+        });
+    fail_each_allocation_of(
+        [&]
+        {
+            Value value;
+            value.set(source.ptr(), find_reference(source->meta_class, "Others"));
+            const Value copied = value;
+            const Ref<Sample_Link> made(create<Sample_Link>());
+            copied.get(made.ptr(), find_reference(source->meta_class, "Others"));
+        });
+    fail_each_allocation_of(
+        [&]
+        {
+            Instance_Array instances;
+            for (int i = 0; i < 20; ++i)
+                instances.adopt(Ref<Instance>(clone(static_cast<const Instance*>(source.ptr()))));
+        });
+}
+
+TEST(Memory, WhatFailedKeepsWhatItHad)
+{
+    String text("abc");
+    const String shared = text;
+    Array<String> array = {"a", "b", "c", "d", "e", "f", "g", "h"};
+    Datetime time(5, 60);
+    const Datetime shared_time = time;
+    allocations_left = 0;
+    EXPECT_THROW(text.append('d'), std::bad_alloc);
+    EXPECT_THROW(text.set(0, 'x'), std::bad_alloc);
+    EXPECT_THROW(array.append(array[0]), std::bad_alloc);
+    EXPECT_THROW(time.usec(7), std::bad_alloc);
+    allocations_left = -1;
+    EXPECT_EQ(text, "abc");
+    EXPECT_EQ(array.size(), 8U);
+    EXPECT_EQ(array[7], "h");
+    EXPECT_TRUE(time == Datetime(5, 60));
+    EXPECT_THROW(array.reserve(0x80000001), std::bad_alloc);
+}
+
+TEST(Memory, AnEmptyRecordTakesOneAllocation)
+{
+    EXPECT_EQ(fail_each_allocation_of([] { const Ref<Sample_Disk> made(create<Sample_Disk>(false)); }), 1);
+}
+
+} // namespace

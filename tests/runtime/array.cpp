@@ -1,0 +1,111 @@
+#include "runtime/array.h"
+
+#include <gtest/gtest.h>
+
+#include <cmath>
+#include <limits>
+#include <string>
+
+using namespace zmlr;
+
+namespace
+{
+
+Array<String> strings(uint32 n)
+{
+    Array<String> result;
+    for (uint32 i = 0; i < n; ++i)
+        result.append(String(std::to_string(i).c_str()));
+    return result;
+}
+
+TEST(Array, CapacityIsThePowerOfTwoThatHoldsTheElements)
+{
+    const struct
+    {
+        uint32 size, capacity;
+    } rows[] = {
+        {0, 8}, {1, 8}, {8, 8}, {9, 16}, {16, 16}, {17, 32}, {100, 128}, {128, 128}, {129, 256},
+    };
+    for (const auto& row : rows)
+    {
+        Array<uint32> resized;
+        resized.resize(row.size, 7);
+        EXPECT_EQ(resized.capacity(), row.capacity) << row.size;
+
+        Array<uint32> appended;
+        for (uint32 i = 0; i < row.size; ++i)
+            appended.append(7);
+        EXPECT_EQ(appended.capacity(), row.capacity) << row.size;
+        EXPECT_TRUE(appended == resized);
+
+        Array<uint32> reserved;
+        reserved.reserve(row.size);
+        EXPECT_EQ(reserved.capacity(), row.capacity) << row.size;
+        EXPECT_TRUE(reserved.empty());
+    }
+}
+
+TEST(Array, CopiesShareNothing)
+{
+    const Array<String> source = {"a", "b", "c"};
+    Array<String> copy = source;
+    Array<String> assigned = {"x"};
+    assigned = source;
+    copy[0] = "changed";
+    assigned.remove(0, 3);
+    EXPECT_TRUE(source == (Array<String>{"a", "b", "c"}));
+    EXPECT_FALSE(source == copy);
+
+    assigned = std::move(copy);
+    EXPECT_EQ(assigned.find("changed"), 0U);
+    EXPECT_EQ(assigned.find("a"), 0xFFFFFFFF);
+}
+
+TEST(Array, InsertsItsOwnElementsWhetherItGrowsOrNot)
+{
+    for (uint32 n : {1U, 3U, 4U, 7U, 8U, 15U, 16U})
+    {
+        for (uint32 pos : {0U, n / 2, n})
+        {
+            Array<String> array = strings(n);
+            array.insert(pos, array.data(), n);
+            ASSERT_EQ(array.size(), 2 * n);
+            for (uint32 i = 0; i < n; ++i)
+            {
+                EXPECT_EQ(array[pos + i], std::to_string(i).c_str()) << n << " at " << pos;
+                EXPECT_EQ(array[i < pos ? i : n + i], std::to_string(i).c_str()) << n << " at " << pos;
+            }
+        }
+    }
+}
+
+TEST(Array, EditsInPlace)
+{
+    Array<String> array = strings(4);
+    array.prepend("first");
+    array.remove(1, 2);
+    array.append("last");
+    EXPECT_TRUE(array == (Array<String>{"first", "2", "3", "last"}));
+
+    array.resize(2, "");
+    array.resize(4, array[0]);
+    EXPECT_TRUE(array == (Array<String>{"first", "2", "first", "first"}));
+
+    array.clear();
+    EXPECT_TRUE(array == Array<String>());
+    EXPECT_EQ(array.capacity(), 8U);
+}
+
+TEST(Array, ComparesRealsAsNumbersAndTheRestAsBytes)
+{
+    const real64 nan = std::numeric_limits<real64>::quiet_NaN();
+    EXPECT_FALSE(Array<real64>{nan} == Array<real64>{nan});
+    EXPECT_TRUE(Array<real32>{0.0F} == Array<real32>{-0.0F});
+    EXPECT_TRUE((Array<uint8>{1, 2}) == (Array<uint8>{1, 2}));
+    EXPECT_FALSE((Array<uint8>{1, 2}) == (Array<uint8>{1}));
+    EXPECT_TRUE(Array<Datetime>{Datetime(5)} == Array<Datetime>{Datetime(5)});
+    EXPECT_FALSE(Array<Datetime>{Datetime(5)} == Array<Datetime>{Datetime(5, 0)});
+}
+
+} // namespace

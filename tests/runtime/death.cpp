@@ -1,0 +1,51 @@
+#include "tests/runtime/sample_classes.h"
+
+#include <gtest/gtest.h>
+
+using namespace zmlr;
+using namespace sample;
+
+namespace
+{
+
+// Memory that no one made an instance of.
+struct Junk
+{
+    alignas(Instance) unsigned char bytes[sizeof(Sample_Element)] = {};
+    Instance* instance() { return reinterpret_cast<Instance*>(bytes); }
+};
+
+TEST(AssertDeathTest, ReportsPlaceFunctionAndCondition)
+{
+    Junk junk;
+    EXPECT_DEATH(unref(junk.instance()),
+                 "instance\\.cpp\\([0-9]+\\): unref\\(\\): assert: inst->__magic == CIMPLE_INSTANCE_MAGIC");
+    EXPECT_DEATH(clone(static_cast<const Instance*>(nullptr)), "clone\\(\\): assert: inst != 0");
+    EXPECT_DEATH(identical(nullptr, junk.instance()), "assert: i1 != 0");
+    EXPECT_DEATH(key_eq(element("a").ptr(), junk.instance()), "assert: i2->__magic == CIMPLE_INSTANCE_MAGIC");
+    EXPECT_DEATH(copy(element("a").ptr(), disk("a").ptr()), "copy\\(\\): assert: dest->meta_class == src->meta_class");
+    EXPECT_DEATH(copy(element("a").ptr(), element("b").ptr(), disk("a").ptr()), "model->meta_class == dest->meta_class");
+    EXPECT_DEATH(is_reference_of(element("a").ptr(), nullptr, ""), "assert: assoc_inst != 0");
+}
+
+TEST(AssertDeathTest, DestroyTakesTheLastReferenceOnly)
+{
+    Sample_Element* shared = element("a").steal();
+    ref(shared);
+    EXPECT_DEATH(destroy(shared), "destroy\\(\\): assert: Atomic_get\\(&inst->__refs\\) == 1");
+    unref(shared);
+    destroy(shared);
+}
+
+TEST(AssertDeathTest, PositionsPastTheEnd)
+{
+    String s("abc");
+    EXPECT_DEATH(s.remove(2, 2), "assert: pos \\+ n <= _rep->size");
+    EXPECT_DEATH(s.substr(4), "assert: pos \\+ n <= _rep->size");
+    EXPECT_DEATH(s.remove(1, 0xFFFFFFFE), "assert: pos \\+ n <= _rep->size");
+    EXPECT_DEATH(s.set(4, 'x'), "assert: i <= _rep->size");
+    Array<uint32> array;
+    EXPECT_DEATH(array.remove(0), "assert: pos \\+ n <= rep->size");
+}
+
+} // namespace

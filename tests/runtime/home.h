@@ -1,0 +1,37 @@
+// A home directory of a test's own, and processes that log into it.
+#pragma once
+
+#include <functional>
+#include <string>
+#include <vector>
+
+namespace sample
+{
+
+class Home
+{
+public:
+    Home();
+    ~Home();
+    Home(const Home&) = delete;
+    Home& operator=(const Home&) = delete;
+
+    void options(const std::string& text) const; // writes the option file
+    std::string path(const std::string& name) const { return _path + "/" + name; }
+    bool has(const std::string& name) const;
+
+    // Starts a process that does the work with this home (or with HOME unset) and ends; the log of each process is fresh.
+    int start(const std::function<void()>& work, bool with_home = true) const;
+
+    // Waits for a process: whether the work was done.
+    static bool finish(int pid);
+    bool run(const std::function<void()>& work) const { return finish(start(work)); }
+
+    // The log's lines without their newlines; an incomplete last line comes with "(no newline)".
+    std::vector<std::string> lines() const;
+
+private:
+    std::string _path;
+};
+
+} // namespace sample

@@ -1,0 +1,247 @@
+#include "runtime/instance.h"
+
+#include "tests/runtime/sample_classes.h"
+
+#include <gtest/gtest.h>
+
+#include <limits>
+#include <string>
+#include <vector>
+
+using namespace zmlr;
+using namespace sample;
+
+namespace
+{
+
+constexpr const char* property_names[] = {"Name",  "Online",  "Slot",   "Size",  "Delta",     "Load",   "Letter",
+                                          "Since", "Caption", "Labels", "Codes", "Intervals", "Samples"};
+
+// The names of the properties that are non-null, in their order.
+std::string set_properties(const Instance* instance)
+{
+    std::string result;
+    for (const char* name : property_names)
+        if (!null_of(instance, find_property(instance->meta_class, name)))
+            result += std::string(result.empty() ? "" : " ") + name;
+    return result;
+}
+
+Ref<Sample_Element> filled_element()
+{
+    auto result = element("disk-1");
+    result->__name_space = "root/zemlar";
+    result->Load.set(0.5);
+    result->Samples.set({1.5, 2.5});
+    result->Labels.value.append("c");
+    return result;
+}
+
+TEST(Instance, CreatedWithDefaultsHasThemAndNullsElsewhere)
+{
+    const Ref<Sample_Element> made(create<Sample_Element>());
+    EXPECT_EQ(set_properties(made.ptr()), "Size Letter Since Caption Labels Codes Intervals");
+    EXPECT_EQ(made->Size.value, 1U);
+    EXPECT_TRUE(made->Letter.value == char16(u'x'));
+    EXPECT_TRUE(made->Since.value == Datetime(Datetime::DAY));
+    EXPECT_EQ(made->Caption.value, "new element");
+    EXPECT_TRUE(made->Labels.value == (Array<String>{"a", "b"}));
+    EXPECT_TRUE(made->Codes.value == (Array<uint16>{2, 3, 5}));
+    EXPECT_TRUE(made->Intervals.value == Array<Datetime>{Datetime()});
+    EXPECT_EQ(Atomic_get(&made->__refs), 1U);
+    EXPECT_TRUE(made->__name_space.empty());
+}
+
+TEST(Instance, CreatedWithoutDefaultsIsZeroAndNonNull)
+{
+    const Ref<Sample_Element> made(create<Sample_Element>(false));
+    EXPECT_EQ(set_properties(made.ptr()), "Name Online Slot Size Delta Load Letter Since Caption Labels Codes Intervals Samples");
+    EXPECT_EQ(made->Size.value, 0U);
+    EXPECT_TRUE(made->Since.value == Datetime());
+    EXPECT_TRUE(made->Caption.value.empty());
+    EXPECT_TRUE(made->Labels.value.empty());
+
+    const Ref<Sample_Link> link_made(create<Sample_Link>());
+    EXPECT_EQ(link_made->Antecedent, nullptr);
+    EXPECT_EQ(link_made->Others.null, 1);
+}
+
+TEST(Instance, AParameterRecordIsAnInstance)
+{
+    Ref<Sample_Element_Reset_method> record(
+        static_cast<Sample_Element_Reset_method*>(create(&Sample_Element_Reset_method::static_meta_class)));
+    EXPECT_STREQ(record_of(record.ptr())->name, "Reset");
+    record->Delay.set(7);
+    record->Peer = element("peer").steal();
+    const Ref<Sample_Element_Reset_method> copied(clone(record.ptr()));
+    EXPECT_EQ(copied->Delay.value, 7U);
+    EXPECT_EQ(copied->Peer->Name.value, "peer");
+    EXPECT_EQ(cast<Sample_Element>(static_cast<Instance*>(record.ptr())), nullptr);
+}
+
+TEST(Instance, ReferencesAreReleasedWithTheirHolder)
+{
+    const Ref<Sample_Element> target = element("target");
+    {
+        const Ref<Sample_Link> holder = linked(target, disk("d"));
+        ref(target.ptr());
+        holder->Others.value.append(target.ptr());
+        holder->Others.value.append(nullptr);
+        EXPECT_EQ(Atomic_get(&target->__refs), 3U);
+        clear(holder.ptr());
+        EXPECT_EQ(Atomic_get(&target->__refs), 1U);
+        EXPECT_EQ(holder->Others.null, 1);
+        holder->Antecedent = Ref<Sample_Element>(target).steal();
+    }
+    EXPECT_EQ(Atomic_get(&target->__refs), 1U);
+}
+
+TEST(Instance, ACloneIsIdenticalAndSharesNoReferences)
+{
+    const Ref<Sample_Link> original = linked(filled_element(), disk("d"));
+    original->Others.value.append(element("o").steal());
+    original->Others.value.append(nullptr);
+    original->Others.null = 0;
+
+    const Ref<Sample_Link> copied(clone(original.ptr()));
+    EXPECT_TRUE(identical(original.ptr(), copied.ptr()));
+    EXPECT_NE(original->Antecedent, copied->Antecedent);
+    EXPECT_EQ(copied->Antecedent->__name_space, "root/zemlar");
+
+    copied->Antecedent->Labels.value[2] = "changed";
+    EXPECT_EQ(original->Antecedent->Labels.value[2], "c");
+    EXPECT_FALSE(identical(original.ptr(), copied.ptr()));
+}
+
+TEST(Instance, KeyCloneCopiesTheKeysOnly)
+{
+    const Ref<Sample_Element> keys(cast<Sample_Element>(key_clone(filled_element().ptr())));
+    EXPECT_EQ(set_properties(keys.ptr()), "Name");
+    EXPECT_EQ(keys->Name.value, "disk-1");
+    EXPECT_TRUE(keys->Samples.value.empty());
+
+    const Ref<Sample_Link> original = linked(filled_element(), disk("d"));
+    original->Note.set("note");
+    const Ref<Sample_Link> link_keys(cast<Sample_Link>(key_clone(original.ptr())));
+    EXPECT_TRUE(key_eq(link_keys.ptr(), original.ptr()));
+    EXPECT_TRUE(link_keys->Note.null);
+}
+
+TEST(Instance, CopiesWhatTheModelHolds)
+{
+    const Ref<Sample_Element> source = filled_element();
+    source->Caption.clear();
+    const Ref<Sample_Element> model(create<Sample_Element>());
+    nullify_properties(model.ptr());
+    model->Caption.null = 0;
+    model->Load.null = 0;
+
+    const Ref<Sample_Element> dest = element("other");
+    copy(dest.ptr(), source.ptr(), model.ptr());
+    EXPECT_EQ(dest->Name.value, "other");
+    EXPECT_TRUE(dest->Caption.null);
+    EXPECT_EQ(dest->Load.value, 0.5);
+    EXPECT_EQ(dest->Labels.value.size(), 2U);
+
+    copy_keys(dest.ptr(), source.ptr());
+    EXPECT_EQ(dest->Name.value, "disk-1");
+    copy(dest.ptr(), source.ptr());
+    dest->__name_space = source->__name_space;
+    EXPECT_TRUE(identical(dest.ptr(), source.ptr()));
+}
+
+TEST(Instance, IdenticalSeesEveryDifference)
+{
+    void (*const changes[])(Sample_Element&) = {
+        [](Sample_Element& e) { e.__name_space = "root/other"; },
+        [](Sample_Element& e) { e.Name.set("x"); },
+        [](Sample_Element& e) { e.Online.set(true); },
+        [](Sample_Element& e) { e.Online.null = 0; },
+        [](Sample_Element& e) { e.Slot.value = 9; }, // compared although it is null
+        [](Sample_Element& e) { e.Since.set(Datetime(Datetime::DAY, 0)); },
+        [](Sample_Element& e) { e.Labels.value.append("d"); },
+        [](Sample_Element& e) { e.Codes.value[0] = 7; },
+        [](Sample_Element& e) { e.Intervals.value[0] = Datetime(1); },
+        [](Sample_Element& e) { e.Load.set(std::numeric_limits<real64>::quiet_NaN()); },
+    };
+    const Ref<Sample_Element> original = filled_element();
+    for (std::size_t i = 0; i < std::size(changes); ++i)
+    {
+        const Ref<Sample_Element> changed(clone(original.ptr()));
+        ASSERT_TRUE(identical(original.ptr(), changed.ptr()));
+        changes[i](*changed.ptr());
+        EXPECT_FALSE(identical(original.ptr(), changed.ptr())) << i;
+    }
+    original->Load.set(std::numeric_limits<real64>::quiet_NaN());
+    EXPECT_FALSE(identical(original.ptr(), original.ptr())) << "NaN differs from itself";
+}
+
+TEST(Instance, KeysDecideAloneAndAcrossSubclasses)
+{
+    const auto a = element("a");
+    const auto disk_a = disk("a");
+    disk_a->Blocks.set(5);
+    a->Size.set(77);
+    EXPECT_TRUE(key_eq(a.ptr(), disk_a.ptr()));
+    EXPECT_TRUE(key_eq(disk_a.ptr(), a.ptr()));
+    EXPECT_FALSE(key_eq(a.ptr(), disk("b").ptr()));
+
+    const auto first = linked(element("a"), disk("d"));
+    const auto second = linked(Ref<Sample_Element>(disk("a").steal()), disk("d"));
+    second->Note.set("does not count");
+    EXPECT_TRUE(key_eq(first.ptr(), second.ptr()));
+    EXPECT_FALSE(key_eq(first.ptr(), linked(element("b"), disk("d")).ptr()));
+    EXPECT_FALSE(key_eq(first.ptr(), linked(element("a"), Ref<Sample_Disk>()).ptr()));
+    EXPECT_TRUE(key_eq(linked({}, {}).ptr(), linked({}, {}).ptr()));
+    EXPECT_FALSE(key_eq(first.ptr(), a.ptr()));
+}
+
+TEST(Instance, FilterLeavesWhatWasAskedFor)
+{
+    const struct
+    {
+        std::vector<const char*> names;
+        bool keep_keys;
+        int result;
+        const char* left;
+    } rows[] = {
+        {{nullptr}, true, 0, "Name"},
+        {{nullptr}, false, 0, ""},
+        {{"SIZE", "unknown", "Name", "labels", nullptr}, true, 0, "Name Size Labels"},
+        {{"Size", "Name", nullptr}, false, 0, "Size"},
+        {{"Slot", "Reset", "Size", nullptr}, true, -1, "Name Slot"},
+    };
+    for (const auto& row : rows)
+    {
+        const Ref<Sample_Element> filtered = element("a");
+        EXPECT_EQ(filter_properties(filtered.ptr(), row.names.data(), row.keep_keys), row.result);
+        EXPECT_EQ(set_properties(filtered.ptr()), row.left);
+    }
+    const Ref<Sample_Element> everything(create<Sample_Element>());
+    EXPECT_EQ(filter_properties(everything.ptr(), nullptr, true), 0);
+    EXPECT_EQ(everything->Samples.null, 0);
+}
+
+TEST(Instance, NullFlagsAndKeys)
+{
+    const auto e = element("a");
+    nullify_non_keys(e.ptr());
+    EXPECT_EQ(set_properties(e.ptr()), "Name");
+    EXPECT_TRUE(keys_non_null(e.ptr()));
+    nullify_properties(e.ptr());
+    EXPECT_FALSE(keys_non_null(e.ptr()));
+    EXPECT_EQ(e->Name.value, "a") << "the value stays";
+
+    const auto half = linked(element("a"), {});
+    EXPECT_FALSE(keys_non_null(half.ptr()));
+    const char* const names[] = {"Dependent", "Others", nullptr};
+    EXPECT_EQ(filter_properties(half.ptr(), names, true), 0);
+    EXPECT_EQ(half->Dependent, nullptr) << "a key is not touched";
+    EXPECT_EQ(half->Others.null, 0);
+    __create_refs(half.ptr());
+    ASSERT_NE(half->Dependent, nullptr);
+    EXPECT_EQ(half->Dependent->Size.value, 1U) << "made with defaults";
+    EXPECT_TRUE(keys_non_null(half.ptr()));
+}
+
+} // namespace

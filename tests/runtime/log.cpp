@@ -1,0 +1,232 @@
+#include "runtime/log.h"
+
+#include "runtime/file_lock.h"
+#include "runtime/trace.h"
+#include "tests/runtime/home.h"
+
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+
+#include <cerrno>
+#include <chrono>
+#include <cstdio>
+#include <cstdlib>
+#include <map>
+#include <string>
+#include <thread>
+#include <vector>
+
+using namespace zmlr;
+using sample::Home;
+using ::testing::ElementsAre;
+using ::testing::MatchesRegex;
+
+namespace
+{
+
+constexpr const char* log_source = "FCHBAManager";
+
+void log_one_of_each()
+{
+    for (Log_Level level : {LL_FATAL, LL_ERR, LL_WARN, LL_INFO, LL_DBG})
+        ZMLR_LOG(level, "level %u", static_cast<unsigned>(level));
+}
+
+TEST(Log, OptionFileDecidesWhatIsWritten)
+{
+    const struct
+    {
+        const char* options;
+        std::size_t written;
+    } rows[] = {
+        {"LOG_LEVEL=FATAL\n", 1},
+        {"LOG_LEVEL = warn", 3},
+        {"# LOG_LEVEL=DBG\n\n   \nLOG_LEVEL\t=\t Info \r\n", 4},
+        {"OTHER=1\nLOG_LEVEL=DBG\nLOG_LEVEL=ERR\n", 5},
+        {"LOG_LEVEL_OLD=DBG\nLOG_LEVEL=ERR\n", 2},
+        {"LOG_LEVEL DBG\nlog_level=DBG\n LOG_LEVEL=DBG\nLOG_LEVEL=err\n", 2},
+    };
+    for (const auto& row : rows)
+    {
+        const Home home;
+        home.options(row.options);
+        ASSERT_TRUE(home.run(log_one_of_each));
+        EXPECT_EQ(home.lines().size(), row.written) << row.options;
+        EXPECT_TRUE(home.has(".cimple/messages.lock"));
+    }
+}
+
+TEST(Log, IsOffAndLeavesNoTraceWithoutAValidLevel)
+{
+    for (const char* options : {"", "LOG_LEVEL=VERBOSE\n", "LOG_LEVEL=\nLOG_LEVEL=DBG\n", "#LOG_LEVEL=DBG\n", "LOG_LEVEL=DBGS\n",
+                                "LOG_LEVEL=DB\n", "log_level=DBG\n"})
+    {
+        const Home home;
+        if (*options)
+            home.options(options);
+        ASSERT_TRUE(home.run(
+            [&]
+            {
+                log_one_of_each();
+                if (log_wanted(LL_FATAL))
+                    std::abort(); // from now on a call must cost next to nothing
+            }));
+        EXPECT_FALSE(home.has(".cimple")) << options;
+    }
+
+    const Home home;
+    home.options("LOG_LEVEL=DBG\n");
+    EXPECT_TRUE(Home::finish(home.start(log_one_of_each, false))) << "HOME is unset";
+    EXPECT_FALSE(home.has(".cimple"));
+}
+
+TEST(Log, IsTriedOnceOnly)
+{
+    const Home home;
+    ASSERT_TRUE(home.run(
+        [&]
+        {
+            log_one_of_each();
+            home.options("LOG_LEVEL=DBG\n");
+            log_one_of_each();
+        }));
+    EXPECT_FALSE(home.has(".cimple"));
+}
+
+TEST(Log, WritesTimeLevelSourceAndLine)
+{
+    const Home home;
+    home.options("LOG_LEVEL=INFO\n");
+    const std::string large(10000, 'x');
+    ASSERT_TRUE(home.run(
+        [&large]
+        {
+            errno = EBUSY;
+            log(LL_ERR, "FCHBAManager", 120, "port %s: %d", "10000000C9000001", -5);
+            if (errno != EBUSY || log_wanted(LL_DBG) || !log_wanted(LL_INFO))
+                std::abort();
+            log(LL_WARN, "PortHelper", 7, "already ended\n");
+            log(LL_INFO, "PortHelper", 8, "%s", large.c_str());
+            log(LL_INFO, "PortHelper", 9, "%s", "");
+            log(LL_DBG, "PortHelper", 10, "not written");
+        }));
+    const std::string time = "[0-9]{4}/[0-9]{2}/[0-9]{2} [0-9]{2}:[0-9]{2}:[0-9]{2} ";
+    EXPECT_THAT(home.lines(), ElementsAre(MatchesRegex(time + "ERR: FCHBAManager\\(120\\): port 10000000C9000001: -5"),
+                                          MatchesRegex(time + "WARN: PortHelper\\(7\\): already ended"),
+                                          MatchesRegex(time + "INFO: PortHelper\\(8\\): x{10000}"),
+                                          MatchesRegex(time + "INFO: PortHelper\\(9\\): ")));
+}
+
+TEST(Log, TracesScopesOnEveryWayOut)
+{
+    const Home home;
+    home.options("LOG_LEVEL=DBG\n");
+    ASSERT_TRUE(home.run(
+        [&]
+        {
+            try
+            {
+                const Scope_Trace trace(log_source, "getInstances");
+                throw 1;
+            }
+            catch (int)
+            {
+            }
+        }));
+    EXPECT_THAT(home.lines(), ElementsAre(MatchesRegex(".* DBG: FCHBAManager\\([0-9]+\\): Entering: getInstances"),
+                                          MatchesRegex(".* DBG: FCHBAManager\\([0-9]+\\): Returning: getInstances")));
+}
+
+TEST(Log, LinesOfProcessesAndThreadsNeverMix)
+{
+    constexpr int num_processes = 2;
+    constexpr int num_threads = 4;
+    constexpr int num_lines = 100;
+    const Home home;
+    home.options("LOG_LEVEL=INFO\n");
+
+    std::vector<int> processes;
+    for (char process = 'A'; process < 'A' + num_processes; ++process)
+        processes.push_back(home.start(
+            [process]
+            {
+                std::vector<std::thread> threads;
+                for (char thread = 'a'; thread < 'a' + num_threads; ++thread)
+                    threads.emplace_back(
+                        [=]
+                        {
+                            const std::string text(5000, thread);
+                            for (int i = 0; i < num_lines; ++i)
+                                log(LL_INFO, log_source, i, "%c%s.", process, text.c_str());
+                        });
+                for (std::thread& thread : threads)
+                    thread.join();
+            }));
+    for (int pid : processes)
+        EXPECT_TRUE(Home::finish(pid));
+
+    // Each writer's lines are whole and in their order.
+    std::map<std::string, int> next;
+    for (const std::string& line : home.lines())
+    {
+        const std::size_t begin = line.find("): ") + 3;
+        const std::string text = line.substr(begin);
+        ASSERT_EQ(text.size(), 5002U) << line;
+        ASSERT_EQ(text.find_first_not_of(text[1], 1), 5001U) << line;
+        const std::string source = "FCHBAManager(" + std::to_string(next[text.substr(0, 2)]++) + "): ";
+        ASSERT_EQ(line.substr(begin - source.size(), source.size()), source);
+    }
+    EXPECT_EQ(next.size(), std::size_t{num_processes * num_threads});
+    for (const auto& [writer, count] : next)
+        EXPECT_EQ(count, num_lines) << writer;
+}
+
+TEST(Log, WaitsForAnotherProcessThatHoldsTheLock)
+{
+    const Home home;
+    home.options("LOG_LEVEL=FATAL\n");
+    ASSERT_TRUE(home.run(log_one_of_each));
+
+    File_Lock lock(home.path(".cimple/messages.lock").c_str());
+    ASSERT_TRUE(lock.okay());
+    ASSERT_EQ(lock.lock(), 0);
+    const int writer = home.start(log_one_of_each);
+    std::this_thread::sleep_for(std::chrono::milliseconds(100));
+    EXPECT_EQ(home.lines().size(), 1U);
+    ASSERT_EQ(lock.unlock(), 0);
+    EXPECT_TRUE(Home::finish(writer));
+    EXPECT_EQ(home.lines().size(), 2U);
+
+    EXPECT_FALSE(File_Lock(home.path("no such directory/lock").c_str()).okay());
+}
+
+TEST(Log, StaysOffWhenItsDirectoryCannotBeMade)
+{
+    const Home home;
+    home.options("LOG_LEVEL=DBG\n");
+    ASSERT_TRUE(home.run(
+        [&]
+        {
+            std::fclose(std::fopen(home.path(".cimple").c_str(), "w"));
+            log_one_of_each();
+            if (log_wanted(LL_FATAL))
+                std::abort();
+        }));
+}
+
+TEST(Log, LevelAndDirectoryCanBeSetByCode)
+{
+    const Home home;
+    home.options("LOG_LEVEL=ERR\n");
+    ASSERT_TRUE(home.run(
+        [&]
+        {
+            open_log(".cimple");
+            if (log_set_level("loud") != -1 || log_set_level("Info") != 0)
+                std::abort();
+            log_one_of_each();
+        }));
+    EXPECT_EQ(home.lines().size(), 4U);
+}
+
+} // namespace

@@ -1,0 +1,87 @@
+#include "runtime/meta.h"
+
+#include "tests/runtime/sample_classes.h"
+
+#include <gtest/gtest.h>
+
+using namespace zmlr;
+using namespace sample;
+
+namespace
+{
+
+TEST(Meta, FlagNamesStandAtTheirBits)
+{
+    const struct
+    {
+        const char* name;
+        uint32 flag;
+    } rows[] = {
+        {"property", Flag_Property},
+        {"CLASS", Flag_Class},
+        {"DN", Flag_DN},
+        {"EmbeddedObject", Flag_EmbeddedObject},
+        {"Experimental", Flag_Experimental},
+        {"Gauge", Flag_Gauge},
+        {"Key", Flag_Key},
+        {"Out", Flag_Out},
+        {"Read", Flag_Read},
+        {"Write", Flag_Write},
+        {"EmbeddedInstance", Flag_EmbeddedInstance},
+    };
+    for (const auto& row : rows)
+        EXPECT_EQ(1U << flag_name_to_index(row.name), row.flag) << row.name;
+    EXPECT_EQ(flag_name_to_index("Keys"), 0xFFFFFFFF);
+}
+
+TEST(Meta, FindsClassesAndFeaturesByNameInAnyCase)
+{
+    EXPECT_EQ(find_meta_class(&repository, "SAMPLE_DISK"), &Sample_Disk::static_meta_class);
+    EXPECT_EQ(find_meta_class(&repository, "Sample_Disk2"), nullptr);
+    EXPECT_EQ(find_meta_class(static_cast<const Meta_Repository*>(nullptr), "Sample_Disk"), nullptr);
+    EXPECT_EQ(find_meta_class(&Sample_Disk::static_meta_class, "sample_element"), &Sample_Element::static_meta_class);
+    EXPECT_EQ(find_meta_class(&Sample_Disk::static_meta_class, "sample_link"), &Sample_Link::static_meta_class);
+
+    const Meta_Class* disk_class = &Sample_Disk::static_meta_class;
+    EXPECT_STREQ(find_feature(disk_class, "nAME")->name, "Name");
+    EXPECT_STREQ(find_property(disk_class, "blocks")->name, "Blocks");
+    EXPECT_EQ(find_property(disk_class, "Reset"), nullptr);
+    const Meta_Method* reset = find_method(disk_class, "reset");
+    ASSERT_EQ(reset, &Sample_Element_Reset_method::static_meta_class);
+    EXPECT_STREQ(find_parameter(reset, "DELAY")->name, "Delay");
+    EXPECT_EQ(find_parameter(reset, "Peer", Flag_Property), nullptr);
+    EXPECT_STREQ(find_reference(reset, "peer")->name, "Peer");
+    EXPECT_STREQ(find_reference(&Sample_Link::static_meta_class, "others")->name, "Others");
+    EXPECT_TRUE(has_feature(&Sample_Link::static_meta_class, Flag_Reference));
+    EXPECT_FALSE(has_feature(&Sample_Link::static_meta_class, Flag_Method));
+}
+
+TEST(Meta, EveryClassDescendsFromTheRoot)
+{
+    const Meta_Class* const element_class = &Sample_Element::static_meta_class;
+    const Meta_Class* const disk_class = &Sample_Disk::static_meta_class;
+    EXPECT_TRUE(is_subclass(&Instance::static_meta_class, disk_class));
+    EXPECT_TRUE(is_subclass(element_class, disk_class));
+    EXPECT_TRUE(is_subclass(disk_class, disk_class));
+    EXPECT_FALSE(is_subclass(disk_class, element_class));
+
+    // Another module's copy of the class is the same class.
+    const Meta_Class twin = *element_class;
+    EXPECT_TRUE(is_subclass(&twin, disk_class));
+}
+
+TEST(Meta, OnlyClassesMadeAtRunTimeAreCounted)
+{
+    Meta_Class made = Sample_Setting::static_meta_class;
+    Atomic_create(&made.refs, 1);
+    Instance* instance = create(&made, true);
+    EXPECT_EQ(Atomic_get(&made.refs), 2U);
+    unref(instance);
+    EXPECT_EQ(Atomic_get(&made.refs), 1U);
+
+    unref(&Sample_Setting::static_meta_class);
+    ref(&Sample_Setting::static_meta_class);
+    EXPECT_EQ(Atomic_get(&Sample_Setting::static_meta_class.refs), 0U);
+}
+
+} // namespace

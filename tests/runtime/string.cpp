@@ -1,0 +1,165 @@
+#include "runtime/string.h"
+
+#include <gtest/gtest.h>
+
+#include <string>
+
+using namespace zmlr;
+
+namespace
+{
+
+String of_size(std::size_t n) { return String(std::string(n, 'x').c_str()); }
+
+TEST(String, CapacitiesArePowersOfTwoFromThirtyTwo)
+{
+    const struct
+    {
+        std::size_t size;
+        uint32 made, character_more, text_more;
+    } rows[] = {
+        // a new one, then with one character more, or with a text of one character more
+        {0, 0, 32, 32}, {1, 32, 32, 32}, {31, 32, 32, 32}, {32, 32, 64, 64}, {33, 64, 64, 64}, {64, 64, 128, 128},
+    };
+    for (const auto& row : rows)
+    {
+        String made = of_size(row.size);
+        EXPECT_EQ(made.capacity(), row.made) << row.size;
+        String with_character = of_size(row.size);
+        with_character.append('y');
+        EXPECT_EQ(with_character.capacity(), row.character_more) << row.size;
+        String with_text = of_size(row.size);
+        with_text.append("y");
+        EXPECT_EQ(with_text.capacity(), row.text_more) << row.size;
+        EXPECT_TRUE(with_text == with_character);
+        EXPECT_EQ(with_text.size(), row.size + 1);
+    }
+}
+
+TEST(String, ChangingACopyLeavesTheSourceAlone)
+{
+    void (*const changes[])(String&) = {
+        [](String& s) { s.append('!'); },  [](String& s) { s.append("more"); }, [](String& s) { s.set(0, 'X'); },
+        [](String& s) { s.remove(0, 2); }, [](String& s) { s.clear(); },        [](String& s) { s.assign("other"); },
+        [](String& s) { s.reserve(100); }, [](String& s) { s = ""; },           [](String& s) { s.append(s); },
+    };
+    for (const auto& change : changes)
+    {
+        const String source("source");
+        String copy = source;
+        EXPECT_EQ(copy.c_str(), source.c_str()) << "copies share";
+        change(copy);
+        EXPECT_STREQ(source.c_str(), "source");
+        EXPECT_EQ(source.size(), 6U);
+        EXPECT_NE(copy.c_str(), source.c_str());
+    }
+}
+
+TEST(String, AppendingACharacterToASharedOneDoublesItsCapacity)
+{
+    const String source("abc");
+    String copy = source;
+    copy.append('d');
+    EXPECT_EQ(copy.capacity(), 64U);
+    EXPECT_STREQ(copy.c_str(), "abcd");
+}
+
+TEST(String, AllEmptyStringsAreOne)
+{
+    String cleared("text");
+    const String holder = cleared;
+    cleared.clear();
+    for (const String& empty : {String(), String(""), String(nullptr), String("abc", 0), cleared, String("abc").substr(3)})
+    {
+        EXPECT_EQ(empty.c_str(), String().c_str());
+        EXPECT_EQ(empty.capacity(), 0U);
+        EXPECT_STREQ(empty.c_str(), "");
+    }
+
+    String own("text");
+    own.clear();
+    EXPECT_EQ(own.capacity(), 32U) << "an unshared one keeps its room";
+}
+
+TEST(String, TakesItsOwnTextAsArgument)
+{
+    String s("0123456789");
+    s.append(s.c_str() + 5, 5);
+    EXPECT_STREQ(s.c_str(), "012345678956789");
+    for (int i = 0; i < 4; ++i)
+        s.append(s);
+    EXPECT_EQ(s.size(), 15U * 16);
+    EXPECT_TRUE(s.equal(15 * 15, 15, "012345678956789"));
+    s.assign(s.c_str() + 230, 5);
+    EXPECT_STREQ(s.c_str(), "56789");
+    s = s.c_str() + 3;
+    EXPECT_STREQ(s.c_str(), "89");
+    s = *&s;
+    EXPECT_STREQ(s.c_str(), "89");
+}
+
+TEST(String, FindsRemovesAndCompares)
+{
+    String s("a.b.c", 5);
+    EXPECT_EQ(s.find('.'), 1U);
+    EXPECT_EQ(s.find(2, '.'), 3U);
+    EXPECT_EQ(s.find(5, '.'), String::npos);
+    EXPECT_EQ(s.find("b.c"), 2U);
+    EXPECT_EQ(s.find(String("x")), String::npos);
+    EXPECT_STREQ(s.substr(2, 2).c_str(), "b.");
+
+    s.remove(1, 2);
+    EXPECT_STREQ(s.c_str(), "a.c");
+    s.remove(1);
+    EXPECT_STREQ(s.c_str(), "a");
+    s.set(1, 'b');
+    EXPECT_STREQ(s.c_str(), "ab");
+
+    const String with_zero("a\0b", 3);
+    EXPECT_TRUE(with_zero.equal("a\0b", 3));
+    EXPECT_FALSE(with_zero.equal("a"));
+    EXPECT_TRUE(String("WWN-\xC4").equali("wwn-\xC4"));
+    EXPECT_FALSE(String("\xC4").equali("\xE4")) << "ASCII letters only";
+    EXPECT_STREQ((String("a") + "b" + String("c")).c_str(), "abc");
+}
+
+TEST(Text, ComparesNamesWithoutRegardToCase)
+{
+    EXPECT_TRUE(eqi("", ""));
+    EXPECT_TRUE(eqi("DeviceID", "deviceid"));
+    for (const char* other : {"", "d", "DeviceI", "DeviceID2", "Device[D"})
+    {
+        EXPECT_FALSE(eqi("DeviceID", other)) << other;
+        EXPECT_FALSE(eqi(other, "DeviceID")) << other;
+    }
+}
+
+TEST(Text, BoundedCopyAndAppend)
+{
+    const struct
+    {
+        const char* before;
+        std::size_t size;
+        const char* source;
+        std::size_t result;
+        const char* after;
+    } rows[] = {
+        {"ab", 8, "cd", 4, "abcd"}, {"ab", 5, "cd", 4, "abcd"}, {"ab", 4, "cd", 4, "abc"},
+        {"ab", 2, "cd", 2, "ab"},   {"", 1, "cd", 2, ""},       {"ab", 0, "cd", 0, "ab"},
+    };
+    for (const auto& row : rows)
+    {
+        char buffer[8] = {};
+        strlcpy(buffer, row.before, sizeof(buffer));
+        EXPECT_EQ(strlcat(buffer, row.source, row.size), row.result) << row.before << row.size;
+        EXPECT_STREQ(buffer, row.after);
+    }
+
+    char untouched[2] = {'x', 'y'};
+    EXPECT_EQ(strlcpy(untouched, "long", 0), 4U);
+    EXPECT_EQ(strlcpy(untouched, "long", 1), 4U);
+    EXPECT_EQ(untouched[0], '\0');
+    EXPECT_EQ(untouched[1], 'y');
+}
+
+} // namespace

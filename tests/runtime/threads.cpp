@@ -1,0 +1,87 @@
+#include "runtime/instance.h"
+#include "runtime/mutex.h"
+#include "runtime/thread_context.h"
+#include "tests/runtime/sample_classes.h"
+
+#include <gtest/gtest.h>
+
+#include <thread>
+#include <vector>
+
+using namespace zmlr;
+
+namespace
+{
+
+template <class Work> void in_threads(int count, Work work)
+{
+    std::vector<std::thread> threads;
+    for (int i = 0; i < count; ++i)
+        threads.emplace_back(work);
+    for (std::thread& thread : threads)
+        thread.join();
+}
+
+TEST(Mutex, IsHeldByOneThreadAtATime)
+{
+    for (bool recursive : {true, false})
+    {
+        Mutex mutex(recursive);
+        int count = 0;
+        in_threads(4,
+                   [&]
+                   {
+                       for (int i = 0; i < 1000; ++i)
+                       {
+                           const Auto_Mutex held(mutex);
+                           ++count;
+                       }
+                   });
+        EXPECT_EQ(count, 4000);
+
+        const Auto_Mutex held(mutex);
+        EXPECT_EQ(mutex.try_lock(), recursive ? 0 : -1);
+        if (recursive)
+            mutex.unlock();
+        in_threads(1, [&] { EXPECT_EQ(mutex.try_lock(), -1); });
+    }
+}
+
+TEST(Thread_Context, EachThreadHasItsOwnStack)
+{
+    Thread_Context lower, upper;
+    Thread_Context::push(&lower);
+    Thread_Context::push(&upper);
+    EXPECT_EQ(Thread_Context::top(), &upper);
+    in_threads(1, [] { EXPECT_EQ(Thread_Context::top(), nullptr); });
+    Thread_Context::pop();
+    EXPECT_EQ(Thread_Context::top(), &lower);
+    Thread_Context::pop();
+    EXPECT_EQ(Thread_Context::top(), nullptr);
+}
+
+TEST(Counts, ThreadsShareValuesAndInstances)
+{
+    const auto shared = sample::element("shared");
+    const String text("text");
+    const Datetime time(5, 60);
+    in_threads(4,
+               [&]
+               {
+                   for (int i = 0; i < 1000; ++i)
+                   {
+                       const Ref<sample::Sample_Element> held = shared;
+                       const Ref<sample::Sample_Element> copied(clone(held.ptr()));
+                       String own = text;
+                       own.append('!');
+                       Datetime later = time;
+                       later.usec(6);
+                       EXPECT_EQ(copied->Name.value, "shared");
+                   }
+               });
+    EXPECT_EQ(Atomic_get(&shared->__refs), 1U);
+    EXPECT_EQ(text, "text");
+    EXPECT_TRUE(time == Datetime(5, 60));
+}
+
+} // namespace

@@ -1,0 +1,232 @@
+// The meta-data as generic code relies on it, for all classes at once, and by example.
+#include "runtime/instance.h"
+#include "schema/CIM_DiagnosticService.h"
+#include "schema/CIM_Service.h"
+#include "schema/ZEMLAR_AlarmDevice.h"
+#include "schema/repository.h"
+
+#include <gtest/gtest.h>
+
+#include <cstring>
+#include <set>
+#include <span>
+#include <string>
+#include <strings.h>
+
+namespace zmlr
+{
+namespace
+{
+
+std::span<const Meta_Class* const> all_classes() { return {meta_repository().meta_classes, meta_repository().num_meta_classes}; }
+
+std::span<const Meta_Feature* const> features_of(const Meta_Record& record)
+{
+    return {record.meta_features, record.num_meta_features};
+}
+
+const Meta_Class& class_named(const char* name)
+{
+    const Meta_Class* found = find_meta_class(&meta_repository(), name);
+    EXPECT_NE(found, nullptr) << name;
+    return *found;
+}
+
+const Meta_Feature& feature_named(const char* class_name, const char* name)
+{
+    const Meta_Feature* found = find_feature(&class_named(class_name), name);
+    EXPECT_NE(found, nullptr) << class_name << "." << name;
+    return *found;
+}
+
+uint32 offset_of(const Meta_Feature* feature)
+{
+    return is_property(feature) ? as_property(feature)->offset : as_reference(feature)->offset;
+}
+
+// Bytes from the offset to the end of the value and its null flag.
+uint32 extent_of(const Meta_Feature* feature)
+{
+    if (is_property(feature))
+        return type_size_of(as_property(feature)) + 1;
+    return as_reference(feature)->subscript ? static_cast<uint32>(sizeof(void*)) + 1 : static_cast<uint32>(sizeof(void*));
+}
+
+// Fields lie behind the head, in feature order, apart from each other and inside the record.
+void expect_fields_apart(const Meta_Record& record)
+{
+    uint32 end = sizeof(Instance);
+    for (const Meta_Feature* feature : features_of(record))
+    {
+        if (is_method(feature))
+            continue;
+        EXPECT_GE(offset_of(feature), end) << record.name << "." << feature->name;
+        end = offset_of(feature) + extent_of(feature);
+    }
+    EXPECT_LE(end, record.size) << record.name;
+}
+
+TEST(Meta_Data, fields_of_every_record_lie_apart_and_inside)
+{
+    for (const Meta_Class* meta_class : all_classes())
+    {
+        expect_fields_apart(*meta_class);
+        for (const Meta_Feature* feature : features_of(*meta_class))
+            if (is_method(feature))
+                expect_fields_apart(*as_method(feature));
+    }
+}
+
+TEST(Meta_Data, inherited_features_are_the_ancestors_objects_and_overrides_stand_in_their_place)
+{
+    for (const Meta_Class* meta_class : all_classes())
+    {
+        const Meta_Class* superclass = meta_class->super_meta_class;
+        const uint32 inherited = superclass ? superclass->num_meta_features : 0;
+        ASSERT_GE(meta_class->num_meta_features, inherited) << meta_class->name;
+        for (uint32 i = 0; i < meta_class->num_meta_features; i++)
+        {
+            const Meta_Feature* feature = meta_class->meta_features[i];
+            SCOPED_TRACE(std::string(meta_class->name) + "." + feature->name);
+            if (i >= inherited)
+            {
+                EXPECT_EQ(meta_class->locals[i].local, 1);
+                continue;
+            }
+            EXPECT_EQ(meta_class->locals[i].local == 0, feature == superclass->meta_features[i]);
+            EXPECT_STRCASEEQ(feature->name, superclass->meta_features[i]->name);
+            EXPECT_EQ(is_key(superclass->meta_features[i]) && !is_key(feature), false);
+        }
+    }
+}
+
+TEST(Meta_Data, feature_names_are_unique_and_keys_are_counted)
+{
+    for (const Meta_Class* meta_class : all_classes())
+    {
+        const auto less = [](const char* a, const char* b) { return strcasecmp(a, b) < 0; };
+        std::set<const char*, decltype(less)> names;
+        uint32 keys = 0;
+        for (const Meta_Feature* feature : features_of(*meta_class))
+        {
+            EXPECT_TRUE(names.insert(feature->name).second) << meta_class->name << "." << feature->name;
+            keys += is_key(feature) ? 1 : 0;
+        }
+        EXPECT_EQ(meta_class->num_keys, keys) << meta_class->name;
+        EXPECT_EQ(meta_class->meta_repository, &meta_repository());
+    }
+}
+
+TEST(Meta_Data, an_overriding_reference_narrows_the_class)
+{
+    for (const Meta_Class* meta_class : all_classes())
+        for (uint32 i = 0; meta_class->super_meta_class && i < meta_class->super_meta_class->num_meta_features; i++)
+        {
+            const Meta_Feature* feature = meta_class->meta_features[i];
+            const Meta_Feature* overridden = meta_class->super_meta_class->meta_features[i];
+            if (!is_reference(feature))
+                continue;
+            EXPECT_TRUE(is_subclass(as_reference(overridden)->meta_class, as_reference(feature)->meta_class))
+                << meta_class->name << "." << feature->name;
+        }
+}
+
+TEST(Meta_Data, every_method_ends_with_its_return_value)
+{
+    for (const Meta_Class* meta_class : all_classes())
+        for (const Meta_Feature* feature : features_of(*meta_class))
+        {
+            if (!is_method(feature))
+                continue;
+            const Meta_Method& method = *as_method(feature);
+            SCOPED_TRACE(std::string(meta_class->name) + "." + method.name);
+            const Meta_Feature* last = features_of(method).back();
+            EXPECT_STREQ(last->name, "return_value");
+            EXPECT_EQ(last->flags, 0x01000001u);
+            EXPECT_EQ(as_property(last)->type, method.return_type);
+            for (const Meta_Feature* parameter : features_of(method))
+                EXPECT_NE(parameter->flags & (Flag_In | Flag_Out), 0u) << parameter->name;
+        }
+}
+
+TEST(Meta_Data, flag_words)
+{
+    struct Case
+    {
+        const char* class_name;
+        const char* feature; // null: the class itself
+        uint32 flags;
+    };
+    // clang-format off
+    const Case cases[] = {
+        {"ZEMLAR_FCPort",             nullptr,                 0x00000008},
+        {"CIM_ManagedElement",        nullptr,                 0x00000018},
+        {"ZEMLAR_ControlledBy",       nullptr,                 0x00000080},
+        {"ZEMLAR_FCPortSystemDevice", nullptr,                 0x000000C0},
+        {"CIM_SystemDevice",          nullptr,                 0x000001C0},
+        {"CIM_Dependency",            nullptr,                 0x00000090},
+        {"ZEMLAR_AlertIndication",    nullptr,                 0x00080000},
+        {"ZEMLAR_FCPort",             "DeviceID",              0x02200001},
+        {"ZEMLAR_FCPort",             "Caption",               0x02000001},
+        {"ZEMLAR_ComputerSystem",     "Roles",                 0x42000001}, // a writable array
+        {"ZEMLAR_ConcreteJob",        "InstanceID",            0x02200001}, // an override that makes a key
+        {"ZEMLAR_SCSIProtocolEndpoint", "Name",                0x02200001}, // an override of a key
+        {"ZEMLAR_FCPortStatistics",   "LIPCount",              0x02000201}, // a counter
+        {"ZEMLAR_TapeDrive",          "UnitsUsed",             0x02010001}, // a gauge
+        {"ZEMLAR_RegisteredProfile",  "RegisteredName",        0x06000001}, // required
+        {"ZEMLAR_FCPort",             "AllocationState",       0x82008001}, // an experimental embedded instance
+        {"ZEMLAR_ControlledBy",       "Antecedent",            0x00200002},
+        {"ZEMLAR_FCPortSystemDevice", "GroupComponent",        0x00200022},
+        {"ZEMLAR_FCPortSystemDevice", "PartComponent",         0x20200002},
+        {"ZEMLAR_FCPort",             "RequestStateChange",    0x00000004},
+        {"ZEMLAR_ObjectManager",      "ChangeAffectedElementsAssignedSequence", 0x00008004},
+    };
+    // clang-format on
+    for (const Case& c : cases)
+    {
+        const uint32 flags = c.feature ? feature_named(c.class_name, c.feature).flags : class_named(c.class_name).flags;
+        EXPECT_EQ(flags, c.flags) << std::hex << c.class_name << "." << (c.feature ? c.feature : "") << " is " << flags;
+    }
+}
+
+TEST(Meta_Data, parameters)
+{
+    struct Case
+    {
+        const Meta_Method& method;
+        const char* parameter;
+        uint32 flags;
+        int subscript;
+    };
+    const auto& change = CIM_Service_ChangeAffectedElementsAssignedSequence_method::static_meta_class;
+    const auto& run = CIM_DiagnosticService_RunDiagnosticService_method::static_meta_class;
+    // clang-format off
+    const Case cases[] = {
+        {ZEMLAR_AlarmDevice_SetAlarmState_method::static_meta_class, "State", 0x00040001, 0},
+        {change, "ManagedElements",    0x04040002, 1},  // a required array of references
+        {change, "AssignedSequence",   0x04040001, -1},
+        {change, "Job",                0x01000002, 0},  // a reference that only goes out
+        {run,    "DiagnosticSettings", 0x80040001, 0},  // an embedded instance
+    };
+    // clang-format on
+    for (const Case& c : cases)
+    {
+        SCOPED_TRACE(c.parameter);
+        const Meta_Feature* parameter = find_parameter(&c.method, c.parameter);
+        ASSERT_NE(parameter, nullptr);
+        EXPECT_EQ(parameter->flags, c.flags);
+        EXPECT_EQ(is_property(parameter) ? as_property(parameter)->subscript : as_reference(parameter)->subscript, c.subscript);
+    }
+}
+
+TEST(Meta_Data, an_overriding_method_replaces_the_parameters)
+{
+    const Meta_Feature& standard = feature_named("CIM_AlarmDevice", "SetAlarmState");
+    const Meta_Feature& served = feature_named("ZEMLAR_AlarmDevice", "SetAlarmState");
+    EXPECT_NE(find_parameter(as_method(&standard), "RequestedAlarmState"), nullptr);
+    EXPECT_EQ(find_parameter(as_method(&served), "RequestedAlarmState"), nullptr);
+    EXPECT_EQ(&served, &ZEMLAR_AlarmDevice_SetAlarmState_method::static_meta_class);
+}
+
+} // namespace
+} // namespace zmlr

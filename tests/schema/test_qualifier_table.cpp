@@ -1,0 +1,101 @@
+// The generated qualifier table: usable by binary search, and every code has its text.
+#include "cimserver/qualifier_table.h"
+#include "schema/repository.h"
+
+#include <gtest/gtest.h>
+
+#include <set>
+#include <span>
+#include <string>
+#include <strings.h>
+#include <tuple>
+
+namespace
+{
+
+using cimserver::Qualifier_Row;
+
+std::span<const Qualifier_Row> rows() { return {cimserver::qualifier_table, cimserver::qualifier_table_size}; }
+
+const Qualifier_Row* find(const char* class_name, const char* feature_name, const char* name)
+{
+    for (const Qualifier_Row& row : rows())
+        if (!strcasecmp(row.class_name, class_name) && !strcasecmp(row.feature_name, feature_name) && !strcasecmp(row.name, name))
+            return &row;
+    return nullptr;
+}
+
+std::string text_of(const char* class_name, const char* property, const std::string& code)
+{
+    const Qualifier_Row* codes = find(class_name, property, "ValueMap");
+    const Qualifier_Row* texts = find(class_name, property, "Values");
+    for (unsigned i = 0; codes && texts && i < codes->num_values; i++)
+        if (codes->values[i] == code)
+            return texts->values[i];
+    return "";
+}
+
+TEST(Qualifier_Table, is_sorted_without_duplicates)
+{
+    const auto before = [](const Qualifier_Row& a, const Qualifier_Row& b)
+    {
+        if (const int order = strcasecmp(a.class_name, b.class_name))
+            return order < 0;
+        if (const int order = strcasecmp(a.feature_name, b.feature_name))
+            return order < 0;
+        return strcasecmp(a.name, b.name) < 0;
+    };
+    for (std::size_t i = 1; i < rows().size(); i++)
+        EXPECT_TRUE(before(rows()[i - 1], rows()[i])) << rows()[i].class_name << "." << rows()[i].feature_name;
+}
+
+TEST(Qualifier_Table, every_code_has_one_text)
+{
+    unsigned maps = 0;
+    for (const Qualifier_Row& row : rows())
+    {
+        if (std::string(row.name) != "ValueMap")
+            continue;
+        SCOPED_TRACE(std::string(row.class_name) + "." + row.feature_name);
+        maps++;
+        const Qualifier_Row* texts = find(row.class_name, row.feature_name, "Values");
+        ASSERT_NE(texts, nullptr);
+        EXPECT_TRUE(row.array && texts->array);
+        EXPECT_EQ(row.num_values, texts->num_values);
+        EXPECT_EQ(std::set<std::string>(row.values, row.values + row.num_values).size(), row.num_values);
+    }
+    EXPECT_GT(maps, 40u);
+}
+
+TEST(Qualifier_Table, reported_codes_have_their_texts)
+{
+    EXPECT_EQ(text_of("CIM_ManagedSystemElement", "OperationalStatus", "11"), "In Service");
+    EXPECT_EQ(text_of("CIM_ProtocolEndpoint", "OperationalStatus", "10"), "Stopped"); // an override has what it overrides
+    EXPECT_EQ(text_of("CIM_EnabledLogicalElement", "EnabledState", "6"), "Enabled but Offline");
+    EXPECT_EQ(text_of("CIM_FCPort", "PortType", "10"), "N");
+    EXPECT_EQ(text_of("CIM_EthernetPort", "PortType", "108"), "10GBase-LR");
+    EXPECT_EQ(text_of("CIM_PortController", "ControllerType", "4"), "FC");
+    EXPECT_EQ(text_of("CIM_ComputerSystem", "Dedicated", "14"), "Management");
+    EXPECT_EQ(text_of("CIM_RegisteredSpecification", "RegisteredOrganization", "11"), "SNIA");
+    EXPECT_EQ(text_of("CIM_RegisteredSpecification", "AdvertiseTypes", "3"), "SLP");
+    EXPECT_EQ(text_of("CIM_StorageExtent", "NameFormat", "7"), "SNVM");
+    EXPECT_EQ(text_of("CIM_AlarmDevice", "AlarmState", "3"), "Alternating");
+    EXPECT_EQ(text_of("CIM_ConcreteJob", "JobState", "7"), "Completed");
+}
+
+TEST(Qualifier_Table, every_served_class_is_described)
+{
+    const zmlr::Meta_Repository& repository = zmlr::meta_repository();
+    for (zmlr::uint32 i = 0; i < repository.num_meta_classes; i++)
+    {
+        const std::string name = repository.meta_classes[i]->name;
+        if (!name.starts_with("ZEMLAR_"))
+            continue;
+        const Qualifier_Row* row = find(name.c_str(), "", "Description");
+        ASSERT_NE(row, nullptr) << name;
+        EXPECT_FALSE(row->array);
+        EXPECT_EQ(row->num_values, 1u);
+    }
+}
+
+} // namespace

@@ -1,0 +1,128 @@
+// Requests that are made to fail, by a test or by the scenario.
+#include "tests/sim/simulated_host.h"
+
+#include <stdexcept>
+
+namespace
+{
+
+using hxasim::Fault;
+using ::testing::ElementsAre;
+
+class Faults : public Simulated_Host
+{
+protected:
+    Faults() : Simulated_Host("cna") {}
+
+    // The errno, or the status as a negative number, of one request for the port attributes.
+    static int outcome(const char* path, std::uint16_t instance)
+    {
+        Open_File node(path);
+        hxa_ioctl_port_attr_t record{};
+        record.hxad_num = instance;
+        int error = send(*node, "IOCMD_PORT_GET_ATTR", std::string(path) == "/dev/hxa" ? 'C' : 'D', record);
+        return error != 0 ? error : -record.status;
+    }
+
+    static std::vector<int> outcomes(int count)
+    {
+        std::vector<int> results;
+        while (count-- > 0)
+            results.push_back(outcome("/dev/hxa", 0));
+        return results;
+    }
+};
+
+TEST_F(Faults, strike_after_the_skipped_requests_and_so_many_times)
+{
+    hxasim::inject({.command = "IOCMD_PORT_GET_ATTR", .error = EIO, .skip = 1, .times = 2});
+    EXPECT_THAT(outcomes(5), ElementsAre(0, EIO, EIO, 0, 0));
+    hxasim::inject({.error = EINTR});
+    EXPECT_THAT(outcomes(3), ElementsAre(EINTR, EINTR, EINTR));
+    hxasim::clear_faults();
+    EXPECT_THAT(outcomes(1), ElementsAre(0));
+}
+
+TEST_F(Faults, are_asked_in_the_order_of_injection)
+{
+    hxasim::inject({.error = EIO, .times = 1});
+    hxasim::inject({.status = 13, .times = 2});
+    hxasim::inject({.error = ENXIO, .times = 0});
+    EXPECT_THAT(outcomes(4), ElementsAre(EIO, -13, -13, 0));
+}
+
+TEST_F(Faults, strike_only_what_they_match)
+{
+    hxasim::inject({.command = "IOCMD_PORT_GET_ATTR", .node = "/dev/hxn", .instance = 1, .error = ENXIO});
+    EXPECT_EQ(outcome("/dev/hxn", 1), ENXIO);
+    EXPECT_EQ(outcome("/dev/hxn", 0), 0);
+    EXPECT_EQ(outcome("/dev/hxa", 1), 0);
+    EXPECT_EQ(attributes(Open_File("/dev/hxn"), 'D', 1).port_id, 1);
+}
+
+TEST_F(Faults, leave_the_record_as_sent_but_for_the_status)
+{
+    hxasim::inject({.command = "IOCMD_IOC_GET_INFO", .status = 61});
+    auto refused = info(Open_File("/dev/hxa"), 'C', 1);
+    hxa_ioctl_ioc_info_t expected{};
+    expected.status = HXA_STATUS_IOC_NON_OP;
+    expected.hxad_num = 1;
+    EXPECT_EQ(std::memcmp(&refused, &expected, sizeof(refused)), 0);
+}
+
+TEST_F(Faults, put_a_status_where_the_record_keeps_it)
+{
+    hxasim::inject({.status = 70}); // instance requests carry no status: they go on
+    Open_File hxa("/dev/hxa");
+    EXPECT_EQ(instances(hxa, 'C').first, 2U);
+    hxa_ioctl_aen_t record{};
+    EXPECT_EQ(send(*hxa, "IOCMD_AEN_SYNC", 'C', record), 0);
+    EXPECT_EQ(record.status, HXA_STATUS_VERSION_FAIL);
+    EXPECT_EQ(record.hxad_num, 0);
+}
+
+TEST_F(Faults, overwrite_bytes_of_the_answer)
+{
+    hxasim::load_text(R"({
+        "adapters": [{"kind": "cna"}],
+        "faults": [
+            {"command": "IOCMD_IOC_GET_INST", "node": "/dev/hxn", "answer": {"offset": 0, "bytes": "81000000"}},
+            {"command": "IOCMD_IOC_GET_INFO", "status": 1, "times": 1,
+             "answer": [{"offset": 8, "bytes": "58595A"}, {"offset": "0x207", "bytes": "ff"}]}
+        ]})");
+    EXPECT_EQ(instances(Open_File("/dev/hxa"), 'C').first, 2U);
+    EXPECT_EQ(instances(Open_File("/dev/hxn"), 'D').first, 129U);
+    auto patched = info(Open_File("/dev/hxa"), 'C', 0);
+    EXPECT_EQ(patched.status, HXA_STATUS_FAILED);
+    EXPECT_EQ(text_of(patched.serialnum), "XYZ");
+    EXPECT_EQ(patched.rsvd1[2], 0xFF00);
+    EXPECT_EQ(hxasim::take_requests().back().answered[0x207], 0xFF);
+}
+
+TEST_F(Faults, that_could_not_do_what_they_say_are_refused)
+{
+    const std::pair<Fault, const char*> cases[] = {
+        {{.command = "IOCMD_IOC_GET_ATTRS", .error = EIO}, "fault.command: no such command: IOCMD_IOC_GET_ATTRS"},
+        {{.node = "/dev/hxx", .error = EIO}, "fault.node: no such node: /dev/hxx"},
+        {{.command = "IOCMD_IOC_GET_INFO"}, "fault: needs an error, a status or an answer"},
+        {{.command = "IOCMD_IOC_GET_INST", .status = 1}, "fault.status: IOCMD_IOC_GET_INST carries no status"},
+        {{.command = "IOCMD_IOC_GET_INST", .answer = {{.offset = 37, .bytes = {1, 2, 3, 4}}}},
+         "fault.answer: beyond the 40 bytes of IOCMD_IOC_GET_INST"},
+        {{.command = "IOCMD_IOC_GET_INST", .answer = {{.offset = SIZE_MAX, .bytes = {1, 2}}}},
+         "fault.answer: beyond the 40 bytes of IOCMD_IOC_GET_INST"},
+    };
+    for (const auto& [fault, message] : cases)
+    {
+        try
+        {
+            hxasim::inject(fault);
+            ADD_FAILURE() << "accepted: " << message;
+        }
+        catch (const std::runtime_error& error)
+        {
+            EXPECT_STREQ(error.what(), message);
+        }
+    }
+}
+
+} // namespace

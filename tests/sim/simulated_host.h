@@ -1,0 +1,120 @@
+// A test on a simulated host: loads a scenario, opens nodes, sends records, and fails on requests that no driver accepts.
+#pragma once
+
+#include "sim/hxasim.h"
+
+#include "hxal/records/commands.h"
+
+#include <fcntl.h>
+#include <sys/ioctl.h>
+#include <unistd.h>
+
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+
+#include <cerrno>
+#include <cstring>
+#include <string>
+#include <utility>
+
+// An open file that is closed at the end.
+class Open_File
+{
+public:
+    explicit Open_File(const char* path) : _descriptor(open(path, O_RDWR)) {}
+    explicit Open_File(int descriptor) : _descriptor(descriptor) {}
+    Open_File(Open_File&& other) noexcept : _descriptor(std::exchange(other._descriptor, -1)) {}
+    Open_File& operator=(Open_File&&) = delete;
+    ~Open_File() { close_now(); }
+
+    void close_now()
+    {
+        if (int descriptor = std::exchange(_descriptor, -1); descriptor >= 0)
+            close(descriptor);
+    }
+    int operator*() const { return _descriptor; }
+
+private:
+    int _descriptor;
+};
+
+inline std::uint32_t code_of(std::string_view name, char group)
+{
+    for (const auto& command : hxal::catalogue)
+        if (command.name == name)
+            return hxal::command_code(command, static_cast<std::uint8_t>(group));
+    ADD_FAILURE() << "not in the catalogue: " << name;
+    return 0;
+}
+
+// Sends the record; 0 or the errno.
+template <typename Record> int send(int descriptor, std::string_view name, char group, Record& record)
+{
+    return ioctl(descriptor, code_of(name, group), &record) == 0 ? 0 : errno;
+}
+
+// Text of a fixed field, terminated or not.
+template <std::size_t size> std::string text_of(const char (&field)[size]) { return {field, strnlen(field, size)}; }
+
+// The bytes of an address in memory order as hexadecimal digits.
+template <typename Address> std::string digits_of(const Address& address)
+{
+    std::array<unsigned char, sizeof(Address)> bytes{};
+    std::memcpy(bytes.data(), &address, sizeof(Address));
+    std::string digits;
+    for (unsigned char byte : bytes)
+    {
+        digits += "0123456789ABCDEF"[byte >> 4];
+        digits += "0123456789ABCDEF"[byte & 15];
+    }
+    return digits;
+}
+
+class Simulated_Host : public ::testing::Test
+{
+protected:
+    explicit Simulated_Host(const char* scenario = nullptr)
+    {
+        if (scenario)
+            hxasim::load(scenario);
+    }
+
+    void TearDown() override
+    {
+        EXPECT_THAT(hxasim::violations(), ::testing::ElementsAreArray(_expected_violations));
+        hxasim::unload();
+    }
+
+    void expect_violation(const std::string& text) { _expected_violations.push_back(text); }
+
+    // The answer of instance `instance`; the request must succeed.
+    template <typename Record> Record ask(const Open_File& node, std::string_view name, char group, std::uint16_t instance)
+    {
+        Record record{};
+        record.hxad_num = instance;
+        EXPECT_EQ(send(*node, name, group, record), 0) << name;
+        return record;
+    }
+
+    hxa_ioctl_ioc_info_t info(const Open_File& node, char group, std::uint16_t instance)
+    {
+        return ask<hxa_ioctl_ioc_info_t>(node, "IOCMD_IOC_GET_INFO", group, instance);
+    }
+    hxa_ioc_attr_t attributes(const Open_File& node, char group, std::uint16_t instance)
+    {
+        return ask<hxa_ioctl_ioc_attr_t>(node, "IOCMD_IOC_GET_ATTR", group, instance).attr;
+    }
+    hxa_pport_attr_t port(const Open_File& node, char group, std::uint16_t instance)
+    {
+        return ask<hxa_ioctl_port_attr_t>(node, "IOCMD_PORT_GET_ATTR", group, instance).attr;
+    }
+    std::pair<std::uint32_t, std::string> instances(const Open_File& node, char group)
+    {
+        hxa_ioctl_ioc_get_inst_t record{};
+        EXPECT_EQ(send(*node, "IOCMD_IOC_GET_INST", group, record), 0);
+        return {record.cnt, digits_of(record.bm)};
+    }
+
+private:
+    std::vector<std::string> _expected_violations;
+};

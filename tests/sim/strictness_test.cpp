@@ -1,0 +1,137 @@
+// Requests that no driver accepts fail, are told as violations, and are recorded like all others.
+#include "tests/sim/simulated_host.h"
+
+#include <sys/mman.h>
+
+namespace
+{
+
+using ::testing::IsEmpty;
+
+class Strictness : public Simulated_Host
+{
+protected:
+    Strictness() : Simulated_Host("cna") {}
+
+    Open_File hxa{"/dev/hxa"};
+    Open_File hxn{"/dev/hxn"};
+};
+
+struct Bad_Request
+{
+    const char* node;
+    std::uint32_t code;
+    std::size_t offset; // of one byte that is set in a record of zeros
+    std::uint8_t value;
+    int error;
+    const char* violation;
+};
+
+// clang-format off
+const Bad_Request bad_requests[] = {
+    // commands that the node does not know
+    {"/dev/hxa", 0xC0084399, 0, 0, ENOTTY, "/dev/hxa 0xC0084399: unknown command"},
+    {"/dev/hxa", 0x00005401, 0, 0, ENOTTY, "/dev/hxa 0x00005401: unknown command"},
+    {"/dev/hxa", 0xC648B006, 0, 0, ENOTTY, "/dev/hxa 0xC648B006: unknown command"},
+    {"/dev/hxa", 0x86484306, 0, 0, ENOTTY, "/dev/hxa 0x86484306: unknown command"},
+    {"/dev/hxa", 0xC6484406, 0, 0, ENOTTY, "/dev/hxa IOCMD_IOC_GET_ATTR: belongs on /dev/hxn"},
+    {"/dev/hxn", 0xC6484306, 0, 0, ENOTTY, "/dev/hxn IOCMD_IOC_GET_ATTR: belongs on /dev/hxa"},
+    {"/dev/hxn", 0xC058432A, 0, 0, ENOTTY, "/dev/hxn IOCMD_AEN_SYNC: belongs on /dev/hxa"},
+    // records of another size
+    {"/dev/hxa", 0xC6474306, 0, 0, EINVAL, "/dev/hxa IOCMD_IOC_GET_ATTR: record of 1607 bytes, must be 1608"},
+    {"/dev/hxa", 0xC0004301, 0, 0, EINVAL, "/dev/hxa IOCMD_IOC_GET_VERSION: record of 0 bytes, must be 8"},
+    // bytes that must be 0: status, reserved, output, the last one
+    {"/dev/hxa", 0xC6484306,    0,   1, EINVAL, "/dev/hxa IOCMD_IOC_GET_ATTR instance 0: byte 0 is 1, must be 0"},
+    {"/dev/hxa", 0xC6484306,    6, 255, EINVAL, "/dev/hxa IOCMD_IOC_GET_ATTR instance 0: byte 6 is 255, must be 0"},
+    {"/dev/hxn", 0xC2084407, 519, 7, EINVAL, "/dev/hxn IOCMD_IOC_GET_INFO instance 0: byte 519 is 7, must be 0"},
+    {"/dev/hxa", 0xC0084301,    4,   2, EINVAL, "/dev/hxa IOCMD_IOC_GET_VERSION: byte 4 is 2, must be 0"},
+    {"/dev/hxa", 0xC0284302,    4,   2, EINVAL, "/dev/hxa IOCMD_IOC_GET_INST: byte 4 is 2, must be 0"},
+    {"/dev/hxa", 0xC058432A,    0,   1, EINVAL, "/dev/hxa IOCMD_AEN_SYNC: byte 0 is 1, must be 0"},
+    {"/dev/hxa", 0xC058432A,   16,   1, EINVAL, "/dev/hxa IOCMD_AEN_SYNC: byte 16 is 1, must be 0"},
+    // instances and applications that are not there
+    {"/dev/hxa", 0xC178432D,    4,   2, ENODEV, "/dev/hxa IOCMD_PORT_GET_ATTR instance 2: no such instance"},
+    {"/dev/hxn", 0xC178442D,    5,   1, ENODEV, "/dev/hxn IOCMD_PORT_GET_ATTR instance 256: no such instance"},
+    {"/dev/hxa", 0xC058432A,    8,   5, EINVAL, "/dev/hxa IOCMD_AEN_SYNC: no such application: 5"},
+};
+// clang-format on
+
+TEST_F(Strictness, refuses_bad_requests_and_leaves_the_record_alone)
+{
+    for (const auto& bad : bad_requests)
+    {
+        SCOPED_TRACE(bad.violation);
+        std::array<std::uint8_t, 2048> record{};
+        record[bad.offset] = bad.value;
+        auto sent = record;
+        errno = 0;
+        EXPECT_EQ(ioctl(std::string(bad.node) == "/dev/hxa" ? *hxa : *hxn, bad.code, record.data()), -1);
+        EXPECT_EQ(errno, bad.error);
+        EXPECT_EQ(record, sent);
+        expect_violation(bad.violation);
+    }
+    auto requests = hxasim::take_requests();
+    ASSERT_EQ(requests.size(), std::size(bad_requests));
+    for (std::size_t i = 0; i < requests.size(); ++i)
+    {
+        EXPECT_EQ(requests[i].command, bad_requests[i].code);
+        EXPECT_EQ(requests[i].error, bad_requests[i].error);
+        EXPECT_THAT(requests[i].answered, IsEmpty());
+    }
+    EXPECT_EQ(requests[0].name, "");
+    EXPECT_EQ(requests[4].name, "IOCMD_IOC_GET_ATTR");
+}
+
+TEST_F(Strictness, answers_bad_addresses_without_touching_them)
+{
+    void* page = mmap(nullptr, 4096, PROT_READ | PROT_WRITE, MAP_PRIVATE | MAP_ANONYMOUS, -1, 0);
+    ASSERT_NE(page, MAP_FAILED);
+    auto code = code_of("IOCMD_IOC_GET_ATTR", 'C');
+    for (int protection : {PROT_NONE, PROT_READ})
+    {
+        ASSERT_EQ(mprotect(page, 4096, protection), 0);
+        EXPECT_EQ(ioctl(*hxa, code, page), -1);
+        EXPECT_EQ(errno, EFAULT);
+    }
+    munmap(page, 4096);
+    EXPECT_EQ(ioctl(*hxa, code, nullptr), -1);
+    EXPECT_EQ(errno, EFAULT);
+    expect_violation("/dev/hxa IOCMD_IOC_GET_ATTR: bad address");
+    expect_violation("/dev/hxa IOCMD_IOC_GET_ATTR instance 0: bad address");
+    expect_violation("/dev/hxa IOCMD_IOC_GET_ATTR: bad address");
+}
+
+TEST_F(Strictness, records_requests_with_their_bytes_until_taken)
+{
+    port(hxn, 'D', 1);
+    instances(hxa, 'C');
+    auto requests = hxasim::take_requests();
+    ASSERT_EQ(requests.size(), 2U);
+    EXPECT_EQ(requests[0].node, "/dev/hxn");
+    EXPECT_EQ(requests[0].command, 0xC178442DU);
+    EXPECT_EQ(requests[0].name, "IOCMD_PORT_GET_ATTR");
+    EXPECT_EQ(requests[0].instance, 1);
+    std::vector<std::uint8_t> sent(376);
+    sent[4] = 1;
+    EXPECT_EQ(requests[0].sent, sent);
+    EXPECT_EQ(requests[0].answered.size(), 376U);
+    EXPECT_EQ(requests[0].answered[8 + 324], HXA_PPORT_ST_LINKUP);
+    EXPECT_EQ(requests[1].name, "IOCMD_IOC_GET_INST");
+    EXPECT_EQ(requests[1].instance, -1);
+    EXPECT_THAT(hxasim::take_requests(), IsEmpty());
+}
+
+TEST_F(Strictness, keeps_the_newest_requests_only)
+{
+    hxa_ioctl_ioc_get_version_t record{};
+    EXPECT_EQ(send(*hxn, "IOCMD_IOC_GET_VERSION", 'D', record), 0);
+    for (int i = 0; i < 100'000; ++i)
+    {
+        record = {};
+        send(*hxa, "IOCMD_IOC_GET_VERSION", 'C', record);
+    }
+    auto requests = hxasim::take_requests();
+    ASSERT_EQ(requests.size(), 100'000U);
+    EXPECT_EQ(requests.front().node, "/dev/hxa");
+}
+
+} // namespace

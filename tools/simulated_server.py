@@ -1,0 +1,75 @@
+"""The embedded CIM server on a simulated host, as a context manager."""
+
+import os
+import re
+import signal
+import subprocess
+import threading
+from pathlib import Path
+
+ROOT = Path(__file__).resolve().parent.parent
+START_TIMEOUT = 60  # seconds; sanitized builds start slowly
+STOP_TIMEOUT = 30  # seconds
+
+
+class SimulatedServer:
+    """Starts script/server on a free port; `lines` collects what it says on standard error."""
+
+    def __init__(self, scenario="mixed", environment=None):
+        self.lines = []
+        self._listening = threading.Event()
+        self._process = subprocess.Popen(
+            [ROOT / "script/server", "--scenario", scenario, "--port", "0"],
+            stdin=subprocess.DEVNULL,
+            stdout=subprocess.PIPE,
+            stderr=subprocess.PIPE,
+            text=True,
+            errors="replace",
+            env={**os.environ, **(environment or {})},
+        )
+        self._readers = [
+            threading.Thread(target=self._collect, args=[stream], daemon=True)
+            for stream in (self._process.stdout, self._process.stderr)
+        ]
+        for reader in self._readers:
+            reader.start()
+
+        if not self._listening.wait(START_TIMEOUT):
+            self._process.kill()
+            raise RuntimeError("the server did not start:\n" + "\n".join(self.lines))
+
+    def _collect(self, stream):
+        for line in stream:
+            self.lines.append(line.rstrip("\n"))
+            listening = re.search(r"listening on 127\.0\.0\.1:(\d+)", line)
+            if listening:
+                self.port = int(listening[1])
+                self.url = f"http://127.0.0.1:{self.port}"
+                self._listening.set()
+
+    @property
+    def pid(self):
+        return self._process.pid
+
+    def arguments(self):
+        """The server's own command line, as the system knows it."""
+        return Path(f"/proc/{self.pid}/cmdline").read_text(encoding="utf-8").split("\0")[:-1]
+
+    def stop(self, with_signal=signal.SIGTERM):
+        """Stops the server and returns its exit code."""
+        if self._process.poll() is None:
+            self._process.send_signal(with_signal)
+        try:
+            code = self._process.wait(STOP_TIMEOUT)
+        except subprocess.TimeoutExpired:
+            self._process.kill()
+            raise
+        for reader in self._readers:
+            reader.join(STOP_TIMEOUT)
+        return code
+
+    def __enter__(self):
+        return self
+
+    def __exit__(self, *_):
+        self.stop()
