@@ -24,6 +24,8 @@ void unload() { simulator().unload(); }
 
 std::vector<Request> take_requests() { return simulator().take_requests(); }
 
+std::uint64_t request_count() { return simulator().request_count(); }
+
 void inject(const Fault& fault) { simulator().inject(fault); }
 
 void clear_faults() { simulator().clear_faults(); }

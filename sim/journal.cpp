@@ -27,6 +27,7 @@ Request as_request(Journal_Entry& entry)
 
 void Journal::add(Journal_Entry entry)
 {
+    ++_count;
     _bytes += size_of(entry);
     _entries.push_back(std::move(entry));
     while (_entries.size() > max_entries || _bytes > max_bytes)

@@ -27,12 +27,14 @@ public:
     void add(Journal_Entry entry);        // drops the oldest ones beyond the bounds
     void add_violation(std::string text); // dropped beyond the bound
     std::vector<Request> take();          // oldest first; leaves none
+    std::uint64_t count() const { return _count; } // of all that were added
     const std::vector<std::string>& violations() const { return _violations; }
     void clear();
 
 private:
     std::deque<Journal_Entry> _entries;
     std::size_t _bytes = 0;
+    std::uint64_t _count = 0;
     std::vector<std::string> _violations;
 };
 

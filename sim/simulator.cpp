@@ -192,6 +192,12 @@ int Simulator::answer_row(Call& call, const Row& row, Journal_Entry& entry, void
     return 0;
 }
 
+std::uint64_t Simulator::request_count()
+{
+    const auto lock = locked();
+    return _journal.count();
+}
+
 std::vector<Request> Simulator::take_requests()
 {
     auto lock = locked();

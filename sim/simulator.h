@@ -29,6 +29,7 @@ public:
     void load(Scenario scenario);
     void unload();
     std::vector<Request> take_requests();
+    std::uint64_t request_count();
     void inject(const Fault& fault);
     void clear_faults();
     std::vector<std::string> violations();

@@ -28,7 +28,7 @@ MAY_INCLUDE = {
         "cmpi/status.h",
         "runtime",
     ],
-    "cimserver": ["cmpi/standard", "cmpi/registration.h", "runtime/meta.h"],
+    "cimserver": ["cmpi/standard", "cmpi/registration.h", "runtime/meta.h", "runtime/types.h"],
     "sim": ["hxal/records", "hxal/commands.h"],
 }
 

@@ -15,7 +15,8 @@ bool is_library_node(std::size_t size) { return size == sizeof(hxal::Ioc_Node) |
 
 } // namespace
 
-void* operator new(std::size_t size)
+// Not inlined: the compiler would see malloc() through them and take the pairs for mismatched.
+[[gnu::noinline]] void* operator new(std::size_t size)
 {
     if (failing_allocation > 0 && is_library_node(size) && --failing_allocation == 0)
         throw std::bad_alloc();
@@ -24,8 +25,8 @@ void* operator new(std::size_t size)
     throw std::bad_alloc();
 }
 
-void operator delete(void* memory) noexcept { std::free(memory); }
-void operator delete(void* memory, std::size_t) noexcept { std::free(memory); }
+[[gnu::noinline]] void operator delete(void* memory) noexcept { std::free(memory); }
+[[gnu::noinline]] void operator delete(void* memory, std::size_t) noexcept { std::free(memory); }
 
 namespace
 {
