@@ -1,4 +1,6 @@
 // zmlr-cimserver: serves a CIM provider module to CIM-XML clients on the loopback interface.
+//
+// Exit status: 0 after a clean stop, 1 when it cannot serve or a request did not end in time, 2 for a wrong command line.
 #include "cimserver/broker/module.h"
 #include "cimserver/cimxml/http_server.h"
 #include "cimserver/cimxml/service.h"
@@ -6,7 +8,9 @@
 #include "cimserver/module_operations.h"
 
 #include <CLI/CLI.hpp>
+#include <semaphore.h>
 
+#include <chrono>
 #include <csignal>
 #include <cstdio>
 #include <cstdlib>
@@ -18,6 +22,10 @@ namespace
 
 // How long a stop waits for the requests that run.
 constexpr std::chrono::seconds stop_grace{10};
+
+constexpr int exit_usage = 2; // a command line that cannot be served
+
+sem_t stop_asked;
 
 struct Options
 {
@@ -45,21 +53,27 @@ void declare(CLI::App& app, Options& options)
         ->capture_default_str();
 }
 
-// Blocks the stop signals in this thread and in every thread made after it: they are waited for, not handled.
-sigset_t block_stop_signals()
+void ask_to_stop(int) { sem_post(&stop_asked); }
+
+// Handles the signals: what is blocked or ignored stays so in every program that the module starts.
+void handle_signals()
 {
-    std::signal(SIGPIPE, SIG_IGN);
-    sigset_t signals;
-    sigemptyset(&signals);
-    sigaddset(&signals, SIGTERM);
-    sigaddset(&signals, SIGINT);
-    pthread_sigmask(SIG_BLOCK, &signals, nullptr);
-    return signals;
+    sem_init(&stop_asked, 0, 0);
+    std::signal(SIGTERM, ask_to_stop);
+    std::signal(SIGINT, ask_to_stop);
+    std::signal(SIGPIPE, [](int) {});
+}
+
+void wait_for_stop()
+{
+    while (sem_wait(&stop_asked) != 0)
+    {
+    }
 }
 
 void serve(const Options& options)
 {
-    const sigset_t stop_signals = block_stop_signals();
+    handle_signals();
     cimserver::Module module(options.module);
     cimserver::Module_Operations operations(module);
     cimserver::Service service(operations);
@@ -67,12 +81,11 @@ void serve(const Options& options)
                                   [&](const cimserver::Http_Request& request) { return service.answer(request); });
     std::fprintf(stderr, "zmlr-cimserver: listening on 127.0.0.1:%u\n", static_cast<unsigned>(server.port()));
 
-    int signal = 0;
-    sigwait(&stop_signals, &signal);
+    wait_for_stop();
     if (!server.stop(stop_grace))
     {
         std::fprintf(stderr, "zmlr-cimserver: a request did not finish in time\n");
-        std::_Exit(EXIT_SUCCESS); // it still uses the module
+        std::_Exit(EXIT_FAILURE); // it still uses the module
     }
 }
 
@@ -83,11 +96,15 @@ int main(int argc, char** argv)
     CLI::App app("Serves a CIM provider module to CIM-XML clients on the loopback interface.", "zmlr-cimserver");
     Options options;
     declare(app, options);
-    CLI11_PARSE(app, argc, argv);
     try
     {
+        app.parse(argc, argv);
         serve(options);
         return EXIT_SUCCESS;
+    }
+    catch (const CLI::ParseError& error) // a request for help, too
+    {
+        return app.exit(error) == EXIT_SUCCESS ? EXIT_SUCCESS : exit_usage;
     }
     catch (const std::exception& error)
     {

@@ -12,37 +12,6 @@ namespace
 
 constexpr const char* log_source = "CMPI_Containers";
 
-// Where a container's items come from.
-struct Source
-{
-    const Meta_Repository* repository;
-    const CMPIBroker* broker;
-    const char* name_space;
-};
-
-int to_value(const Source& source, const CMPIData& data, const char* name, Value::Type expected, Value& value)
-{
-    if (cmpi_to_cimple_value(source.repository, source.broker, source.name_space, data, value) != 0)
-    {
-        ZMLR_LOG(LL_WARN, "cmpi_to_cimple_value() failed");
-        return -1;
-    }
-    if (value.type() != expected)
-    {
-        ZMLR_LOG(LL_WARN, "type mismatch on %s: %s/%s", name, name_of(expected), name_of(value.type()));
-        return -1;
-    }
-    return 0;
-}
-
-int to_data(const Source& source, const char* name, const Value& value, uint32 flags, CMPI_Data& data)
-{
-    if (_to_cmpi_data(source.repository, source.broker, source.name_space, value, flags, data) == 0)
-        return 0;
-    ZMLR_LOG(LL_WARN, "_to_cmpi_data() failed: feature=%s", name);
-    return -1;
-}
-
 bool in_bounds(uint32 index, uint32 size)
 {
     if (index < size)
@@ -63,13 +32,52 @@ bool take_name(const CMPIString* cmpi_name, String& name)
 
 } // namespace
 
+CMPI_Container::CMPI_Container(const Meta_Repository* repository, const CMPIBroker* broker, const char* name_space)
+    : Container(repository)
+    , _broker(broker)
+    , _name_space(name_space)
+{
+}
+
+int CMPI_Container::get_name(uint32 index, String& name)
+{
+    CMPIData data;
+    return fetch(index, data, name);
+}
+
+int CMPI_Container::get_value(uint32 index, Value::Type expected, Value& value)
+{
+    CMPIData data;
+    String name;
+    if (fetch(index, data, name) != 0)
+        return -1;
+    if (cmpi_to_cimple_value(repository(), _broker, _name_space.c_str(), data, value) != 0)
+    {
+        ZMLR_LOG(LL_WARN, "cmpi_to_cimple_value() failed");
+        return -1;
+    }
+    if (value.type() != expected)
+    {
+        ZMLR_LOG(LL_WARN, "type mismatch on %s: %s/%s", name.c_str(), name_of(expected), name_of(value.type()));
+        return -1;
+    }
+    return 0;
+}
+
+int CMPI_Container::set_value(const char* name, const Value& value, uint32 flags)
+{
+    CMPI_Data data;
+    if (_to_cmpi_data(repository(), _broker, _name_space.c_str(), value, flags, data) == 0)
+        return put(name, data);
+    ZMLR_LOG(LL_WARN, "_to_cmpi_data() failed: feature=%s", name);
+    return -1;
+}
+
 // ---- instances ----
 
 CMPIInstance_Container::CMPIInstance_Container(const Meta_Repository* repository, const CMPIBroker* broker,
                                                const char* name_space, const CMPIInstance* instance)
-    : Container(repository)
-    , _broker(broker)
-    , _name_space(name_space)
+    : CMPI_Container(repository, broker, name_space)
     , _instance(instance)
 {
 }
@@ -97,26 +105,8 @@ int CMPIInstance_Container::fetch(uint32 index, CMPIData& data, String& name)
     return -1;
 }
 
-int CMPIInstance_Container::get_name(uint32 index, String& name)
+int CMPIInstance_Container::put(const char* name, const CMPI_Data& data)
 {
-    CMPIData data;
-    return fetch(index, data, name);
-}
-
-int CMPIInstance_Container::get_value(uint32 index, Value::Type expected, Value& value)
-{
-    CMPIData data;
-    String name;
-    if (fetch(index, data, name) != 0)
-        return -1;
-    return to_value({repository(), _broker, _name_space.c_str()}, data, name.c_str(), expected, value);
-}
-
-int CMPIInstance_Container::set_value(const char* name, const Value& value, uint32 flags)
-{
-    CMPI_Data data;
-    if (to_data({repository(), _broker, _name_space.c_str()}, name, value, flags, data) != 0)
-        return -1;
     if (okay(CMSetProperty(_instance, name, data.value(), data.type())))
         return 0;
     ZMLR_LOG(LL_WARN, "CMSetProperty() failed: %s", name);
@@ -127,9 +117,7 @@ int CMPIInstance_Container::set_value(const char* name, const Value& value, uint
 
 CMPIObjectPath_Container::CMPIObjectPath_Container(const Meta_Repository* repository, const CMPIBroker* broker,
                                                    const char* name_space, const CMPIObjectPath* path)
-    : Container(repository)
-    , _broker(broker)
-    , _name_space(name_space)
+    : CMPI_Container(repository, broker, name_space)
     , _path(path)
 {
 }
@@ -149,26 +137,8 @@ int CMPIObjectPath_Container::fetch(uint32 index, CMPIData& data, String& name)
     return -1;
 }
 
-int CMPIObjectPath_Container::get_name(uint32 index, String& name)
+int CMPIObjectPath_Container::put(const char* name, const CMPI_Data& data)
 {
-    CMPIData data;
-    return fetch(index, data, name);
-}
-
-int CMPIObjectPath_Container::get_value(uint32 index, Value::Type expected, Value& value)
-{
-    CMPIData data;
-    String name;
-    if (fetch(index, data, name) != 0)
-        return -1;
-    return to_value({repository(), _broker, _name_space.c_str()}, data, name.c_str(), expected, value);
-}
-
-int CMPIObjectPath_Container::set_value(const char* name, const Value& value, uint32 flags)
-{
-    CMPI_Data data;
-    if (to_data({repository(), _broker, _name_space.c_str()}, name, value, flags, data) != 0)
-        return -1;
     // Only paths that we made, which are not constant, are written.
     if (okay(CMAddKey(const_cast<CMPIObjectPath*>(_path), name, data.value(), data.type())))
         return 0;

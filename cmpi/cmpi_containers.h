@@ -3,6 +3,7 @@
 // A container borrows the object it wraps. `name_space` is where references without a name space of their own point to.
 #pragma once
 
+#include "cmpi/cmpi_data.h"
 #include "cmpi/container.h"
 
 #include <cmpift.h>
@@ -10,42 +11,53 @@
 namespace zmlr
 {
 
-class CMPIInstance_Container : public Container
+// What the containers share: items as the broker holds them, converted on their way in and out.
+class CMPI_Container : public Container
+{
+public:
+    CMPI_Container(const Meta_Repository* repository, const CMPIBroker* broker, const char* name_space);
+
+    int get_name(uint32 index, String& name) override;
+    int get_value(uint32 index, Value::Type expected, Value& value) override;
+    int set_value(const char* name, const Value& value, uint32 flags) override;
+
+private:
+    // Each answers 0, or -1 and a log line.
+    virtual int fetch(uint32 index, CMPIData& data, String& name) = 0;
+    virtual int put(const char* name, const CMPI_Data& data) = 0;
+
+    const CMPIBroker* _broker;
+    String _name_space;
+};
+
+class CMPIInstance_Container : public CMPI_Container
 {
 public:
     CMPIInstance_Container(const Meta_Repository* repository, const CMPIBroker* broker, const char* name_space,
                            const CMPIInstance* instance);
 
     uint32 get_size() override;
-    int get_name(uint32 index, String& name) override;
-    int get_value(uint32 index, Value::Type expected, Value& value) override;
-    int set_value(const char* name, const Value& value, uint32 flags) override;
 
 private:
-    int fetch(uint32 index, CMPIData& data, String& name);
+    int fetch(uint32 index, CMPIData& data, String& name) override;
+    int put(const char* name, const CMPI_Data& data) override;
 
-    const CMPIBroker* _broker;
-    String _name_space;
     const CMPIInstance* _instance;
 };
 
 // A container for a constant path may only be read.
-class CMPIObjectPath_Container : public Container
+class CMPIObjectPath_Container : public CMPI_Container
 {
 public:
     CMPIObjectPath_Container(const Meta_Repository* repository, const CMPIBroker* broker, const char* name_space,
                              const CMPIObjectPath* path);
 
     uint32 get_size() override;
-    int get_name(uint32 index, String& name) override;
-    int get_value(uint32 index, Value::Type expected, Value& value) override;
-    int set_value(const char* name, const Value& value, uint32 flags) override;
 
 private:
-    int fetch(uint32 index, CMPIData& data, String& name);
+    int fetch(uint32 index, CMPIData& data, String& name) override;
+    int put(const char* name, const CMPI_Data& data) override;
 
-    const CMPIBroker* _broker;
-    String _name_space;
     const CMPIObjectPath* _path;
 };
 

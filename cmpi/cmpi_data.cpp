@@ -76,16 +76,17 @@ void CMPI_Data::release()
     if (!_owner)
         return;
     _owner = false;
+    const CMPI_Release release_object;
     if (CMIsArray(_data))
-        CMRelease(_data.value.array);
+        release_object(_data.value.array);
     else if (_data.type == CMPI_string)
-        CMRelease(_data.value.string);
+        release_object(_data.value.string);
     else if (_data.type == CMPI_dateTime)
-        CMRelease(_data.value.dateTime);
+        release_object(_data.value.dateTime);
     else if (_data.type == CMPI_ref)
-        CMRelease(_data.value.ref);
+        release_object(_data.value.ref);
     else
-        CMRelease(_data.value.inst);
+        release_object(_data.value.inst);
 }
 
 } // namespace zmlr

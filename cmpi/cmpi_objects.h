@@ -10,9 +10,19 @@
 namespace zmlr
 {
 
+// Releases an object. A server that throws here must not end the process: destructors call this.
 struct CMPI_Release
 {
-    template <class T> void operator()(T* object) const { CMRelease(object); }
+    template <class T> void operator()(T* object) const noexcept
+    {
+        try
+        {
+            CMRelease(object);
+        }
+        catch (...)
+        {
+        }
+    }
 };
 
 // Owns an object that the broker made for us. (Objects read out of other objects belong to the broker.)

@@ -75,7 +75,6 @@ CMPIrc enumerate_names(CMPI_Adapter& adapter, const CMPIResult* result, const CM
     CMPIrc rc = make_model(adapter, path, model);
     if (rc != CMPI_RC_OK)
         return rc;
-    nullify_non_keys(model.ptr());
 
     Enumeration enumeration{adapter.broker, result, name_space_of(path), nullptr};
     const auto status = adapter.enum_instances(model.ptr(), return_object_path, &enumeration);

@@ -51,7 +51,7 @@ struct Associator_Names_Args
     const String& result_role;
     Enum_Associator_Names_Proc proc;
     void* client_data;
-    std::vector<const Instance*> far_ends; // room for one per reference of the association
+    std::vector<const Instance*> far_ends;
     bool stopped = false;
 };
 
@@ -62,6 +62,7 @@ bool pass_on_far_ends(Instance* instance, Enum_Instances_Status, void* client_da
     if (!association || args.stopped)
         return false;
 
+    args.far_ends.resize(association->meta_class->num_meta_features);
     const int count = get_associators(args.instance, association.ptr(), args.result_class.c_str(), args.role.c_str(),
                                       args.result_role.c_str(), args.far_ends.data());
     for (int i = 0; i < count && !args.stopped; ++i)
@@ -205,7 +206,6 @@ Enum_Associator_Names_Status Provider_Handle::enum_associator_names(const Instan
     const Ref<Instance> model(create(meta_class, false));
     nullify_non_keys(model.ptr());
     Associator_Names_Args args{instance, result_class, role, result_role, proc, client_data, {}};
-    args.far_ends.resize(meta_class->num_meta_features);
     const auto status = enum_instances(model.ptr(), pass_on_far_ends, &args);
     proc(nullptr, ENUM_ASSOCIATOR_NAMES_OK, client_data);
 

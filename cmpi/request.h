@@ -26,8 +26,17 @@ template <class MI, class Work> CMPIStatus serve(const char* name, MI* mi, const
     return {shielded(name, request), nullptr};
 }
 
-// Runs the common cleanup as the cleanup function `name` of the interface, under a thread context. The lock is not taken:
-// the adapter may end here, and a provider that unloads may wait for a thread that needs it.
+// The common cleanup, traced as the cleanup function `name`. The adapter's lock is not taken: the adapter may end here, and a
+// provider that unloads may wait for a thread that needs it.
+inline CMPIrc traced_cleanup(const char* name, CMPI_Adapter* adapter, CMPIBoolean terminating)
+{
+    ent(name);
+    const CMPIrc answer = cleanup(adapter, terminating != 0);
+    ret(name, answer);
+    return answer;
+}
+
+// Runs the common cleanup as the cleanup function `name` of the interface, under a thread context.
 template <class MI>
 CMPIStatus serve_cleanup(const char* name, MI* mi, const CMPIContext* context, CMPIBoolean terminating) noexcept
 {
@@ -35,10 +44,7 @@ CMPIStatus serve_cleanup(const char* name, MI* mi, const CMPIContext* context, C
     {
         CMPI_Adapter* adapter = CMPI_Adapter::of(mi);
         const CMPI_Thread_Context_Pusher pusher(adapter->broker, context, adapter);
-        ent(name);
-        const CMPIrc answer = cleanup(adapter, terminating != 0);
-        ret(name, answer);
-        return answer;
+        return traced_cleanup(name, adapter, terminating);
     };
     return {shielded(name, request), nullptr};
 }

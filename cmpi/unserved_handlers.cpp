@@ -29,15 +29,7 @@ CMPIStatus CMPI_Adapter::invokeMethod(CMPIMethodMI* mi, const CMPIContext* conte
 CMPIStatus CMPI_Adapter::associationCleanup(CMPIAssociationMI* mi, const CMPIContext*, CMPIBoolean terminating) noexcept
 {
     constexpr const char* name = "associationCleanup";
-    const auto request = [&]
-    {
-        CMPI_Adapter* adapter = CMPI_Adapter::of(mi);
-        ent(name);
-        const CMPIrc answer = cleanup(adapter, terminating != 0);
-        ret(name, answer);
-        return answer;
-    };
-    return {shielded(name, request), nullptr};
+    return {shielded(name, [&] { return traced_cleanup(name, CMPI_Adapter::of(mi), terminating); }), nullptr};
 }
 
 CMPIStatus CMPI_Adapter::associators(CMPIAssociationMI* mi, const CMPIContext* context, const CMPIResult*, const CMPIObjectPath*,

@@ -71,13 +71,13 @@ hxa_status_t add_ioc(Adapter_List& list, hxal_s& ioc)
     return HXA_STATUS_OK;
 }
 
-// Groups all IOCs. False when one of them fails.
+// Groups all IOCs. False when one of them fails or an index has none; indexes only grow along the IOC list.
 bool group_all(Adapter_List& list, int ioc_count)
 {
-    for (int idx = 0; idx < ioc_count; ++idx)
+    hxal_t* ioc = hxal_ioc_get_list();
+    for (int idx = 0; idx < ioc_count; ++idx, ioc = ioc->next)
     {
-        hxal_t* ioc = hxal_ioc_open_idx(idx);
-        if (!ioc)
+        if (!ioc || ioc->id != idx)
             return false;
         if (const hxa_status_t failed = add_ioc(list, *ioc); failed != HXA_STATUS_OK)
         {

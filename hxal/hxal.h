@@ -17,6 +17,8 @@
 // Ownership. The library owns every handle, adapter record and text it returns. They stay valid until the next scan.
 // Look-ups.  A null or out-of-range argument finds nothing; each look-up names its answer for "none". Texts are compared
 //            byte by byte: "Blue" is not "blue".
+// Texts.     A driver's text that fills its field loses its last character to the terminator (a serial number of 12 keeps
+//            11). Looked up is what the field holds: the driver's whole text finds it, and so does the cut one.
 // Threads.   No list is locked. Requests and look-ups may run on any number of threads, but the calls that store what
 //            they read (hxal_adapter_get_name, hxal_ioc_get_current_mac, hxal_adapter_update_ioc) one at a time for an
 //            adapter or handle, and a scan alone: it replaces what the others are looking at.

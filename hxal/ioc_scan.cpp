@@ -89,6 +89,7 @@ hxa_status_t list_instances(hxal::List<hxal_s>& found, const Device_Node& node, 
                             const hxa_ioctl_ioc_get_inst_t& instances)
 {
     hxal_s probe = probe_of(*descriptor, node.type);
+    hxal_s** end = &found.head; // appending there need not walk the list
     int next_id = iocs.count;
     for (uint32_t instance = 0; instance < instances.cnt; ++instance)
     {
@@ -102,7 +103,8 @@ hxa_status_t list_instances(hxal::List<hxal_s>& found, const Device_Node& node, 
             return info.status;
 
         auto* ioc = new Ioc_Node{};
-        hxal::list_append(found.head, static_cast<hxal_s*>(ioc));
+        hxal::list_append(*end, static_cast<hxal_s*>(ioc));
+        end = &ioc->next;
         ioc->node = descriptor;
         ioc->fd = probe.fd;
         ioc->instance = probe.instance;

@@ -1,7 +1,6 @@
 #include "hxal/port.h"
 
 #include "hxal/internal/request.h"
-#include "hxal/texts.h"
 
 hxa_status_t hxal_port_get_attr(const hxal_t* ioc, hxa_pport_attr_t* attr)
 {
@@ -12,9 +11,4 @@ hxa_status_t hxal_port_get_attr(const hxal_t* ioc, hxa_pport_attr_t* attr)
         return sent;
     *attr = record.attr;
     return record.status;
-}
-
-const char* hxal_port_get_state_name(uint32_t state)
-{
-    return state < HXA_PPORT_ST_MAX_STATE ? hxal_pport_states_to_string(state) : "Unknown";
 }

@@ -12,9 +12,6 @@ extern "C"
     // One request: reads the port's attributes.
     hxa_status_t hxal_port_get_attr(const hxal_t* ioc, hxa_pport_attr_t* attr);
 
-    // The text of a port state (hxa_pport_states_t); "Unknown" for 0 and for numbers of 14 and above.
-    const char* hxal_port_get_state_name(uint32_t state);
-
 #ifdef __cplusplus
 }
 #endif

@@ -98,15 +98,17 @@ int ProviderUtil::getAdapterId(const String& address)
 String ProviderUtil::getAddrByAdapterId(int adapter)
 {
     const Scope_Trace trace(log_source);
-    hxal_adapter_t* opened = open_adapter(adapter);
-    hxal_t* fc = opened ? hxal_adapter_get_fcioc(opened, 0) : nullptr;
-    if (!fc)
+    const hxal_adapter_t* opened = open_adapter(adapter);
+    const bool is_cna = hxal_adapter_is_cna_capable(adapter) != HXA_FALSE;
+    const hxal_t* fc = hxal_adapter_get_fcioc(opened, 0);
+    const hxal_t* ethernet = is_cna ? hxal_adapter_get_ethioc(opened, 0) : nullptr;
+    if (!fc && !ethernet)
         return String();
 
     char text[wwn_text_size];
-    if (hxal_adapter_is_cna_capable(adapter))
+    if (is_cna)
     {
-        const mac_t mac = read_fc_mac(fc);
+        const mac_t mac = read_cna_mac(fc, ethernet);
         MAC2str(text, &mac);
     }
     else

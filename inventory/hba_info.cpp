@@ -82,11 +82,6 @@ void fill_ethernet_side(_hbaInfo& info, const Ioc_Reading& ethernet, int index)
 
 void fill_fc_side(_hbaInfo& info, const Ioc_Reading& fc, int index)
 {
-    if (info.is_cna)
-    {
-        const mac_t mac = read_fc_mac(fc.ioc.get());
-        ProviderUtil::MAC2str(info.mac, &mac);
-    }
     const wwn_t wwn = hxal_ioc_get_nwwn(fc.ioc.get());
     ProviderUtil::WWN2str(info.node_wwn, &wwn);
 
@@ -101,8 +96,11 @@ void fill_fc_side(_hbaInfo& info, const Ioc_Reading& fc, int index)
 
 } // namespace
 
-mac_t read_fc_mac(hxal_t* fc)
+mac_t read_cna_mac(const hxal_t* fc, const hxal_t* ethernet)
 {
+    if (!fc)
+        return hxal_ioc_get_mac(ethernet);
+
     hxa_ioctl_ioc_info_t info = {};
     if (hxal_ioc_get_info(fc, &info) == HXA_STATUS_OK)
         return info.mac;
@@ -136,6 +134,11 @@ std::optional<_hbaInfo> read_hba_info(int index)
     fill_card(info, (reading.ethernet.is_read ? reading.ethernet : reading.fc).attributes);
     if (reading.ethernet.ioc)
         fill_ethernet_side(info, reading.ethernet, index);
+    if (is_cna)
+    {
+        const mac_t mac = read_cna_mac(reading.fc.ioc.get(), reading.ethernet.ioc.get());
+        ProviderUtil::MAC2str(info.mac, &mac);
+    }
     if (reading.fc.ioc)
         fill_fc_side(info, reading.fc, index);
     return info;

@@ -44,7 +44,8 @@ using Ioc_Handle = std::unique_ptr<hxal_t, Ioc_Closer>;
 // can be read.
 std::optional<_hbaInfo> read_hba_info(int adapter);
 
-// The MAC address of a CNA's FC IOC: as the driver knows it now, else as the scan found it.
-mac_t read_fc_mac(hxal_t* fc);
+// The MAC address that keys a CNA: its FC IOC's, as the driver knows it now, else as the scan found it. Without an FC IOC (its
+// driver is not there) it is the Ethernet IOC's, so that two such adapters never share a key. Either may be null, not both.
+mac_t read_cna_mac(const hxal_t* fc, const hxal_t* ethernet);
 
 } // namespace zmlr

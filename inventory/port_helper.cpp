@@ -23,6 +23,25 @@ struct Host_Text
     char text[sizeof(_hbaPortInfo::host)] = {};
 };
 
+uint16 enabled_state(uint16 operational_status)
+{
+    switch (operational_status)
+    {
+    case OPERATIONAL_STATUS_STARTING:
+        return ENABLED_STATE_QUIESCE;
+    case OPERATIONAL_STATUS_STOPPING:
+        return ENABLED_STATE_SHUTTING_DOWN;
+    case OPERATIONAL_STATUS_STOPPED:
+        return ENABLED_STATE_DISABLED;
+    case OPERATIONAL_STATUS_IN_SERVICE:
+        return ENABLED_STATE_ENABLED;
+    case OPERATIONAL_STATUS_LOST_COMMUNICATION:
+        return ENABLED_STATE_OFFLINE;
+    default:
+        return ENABLED_STATE_OTHER;
+    }
+}
+
 void fill(_hbaPortInfo& info, const hxa_pport_attr_t& attributes, const Host_Text& host, int port)
 {
     ProviderUtil::WWN2str(info.port_wwn, &attributes.pwwn);
@@ -129,6 +148,7 @@ Instance_Array PortHelper::getFCPortInstancesByAdapter(const String& address) co
 
 uint16 PortHelper::getPortState(uint32 port_state)
 {
+    const Scope_Trace trace(log_source);
     switch (port_state)
     {
     case HXA_PPORT_ST_ENABLING_QWAIT:
@@ -153,6 +173,7 @@ uint16 PortHelper::getPortState(uint32 port_state)
 
 uint16 PortHelper::getPortType(uint32 port_type)
 {
+    const Scope_Trace trace(log_source);
     switch (port_type)
     {
     case HXA_PPORT_TYPE_TRUNKED:
@@ -165,25 +186,6 @@ uint16 PortHelper::getPortType(uint32 port_type)
         return FC_PORT_TYPE_NL;
     default:
         return FC_PORT_TYPE_UNKNOWN;
-    }
-}
-
-uint16 PortHelper::getEnabledState(uint16 operational_status)
-{
-    switch (operational_status)
-    {
-    case OPERATIONAL_STATUS_STARTING:
-        return ENABLED_STATE_QUIESCE;
-    case OPERATIONAL_STATUS_STOPPING:
-        return ENABLED_STATE_SHUTTING_DOWN;
-    case OPERATIONAL_STATUS_STOPPED:
-        return ENABLED_STATE_DISABLED;
-    case OPERATIONAL_STATUS_IN_SERVICE:
-        return ENABLED_STATE_ENABLED;
-    case OPERATIONAL_STATUS_LOST_COMMUNICATION:
-        return ENABLED_STATE_OFFLINE;
-    default:
-        return ENABLED_STATE_OTHER;
     }
 }
 
@@ -205,7 +207,7 @@ Ref<ZEMLAR_FCPort> PortHelper::getFCPortInstance(const _hbaPortInfo& info)
     port->ElementName.set(name);
     port->Caption.set(property_text(info.symbolic_name));
     port->OperationalStatus.set({info.operational_status});
-    port->EnabledState.set(getEnabledState(info.operational_status));
+    port->EnabledState.set(enabled_state(info.operational_status));
     port->EnabledDefault.set(ENABLED_STATE_ENABLED);
     port->PortType.set(info.port_type);
     port->UsageRestriction.set(NOT_RESTRICTED);

@@ -41,10 +41,9 @@ public:
 
     static Ref<ZEMLAR_FCPort> getFCPortInstance(const _hbaPortInfo& info);
 
-    // CIM OperationalStatus, PortType and EnabledState for what the driver, or the status, says.
+    // CIM OperationalStatus and PortType for what the driver says.
     static uint16 getPortState(uint32 port_state);
     static uint16 getPortType(uint32 port_type);
-    static uint16 getEnabledState(uint16 operational_status);
 
 private:
     PortHelper() = default;

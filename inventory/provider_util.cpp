@@ -32,6 +32,12 @@ bool read_attributes(hxal_adapter_t* adapter, int ports, hxa_ioc_attr_t& attribu
 
 } // namespace
 
+const ProviderUtil& ProviderUtil::getProviderUtil()
+{
+    static constinit const ProviderUtil util;
+    return util;
+}
+
 String ProviderUtil::getClassName(classId_t id)
 {
     const Scope_Trace trace(log_source);

@@ -26,6 +26,9 @@ enum Host_Info : int
 class ProviderUtil
 {
 public:
+    // The one object, for callers that hold their collaborators; no function needs it.
+    static const ProviderUtil& getProviderUtil();
+
     // Room for an address text and its terminator.
     static constexpr std::size_t wwn_text_size = 17;
     static constexpr std::size_t mac_text_size = 13;
@@ -78,7 +81,8 @@ public:
     static int getAdapterIdByMacAddr(const String& mac);
     static int getAdapterId(const String& address);
 
-    // The adapter's address: of a CNA its MAC address, else its node WWN; empty when it has no FC IOC on port 0.
+    // The adapter's address: of a CNA its MAC address (see read_cna_mac), else its node WWN; empty when port 0 has no IOC to
+    // take it from.
     static String getAddrByAdapterId(int adapter);
 
     // The first Ethernet IOC, failing that FC IOC, of the adapter's lowest port that has one; null when there is none.
@@ -91,6 +95,9 @@ public:
 
     // The host's network interface of the IOC with this MAC address; empty when there is none.
     static String getEthDeviceNameByMAC(const String& mac);
+
+private:
+    ProviderUtil() = default;
 };
 
 } // namespace zmlr

@@ -19,8 +19,7 @@ namespace hxasim
 struct Descriptor
 {
     Node node;
-    std::uint64_t host_number;                     // of the host that it was opened on
-    std::optional<std::uint32_t> application = {}; // as synchronised
+    std::uint64_t host_number; // of the host that it was opened on
 };
 
 // One request while it is answered. The answer sets `status` in its record, or refuses the whole call.
@@ -64,7 +63,7 @@ struct Row
 };
 
 // Where requests to one IOC carry its instance.
-inline constexpr Field instance_field{.offset = 4, .size = 2};
+inline constexpr Field instance_field{.offset = offsetof(hxa_ioctl_gen_t, hxad_num), .size = sizeof(hxa_ioctl_gen_t::hxad_num)};
 
 constexpr std::size_t max_record_size = 4096;
 

@@ -30,7 +30,6 @@ void answer_event_sync(Call& call, hxa_ioctl_aen_t& record)
 {
     if (record.app_id > hxa_aen_app_test)
         return call.refuse(EINVAL, "no such application: " + std::to_string(record.app_id));
-    call.descriptor.application = record.app_id;
     record.status = HXA_STATUS_OK;
 }
 

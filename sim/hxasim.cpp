@@ -34,6 +34,4 @@ std::vector<std::string> violations() { return simulator().violations(); }
 
 int open_descriptors() { return simulator().open_descriptors(); }
 
-std::optional<std::uint32_t> application_of(int descriptor) { return simulator().application_of(descriptor); }
-
 } // namespace hxasim

@@ -59,7 +59,7 @@ void unload();
 
 // Returns and forgets the recorded requests, oldest first. Only the newest are kept: 100,000 of them, 128 MiB of records.
 std::vector<Request> take_requests();
-std::uint64_t request_count();         // requests since load(), taken ones included
+std::uint64_t request_count(); // requests since load(), taken ones included
 
 // Throws std::runtime_error for a fault that could never do what it says: an unknown command or node, a status for a record
 // that carries none, bytes beyond the record, nothing to do at all.
@@ -72,9 +72,6 @@ std::vector<std::string> violations();
 
 // Open descriptors on the simulated nodes.
 int open_descriptors();
-
-// The application identity that was last synchronised with the driver on this descriptor; none before that.
-std::optional<std::uint32_t> application_of(int descriptor);
 
 } // namespace hxasim
 

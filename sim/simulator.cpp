@@ -229,11 +229,4 @@ int Simulator::open_descriptors()
     return static_cast<int>(_descriptors.size());
 }
 
-std::optional<std::uint32_t> Simulator::application_of(int descriptor)
-{
-    auto lock = locked();
-    auto found = _descriptors.find(descriptor);
-    return found == _descriptors.end() ? std::nullopt : found->second.application;
-}
-
 } // namespace hxasim

@@ -34,7 +34,6 @@ public:
     void clear_faults();
     std::vector<std::string> violations();
     int open_descriptors();
-    std::optional<std::uint32_t> application_of(int descriptor);
 
     void lock_for_fork() { _mutex.lock(); }
     void unlock_after_fork() { _mutex.unlock(); }

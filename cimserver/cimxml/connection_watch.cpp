@@ -3,6 +3,7 @@
 #include <sys/socket.h>
 
 #include <iterator>
+#include <new>
 
 namespace cimserver
 {
@@ -41,7 +42,8 @@ Connection_Watch::~Connection_Watch()
     _thread.join();
 }
 
-Connection_Watch::Connection* Connection_Watch::add(int socket)
+Connection_Watch::Connection* Connection_Watch::add(int socket) noexcept
+try
 {
     const std::lock_guard lock(_mutex);
     const Clock::time_point deadline = Clock::now() + _limits.receive;
@@ -52,9 +54,16 @@ Connection_Watch::Connection* Connection_Watch::add(int socket)
     _changed.notify_all();
     return &_connections.back();
 }
+catch (const std::bad_alloc&)
+{
+    shutdown(socket, SHUT_RDWR);
+    return nullptr;
+}
 
 void Connection_Watch::enter(Connection* connection, Phase phase)
 {
+    if (!connection)
+        return;
     const std::lock_guard lock(_mutex);
     connection->phase = phase;
     connection->deadline = Clock::now() + (phase == Phase::sending ? _limits.send : _limits.receive);
@@ -62,6 +71,8 @@ void Connection_Watch::enter(Connection* connection, Phase phase)
 
 void Connection_Watch::remove(Connection* connection)
 {
+    if (!connection)
+        return;
     const std::lock_guard lock(_mutex);
     _connections.erase(connection->self);
 }

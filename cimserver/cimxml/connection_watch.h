@@ -40,8 +40,9 @@ public:
     Connection_Watch& operator=(const Connection_Watch&) = delete;
 
     // Watches a socket, receiving, until remove(), which must come before the socket is closed. Cutting is a shutdown of the
-    // socket: its owner sees it end and closes it. Deadlines are kept to a second.
-    Connection* add(int socket);
+    // socket: its owner sees it end and closes it. Deadlines are kept to a second. Null, and the socket cut, when memory is
+    // out; the other functions do nothing with a null.
+    Connection* add(int socket) noexcept;
     void enter(Connection* connection, Phase phase); // a new phase, or the same one from now on
     void remove(Connection* connection);
 

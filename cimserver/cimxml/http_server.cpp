@@ -6,7 +6,6 @@
 #include "cimserver/cimxml/worker_pool.h"
 
 #include <microhttpd.h>
-#include <unistd.h>
 
 #include <atomic>
 #include <cerrno>
@@ -31,21 +30,24 @@ constexpr std::size_t head_bytes = 32 * 1024;
 // Connections that are being cut still count until the library closes them.
 constexpr unsigned spare_connections = 64;
 
+// A client hears of a refused body only when it has sent all of it. One that goes on beyond this many times the limit is cut.
+constexpr std::size_t max_excess = 4;
+
 // One request on its way: filled by the byte mover, answered by a worker while the connection is suspended.
 struct Exchange
 {
     Http_Request request;
-    bool too_large = false;
+    std::size_t received = 0; // bytes of the body, kept or not
     bool submitted = false;
     std::optional<Http_Answer> answer;
 
     void receive(std::string_view bytes, std::size_t limit)
     {
-        too_large = too_large || bytes.size() > limit - request.body.size();
-        if (too_large)
-            request.body = {};
-        else
+        received += bytes.size();
+        if (received <= limit)
             request.body.append(bytes);
+        else
+            std::string().swap(request.body);
     }
 };
 
@@ -57,7 +59,7 @@ public:
     Daemon(std::uint16_t port, const Http_Limits& limits, Http_Handler handler);
     ~Daemon();
 
-    std::uint16_t port() const { return _listener.port; }
+    std::uint16_t port() const { return _listener.port(); }
     bool stop(Clock::time_point deadline);
 
 private:
@@ -78,9 +80,8 @@ private:
 
     const Http_Limits _limits;
     const Http_Handler _handler;
-    const Listener _listener;
+    Listener _listener;
     std::atomic<bool> _stopping = false;
-    bool _listening = true;
 
     std::mutex _mutex;
     std::condition_variable _answered;
@@ -94,14 +95,14 @@ private:
 Http_Server::Daemon::Daemon(std::uint16_t port, const Http_Limits& limits, Http_Handler handler)
     : _limits(limits)
     , _handler(std::move(handler))
-    , _listener(listen_on_loopback(port))
+    , _listener(port)
     , _watch({limits.connections, limits.receive, limits.send})
     , _pool(limits.workers, limits.waiting_requests)
 {
     const unsigned flags = MHD_USE_EPOLL_INTERNAL_THREAD | MHD_ALLOW_SUSPEND_RESUME;
     // clang-format off
     _http = MHD_start_daemon(flags, 0, nullptr, nullptr, on_request, this,
-                             MHD_OPTION_LISTEN_SOCKET, _listener.socket,
+                             MHD_OPTION_LISTEN_SOCKET, _listener.socket(),
                              MHD_OPTION_CONNECTION_LIMIT, static_cast<unsigned>(limits.connections) + spare_connections,
                              MHD_OPTION_CONNECTION_MEMORY_LIMIT, head_bytes,
                              MHD_OPTION_STRICT_FOR_CLIENT, 1,
@@ -110,10 +111,7 @@ Http_Server::Daemon::Daemon(std::uint16_t port, const Http_Limits& limits, Http_
                              MHD_OPTION_END);
     // clang-format on
     if (!_http)
-    {
-        close(_listener.socket);
         throw std::system_error(errno, std::generic_category(), "cannot start the HTTP server");
-    }
 }
 
 Http_Server::Daemon::~Daemon()
@@ -139,11 +137,10 @@ bool Http_Server::Daemon::stop(Clock::time_point deadline)
 
 void Http_Server::Daemon::close_listener()
 {
-    if (!_listening)
+    if (_listener.socket() < 0)
         return;
-    _listening = false;
     MHD_quiesce_daemon(_http);
-    close(_listener.socket);
+    _listener.close();
 }
 
 // A client that does not take its answer does not keep the server from stopping.
@@ -166,7 +163,7 @@ MHD_Result Http_Server::Daemon::on_request(void* self, MHD_Connection* connectio
             return daemon.finish(connection, exchange);
         exchange.receive({data, *size}, daemon._limits.request_bytes);
         *size = 0;
-        return MHD_YES;
+        return exchange.received <= max_excess * daemon._limits.request_bytes ? MHD_YES : MHD_NO;
     }
     catch (...)
     {
@@ -215,7 +212,7 @@ MHD_Result Http_Server::Daemon::begin(MHD_Connection* connection, std::string_vi
 // Called when the body is complete, and again when the answer is there.
 MHD_Result Http_Server::Daemon::finish(MHD_Connection* connection, Exchange& exchange)
 {
-    if (!exchange.answer && exchange.too_large)
+    if (!exchange.answer && exchange.received > _limits.request_bytes)
         exchange.answer = {MHD_HTTP_CONTENT_TOO_LARGE, "", ""};
     if (!exchange.answer)
     {
@@ -229,6 +226,7 @@ MHD_Result Http_Server::Daemon::finish(MHD_Connection* connection, Exchange& exc
 // The connection is suspended first: a worker may resume it before submit() returns.
 void Http_Server::Daemon::submit(MHD_Connection* connection, Exchange& exchange)
 {
+    Worker_Pool::Job job = [this, connection, &exchange] { work(connection, exchange); };
     enter(connection, Connection_Watch::Phase::working);
     MHD_suspend_connection(connection);
     exchange.submitted = true;
@@ -236,7 +234,7 @@ void Http_Server::Daemon::submit(MHD_Connection* connection, Exchange& exchange)
         const std::lock_guard lock(_mutex);
         ++_unanswered;
     }
-    if (_pool.submit([this, connection, &exchange] { work(connection, exchange); }))
+    if (_pool.submit(std::move(job)))
         return;
     exchange.answer = {MHD_HTTP_SERVICE_UNAVAILABLE, "", ""};
     MHD_resume_connection(connection);

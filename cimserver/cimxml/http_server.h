@@ -2,8 +2,9 @@
 //
 // One thread moves bytes for all connections, a few workers run the handler, so neither a slow client nor a slow operation
 // keeps others from being served. What passes a limit is refused with a status: 413 for a body beyond request_bytes (told
-// by its Content-Length, before any of it is read), 503 when too many requests wait. Clients that do not deliver a request
-// or take an answer in time are cut, and so may be a client that ends its sending side before it has its answer.
+// by its Content-Length, before any of it is read, else at its end), 503 when too many requests wait. Clients that do not
+// deliver a request or take an answer in time are cut, so is a body without a Content-Length that goes on far beyond the
+// limit, and so may be a client that ends its sending side before it has its answer.
 #pragma once
 
 #include "cimserver/cimxml/http_message.h"

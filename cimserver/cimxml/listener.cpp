@@ -17,37 +17,34 @@ namespace
 
 constexpr int backlog = 512; // connections that wait while others are accepted
 
-[[noreturn]] void fail(int socket, std::uint16_t port)
-{
-    const int error = errno;
-    if (socket >= 0)
-        close(socket);
-    throw std::system_error(error, std::generic_category(), "cannot listen on 127.0.0.1:" + std::to_string(port));
-}
-
 sockaddr* as_address(sockaddr_in& address) { return reinterpret_cast<sockaddr*>(&address); }
 
 } // namespace
 
-Listener listen_on_loopback(std::uint16_t port)
+Listener::Listener(std::uint16_t port) : _socket(::socket(AF_INET, SOCK_STREAM | SOCK_CLOEXEC | SOCK_NONBLOCK, 0))
 {
-    const int socket = ::socket(AF_INET, SOCK_STREAM | SOCK_CLOEXEC | SOCK_NONBLOCK, 0);
-    if (socket < 0)
-        fail(socket, port);
-
-    // A restart must not wait for the last connections of the server before it.
-    const int on = 1;
-    setsockopt(socket, SOL_SOCKET, SO_REUSEADDR, &on, sizeof on);
-
+    const int on = 1; // a restart must not wait for the last connections of the server before it
     sockaddr_in address{};
     address.sin_family = AF_INET;
     address.sin_addr.s_addr = htonl(INADDR_LOOPBACK);
     address.sin_port = htons(port);
     socklen_t size = sizeof address;
-    if (bind(socket, as_address(address), size) != 0 || listen(socket, backlog) != 0 ||
-        getsockname(socket, as_address(address), &size) != 0)
-        fail(socket, port);
-    return {socket, ntohs(address.sin_port)};
+    if (_socket < 0 || setsockopt(_socket, SOL_SOCKET, SO_REUSEADDR, &on, sizeof on) != 0 ||
+        bind(_socket, as_address(address), size) != 0 || listen(_socket, backlog) != 0 ||
+        getsockname(_socket, as_address(address), &size) != 0)
+    {
+        const int error = errno;
+        close();
+        throw std::system_error(error, std::generic_category(), "cannot listen on 127.0.0.1:" + std::to_string(port));
+    }
+    _port = ntohs(address.sin_port);
+}
+
+void Listener::close()
+{
+    if (_socket >= 0)
+        ::close(_socket);
+    _socket = -1;
 }
 
 } // namespace cimserver

@@ -6,14 +6,22 @@
 namespace cimserver
 {
 
-// A listening IPv4 socket; whoever takes `socket` closes it.
-struct Listener
+// A listening IPv4 socket on 127.0.0.1.
+class Listener
 {
-    int socket = -1;
-    std::uint16_t port = 0;
-};
+public:
+    explicit Listener(std::uint16_t port); // 0 picks a free one; throws std::system_error when the port cannot be had
+    ~Listener() { close(); }
+    Listener(const Listener&) = delete;
+    Listener& operator=(const Listener&) = delete;
 
-// Listens on 127.0.0.1 only; port 0 picks a free one. Throws std::system_error when the port cannot be had.
-Listener listen_on_loopback(std::uint16_t port);
+    int socket() const { return _socket; } // -1 when closed
+    std::uint16_t port() const { return _port; }
+    void close();
+
+private:
+    int _socket;
+    std::uint16_t _port = 0;
+};
 
 } // namespace cimserver

@@ -103,11 +103,12 @@ Object_Path read_full_path(const Xml_Element& element)
 {
     const Xml_Element& where = element.children.front();
     const Xml_Element& what = element.children.back();
-    const Xml_Element& local = where.name == "NAMESPACEPATH" ? where.children.back() : where;
-    if (local.name != "LOCALNAMESPACEPATH" || what.name == where.name)
+    const bool with_host = where.name == "NAMESPACEPATH";
+    const Xml_Element& local = with_host ? where.children.back() : where;
+    if (local.name != "LOCALNAMESPACEPATH" || what.name == where.name || (with_host && where.children.front().name != "HOST"))
         fail("malformed " + element.name);
     Object_Path path = read_path(what, read_name_space(local));
-    if (where.name == "NAMESPACEPATH")
+    if (with_host)
         path.host = where.children.front().text;
     return path;
 }

@@ -39,7 +39,7 @@ const char* value_type_of(CMPIType type)
 void write_key_value(Xml_Writer& writer, const Value& value)
 {
     const std::optional<std::string> text = value_text(value);
-    writer.start("KEYVALUE").attribute("VALUETYPE", value_type_of(value.type));
+    writer.start("KEYVALUE").attribute("VALUETYPE", text ? value_type_of(value.type) : "string");
     // A key that clients could refuse as a datetime still names its instance as a text.
     if (text)
         writer.attribute("TYPE", cim_type_name(value.type)).text(*text);

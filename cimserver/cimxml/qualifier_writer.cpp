@@ -4,10 +4,8 @@
 #include "cimserver/cimxml/meta_search.h"
 #include "cimserver/qualifier_table.h"
 
-#include <algorithm>
 #include <span>
 #include <string_view>
-#include <vector>
 
 namespace cimserver
 {
@@ -31,7 +29,7 @@ struct Flag_Row
 };
 
 // The flags that are boolean qualifiers, in bit order. Not here: the kinds of features, In and Read, which are true unless
-// said otherwise, and EmbeddedInstance, which names a class.
+// said otherwise, and EmbeddedInstance, which names a class: the table has it.
 // clang-format off
 constexpr Flag_Row flag_rows[] = {
     {zmlr::Flag_Abstract,       "Abstract",       {false, false}},
@@ -92,12 +90,6 @@ void write_flags(Xml_Writer& writer, zmlr::uint32 flags)
             write_boolean(writer, row.name, true, row.flavors);
 }
 
-void write_embedded_class(Xml_Writer& writer, const zmlr::Meta_Feature& feature)
-{
-    if ((feature.flags & zmlr::Flag_EmbeddedInstance) != 0 && zmlr::is_reference(&feature))
-        write_text(writer, "EmbeddedInstance", zmlr::as_reference(&feature)->meta_class->name, {});
-}
-
 using Rows = std::span<const Qualifier_Row>;
 
 // The table's rows by class: rows of one class stand together.
@@ -124,10 +116,12 @@ Rows rows_of(std::string_view class_name)
     return entry == index.end() ? Rows() : entry->second;
 }
 
+bool is_translatable(std::string_view name) { return equal_names(name, "Description") || equal_names(name, "Values"); }
+
 void write_row(Xml_Writer& writer, const Qualifier_Row& row)
 {
     const std::span<const char* const> values(row.values, row.num_values);
-    start_qualifier(writer, row.name, "string", {true, true, !equal_names(row.name, "ValueMap")});
+    start_qualifier(writer, row.name, "string", {true, true, is_translatable(row.name)});
     if (row.array)
         writer.start("VALUE.ARRAY");
     for (const char* value : values)
@@ -139,17 +133,9 @@ void write_row(Xml_Writer& writer, const Qualifier_Row& row)
 
 void write_rows(Xml_Writer& writer, const zmlr::Meta_Class& meta_class, std::string_view feature)
 {
-    std::vector<std::string_view> written;
-    const auto is_written = [&](std::string_view name)
-    { return std::ranges::any_of(written, [&](std::string_view other) { return equal_names(name, other); }); };
-    for (const zmlr::Meta_Class* ancestor = &meta_class; ancestor; ancestor = ancestor->super_meta_class)
-        for (const Qualifier_Row& row : rows_of(ancestor->name))
-        {
-            if (!equal_names(row.feature_name, feature) || is_written(row.name))
-                continue;
+    for (const Qualifier_Row& row : rows_of(meta_class.name))
+        if (equal_names(row.feature_name, feature))
             write_row(writer, row);
-            written.emplace_back(row.name);
-        }
 }
 
 bool overrides(const zmlr::Meta_Class& meta_class, unsigned index)
@@ -175,15 +161,14 @@ void write_feature_qualifiers(Xml_Writer& writer, const zmlr::Meta_Class& meta_c
         write_boolean(writer, "Read", false, {});
     if (overrides(meta_class, index))
         write_text(writer, "Override", feature.name, {true, false});
-    write_embedded_class(writer, feature);
-    write_rows(writer, meta_class, feature.name);
+    if (const zmlr::Meta_Class* origin = origin_of(meta_class, feature.name))
+        write_rows(writer, *origin, feature.name);
 }
 
 void write_parameter_qualifiers(Xml_Writer& writer, const zmlr::Meta_Feature& parameter)
 {
     write_boolean(writer, "In", (parameter.flags & zmlr::Flag_In) != 0, {false, true});
     write_flags(writer, parameter.flags);
-    write_embedded_class(writer, parameter);
 }
 
 } // namespace cimserver

@@ -8,7 +8,7 @@
 namespace cimserver
 {
 
-// A row of the table that stands at an ancestor holds for the class and its features unless a nearer class has its own.
+// The table's rows of the class itself, and of a feature those of the class that declares it or last overrides it.
 void write_class_qualifiers(Xml_Writer& writer, const zmlr::Meta_Class& meta_class);
 void write_feature_qualifiers(Xml_Writer& writer, const zmlr::Meta_Class& meta_class, unsigned feature_index);
 

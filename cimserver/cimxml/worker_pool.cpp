@@ -1,14 +1,21 @@
 #include "cimserver/cimxml/worker_pool.h"
 
+#include <new>
 #include <utility>
 
 namespace cimserver
 {
 
-Worker_Pool::Worker_Pool(unsigned workers, std::size_t max_waiting) : _max_waiting(max_waiting), _running(workers)
+// Delegates, so that the destructor ends the threads there are when one more cannot be had.
+Worker_Pool::Worker_Pool(unsigned workers, std::size_t max_waiting) : Worker_Pool(max_waiting)
 {
+    _workers.reserve(workers);
     for (unsigned i = 0; i < workers; ++i)
+    {
         _workers.emplace_back([this] { work(); });
+        const std::lock_guard lock(_mutex);
+        ++_running;
+    }
 }
 
 Worker_Pool::~Worker_Pool()
@@ -18,7 +25,8 @@ Worker_Pool::~Worker_Pool()
     }
 }
 
-bool Worker_Pool::submit(Job job)
+bool Worker_Pool::submit(Job job) noexcept
+try
 {
     {
         const std::lock_guard lock(_mutex);
@@ -28,6 +36,10 @@ bool Worker_Pool::submit(Job job)
     }
     _changed.notify_one();
     return true;
+}
+catch (const std::bad_alloc&)
+{
+    return false;
 }
 
 bool Worker_Pool::stop(std::chrono::steady_clock::time_point deadline)

@@ -24,14 +24,15 @@ public:
     Worker_Pool(const Worker_Pool&) = delete;
     Worker_Pool& operator=(const Worker_Pool&) = delete;
 
-    // False, and the job is not taken, when max_waiting jobs wait already or the pool has been stopped.
-    bool submit(Job job);
+    // False, and the job is not taken, when max_waiting jobs wait already, memory is out or the pool has been stopped.
+    bool submit(Job job) noexcept;
 
     // Takes no more jobs and runs those accepted. False when they had not finished by the deadline; they go on, and stop()
     // may be called again.
     bool stop(std::chrono::steady_clock::time_point deadline);
 
 private:
+    explicit Worker_Pool(std::size_t max_waiting) : _max_waiting(max_waiting) {}
     void work();
 
     std::mutex _mutex;

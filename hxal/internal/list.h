@@ -50,7 +50,6 @@ void list_free(hxal_adapter_t*& head);
 template <typename Node> struct List
 {
     List() = default;
-    List(List&& other) noexcept : head(std::exchange(other.head, nullptr)), count(std::exchange(other.count, 0)) {}
     ~List() { list_free(head); }
 
     List& operator=(List&& other) noexcept

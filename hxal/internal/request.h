@@ -32,6 +32,7 @@ public:
 // A record of zeros for the IOC.
 template <typename Record> Record request_for(const hxal_s& ioc)
 {
+    static_assert(offsetof(Record, hxad_num) == offsetof(hxa_ioctl_gen_t, hxad_num));
     Record record{};
     record.hxad_num = static_cast<uint16_t>(ioc.instance);
     return record;

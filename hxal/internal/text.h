@@ -16,8 +16,12 @@ template <std::size_t To, std::size_t From> void copy_text(char (&to)[To], const
     std::memset(to + length, 0, To - length);
 }
 
-// Whether a caller's text, which may be missing, is the text of a field.
-inline bool same_text(const char* wanted, const char* field) { return wanted && std::strcmp(wanted, field) == 0; }
+// Whether a caller's text, which may be missing, is the text of a field. A full field may have been cut: what the caller has
+// beyond it does not count.
+template <std::size_t Size> bool same_text(const char* wanted, const char (&field)[Size])
+{
+    return wanted && std::strncmp(wanted, field, Size - 1) == 0;
+}
 
 // Copies a terminated text into a caller's buffer, which may be missing.
 inline void copy_out(char* buffer, const char* field)

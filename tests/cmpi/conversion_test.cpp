@@ -5,6 +5,9 @@
 
 #include <gmock/gmock.h>
 
+#include <malloc.h>
+#include <stdexcept>
+
 using namespace test;
 using testing::ElementsAre;
 using testing::IsEmpty;
@@ -98,7 +101,7 @@ TEST_F(Conversion, gives_every_type_its_code_and_bits)
         EXPECT_EQ(value(properties, name).type, type) << name;
         EXPECT_FALSE(value(properties, name).null()) << name;
     }
-    EXPECT_EQ(value(properties, "Uint32s").type, CMPI_uint32 | CMPI_ARRAY);
+    EXPECT_EQ(value(properties, "Sint64s").type, CMPI_sint64 | CMPI_ARRAY);
     EXPECT_EQ(std::get<std::uint64_t>(value(properties, "Uint64").content), 0xFFFFFFFFFFFFFFFF);
     EXPECT_EQ(std::get<std::int64_t>(value(properties, "Sint8").content), -128);
     EXPECT_EQ(std::get<std::uint64_t>(value(properties, "Char16").content), 0x20ACU);
@@ -167,8 +170,8 @@ TEST_F(Conversion, leaves_bad_items_null_and_says_why)
         {{"Unknown", string("x")}, {"Container: unknown feature: Test_Thing.Unknown"}},
         {{"Uint16", {CMPI_uint32, std::uint64_t{1}}},
          {"CMPI_Containers: type mismatch on Uint16: uint16/uint32", "Container: conversion error: Test_Thing.Uint16"}},
-        {{"uint16s", {CMPI_uint16, std::uint64_t{1}}},
-         {"CMPI_Containers: type mismatch on uint16s: uint16_array/uint16", "Container: conversion error: Test_Thing.uint16s"}},
+        {{"uint8s", {CMPI_uint8, std::uint64_t{1}}},
+         {"CMPI_Containers: type mismatch on uint8s: uint8_array/uint8", "Container: conversion error: Test_Thing.uint8s"}},
         {{"Uint8", {CMPI_uint8, {}}}, {}},
         {{"Uint8s", {CMPI_uint8 | CMPI_ARRAY, {}}}, {}},
         {{"Name", reference("Test_Thing", {})},
@@ -226,6 +229,57 @@ TEST_F(Conversion, copes_with_data_that_hold_nothing)
     EXPECT_THAT(message(CMPI_ref), ElementsAre("Converter: null instance", "Converter: failed to create CIMPLE instance"));
     EXPECT_THAT(message(CMPI_args), ElementsAre("Converter: unknown type"));
     EXPECT_THAT(logged([&] { convert(CMPI_string, made); }, "INFO"), ElementsAre("Converter: ignored null CMPI string"));
+}
+
+TEST_F(Conversion, survives_a_server_that_throws_or_answers_nothing)
+{
+    CMPIInstanceFT instance_table = Instance_Object::table;
+    instance_table.getPropertyCount = [](const CMPIInstance*, CMPIStatus*) { return CMPICount{1}; };
+    instance_table.release = [](CMPIInstance*) -> CMPIStatus { throw std::runtime_error("release"); };
+    CMPIInstance face = {nullptr, &instance_table};
+    const auto take = [&] { from_cmpi<Test_Thing>(CMPI_Ptr<CMPIInstance>(&face).get()); };
+    instance_table.getPropertyAt = [](const CMPIInstance*, CMPICount, CMPIString**, CMPIStatus*) -> CMPIData { throw 1; };
+    EXPECT_THAT(logged(take), ElementsAre("CMPI_Containers: CMGetPropertyAt() threw exception: index=0 size=1",
+                                          "Container: get_name() failed: class=Test_Thing, index=0"));
+    instance_table.getPropertyAt = [](const CMPIInstance*, CMPICount, CMPIString**, CMPIStatus*) -> CMPIData { return {}; };
+    EXPECT_THAT(logged(take), ElementsAre("CMPI_Containers: CMGetPropertyAt() failed",
+                                          "Container: get_name() failed: class=Test_Thing, index=0"));
+
+    CMPIObjectPathFT path_table = Path_Object::table;
+    path_table.getClassName = [](const CMPIObjectPath*, CMPIStatus*) -> CMPIString* { return nullptr; };
+    CMPIObjectPath nameless = {nullptr, &path_table};
+    CMPIStringFT string_table = cimserver::String_Object::table;
+    string_table.getCharPtr = [](const CMPIString*, CMPIStatus*) -> const char* { return nullptr; };
+    CMPIString mute = {nullptr, &string_table};
+    Value made;
+    const auto convert = [&](CMPIType type, CMPIValue content) {
+        return cmpi_to_cimple_value(&repository, broker.face(), name_space, {type, CMPI_goodValue, content}, made);
+    };
+    EXPECT_THAT(logged([&] { EXPECT_EQ(convert(CMPI_ref, {.ref = &nameless}), -1); }),
+                ElementsAre("Converter: CMGetClassName() failed", "Converter: failed to create CIMPLE instance"));
+    EXPECT_THAT(logged([&] { EXPECT_EQ(convert(CMPI_string, {.string = &mute}), 0); }),
+                ElementsAre("Converter: CMGetCharsPtr() failed"));
+    EXPECT_EQ(*made.get_if<String>(), "");
+}
+
+TEST_F(Conversion, leaves_no_object_with_the_broker_in_a_long_request)
+{
+    const Ref<Test_Link> original = make_link("a", "b");
+    original->Detail = thing("detail").steal();
+    original->Detail->When.set(Datetime(7));
+    original->Detail->Uint8s.set({1, 2});
+    const auto convert = [&]
+    {
+        CMPI_Ptr<CMPIObjectPath> object_path;
+        CMPI_Ptr<CMPIInstance> made;
+        EXPECT_EQ(make_cmpi_object_path(broker.face(), original.ptr(), name_space, object_path), CMPI_RC_OK);
+        EXPECT_EQ(make_cmpi_instance(broker.face(), original.ptr(), name_space, object_path.get(), nullptr, made), CMPI_RC_OK);
+    };
+    convert();
+    const std::size_t before = mallinfo2().uordblks;
+    for (int i = 0; i < 5'000; ++i)
+        convert();
+    EXPECT_LT(mallinfo2().uordblks, before + 100'000);
 }
 
 TEST_F(Conversion, says_what_cannot_be_sent)

@@ -1,5 +1,4 @@
 // The life of an adapter: made by the first factory call, shared by all interfaces, gone with the last cleanup.
-#include "cmpi/cmpi_trace.h"
 #include "cmpi/thread_context.h"
 #include "tests/cmpi/served_provider.h"
 
@@ -9,6 +8,8 @@
 #include <thread>
 
 using namespace test;
+using testing::Each;
+using testing::ElementsAre;
 
 namespace
 {
@@ -20,15 +21,31 @@ protected:
     {
         return mi->ft->cleanup(mi, request.context(), terminating).rc;
     }
+
+    // One interface of each kind, all of one provider.
+    struct Kinds
+    {
+        CMPIInstanceMI* instances;
+        CMPIMethodMI* methods;
+        CMPIAssociationMI* associations;
+        CMPIIndicationMI* indications;
+    };
+    Kinds all_kinds()
+    {
+        return {links(), interface<CMPIMethodMI>('M', link_data, link_registration),
+                interface<CMPIAssociationMI>('A', link_data, link_registration),
+                interface<CMPIIndicationMI>('N', link_data, link_registration)};
+    }
+    std::vector<CMPIrc> clean_up_all(const Kinds& kinds, bool terminating)
+    {
+        return {clean_up(kinds.instances, terminating), clean_up(kinds.methods, terminating),
+                clean_up(kinds.associations, terminating), clean_up(kinds.indications, terminating)};
+    }
 };
 
 TEST_F(Life, all_interfaces_share_one_adapter_and_one_loaded_provider)
 {
-    auto* instances = links();
-    auto* methods = interface<CMPIMethodMI>('M', link_data, link_registration);
-    auto* associations = interface<CMPIAssociationMI>('A', link_data, link_registration);
-    auto* indications = interface<CMPIIndicationMI>('N', link_data, link_registration);
-
+    const auto [instances, methods, associations, indications] = all_kinds();
     ASSERT_TRUE(link_data.adapter);
     EXPECT_EQ(link_data.adapter->load_count, 4U);
     EXPECT_EQ(link_data.adapter->mc, &Test_Link::static_meta_class);
@@ -75,15 +92,48 @@ TEST_F(Life, the_last_cleanup_unloads_and_the_next_factory_call_begins_afresh)
 
 TEST_F(Life, an_adapter_that_may_not_unload_stays_until_the_server_ends)
 {
-    auto* associations = interface<CMPIAssociationMI>('A', link_data, link_registration);
-    auto* indications = interface<CMPIIndicationMI>('N', link_data, link_registration);
+    const Kinds kinds = all_kinds();
     link_data.adapter->allow_unload = false;
-    EXPECT_EQ(clean_up(associations), CMPI_RC_DO_NOT_UNLOAD);
-    EXPECT_EQ(clean_up(indications), CMPI_RC_DO_NOT_UNLOAD);
-    EXPECT_EQ(link_data.adapter->load_count, 2U);
-    EXPECT_EQ(clean_up(associations, true), CMPI_RC_OK);
-    EXPECT_EQ(clean_up(indications, true), CMPI_RC_OK);
+    EXPECT_THAT(clean_up_all(kinds, false), Each(CMPI_RC_DO_NOT_UNLOAD));
+    EXPECT_EQ(link_data.adapter->load_count, 4U);
+    EXPECT_EQ(script.unloads, 0);
+    EXPECT_THAT(clean_up_all(kinds, true), Each(CMPI_RC_OK));
+    EXPECT_EQ(script.unloads, 1);
     EXPECT_EQ(script.providers, 0);
+}
+
+TEST_F(Life, coming_and_going_are_traced_in_order)
+{
+    EXPECT_THAT(logged([&] { links(); }, "DBG"),
+                ElementsAre("CMPI_Adapter: enter: CMPI_Adapter()", "CMPI_Adapter: return: CMPI_Adapter()",
+                            "CMPI_Adapter: enter: cimple_cmpi_adapter()", "CMPI_Adapter: return: cimple_cmpi_adapter()"));
+    const Kinds kinds = all_kinds();
+    std::vector<std::string> lines;
+    for (const char* kind : {"instance", "method", "association", "indication"})
+    {
+        lines.push_back(std::string("CMPI_Adapter: enter: ") + kind + "Cleanup()");
+        lines.push_back(std::string("CMPI_Adapter: return: ") + kind + "Cleanup(): CMPI_RC_OK");
+    }
+    EXPECT_EQ(logged([&] { clean_up_all(kinds, false); }, "DBG"), lines);
+}
+
+TEST_F(Life, a_provider_unloads_in_the_thread_context_of_the_interface_that_goes_last)
+{
+    const Kinds kinds = all_kinds();
+    std::vector<bool> in_context;
+    script.on_unload = [&] { in_context.push_back(Thread_Context::top() != nullptr); };
+    const auto last = [&](auto* mi)
+    {
+        link_data.adapter->load_count = 1;
+        clean_up(mi);
+        links();
+    };
+    last(kinds.instances);
+    last(kinds.methods);
+    last(kinds.associations);
+    last(kinds.indications);
+    EXPECT_THAT(in_context, ElementsAre(true, true, false, true));
+    EXPECT_EQ(Thread_Context::top(), nullptr);
 }
 
 TEST_F(Life, exceptions_of_a_provider_reach_nobody)
@@ -147,15 +197,6 @@ TEST_F(Life_Death_Test, a_broken_interface_is_an_internal_error)
     EXPECT_DEATH((thing_data.magic = 0, call(mi)), "assert: sd->magic == STATIC_DATA_MAGIC\n\n");
     EXPECT_DEATH((thing_data.magic = 0, delete adapter), "assert: sd->magic == STATIC_DATA_MAGIC\n\n");
     EXPECT_DEATH((adapter->magic.~Magic(), call(mi)), "assert: sd->adapter->magic\n\n");
-}
-
-TEST(Return_Codes, have_their_names)
-{
-    EXPECT_STREQ(_rc_to_str(CMPI_RC_OK), "CMPI_RC_OK");
-    EXPECT_STREQ(_rc_to_str(CMPI_RC_ERR_FAILED), "CMPI_RC_ERR_FAILED");
-    EXPECT_STREQ(_rc_to_str(CMPI_RC_DO_NOT_UNLOAD), "CMPI_RC_DO_NOT_UNLOAD");
-    EXPECT_STREQ(_rc_to_str(CMPI_RC_ERROR), "CMPI_RC_ERROR");
-    EXPECT_STREQ(_rc_to_str(static_cast<CMPIrc>(18)), "CMPI_RC_ERR_FAILED");
 }
 
 } // namespace

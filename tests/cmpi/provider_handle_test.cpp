@@ -215,13 +215,6 @@ TEST_F(Associations, of_an_ordinary_class_fail_without_a_word_to_the_provider)
     EXPECT_EQ(script.enumerations, 0);
 }
 
-TEST_F(Associations, have_no_associators_of_their_own)
-{
-    Received received;
-    EXPECT_EQ(links.enum_associators(source.ptr(), "", "", "", receive, &received), ENUM_ASSOCIATORS_UNSUPPORTED);
-    EXPECT_THAT(received.names, IsEmpty());
-}
-
 TEST_F(Associations, lose_nothing_when_a_callback_throws)
 {
     offer_links();
@@ -248,15 +241,8 @@ TEST_F(Procedure, answers_minus_one_for_what_the_class_does_not_have)
     EXPECT_EQ(static_cast<int>(things.disable_indications()), -1);
 }
 
-TEST_F(Procedure, makes_one_provider_a_handle_and_marks_each_end_once)
+TEST_F(Procedure, marks_the_end_of_an_enumeration_once)
 {
-    EXPECT_EQ(script.providers, 2);
-    {
-        const Provider_Handle handle(&thing_registration);
-        EXPECT_EQ(script.providers, 3);
-    }
-    EXPECT_EQ(script.providers, 2);
-
     offer("x", "y");
     for (const auto status : {ENUM_INSTANCES_OK, ENUM_INSTANCES_FAILED})
     {

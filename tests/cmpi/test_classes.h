@@ -29,15 +29,7 @@ struct Test_Thing : Instance
     Property<Datetime> When;
     Property<Array<boolean>> Booleans;
     Property<Array<uint8>> Uint8s;
-    Property<Array<sint8>> Sint8s;
-    Property<Array<uint16>> Uint16s;
-    Property<Array<sint16>> Sint16s;
-    Property<Array<uint32>> Uint32s;
-    Property<Array<sint32>> Sint32s;
-    Property<Array<uint64>> Uint64s;
     Property<Array<sint64>> Sint64s;
-    Property<Array<real32>> Real32s;
-    Property<Array<real64>> Real64s;
     Property<Array<char16>> Char16s;
     Property<Array<String>> Strings;
     Property<Array<Datetime>> Whens;

@@ -89,14 +89,12 @@ public:
     Enum_Associator_Names_Status enum_associator_names(const Instance*, const String&, const String&, const String&,
                                                        Enum_Associator_Names_Handler<Instance>&) override
     {
-        ++Script::get().association_requests;
         return Script::get().enum_associator_names;
     }
 
     Enum_References_Status enum_references(const Instance*, const Test_Link*, const String&,
                                            Enum_References_Handler<Test_Link>&) override
     {
-        ++Script::get().association_requests;
         return Script::get().enum_references;
     }
 };

@@ -33,7 +33,6 @@ struct Script
     int loads = 0;
     int unloads = 0;
     int enumerations = 0;
-    int association_requests = 0;
     int delivered = 0;
     Ref<Instance> model; // of the last request
     Ref<Instance> instance;

@@ -60,6 +60,14 @@ def test_a_port_that_fails_is_skipped_while_it_fails(start):
     assert len(host.device_ids()) == 2, "everything is read anew for every request"
 
 
+def test_a_text_of_any_bytes_spoils_no_answer(start):
+    symbolic_name = {"offset": 48, "bytes": b"<&]]>\x01\x80\xc3\xa9\xff'\0".hex()}
+    host = start({**HBA, "faults": [{"command": "IOCMD_PORT_GET_ATTR", "answer": symbolic_name}]})
+    expected = ["<&]]>??\u00e9?'"] * 2
+    assert [port["Caption"] for port in host.pywbem.EnumerateInstances("ZEMLAR_FCPort")] == expected
+    assert [port["Caption"] for port in host.wbemcli.enumerate_instances("ZEMLAR_FCPort")] == expected
+
+
 def test_large_host(start):
     host = start("large")
     ids = host.device_ids()

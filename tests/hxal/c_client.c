@@ -8,7 +8,7 @@ static void print_port(const hxal_adapter_t* adapter, int port)
     const hxal_t* ioc = hxal_adapter_get_ioc(adapter, port);
     hxa_pport_attr_t attr;
     if (hxal_port_get_attr(ioc, &attr) == HXA_STATUS_OK)
-        printf("  port %d: %s, %s\n", port, hxal_port_get_state_name(attr.port_state), hxal_pport_speed_to_string(attr.speed));
+        printf("  port %d: %s, %s\n", port, hxal_pport_states_to_string(attr.port_state), hxal_pport_speed_to_string(attr.speed));
 }
 
 static void print_adapter(int ad)

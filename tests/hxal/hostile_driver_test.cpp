@@ -1,4 +1,7 @@
+#include "hxal/records/commands.h"
 #include "simulated_host.h"
+
+#include <random>
 
 namespace
 {
@@ -6,6 +9,39 @@ namespace
 class Hostile_Driver : public Simulated_Host
 {
 protected:
+    // From here on every answer is random; most of them keep the status and the instances, so that the scan goes on.
+    void answer_random_bytes()
+    {
+        hxasim::clear_faults();
+        for (const hxal::Command& command : hxal::catalogue)
+            for (const std::optional<int> instance : {std::optional(0), std::optional(1), std::optional<int>()})
+            {
+                const std::size_t kept = random() % 8 == 0 ? 0 : command.name == "IOCMD_IOC_GET_INST" ? 9 : 8;
+                std::vector<std::uint8_t> bytes(command.size - kept);
+                std::generate(bytes.begin(), bytes.end(), [this] { return static_cast<std::uint8_t>(random()); });
+                hxasim::inject(
+                    {.command = std::string(command.name), .instance = instance, .answer = {{kept, std::move(bytes)}}});
+            }
+    }
+
+    static void use_adapter(int ad)
+    {
+        hxal_adapter_get_name(static_cast<unsigned>(ad));
+        hxal_adapter_is_enabled(ad);
+        for (int port = 0; port < hxal_adapter_get_num_port(ad); ++port)
+        {
+            hxa_pport_attr_t attr;
+            hxal_t* ioc = hxal_adapter_get_ioc(hxal_adapter_open_idx(ad), port);
+            if (hxal_port_get_attr(ioc, &attr) == HXA_STATUS_OK)
+                hxal_pport_states_to_string(attr.port_state);
+            hxal_ioc_get_current_mac(ioc);
+        }
+        const hxal_adapter_t* adapter = hxal_adapter_open_idx(ad);
+        EXPECT_EQ(hxal_adapter_lookup(adapter->serial_num)->id, ad);
+        EXPECT_LT(strnlen(adapter->model_descr, sizeof adapter->model_descr), sizeof adapter->model_descr);
+    }
+
+    std::minstd_rand random{1};
     static constexpr std::size_t port_id = offsetof(hxa_ioctl_ioc_attr_t, attr) + offsetof(hxa_ioc_attr_t, port_id);
     static constexpr std::size_t pcifn = offsetof(hxa_ioctl_ioc_attr_t, attr) + offsetof(hxa_ioc_attr_t, pci_attr.pcifn);
     static constexpr std::size_t model_descr =
@@ -21,7 +57,7 @@ TEST_F(Hostile_Driver, that_ends_no_text_is_cut_at_the_field)
     ASSERT_EQ(hxal_adapter_scan(), 1);
 
     const hxal_t* ioc = hxal_ioc_open_idx(1);
-    EXPECT_EQ(std::strlen(ioc->serialnum), 11u);
+    EXPECT_STREQ(hxal_ioc_get_sn(ioc), "xxxxxxxxxxx");
     EXPECT_EQ(std::strlen(ioc->ioc_hwpath), 31u);
     EXPECT_EQ(std::strlen(ioc->adapter_hwpath), 31u);
     EXPECT_EQ(std::strlen(ioc->name), 63u);
@@ -29,6 +65,35 @@ TEST_F(Hostile_Driver, that_ends_no_text_is_cut_at_the_field)
     EXPECT_EQ(std::strlen(ioc->eth_name), 63u);
     EXPECT_EQ(std::strlen(hxal_adapter_open_idx(1)->model_descr), 127u);
     EXPECT_EQ(std::strlen(hxal_adapter_get_name(1)), 63u);
+}
+
+TEST_F(Hostile_Driver, that_fills_a_serial_number_has_it_looked_up_whole_and_cut)
+{
+    host(R"({"adapters": [{"kind": "fc-hba", "serial": "12345678901"}, {"kind": "fc-hba", "serial": "A23456789012"}]})");
+    ASSERT_EQ(hxal_adapter_scan(), 2);
+    EXPECT_EQ(hxal_adapter_get_idx_by_sn("12345678901"), 1u);
+    EXPECT_EQ(hxal_adapter_get_idx_by_sn("A23456789012"), 2u);
+    EXPECT_EQ(hxal_adapter_get_idx_by_sn("A2345678901"), 2u);
+    for (const char* other : {"", "1", "1234567890", "A234567890", "A2345678911"})
+        EXPECT_EQ(hxal_adapter_get_idx_by_sn(other), 0u) << other;
+}
+
+TEST_F(Hostile_Driver, that_answers_random_bytes_breaks_nothing)
+{
+    host(one_cna);
+    testing::internal::CaptureStdout();
+    int scans_with_adapters = 0;
+    for (int round = 0; round < 300; ++round)
+    {
+        answer_random_bytes();
+        const int count = hxal_adapter_scan();
+        for (int ad = 1; ad <= count; ++ad)
+            use_adapter(ad);
+        scans_with_adapters += count > 0;
+        EXPECT_LE(hxasim::open_descriptors(), 2);
+    }
+    testing::internal::GetCapturedStdout();
+    EXPECT_GT(scans_with_adapters, 30);
 }
 
 TEST_F(Hostile_Driver, that_invents_an_ioc_type_is_taken_for_the_type_of_its_node)

@@ -62,9 +62,6 @@ TEST(Texts, of_values_first_last_and_beside_the_table)
         {hxal_get_sfp_media,                  0,           "--"},
         {hxal_get_sfp_media,                  5,           "us"},
         {hxal_get_sfp_media,                  6,           "--"},
-        {hxal_port_get_state_name,            5,           "Linkup"},
-        {hxal_port_get_state_name,            13,          "Disabled#"},
-        {hxal_port_get_state_name,            14,          "Unknown"},
     };
     // clang-format on
     for (const Case& each : cases)

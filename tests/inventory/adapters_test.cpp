@@ -1,4 +1,5 @@
 #include "inventory/fchba_manager.h"
+#include "inventory/provider_util.h"
 #include "tests/inventory/inventory_fixture.h"
 
 #include <cerrno>
@@ -115,6 +116,17 @@ TEST_F(Adapters, Are_Read_From_What_Answers)
     EXPECT_THAT(lines, Contains("ERR AdapterHelper: hxal_ioc_get_attr call to fill fc attributes failed for Adapter id 1"));
     EXPECT_THAT(lines, Contains("WARN AdapterHelper: hxal_ioc_get_info() failed"));
     EXPECT_THAT(lines, Contains("INFO AdapterHelper: Using hxal_ioc_get_mac() to get Mac address"));
+}
+
+// Where the FC driver is missing or fails, the Ethernet side is all there is: its MAC address still tells the adapters apart.
+TEST_F(Adapters, Keep_A_Key_Of_Their_Own_Without_The_FC_Driver)
+{
+    plug_text(R"({"adapters": [{"kind": "cna"}, {"kind": "cna"}],
+        "faults": [{"command": "IOCMD_IOC_GET_INST", "node": "/dev/hxa", "error": "EIO"}]})");
+    EXPECT_THAT(values("DeviceID"), ElementsAre(R"("00051E200000")", R"("00051E200100")"));
+    EXPECT_THAT(log(), Contains("WARN AdapterHelper: hxal_adapter_get_fcioc failed for adapter Index: 2"));
+    EXPECT_STREQ(ProviderUtil::getAddrByAdapterId(2).c_str(), "00051E200100");
+    EXPECT_EQ(ProviderUtil::getAdapterId("00051E200100"), 2);
 }
 
 TEST_F(Adapters, Are_Skipped_One_By_One_When_They_Fail)

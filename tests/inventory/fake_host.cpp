@@ -2,6 +2,7 @@
 
 #include <arpa/inet.h>
 #include <netdb.h>
+#include <sys/utsname.h>
 #include <unistd.h>
 
 #include <cerrno>
@@ -54,6 +55,12 @@ extern "C" int gethostname(char* out, size_t size) noexcept
     if (zmlr::fake_host.name_answers > 0)
         zmlr::fake_host.name_answers--;
     return zmlr::answer(zmlr::fake_host.name, out, size);
+}
+
+extern "C" int uname(utsname* out) noexcept
+{
+    *out = {};
+    return zmlr::answer(zmlr::fake_host.name, out->nodename, sizeof out->nodename - 1);
 }
 
 extern "C" int getdomainname(char* out, size_t size) noexcept { return zmlr::answer(zmlr::fake_host.domain, out, size); }

@@ -11,7 +11,7 @@ namespace zmlr
 
 struct Fake_Host
 {
-    std::optional<std::string> name = "storage-host"; // unset: gethostname fails
+    std::optional<std::string> name = "storage-host"; // unset: gethostname and uname fail
     int name_answers = -1;                            // then fails after this many answers; -1: never
     std::vector<std::string> addresses = {"192.0.2.10"};
     std::optional<std::string> domain = "(none)"; // unset: getdomainname fails

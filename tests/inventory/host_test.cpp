@@ -89,9 +89,16 @@ TEST_F(Host, Paths_Begin_With_The_Host)
 {
     EXPECT_STREQ(ProviderUtil::updateNamespacePath("ZEMLAR_FCPort.DeviceID=\"1\"").c_str(),
                  "//192.0.2.10/root/zemlar:ZEMLAR_FCPort.DeviceID=\"1\"");
-    EXPECT_FALSE(ProviderUtil::getHostName().empty());
     EXPECT_TRUE(ProviderUtil::IsFileExist("/"));
     EXPECT_FALSE(ProviderUtil::IsFileExist("/no/such/file"));
+}
+
+TEST_F(Host, Name_Is_The_Node_s)
+{
+    const ProviderUtil& util = ProviderUtil::getProviderUtil();
+    EXPECT_STREQ(util.getHostName().c_str(), "storage-host");
+    fake_host.name.reset();
+    EXPECT_STREQ(util.getHostName().c_str(), "localhost");
 }
 
 TEST_F(Host, Is_One_Computer_System)

@@ -73,6 +73,7 @@ TEST_F(Lookups, Tell_The_Key_Of_An_Adapter)
 {
     EXPECT_STREQ(ProviderUtil::getAddrByAdapterId(1).c_str(), "00051E300000");
     EXPECT_STREQ(ProviderUtil::getAddrByAdapterId(2).c_str(), "200000051E100100");
+    EXPECT_THAT(requests(), ElementsAre("IOCMD_IOC_GET_INFO /dev/hxa 0"));
     EXPECT_STREQ(ProviderUtil::getAddrByAdapterId(0).c_str(), "");
     EXPECT_STREQ(ProviderUtil::getAddrByAdapterId(3).c_str(), "");
 }

@@ -12,14 +12,42 @@ std::string text_of(const cimserver::Instance& instance, const std::string& prop
     return "(none)";
 }
 
+namespace
+{
+
+std::string text_of(const cimserver::Value& value)
+{
+    if (const auto* text = std::get_if<std::string>(&value.content))
+        return '"' + *text + '"';
+    if (const auto* number = std::get_if<std::uint64_t>(&value.content))
+        return std::to_string(*number);
+    std::string texts;
+    for (const auto& element : std::get<std::vector<cimserver::Value>>(value.content))
+        texts += (texts.empty() ? "" : ", ") + text_of(element);
+    return '{' + texts + '}';
+}
+
+} // namespace
+
+std::string describe(const cimserver::Instance& instance)
+{
+    std::string text = instance.path.class_name + '\n';
+    for (const auto& [name, value] : instance.properties)
+        if (!value.null())
+            text += "    " + name + " = " + text_of(value) + '\n';
+    return text;
+}
+
 void Loaded_Module::load(const std::string& scenario)
 {
+    unload();
     hxasim::load(scenario);
     load_module();
 }
 
 void Loaded_Module::load_text(const std::string& json)
 {
+    unload();
     hxasim::load_text(json);
     load_module();
 }
@@ -28,6 +56,13 @@ void Loaded_Module::load_module()
 {
     _module = std::make_unique<cimserver::Module>(module_path);
     _operations = std::make_unique<cimserver::Module_Operations>(*_module);
+}
+
+// A module that is still mapped would not look at the new host.
+void Loaded_Module::unload()
+{
+    _operations.reset();
+    _module.reset();
 }
 
 std::vector<cimserver::Instance> Loaded_Module::enumerate(const std::string& class_name)
@@ -46,7 +81,6 @@ std::vector<std::string> Loaded_Module::requests()
 void Loaded_Module::TearDown()
 {
     EXPECT_THAT(hxasim::violations(), testing::IsEmpty());
-    _operations.reset();
-    _module.reset();
+    unload();
     hxasim::unload();
 }

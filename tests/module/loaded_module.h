@@ -18,10 +18,13 @@ inline constexpr const char* name_space = "root/zemlar";
 // The text of a string property; "(null)" when it is null, "(none)" when the instance has no such property.
 std::string text_of(const cimserver::Instance& instance, const std::string& property);
 
+// The class name, then a line for each property that is not null, in the order of the class.
+std::string describe(const cimserver::Instance& instance);
+
 class Loaded_Module : public testing::Test
 {
 protected:
-    // Loads the module on a shipped scenario, or on one given as JSON text.
+    // Loads the module anew on a shipped scenario, or on one given as JSON text.
     void load(const std::string& scenario);
     void load_text(const std::string& json);
 
@@ -39,6 +42,7 @@ protected:
 
 private:
     void load_module();
+    void unload();
 
     std::unique_ptr<cimserver::Module> _module;
     std::unique_ptr<cimserver::Module_Operations> _operations;

@@ -141,18 +141,6 @@ TEST_F(Answers, count_instances_up_to_the_highest)
     EXPECT_EQ(bitmap, "03" + std::string(28, '0') + "80" + std::string(32, '0'));
 }
 
-TEST_F(Answers, keep_the_application_of_each_descriptor)
-{
-    hxasim::load("cna");
-    Open_File hxa("/dev/hxa");
-    Open_File hxn("/dev/hxn");
-    hxa_ioctl_aen_t record{};
-    record.app_id = hxa_aen_app_cim;
-    EXPECT_EQ(send(*hxa, "IOCMD_AEN_SYNC", 'C', record), 0);
-    EXPECT_EQ(hxasim::application_of(*hxa), hxa_aen_app_cim);
-    EXPECT_EQ(hxasim::application_of(*hxn), std::nullopt);
-}
-
 TEST_F(Answers, include_refusing_the_version)
 {
     hxasim::load("version-refused");

@@ -310,7 +310,7 @@ TEST_F(Operations_Test, requests_leave_no_memory_behind_and_large_answers_are_co
 
     test_module.state().disks = 3;
     const long before = live_allocations();
-    for (int i = 0; i < 1000; ++i)
+    for (int i = 0; i < 300; ++i)
     {
         operations.enumerate_instances(zemlar, "TST_Base", false, {{"Name", "Uint64"}});
         operations.get_instance(path("TST_Tape", id("tape0")), {});

@@ -32,7 +32,7 @@ TEST(class_writer, writes_local_features_with_their_qualifiers)
     const std::string in_false = "<QUALIFIER NAME=\"In\" TYPE=\"boolean\" OVERRIDABLE=\"false\"><VALUE>false</VALUE></QUALIFIER>";
     EXPECT_EQ(
         class_text(test::TST_Port, {}),
-        "<CLASS NAME=\"TST_Port\" SUPERCLASS=\"TST_Element\">" + description + "An element.</VALUE></QUALIFIER>" +
+        "<CLASS NAME=\"TST_Port\" SUPERCLASS=\"TST_Element\">" + description + "A port.</VALUE></QUALIFIER>" +
             "<PROPERTY NAME=\"Name\" TYPE=\"string\">" + fixed("Key") + fixed("Required") +
             "<QUALIFIER NAME=\"Override\" TYPE=\"string\" TOSUBCLASS=\"false\"><VALUE>Name</VALUE></QUALIFIER>" + description +
             "The port&apos;s WWN.</VALUE></QUALIFIER></PROPERTY>" +
@@ -43,6 +43,8 @@ TEST(class_writer, writes_local_features_with_their_qualifiers)
             "<VALUE>..</VALUE></VALUE.ARRAY></QUALIFIER><QUALIFIER NAME=\"Values\" TYPE=\"string\" TRANSLATABLE=\"true\">"
             "<VALUE.ARRAY><VALUE>Point &amp; point</VALUE><VALUE>Reserved</VALUE></VALUE.ARRAY></QUALIFIER>"
             "<VALUE.ARRAY><VALUE>2</VALUE><VALUE>65535</VALUE></VALUE.ARRAY></PROPERTY.ARRAY>"
+            "<PROPERTY NAME=\"Setting\" TYPE=\"string\" EmbeddedObject=\"instance\"><QUALIFIER NAME=\"EmbeddedInstance\" "
+            "TYPE=\"string\"><VALUE>TST_Element</VALUE></QUALIFIER></PROPERTY>"
             "<METHOD NAME=\"Reset\" TYPE=\"uint32\"><PARAMETER NAME=\"Force\" TYPE=\"boolean\">" +
             in + "</PARAMETER><PARAMETER.REFERENCE NAME=\"Job\" REFERENCECLASS=\"TST_Element\">" + in_false + fixed("Out") +
             "</PARAMETER.REFERENCE><PARAMETER.ARRAY NAME=\"Codes\" TYPE=\"uint8\">" + in + fixed("Out") +
@@ -62,6 +64,12 @@ TEST(class_writer, writes_what_was_selected)
               "</PROPERTY><METHOD NAME=\"Reset\" TYPE=\"uint32\" CLASSORIGIN=\"TST_Port\"><PARAMETER NAME=\"Force\" "
               "TYPE=\"boolean\"></PARAMETER><PARAMETER.REFERENCE NAME=\"Job\" REFERENCECLASS=\"TST_Element\">"
               "</PARAMETER.REFERENCE><PARAMETER.ARRAY NAME=\"Codes\" TYPE=\"uint8\"></PARAMETER.ARRAY></METHOD></CLASS>");
+
+    selection.properties = {"Status"};
+    selection.class_origin = false;
+    selection.qualifiers = true;
+    EXPECT_NE(class_text(test::TST_Port, selection).find(description + "How it is.</VALUE>"), std::string::npos);
+
     EXPECT_EQ(class_text(test::TST_Link, {}),
               "<CLASS NAME=\"TST_Link\">" + fixed("Association") +
                   "<PROPERTY.REFERENCE NAME=\"Antecedent\" REFERENCECLASS=\"TST_Element\">" + fixed("Key") +

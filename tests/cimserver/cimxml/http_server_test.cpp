@@ -121,6 +121,8 @@ TEST_F(http_server, keeps_connections_and_takes_requests_in_pieces)
     client.send("POST / HTTP/1.1\r\nHost: x\r\nTransfer-Encoding: chunked\r\n\r\n3\r\nabc\r\n2\r\nde\r\n0\r\n\r\n");
     EXPECT_TRUE(client.receive().ends_with(":abcde"));
 
+    EXPECT_TRUE(ask("POST / HTTP/1.0\r\nContent-Length: 3\r\n\r\nold").ends_with(":old"));
+
     client.send("POST / HTTP/1.1\r\nHost: x\r\nExpect: 100-continue\r\nContent-Length: 5\r\n\r\n");
     EXPECT_TRUE(client.receive().starts_with("HTTP/1.1 100 "));
     client.send("hello");
@@ -165,6 +167,12 @@ TEST_F(http_server, refuses_large_bodies_before_they_arrive)
     for (int i = 0; i < 3; ++i)
         chunks += "100000\r\n" + block + "\r\n";
     EXPECT_EQ(status_of(head + "Transfer-Encoding: chunked\r\n\r\n" + chunks + "0\r\n\r\n"), "413");
+
+    Raw_Client endless = connect();
+    endless.send(head + "Transfer-Encoding: chunked\r\n\r\n");
+    for (blocks = 0; blocks < 100 && endless.send("100000\r\n" + block + "\r\n");)
+        ++blocks;
+    EXPECT_LT(blocks, 100);
 
     EXPECT_EQ(status_of(post(std::string(limits.request_bytes, 'x'))), "200");
     EXPECT_EQ(status_of(post(std::string(limits.request_bytes + 1, 'x'))), "413");

@@ -170,11 +170,13 @@ TEST(object_writer, writes_paths_as_far_as_they_are_known)
                                  {{"N", {CMPI_uint32, 7_u}},
                                   {"B", {CMPI_boolean, true}},
                                   {"D", {CMPI_dateTime, std::string("bad")}},
+                                  {"Big", {CMPI_uint8, 256_u}},
                                   {"Null", {CMPI_string, {}}}}});
     EXPECT_EQ(writer.take(),
               "<INSTANCENAME CLASSNAME=\"A\">"
               "<KEYBINDING NAME=\"N\"><KEYVALUE VALUETYPE=\"numeric\" TYPE=\"uint32\">7</KEYVALUE></KEYBINDING>"
               "<KEYBINDING NAME=\"B\"><KEYVALUE VALUETYPE=\"boolean\" TYPE=\"boolean\">true</KEYVALUE></KEYBINDING>"
               "<KEYBINDING NAME=\"D\"><KEYVALUE VALUETYPE=\"string\">bad</KEYVALUE></KEYBINDING>"
+              "<KEYBINDING NAME=\"Big\"><KEYVALUE VALUETYPE=\"string\"></KEYVALUE></KEYBINDING>"
               "</INSTANCENAME>");
 }

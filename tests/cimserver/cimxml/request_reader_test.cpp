@@ -193,7 +193,9 @@ TEST(object_reader, refuses_keys_that_cannot_be_read)
           key("string", "a") + "<KEYVALUE>b</KEYVALUE>", std::string("<KEYVALUE>a</KEYVALUE><KEYVALUE>b</KEYVALUE>"),
           std::string("<KEYBINDING NAME=\"\"><KEYVALUE>a</KEYVALUE></KEYBINDING>"),
           "<KEYBINDING NAME=\"K\"><VALUE.REFERENCE><LOCALINSTANCEPATH>" + name_space() + name_space() +
-              "</LOCALINSTANCEPATH></VALUE.REFERENCE></KEYBINDING>"})
+              "</LOCALINSTANCEPATH></VALUE.REFERENCE></KEYBINDING>",
+          "<KEYBINDING NAME=\"K\"><VALUE.REFERENCE><INSTANCEPATH><NAMESPACEPATH>" + name_space() + name_space() +
+              "</NAMESPACEPATH><INSTANCENAME CLASSNAME=\"B\"/></INSTANCEPATH></VALUE.REFERENCE></KEYBINDING>"})
         EXPECT_THROW(read_path(instance_name(keys), "n"), Cim_Error) << keys;
 }
 

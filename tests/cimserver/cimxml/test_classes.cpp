@@ -42,6 +42,7 @@ constexpr Meta_Property element_name = property(Flag_Key | Flag_Read, "Name", ST
 constexpr Meta_Property element_status = property(Flag_Read, "Status", STRING, 0, &status_default);
 constexpr Meta_Property port_name = property(Flag_Key | Flag_Read | Flag_Required, "Name", STRING);
 constexpr Meta_Property port_speed = property(Flag_Counter, "Speed", UINT64, 0, &speed_default);
+constexpr Meta_Property port_setting = property(Flag_EmbeddedInstance | Flag_Read, "Setting", STRING);
 constexpr Meta_Property port_modes = property(Flag_Read | Flag_Write, "Modes", UINT16, 4, &modes_default);
 
 constexpr Meta_Property reset_force = property(Flag_In, "Force", BOOLEAN);
@@ -55,8 +56,9 @@ constexpr const Meta_Feature* element_features[] = {&element_name, &element_stat
 constexpr Meta_Feature_Local element_locals[] = {{1}, {1}};
 
 // The method stands between the properties, as declaration order may have it.
-constexpr const Meta_Feature* port_features[] = {&port_name, &element_status, &port_speed, &port_reset, &port_modes};
-constexpr Meta_Feature_Local port_locals[] = {{1}, {0}, {1}, {1}, {1}};
+constexpr const Meta_Feature* port_features[] = {&port_name,  &element_status, &port_speed,
+                                                 &port_reset, &port_modes,     &port_setting};
+constexpr Meta_Feature_Local port_locals[] = {{1}, {0}, {1}, {1}, {1}, {1}};
 
 constexpr Meta_Reference link_antecedent = reference(Flag_Key, "Antecedent", &TST_Element);
 constexpr Meta_Reference link_dependent = reference(Flag_Key | Flag_Weak, "Dependent", &TST_Port);
@@ -67,7 +69,7 @@ constexpr Meta_Feature_Local link_locals[] = {{1}, {1}};
 
 constinit const Meta_Class TST_Element =
     make_class(Flag_Abstract, "TST_Element", element_features, 2, element_locals, nullptr, 1);
-constinit const Meta_Class TST_Port = make_class(0, "TST_Port", port_features, 5, port_locals, &TST_Element, 1);
+constinit const Meta_Class TST_Port = make_class(0, "TST_Port", port_features, 6, port_locals, &TST_Element, 1);
 constinit const Meta_Class TST_Link = make_class(Flag_Association, "TST_Link", link_features, 2, link_locals, nullptr, 2);
 
 } // namespace test
@@ -79,6 +81,8 @@ namespace
 {
 
 const char* const element_text[] = {"An element."};
+const char* const port_text[] = {"A port."};
+const char* const setting_class[] = {"TST_Element"};
 const char* const status_text[] = {"How it is."};
 const char* const name_text[] = {"The port's WWN."};
 const char* const modes_map[] = {"2", ".."};
@@ -90,9 +94,11 @@ const Qualifier_Row qualifier_table[] = {
     {"TST_Element", "", "Description", false, element_text, 1},
     {"TST_Element", "Name", "Description", false, status_text, 1},
     {"TST_Element", "Status", "Description", false, status_text, 1},
+    {"TST_Port", "", "Description", false, port_text, 1},
     {"TST_Port", "Modes", "ValueMap", true, modes_map, 2},
     {"TST_Port", "Modes", "Values", true, modes_values, 2},
     {"TST_Port", "Name", "Description", false, name_text, 1},
+    {"TST_Port", "Setting", "EmbeddedInstance", false, setting_class, 1},
 };
 const unsigned qualifier_table_size = std::size(qualifier_table);
 
