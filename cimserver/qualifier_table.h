@@ -1,4 +1,5 @@
-// The qualifiers that clients ask for and the module does not carry: Description, ValueMap, Values.
+// The qualifiers that clients ask for and the module does not carry: Description, ValueMap, Values, and the class that
+// EmbeddedInstance names.
 //
 // Generated from the MOF. Rows are sorted by class and feature name (ASCII, lower case); an inherited feature's row stands
 // at the class that declares it.
@@ -11,7 +12,7 @@ struct Qualifier_Row
 {
     const char* class_name;
     const char* feature_name; // "" for the class itself
-    const char* name;         // "Description", "ValueMap", "Values"
+    const char* name;         // "Description", "EmbeddedInstance", "ValueMap", "Values"
     bool array;
     const char* const* values; // string values; one unless array
     unsigned num_values;

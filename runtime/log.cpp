@@ -177,7 +177,7 @@ void vlog(Log_Level level, const char* file, int line, const char* format, va_li
 
 void Log_Call_Frame::invoke(const char* format, ...) const
 {
-    if (!log_enabled())
+    if (!_log_enabled_state.load(std::memory_order_relaxed))
         return;
     va_list arguments;
     va_start(arguments, format);
@@ -186,7 +186,6 @@ void Log_Call_Frame::invoke(const char* format, ...) const
 }
 
 int log_enable(bool flag) { return _log_enabled_state.exchange(flag) == flag ? -1 : 0; }
-bool log_enabled() { return _log_enabled_state.load(std::memory_order_relaxed); }
 
 int log_set_level(const char* name)
 {

@@ -43,7 +43,6 @@ struct Log_Call_Frame
 
 // Switches the runtime's own warnings (Log_Call_Frame); -1 when they already were in that state, else 0.
 int log_enable(bool flag);
-bool log_enabled();
 int log_set_level(const char* name); // -1 for an unknown level name
 void open_log(const char* name);     // initialises with another directory name than ".cimple"
 

@@ -1,6 +1,6 @@
 #include "runtime/meta.h"
 
-#include "runtime/instance.h"
+#include "runtime/features.h"
 #include "runtime/string.h"
 
 #include <span>
@@ -15,7 +15,7 @@ template <class T> bool is_named(const T* meta, const char* name) { return eqi(m
 
 const Meta_Feature* find_in(const Meta_Record* record, const char* name, uint32 kind_mask)
 {
-    for (const Meta_Feature* feature : std::span(record->meta_features, record->num_meta_features))
+    for (const Meta_Feature* feature : features_of(record))
         if ((feature->flags & kind_mask) != 0 && is_named(feature, name))
             return feature;
     return nullptr;
@@ -100,7 +100,7 @@ const Meta_Reference* find_reference(const Meta_Method* meta_method, const char*
 
 bool has_feature(const Meta_Class* meta_class, uint32 kind_mask)
 {
-    for (const Meta_Feature* feature : std::span(meta_class->meta_features, meta_class->num_meta_features))
+    for (const Meta_Feature* feature : features_of(meta_class))
         if ((feature->flags & kind_mask) != 0)
             return true;
     return false;

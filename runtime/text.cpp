@@ -9,16 +9,10 @@ namespace zmlr
 
 bool eqi(const char* a, const char* b)
 {
-    // Most names that do not match differ in their first letter.
-    if (ascii::to_lower(*a) != ascii::to_lower(*b))
-        return false;
-
-    while (*a && ascii::to_lower(*a) == ascii::to_lower(*b))
-    {
-        ++a;
-        ++b;
-    }
-    return ascii::to_lower(*a) == ascii::to_lower(*b);
+    for (; ascii::to_lower(*a) == ascii::to_lower(*b); ++a, ++b)
+        if (!*a)
+            return true;
+    return false;
 }
 
 std::size_t strlcpy(char* dst, const char* src, std::size_t size)

@@ -69,7 +69,7 @@ public:
     // one reference to it, as it does to each element of an instance array.
     // clang-format off
     template <class T>
-        requires(std::same_as<T, Instance*> || !(std::convertible_to<T, const Instance*> || std::convertible_to<T, const char*>))
+        requires(!(std::convertible_to<T, const Instance*> || std::convertible_to<T, const char*>))
     void set_value(const T& x) { adopt(Content(std::in_place_type<T>, x)); }
     // clang-format on
     void set_value(Instance* x) { adopt(Content(x)); }

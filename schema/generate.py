@@ -9,7 +9,7 @@ The MOF files are compiled in the given order. Below the output directory:
     providers/<Class>_Provider_Skeleton.h     per row of providers.def: what its provider derives from
     providers/skeletons.h                     all of them
     providers/skeletons.cpp                   default answers, method dispatch, provider procedures
-    cimserver/qualifier_table.cpp             Description, ValueMap and Values
+    cimserver/qualifier_table.cpp             Description, EmbeddedInstance, ValueMap and Values
 
 The same input gives the same bytes. A file is written only when its content changes; files of former classes go away.
 Wrong input ends with a message on standard error and exit status 1, and leaves the output as it was.

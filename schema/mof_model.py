@@ -24,8 +24,8 @@ FLAGS = {
 INHERITED_CLASS_FLAGS = FLAGS["Association"] | FLAGS["Indication"] | FLAGS["Aggregation"]
 INHERITED_FEATURE_FLAGS = FLAGS["Key"]
 
-# The qualifiers that clients ask a server for.
-DOCUMENTED = ("Description", "ValueMap", "Values")
+# The qualifiers that clients ask a server for and whose values the meta-data has no room for.
+DOCUMENTED = ("Description", "EmbeddedInstance", "ValueMap", "Values")
 
 
 class Model_Error(Exception):

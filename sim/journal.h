@@ -24,9 +24,9 @@ struct Journal_Entry
 class Journal
 {
 public:
-    void add(Journal_Entry entry);        // drops the oldest ones beyond the bounds
-    void add_violation(std::string text); // dropped beyond the bound
-    std::vector<Request> take();          // oldest first; leaves none
+    void add(Journal_Entry entry);                 // drops the oldest ones beyond the bounds
+    void add_violation(std::string text);          // dropped beyond the bound
+    std::vector<Request> take();                   // oldest first; leaves none
     std::uint64_t count() const { return _count; } // of all that were added
     const std::vector<std::string>& violations() const { return _violations; }
     void clear();

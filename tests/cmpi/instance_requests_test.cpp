@@ -160,6 +160,7 @@ TEST_F(Instance_Requests, answer_each_get_status)
         EXPECT_EQ(get(thing_path("a")), rc);
         EXPECT_EQ(result.done, rc == CMPI_RC_OK ? 1 : 0) << status;
     }
+    EXPECT_EQ(script.enumerations, 0);
     script.instances.clear();
     script.get_instance = GET_INSTANCE_OK;
     EXPECT_EQ(get(thing_path("a")), CMPI_RC_ERR_FAILED) << "a success without an instance is none";

@@ -119,19 +119,12 @@ TEST_F(Life, coming_and_going_are_traced_in_order)
 
 TEST_F(Life, a_provider_unloads_in_the_thread_context_of_the_interface_that_goes_last)
 {
-    const Kinds kinds = all_kinds();
     std::vector<bool> in_context;
     script.on_unload = [&] { in_context.push_back(Thread_Context::top() != nullptr); };
-    const auto last = [&](auto* mi)
-    {
-        link_data.adapter->load_count = 1;
-        clean_up(mi);
-        links();
-    };
-    last(kinds.instances);
-    last(kinds.methods);
-    last(kinds.associations);
-    last(kinds.indications);
+    clean_up(links());
+    clean_up(interface<CMPIMethodMI>('M', link_data, link_registration));
+    clean_up(interface<CMPIAssociationMI>('A', link_data, link_registration));
+    clean_up(interface<CMPIIndicationMI>('N', link_data, link_registration));
     EXPECT_THAT(in_context, ElementsAre(true, true, false, true));
     EXPECT_EQ(Thread_Context::top(), nullptr);
 }

@@ -84,20 +84,6 @@ using Get_Instance = Provider_Handle_Test;
 using Associations = Provider_Handle_Test;
 using Procedure = Provider_Handle_Test;
 
-TEST_F(Get_Instance, passes_the_providers_own_answer_on)
-{
-    offer("a");
-    for (const auto status : {GET_INSTANCE_OK, GET_INSTANCE_NOT_FOUND, GET_INSTANCE_INVALID_PARAMETER, GET_INSTANCE_ACCESS_DENIED,
-                              GET_INSTANCE_FAILED})
-    {
-        script.get_instance = status;
-        Ref<Instance> found;
-        EXPECT_EQ(things.get_instance(source.ptr(), found), status);
-        EXPECT_EQ(static_cast<bool>(found), status == GET_INSTANCE_OK);
-    }
-    EXPECT_EQ(script.enumerations, 0);
-}
-
 TEST_F(Get_Instance, is_otherwise_the_first_enumerated_instance_with_equal_keys)
 {
     offer("x", "a", "y", "a");

@@ -198,7 +198,10 @@ TEST_F(Scan, that_finds_a_hole_lists_the_iocs_and_no_adapter)
     EXPECT_EQ(hxal_ioc_open_idx(3)->ioc_type, HXA_IOC_TYPE_LL);
 
     hxal_set_last_error(HXA_STATUS_DIAG_BUSY);
+    hxasim::take_requests();
     EXPECT_EQ(hxal_adapter_scan(), 0);
+    const auto sent = requests();
+    EXPECT_EQ(std::count(sent.begin(), sent.end(), "IOCMD_IOC_GET_ATTR"), 2) << "those behind the hole are not asked";
     EXPECT_EQ(hxal_get_last_error(), HXA_STATUS_DIAG_BUSY);
     EXPECT_EQ(hxal_adapter_get_num(), 0u);
 }

@@ -13,6 +13,7 @@ namespace
 
 long allocations_left = -1; // until one fails; negative: none fails
 long live_allocations = 0;
+unsigned char last_freed = 0; // first byte of the memory that was freed last
 
 } // namespace
 
@@ -29,7 +30,10 @@ void* operator new(std::size_t size)
 
 void operator delete(void* memory) noexcept
 {
-    live_allocations -= memory != nullptr;
+    if (!memory)
+        return;
+    --live_allocations;
+    last_freed = *static_cast<const unsigned char*>(memory);
     std::free(memory);
 }
 
@@ -65,7 +69,7 @@ long fail_each_allocation_of(const std::function<void()>& work)
     }
 }
 
-TEST(Memory, RunsOutWithoutALeak)
+TEST(Memory, runs_out_without_a_leak)
 {
     const auto source = linked(element("a"), disk("d"));
     source->Others.value.append(element("o").steal());
@@ -106,7 +110,7 @@ TEST(Memory, RunsOutWithoutALeak)
         });
 }
 
-TEST(Memory, WhatFailedKeepsWhatItHad)
+TEST(Memory, what_failed_keeps_what_it_had)
 {
     String text("abc");
     const String shared = text;
@@ -126,9 +130,10 @@ TEST(Memory, WhatFailedKeepsWhatItHad)
     EXPECT_THROW(array.reserve(0x80000001), std::bad_alloc);
 }
 
-TEST(Memory, AnEmptyRecordTakesOneAllocation)
+TEST(Memory, an_empty_record_takes_one_allocation_and_is_marked_when_freed)
 {
     EXPECT_EQ(fail_each_allocation_of([] { const Ref<Sample_Disk> made(create<Sample_Disk>(false)); }), 1);
+    EXPECT_EQ(last_freed, 0xDD);
 }
 
 } // namespace

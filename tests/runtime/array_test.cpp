@@ -19,7 +19,7 @@ Array<String> strings(uint32 n)
     return result;
 }
 
-TEST(Array, CapacityIsThePowerOfTwoThatHoldsTheElements)
+TEST(Array, capacity_is_the_power_of_two_that_holds_the_elements)
 {
     const struct
     {
@@ -46,7 +46,7 @@ TEST(Array, CapacityIsThePowerOfTwoThatHoldsTheElements)
     }
 }
 
-TEST(Array, CopiesShareNothing)
+TEST(Array, copies_share_nothing)
 {
     const Array<String> source = {"a", "b", "c"};
     Array<String> copy = source;
@@ -62,7 +62,7 @@ TEST(Array, CopiesShareNothing)
     EXPECT_EQ(assigned.find("a"), 0xFFFFFFFF);
 }
 
-TEST(Array, InsertsItsOwnElementsWhetherItGrowsOrNot)
+TEST(Array, inserts_its_own_elements_whether_it_grows_or_not)
 {
     for (uint32 n : {1U, 3U, 4U, 7U, 8U, 15U, 16U})
     {
@@ -80,7 +80,7 @@ TEST(Array, InsertsItsOwnElementsWhetherItGrowsOrNot)
     }
 }
 
-TEST(Array, EditsInPlace)
+TEST(Array, edits_in_place)
 {
     Array<String> array = strings(4);
     array.prepend("first");
@@ -97,7 +97,7 @@ TEST(Array, EditsInPlace)
     EXPECT_EQ(array.capacity(), 8U);
 }
 
-TEST(Array, ComparesRealsAsNumbersAndTheRestAsBytes)
+TEST(Array, compares_reals_as_numbers_and_the_rest_as_bytes)
 {
     const real64 nan = std::numeric_limits<real64>::quiet_NaN();
     EXPECT_FALSE(Array<real64>{nan} == Array<real64>{nan});

@@ -19,7 +19,7 @@ struct Query
     int result;
 };
 
-TEST(Association, FindsTheFarEnds)
+TEST(Association, finds_the_far_ends)
 {
     const auto near = element("near");
     const auto far = disk("far");
@@ -44,7 +44,7 @@ TEST(Association, FindsTheFarEnds)
     }
 }
 
-TEST(Association, ConcernsOnlyTheObjectsItRefersTo)
+TEST(Association, concerns_only_the_objects_it_refers_to)
 {
     const auto near = element("near");
     const auto association = linked(near, disk("far"));
@@ -66,7 +66,7 @@ TEST(Association, ConcernsOnlyTheObjectsItRefersTo)
     EXPECT_FALSE(is_reference_of(near.ptr(), linked({}, {}).ptr(), ""));
 }
 
-TEST(Name_Space, IsSetDepthFirstWhereThereIsNone)
+TEST(Name_Space, is_set_depth_first_where_there_is_none)
 {
     const auto near = element("near");
     near->__name_space = "root/other";

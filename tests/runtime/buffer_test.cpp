@@ -9,7 +9,7 @@ using namespace zmlr;
 namespace
 {
 
-TEST(Buffer, GrowsAroundItsFirstCapacity)
+TEST(Buffer, grows_around_its_first_capacity)
 {
     for (std::size_t n : {0U, 1U, 4095U, 4096U, 4097U, 8192U, 8193U})
     {
@@ -30,7 +30,7 @@ TEST(Buffer, GrowsAroundItsFirstCapacity)
     }
 }
 
-TEST(Buffer, InsertsRemovesAndWritesNumbers)
+TEST(Buffer, inserts_removes_and_writes_numbers)
 {
     Buffer buffer;
     buffer.append_uint64(18446744073709551615U);

@@ -25,7 +25,7 @@ protected:
     }
 };
 
-TEST_F(Datetime_Test, ReadsAndWritesBothForms)
+TEST_F(Datetime_Test, reads_and_writes_both_forms)
 {
     constexpr uint64 day = Datetime::DAY;
     const struct
@@ -59,7 +59,7 @@ TEST_F(Datetime_Test, ReadsAndWritesBothForms)
     }
 }
 
-TEST_F(Datetime_Test, RefusesOtherTextsAndKeepsItsValue)
+TEST_F(Datetime_Test, refuses_other_texts_and_keeps_its_value)
 {
     const char* const texts[] = {
         nullptr,
@@ -85,14 +85,14 @@ TEST_F(Datetime_Test, RefusesOtherTextsAndKeepsItsValue)
     }
 }
 
-TEST_F(Datetime_Test, FieldsOutOfRangeCarryOver)
+TEST_F(Datetime_Test, fields_out_of_range_carry_over)
 {
     EXPECT_EQ(Datetime("00000000250000.000000:000").usec(), 25 * Datetime::HOUR);
     in_zone("UTC");
     EXPECT_TRUE(Datetime("20110132000000.000000+000") == Datetime("20110201000000.000000+000"));
 }
 
-TEST_F(Datetime_Test, TimestampsComeBackInAnyZoneAndSeason)
+TEST_F(Datetime_Test, timestamps_come_back_in_any_zone_and_season)
 {
     for (const char* zone : {"UTC", "CET-1CEST,M3.5.0,M10.5.0/3", "EST5EDT,M3.2.0,M11.1.0", "NPT-5:45"})
     {
@@ -107,7 +107,7 @@ TEST_F(Datetime_Test, TimestampsComeBackInAnyZoneAndSeason)
     EXPECT_STREQ(Datetime(0, 60).ascii().c_str(), "19700101010000.000000+060");
 }
 
-TEST_F(Datetime_Test, ConvertsFromAndToNumbers)
+TEST_F(Datetime_Test, converts_from_and_to_numbers)
 {
     uint32 year, month, day, hour, minute, second, microseconds;
     sint32 offset;
@@ -124,7 +124,7 @@ TEST_F(Datetime_Test, ConvertsFromAndToNumbers)
     EXPECT_EQ((std::array{day, hour, minute, second, microseconds}), (std::array{3U, 4U, 5U, 6U, 7U}));
 }
 
-TEST_F(Datetime_Test, WhatDoesNotFitIsCutAndTerminated)
+TEST_F(Datetime_Test, what_does_not_fit_is_cut_and_terminated)
 {
     for (const Datetime& huge : {Datetime(UINT64_MAX), Datetime(INT64_MAX, INT32_MIN), Datetime(uint64{1} << 63, INT32_MAX)})
     {
@@ -137,7 +137,7 @@ TEST_F(Datetime_Test, WhatDoesNotFitIsCutAndTerminated)
     }
 }
 
-TEST_F(Datetime_Test, CopiesShareUntilOneChanges)
+TEST_F(Datetime_Test, copies_share_until_one_changes)
 {
     const Datetime source(100, 60);
     Datetime copy = source;

@@ -1,3 +1,5 @@
+#include "runtime/assert.h"
+#include "runtime/buffer.h"
 #include "tests/runtime/sample_classes.h"
 
 #include <gtest/gtest.h>
@@ -15,7 +17,7 @@ struct Junk
     Instance* instance() { return reinterpret_cast<Instance*>(bytes); }
 };
 
-TEST(AssertDeathTest, ReportsPlaceFunctionAndCondition)
+TEST(AssertDeathTest, reports_place_function_and_condition)
 {
     Junk junk;
     EXPECT_DEATH(unref(junk.instance()),
@@ -28,7 +30,7 @@ TEST(AssertDeathTest, ReportsPlaceFunctionAndCondition)
     EXPECT_DEATH(is_reference_of(element("a").ptr(), nullptr, ""), "assert: assoc_inst != 0");
 }
 
-TEST(AssertDeathTest, DestroyTakesTheLastReferenceOnly)
+TEST(AssertDeathTest, destroy_takes_the_last_reference_only)
 {
     Sample_Element* shared = element("a").steal();
     ref(shared);
@@ -37,7 +39,14 @@ TEST(AssertDeathTest, DestroyTakesTheLastReferenceOnly)
     destroy(shared);
 }
 
-TEST(AssertDeathTest, PositionsPastTheEnd)
+TEST(Trace, goes_to_standard_error)
+{
+    testing::internal::CaptureStderr();
+    __cimple_trace("port.cpp", 12, "here");
+    EXPECT_EQ(testing::internal::GetCapturedStderr(), "TRACE: port.cpp(12): here\n");
+}
+
+TEST(AssertDeathTest, positions_past_the_end)
 {
     String s("abc");
     EXPECT_DEATH(s.remove(2, 2), "assert: pos \\+ n <= _rep->size");
@@ -46,6 +55,9 @@ TEST(AssertDeathTest, PositionsPastTheEnd)
     EXPECT_DEATH(s.set(4, 'x'), "assert: i <= _rep->size");
     Array<uint32> array;
     EXPECT_DEATH(array.remove(0), "assert: pos \\+ n <= rep->size");
+    Buffer buffer;
+    EXPECT_DEATH(buffer.insert(1, "x", 1), "assert: i <= _size");
+    EXPECT_DEATH(buffer.remove(0, 1), "assert: i \\+ size <= _size");
 }
 
 } // namespace

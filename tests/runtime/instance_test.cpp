@@ -37,7 +37,7 @@ Ref<Sample_Element> filled_element()
     return result;
 }
 
-TEST(Instance, CreatedWithDefaultsHasThemAndNullsElsewhere)
+TEST(Instance, created_with_defaults_has_them_and_nulls_elsewhere)
 {
     const Ref<Sample_Element> made(create<Sample_Element>());
     EXPECT_EQ(set_properties(made.ptr()), "Size Letter Since Caption Labels Codes Intervals");
@@ -52,7 +52,7 @@ TEST(Instance, CreatedWithDefaultsHasThemAndNullsElsewhere)
     EXPECT_TRUE(made->__name_space.empty());
 }
 
-TEST(Instance, CreatedWithoutDefaultsIsZeroAndNonNull)
+TEST(Instance, created_without_defaults_is_zero_and_non_null)
 {
     const Ref<Sample_Element> made(create<Sample_Element>(false));
     EXPECT_EQ(set_properties(made.ptr()), "Name Online Slot Size Delta Load Letter Since Caption Labels Codes Intervals Samples");
@@ -66,7 +66,7 @@ TEST(Instance, CreatedWithoutDefaultsIsZeroAndNonNull)
     EXPECT_EQ(link_made->Others.null, 1);
 }
 
-TEST(Instance, AParameterRecordIsAnInstance)
+TEST(Instance, a_parameter_record_is_an_instance)
 {
     Ref<Sample_Element_Reset_method> record(
         static_cast<Sample_Element_Reset_method*>(create(&Sample_Element_Reset_method::static_meta_class)));
@@ -79,7 +79,7 @@ TEST(Instance, AParameterRecordIsAnInstance)
     EXPECT_EQ(cast<Sample_Element>(static_cast<Instance*>(record.ptr())), nullptr);
 }
 
-TEST(Instance, ReferencesAreReleasedWithTheirHolder)
+TEST(Instance, references_are_released_with_their_holder)
 {
     const Ref<Sample_Element> target = element("target");
     {
@@ -96,7 +96,7 @@ TEST(Instance, ReferencesAreReleasedWithTheirHolder)
     EXPECT_EQ(Atomic_get(&target->__refs), 1U);
 }
 
-TEST(Instance, ACloneIsIdenticalAndSharesNoReferences)
+TEST(Instance, a_clone_is_identical_and_shares_no_references)
 {
     const Ref<Sample_Link> original = linked(filled_element(), disk("d"));
     original->Others.value.append(element("o").steal());
@@ -113,7 +113,7 @@ TEST(Instance, ACloneIsIdenticalAndSharesNoReferences)
     EXPECT_FALSE(identical(original.ptr(), copied.ptr()));
 }
 
-TEST(Instance, KeyCloneCopiesTheKeysOnly)
+TEST(Instance, key_clone_copies_the_keys_only)
 {
     const Ref<Sample_Element> keys(cast<Sample_Element>(key_clone(filled_element().ptr())));
     EXPECT_EQ(set_properties(keys.ptr()), "Name");
@@ -127,7 +127,7 @@ TEST(Instance, KeyCloneCopiesTheKeysOnly)
     EXPECT_TRUE(link_keys->Note.null);
 }
 
-TEST(Instance, CopiesWhatTheModelHolds)
+TEST(Instance, copies_what_the_model_holds)
 {
     const Ref<Sample_Element> source = filled_element();
     source->Caption.clear();
@@ -150,7 +150,7 @@ TEST(Instance, CopiesWhatTheModelHolds)
     EXPECT_TRUE(identical(dest.ptr(), source.ptr()));
 }
 
-TEST(Instance, IdenticalSeesEveryDifference)
+TEST(Instance, identical_sees_every_difference)
 {
     void (*const changes[])(Sample_Element&) = {
         [](Sample_Element& e) { e.__name_space = "root/other"; },
@@ -176,7 +176,7 @@ TEST(Instance, IdenticalSeesEveryDifference)
     EXPECT_FALSE(identical(original.ptr(), original.ptr())) << "NaN differs from itself";
 }
 
-TEST(Instance, KeysDecideAloneAndAcrossSubclasses)
+TEST(Instance, keys_decide_alone_and_across_subclasses)
 {
     const auto a = element("a");
     const auto disk_a = disk("a");
@@ -196,7 +196,7 @@ TEST(Instance, KeysDecideAloneAndAcrossSubclasses)
     EXPECT_FALSE(key_eq(first.ptr(), a.ptr()));
 }
 
-TEST(Instance, FilterLeavesWhatWasAskedFor)
+TEST(Instance, filter_leaves_what_was_asked_for)
 {
     const struct
     {
@@ -222,7 +222,7 @@ TEST(Instance, FilterLeavesWhatWasAskedFor)
     EXPECT_EQ(everything->Samples.null, 0);
 }
 
-TEST(Instance, NullFlagsAndKeys)
+TEST(Instance, null_flags_and_keys)
 {
     const auto e = element("a");
     nullify_non_keys(e.ptr());

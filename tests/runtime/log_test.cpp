@@ -32,7 +32,7 @@ void log_one_of_each()
         ZMLR_LOG(level, "level %u", static_cast<unsigned>(level));
 }
 
-TEST(Log, OptionFileDecidesWhatIsWritten)
+TEST(Log, option_file_decides_what_is_written)
 {
     const struct
     {
@@ -56,7 +56,7 @@ TEST(Log, OptionFileDecidesWhatIsWritten)
     }
 }
 
-TEST(Log, IsOffAndLeavesNoTraceWithoutAValidLevel)
+TEST(Log, is_off_and_leaves_no_trace_without_a_valid_level)
 {
     for (const char* options : {"", "LOG_LEVEL=VERBOSE\n", "LOG_LEVEL=\nLOG_LEVEL=DBG\n", "#LOG_LEVEL=DBG\n", "LOG_LEVEL=DBGS\n",
                                 "LOG_LEVEL=DB\n", "log_level=DBG\n"})
@@ -80,7 +80,7 @@ TEST(Log, IsOffAndLeavesNoTraceWithoutAValidLevel)
     EXPECT_FALSE(home.has(".cimple"));
 }
 
-TEST(Log, IsTriedOnceOnly)
+TEST(Log, is_tried_once_only)
 {
     const Home home;
     ASSERT_TRUE(home.run(
@@ -93,7 +93,7 @@ TEST(Log, IsTriedOnceOnly)
     EXPECT_FALSE(home.has(".cimple"));
 }
 
-TEST(Log, WritesTimeLevelSourceAndLine)
+TEST(Log, writes_time_level_source_and_line)
 {
     const Home home;
     home.options("LOG_LEVEL=INFO\n");
@@ -117,7 +117,7 @@ TEST(Log, WritesTimeLevelSourceAndLine)
                                           MatchesRegex(time + "INFO: PortHelper\\(9\\): ")));
 }
 
-TEST(Log, TracesScopesOnEveryWayOut)
+TEST(Log, traces_scopes_on_every_way_out)
 {
     const Home home;
     home.options("LOG_LEVEL=DBG\n");
@@ -137,7 +137,7 @@ TEST(Log, TracesScopesOnEveryWayOut)
                                           MatchesRegex(".* DBG: FCHBAManager\\([0-9]+\\): Returning: getInstances")));
 }
 
-TEST(Log, LinesOfProcessesAndThreadsNeverMix)
+TEST(Log, lines_of_processes_and_threads_never_mix)
 {
     constexpr int num_processes = 2;
     constexpr int num_threads = 4;
@@ -181,7 +181,7 @@ TEST(Log, LinesOfProcessesAndThreadsNeverMix)
         EXPECT_EQ(count, num_lines) << writer;
 }
 
-TEST(Log, WaitsForAnotherProcessThatHoldsTheLock)
+TEST(Log, waits_for_another_process_that_holds_the_lock)
 {
     const Home home;
     home.options("LOG_LEVEL=FATAL\n");
@@ -200,7 +200,7 @@ TEST(Log, WaitsForAnotherProcessThatHoldsTheLock)
     EXPECT_FALSE(File_Lock(home.path("no such directory/lock").c_str()).okay());
 }
 
-TEST(Log, StaysOffWhenItsDirectoryCannotBeMade)
+TEST(Log, stays_off_when_its_directory_cannot_be_made)
 {
     const Home home;
     home.options("LOG_LEVEL=DBG\n");
@@ -214,7 +214,7 @@ TEST(Log, StaysOffWhenItsDirectoryCannotBeMade)
         }));
 }
 
-TEST(Log, LevelAndDirectoryCanBeSetByCode)
+TEST(Log, level_and_directory_can_be_set_by_code)
 {
     const Home home;
     home.options("LOG_LEVEL=ERR\n");

@@ -24,7 +24,7 @@ void store_what_does_not_fit()
     wrong.get(nullptr, find_property(to->meta_class, "Note"));
 }
 
-TEST(Log_Warnings, NameClassAndFeature)
+TEST(Log_Warnings, name_class_and_feature)
 {
     const Home home;
     home.options("LOG_LEVEL=WARN\n");

@@ -10,7 +10,7 @@ using namespace sample;
 namespace
 {
 
-TEST(Meta, FlagNamesStandAtTheirBits)
+TEST(Meta, flag_names_stand_at_their_bits)
 {
     const struct
     {
@@ -34,7 +34,7 @@ TEST(Meta, FlagNamesStandAtTheirBits)
     EXPECT_EQ(flag_name_to_index("Keys"), 0xFFFFFFFF);
 }
 
-TEST(Meta, FindsClassesAndFeaturesByNameInAnyCase)
+TEST(Meta, finds_classes_and_features_by_name_in_any_case)
 {
     EXPECT_EQ(find_meta_class(&repository, "SAMPLE_DISK"), &Sample_Disk::static_meta_class);
     EXPECT_EQ(find_meta_class(&repository, "Sample_Disk2"), nullptr);
@@ -56,7 +56,7 @@ TEST(Meta, FindsClassesAndFeaturesByNameInAnyCase)
     EXPECT_FALSE(has_feature(&Sample_Link::static_meta_class, Flag_Method));
 }
 
-TEST(Meta, EveryClassDescendsFromTheRoot)
+TEST(Meta, every_class_descends_from_the_root)
 {
     const Meta_Class* const element_class = &Sample_Element::static_meta_class;
     const Meta_Class* const disk_class = &Sample_Disk::static_meta_class;
@@ -70,7 +70,7 @@ TEST(Meta, EveryClassDescendsFromTheRoot)
     EXPECT_TRUE(is_subclass(&twin, disk_class));
 }
 
-TEST(Meta, OnlyClassesMadeAtRunTimeAreCounted)
+TEST(Meta, only_classes_made_at_run_time_are_counted)
 {
     Meta_Class made = Sample_Setting::static_meta_class;
     Atomic_create(&made.refs, 1);

@@ -11,7 +11,7 @@ namespace
 
 String of_size(std::size_t n) { return String(std::string(n, 'x').c_str()); }
 
-TEST(String, CapacitiesArePowersOfTwoFromThirtyTwo)
+TEST(String, capacities_are_powers_of_two_from_thirty_two)
 {
     const struct
     {
@@ -36,7 +36,7 @@ TEST(String, CapacitiesArePowersOfTwoFromThirtyTwo)
     }
 }
 
-TEST(String, ChangingACopyLeavesTheSourceAlone)
+TEST(String, changing_a_copy_leaves_the_source_alone)
 {
     void (*const changes[])(String&) = {
         [](String& s) { s.append('!'); },  [](String& s) { s.append("more"); }, [](String& s) { s.set(0, 'X'); },
@@ -55,7 +55,7 @@ TEST(String, ChangingACopyLeavesTheSourceAlone)
     }
 }
 
-TEST(String, AppendingACharacterToASharedOneDoublesItsCapacity)
+TEST(String, appending_a_character_to_a_shared_one_doubles_its_capacity)
 {
     const String source("abc");
     String copy = source;
@@ -64,7 +64,7 @@ TEST(String, AppendingACharacterToASharedOneDoublesItsCapacity)
     EXPECT_STREQ(copy.c_str(), "abcd");
 }
 
-TEST(String, AllEmptyStringsAreOne)
+TEST(String, all_empty_strings_are_one)
 {
     String cleared("text");
     const String holder = cleared;
@@ -81,7 +81,7 @@ TEST(String, AllEmptyStringsAreOne)
     EXPECT_EQ(own.capacity(), 32U) << "an unshared one keeps its room";
 }
 
-TEST(String, TakesItsOwnTextAsArgument)
+TEST(String, takes_its_own_text_as_argument)
 {
     String s("0123456789");
     s.append(s.c_str() + 5, 5);
@@ -98,7 +98,7 @@ TEST(String, TakesItsOwnTextAsArgument)
     EXPECT_STREQ(s.c_str(), "89");
 }
 
-TEST(String, FindsRemovesAndCompares)
+TEST(String, finds_removes_and_compares)
 {
     String s("a.b.c", 5);
     EXPECT_EQ(s.find('.'), 1U);
@@ -123,7 +123,7 @@ TEST(String, FindsRemovesAndCompares)
     EXPECT_STREQ((String("a") + "b" + String("c")).c_str(), "abc");
 }
 
-TEST(Text, ComparesNamesWithoutRegardToCase)
+TEST(Text, compares_names_without_regard_to_case)
 {
     EXPECT_TRUE(eqi("", ""));
     EXPECT_TRUE(eqi("DeviceID", "deviceid"));
@@ -134,7 +134,7 @@ TEST(Text, ComparesNamesWithoutRegardToCase)
     }
 }
 
-TEST(Text, BoundedCopyAndAppend)
+TEST(Text, bounded_copy_and_append)
 {
     const struct
     {

@@ -22,7 +22,7 @@ template <class Work> void in_threads(int count, Work work)
         thread.join();
 }
 
-TEST(Mutex, IsHeldByOneThreadAtATime)
+TEST(Mutex, is_held_by_one_thread_at_a_time)
 {
     for (bool recursive : {true, false})
     {
@@ -47,7 +47,7 @@ TEST(Mutex, IsHeldByOneThreadAtATime)
     }
 }
 
-TEST(Thread_Context, EachThreadHasItsOwnStack)
+TEST(Thread_Context, each_thread_has_its_own_stack)
 {
     Thread_Context lower, upper;
     Thread_Context::push(&lower);
@@ -60,7 +60,7 @@ TEST(Thread_Context, EachThreadHasItsOwnStack)
     EXPECT_EQ(Thread_Context::top(), nullptr);
 }
 
-TEST(Counts, ThreadsShareValuesAndInstances)
+TEST(Counts, threads_share_values_and_instances)
 {
     const auto shared = sample::element("shared");
     const String text("text");

@@ -29,7 +29,7 @@ template <class T> void expect_holds(const T& x, Value::Type type, const char* n
     EXPECT_TRUE(null_value.null());
 }
 
-TEST(Value, HoldsEveryType)
+TEST(Value, holds_every_type)
 {
     expect_holds(true, Value::BOOLEAN, "boolean", "BOOLEAN");
     expect_holds(uint8{200}, Value::UINT8, "uint8", "UINT8");
@@ -64,7 +64,7 @@ TEST(Value, HoldsEveryType)
     EXPECT_EQ(*value.get_if<String>(), "text");
 }
 
-TEST(Value, OwnsOneReferenceToEachInstance)
+TEST(Value, owns_one_reference_to_each_instance)
 {
     const auto held = element("held");
     const auto refs = [&held] { return Atomic_get(&held->__refs); };
@@ -91,7 +91,7 @@ TEST(Value, OwnsOneReferenceToEachInstance)
     EXPECT_EQ(refs(), 3U);
 }
 
-TEST(Value, CarriesEveryPropertyFromOneInstanceToAnother)
+TEST(Value, carries_every_property_from_one_instance_to_another)
 {
     const auto from = element("a");
     from->Online.set(true);
@@ -118,7 +118,7 @@ TEST(Value, CarriesEveryPropertyFromOneInstanceToAnother)
     EXPECT_EQ(method.type(), Value::NONE);
 }
 
-TEST(Value, CarriesReferences)
+TEST(Value, carries_references)
 {
     const auto target = element("target");
     const auto from = linked(target, {});
@@ -145,7 +145,7 @@ TEST(Value, CarriesReferences)
     EXPECT_EQ(*self.get_if<Instance*>(), target.ptr());
 }
 
-TEST(Value, RefusesWhatDoesNotFitAndChangesNothing)
+TEST(Value, refuses_what_does_not_fit_and_changes_nothing)
 {
     const auto to = linked(element("a"), disk("d"));
     const Sample_Disk* before = to->Dependent;

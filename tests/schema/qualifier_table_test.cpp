@@ -83,6 +83,24 @@ TEST(Qualifier_Table, reported_codes_have_their_texts)
     EXPECT_EQ(text_of("CIM_ConcreteJob", "JobState", "7"), "Completed");
 }
 
+// The meta-data's flag and the table's row go together: the one says that it is an instance, the other of which class.
+TEST(Qualifier_Table, every_embedded_instance_has_its_class)
+{
+    const zmlr::Meta_Repository& repository = zmlr::meta_repository();
+    for (const zmlr::Meta_Class* c : std::span(repository.meta_classes, repository.num_meta_classes))
+        for (zmlr::uint32 i = 0; i < c->num_meta_features; i++)
+        {
+            const zmlr::Meta_Feature* feature = c->meta_features[i];
+            const bool flagged = c->locals[i].local && (feature->flags & zmlr::Flag_EmbeddedInstance) != 0;
+            EXPECT_EQ(find(c->name, feature->name, "EmbeddedInstance") != nullptr, flagged) << c->name << "." << feature->name;
+        }
+
+    const Qualifier_Row* setting = find("CIM_AllocatedLogicalElement", "AllocationState", "EmbeddedInstance");
+    ASSERT_NE(setting, nullptr);
+    EXPECT_FALSE(setting->array);
+    EXPECT_STREQ(setting->values[0], "CIM_SettingData");
+}
+
 TEST(Qualifier_Table, every_served_class_is_described)
 {
     const zmlr::Meta_Repository& repository = zmlr::meta_repository();
