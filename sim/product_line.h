@@ -27,7 +27,7 @@ Adapter usual_adapter(const Product& product, std::size_t index);
 Port usual_port(const Adapter& adapter, std::size_t adapter_index, std::size_t number, std::size_t eth_number);
 
 // Vital product data with the given field-replaceable unit number: an identifier text, the read-only keywords and their
-// checksum, as in the PCI Local Bus Specification 3.0, appendix I.
+// checksum, as in the PCI Local Bus 3.0, appendix I.
 std::vector<std::uint8_t> build_vpd(const Adapter& adapter, std::string_view fru_number);
 
 } // namespace hxasim

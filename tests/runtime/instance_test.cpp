@@ -196,6 +196,35 @@ TEST(Instance, keys_decide_alone_and_across_subclasses)
     EXPECT_FALSE(key_eq(first.ptr(), a.ptr()));
 }
 
+TEST(Instance, keys_of_another_kind_are_never_equal)
+{
+    const Ref<Sample_Person> person(create<Sample_Person>(false));
+    void (*const changes[])(Meta_Property&) = {
+        [](Meta_Property& p) { p.flags &= ~uint32{Flag_Key}; },
+        [](Meta_Property& p) { p.type = UINT64; },
+        [](Meta_Property& p) { p.subscript = -1; },
+        [](Meta_Property& p) { p.name = "Title"; },
+    };
+    for (const auto& change : changes)
+    {
+        Meta_Property changed = *property<Sample_Person>("Name");
+        change(changed);
+        Meta_Class other = Sample_Person::static_meta_class;
+        const Meta_Feature* const features[] = {&changed};
+        other.meta_features = features;
+        EXPECT_FALSE(key_eq(person.ptr(), Ref<Instance>(create(&other, false)).ptr()));
+    }
+
+    // References to unrelated classes differ even while both are unset.
+    Meta_Reference to_person = *find_reference(&Sample_Link::static_meta_class, "Dependent");
+    to_person.meta_class = &Sample_Person::static_meta_class;
+    const Meta_Feature* const* own = Sample_Link::static_meta_class.meta_features;
+    const Meta_Feature* const features[] = {own[0], &to_person, own[2], own[3]};
+    Meta_Class other = Sample_Link::static_meta_class;
+    other.meta_features = features;
+    EXPECT_FALSE(key_eq(linked({}, {}).ptr(), Ref<Instance>(create(&other, false)).ptr()));
+}
+
 TEST(Instance, filter_leaves_what_was_asked_for)
 {
     const struct
