@@ -33,7 +33,8 @@ void enumerate_fc_ports(benchmark::State& state)
     const auto requests = static_cast<double>(hxasim::request_count() - before);
     state.counters["ports"] = static_cast<double>(ports) / static_cast<double>(state.iterations());
     state.counters["requests/port"] = requests / static_cast<double>(ports);
-    state.counters["time/port"] = benchmark::Counter(static_cast<double>(ports), benchmark::Counter::kIsRate | benchmark::Counter::kInvert);
+    state.counters["time/port"] =
+        benchmark::Counter(static_cast<double>(ports), benchmark::Counter::kIsRate | benchmark::Counter::kInvert);
 }
 
 } // namespace

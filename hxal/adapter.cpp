@@ -239,3 +239,16 @@ const char* hxal_adapter_get_name(unsigned ad)
 
 hxa_boolean_t hxal_adapter_is_enabled(int ad) { return all_in_state(hxal_adapter_open_idx(ad), HXA_IOC_OPERATIONAL); }
 hxa_boolean_t hxal_adapter_is_disabled(int ad) { return all_in_state(hxal_adapter_open_idx(ad), HXA_IOC_DISABLED); }
+
+void hxal_adapter_update_ioc(int ad, const hxal_t* ioc)
+{
+    const hxal_adapter_t* adapter = hxal_adapter_open_idx(ad);
+    if (!adapter || !ioc)
+        return;
+    hxal_t* copy = hxal::is_fc(*ioc) ? adapter->fcioc_list : adapter->ethioc_list;
+    if (!copy)
+        return;
+    copy->fd = ioc->fd;
+    if (auto descriptor = hxal::descriptor_of(ioc->fd))
+        static_cast<hxal::Ioc_Node*>(copy)->node = std::move(descriptor);
+}

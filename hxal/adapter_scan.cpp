@@ -112,16 +112,3 @@ hxal_adapter_t* hxal::adapter_list() { return adapters.head; }
 
 unsigned hxal_adapter_get_num(void) { return static_cast<unsigned>(adapters.count); }
 unsigned hxal_adapter_get_count(void) { return hxal_adapter_get_num(); }
-
-void hxal_adapter_update_ioc(int ad, const hxal_t* ioc)
-{
-    hxal_adapter_t* adapter = hxal_adapter_open_idx(ad);
-    if (!adapter || !ioc)
-        return;
-    hxal_t* copy = list_for(*adapter, *ioc);
-    if (!copy)
-        return;
-    copy->fd = ioc->fd;
-    if (auto descriptor = hxal::descriptor_of(ioc->fd))
-        static_cast<Ioc_Node*>(copy)->node = std::move(descriptor);
-}

@@ -2,23 +2,11 @@
 
 namespace cimserver
 {
-namespace
-{
-
-thread_local const Request_User* current_user = nullptr;
-
-} // namespace
-
-Request_User::Request_User(std::string name) : _name(std::move(name)), _outer(current_user) { current_user = this; }
-
-Request_User::~Request_User() { current_user = _outer; }
-
-std::string Request_User::current() { return current_user ? current_user->_name : "root"; }
 
 Request::Request(CMPIFlags flags) : _context(make<Context_Object>())
 {
     _context.entries.push_back({CMPIInvocationFlags, {CMPI_uint32, std::uint64_t{flags}}});
-    _context.entries.push_back({CMPIPrincipal, {CMPI_string, Request_User::current()}});
+    _context.entries.push_back({CMPIPrincipal, {CMPI_string, "root"}}); // clients are not told apart on loopback
 }
 
 } // namespace cimserver

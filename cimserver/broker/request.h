@@ -3,26 +3,8 @@
 
 #include "cimserver/broker/objects.h"
 
-#include <string>
-
 namespace cimserver
 {
-
-// Names the user for whom the calling thread works while the scope lasts; without one that is "root".
-class Request_User
-{
-public:
-    explicit Request_User(std::string name);
-    ~Request_User();
-    Request_User(const Request_User&) = delete;
-    Request_User& operator=(const Request_User&) = delete;
-
-    static std::string current();
-
-private:
-    const std::string _name;
-    const Request_User* _outer;
-};
 
 // Lives on the stack of the thread that calls the module.
 class Request
