@@ -75,7 +75,7 @@ private:
     void submit(MHD_Connection* connection, Exchange& exchange);
     void work(MHD_Connection* connection, Exchange& exchange) noexcept;
     void enter(MHD_Connection* connection, Connection_Watch::Phase phase);
-    void close_listener();
+    void refuse_connections();
     bool wait_for_answers(Clock::time_point deadline);
 
     const Http_Limits _limits;
@@ -125,8 +125,8 @@ bool Http_Server::Daemon::stop(Clock::time_point deadline)
 {
     if (!_http)
         return true;
-    _stopping = true;
-    close_listener();
+    if (!_stopping.exchange(true))
+        refuse_connections();
     if (!_pool.stop(deadline))
         return false;
     wait_for_answers(deadline);
@@ -135,12 +135,10 @@ bool Http_Server::Daemon::stop(Clock::time_point deadline)
     return true;
 }
 
-void Http_Server::Daemon::close_listener()
+void Http_Server::Daemon::refuse_connections()
 {
-    if (_listener.socket() < 0)
-        return;
     MHD_quiesce_daemon(_http);
-    _listener.close();
+    _listener.refuse();
 }
 
 // A client that does not take its answer does not keep the server from stopping.

@@ -34,17 +34,14 @@ Listener::Listener(std::uint16_t port) : _socket(::socket(AF_INET, SOCK_STREAM |
         getsockname(_socket, as_address(address), &size) != 0)
     {
         const int error = errno;
-        close();
+        close(_socket);
         throw std::system_error(error, std::generic_category(), "cannot listen on 127.0.0.1:" + std::to_string(port));
     }
     _port = ntohs(address.sin_port);
 }
 
-void Listener::close()
-{
-    if (_socket >= 0)
-        ::close(_socket);
-    _socket = -1;
-}
+Listener::~Listener() { close(_socket); }
+
+void Listener::refuse() { shutdown(_socket, SHUT_RDWR); }
 
 } // namespace cimserver

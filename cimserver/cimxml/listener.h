@@ -11,13 +11,16 @@ class Listener
 {
 public:
     explicit Listener(std::uint16_t port); // 0 picks a free one; throws std::system_error when the port cannot be had
-    ~Listener() { close(); }
+    ~Listener();
     Listener(const Listener&) = delete;
     Listener& operator=(const Listener&) = delete;
 
-    int socket() const { return _socket; } // -1 when closed
+    int socket() const { return _socket; }
     std::uint16_t port() const { return _port; }
-    void close();
+
+    // Refuses new connections. The socket itself stays until the end: its number must not be given away while a thread may
+    // still be about to accept from it.
+    void refuse();
 
 private:
     int _socket;

@@ -17,7 +17,7 @@
 
 #define EXPORT __attribute__((visibility("default")))
 
-static const CMPIBroker* broker;
+static const CMPIBroker* _Atomic broker; /* the factories of all classes set it, on any thread */
 static struct Test_Module_State state = {3, 0, CMPI_RC_OK};
 
 EXPORT struct Test_Module_State* test_module_state(void);
@@ -208,7 +208,7 @@ static CMPIStatus cleanup(CMPIInstanceMI* mi, const CMPIContext* context, CMPIBo
 
 static CMPIInstanceMI* made(const CMPIBroker* creator, CMPIInstanceMI* mi)
 {
-    __atomic_store_n(&broker, creator, __ATOMIC_SEQ_CST);
+    broker = creator;
     __atomic_add_fetch(&state.live_interfaces, 1, __ATOMIC_SEQ_CST);
     return mi;
 }
