@@ -23,6 +23,14 @@ struct Family
 };
 
 inline constexpr Family common_family{.fc = 'C', .ll = 'D'};
+inline constexpr Family event_family{.fc = 'C', .ll = 'C'};
+inline constexpr Family iocfc_family{.fc = 0xB0, .ll = 'D'};
+inline constexpr Family lport_family{.fc = 0xB1, .ll = 0xB1};
+inline constexpr Family rport_family{.fc = 0xB2, .ll = 0xB2};
+inline constexpr Family flash_family{.fc = 0xB5, .ll = 0xB5};
+inline constexpr Family passthrough_family{.fc = 0xBA, .ll = 0xBA};
+inline constexpr Family itnim_family{.fc = 0xBB, .ll = 0xBB};
+inline constexpr Family fcoe_family{.fc = 0xC1, .ll = 'D'};
 
 // Its address stands for the record type in a row of the catalogue.
 template <typename Record> inline constexpr char record_tag = 0;
@@ -33,7 +41,7 @@ struct Command
     Family family;
     std::uint8_t number;
     std::uint32_t size; // of the record, in bytes
-    const char* record; // tag of the record type
+    const char* record; // tag of the record type; null while no operation has its record
 };
 
 template <typename Record> consteval Command command(std::string_view name, Family family, std::uint8_t number)
@@ -41,15 +49,86 @@ template <typename Record> consteval Command command(std::string_view name, Fami
     return {.name = name, .family = family, .number = number, .size = sizeof(Record), .record = &record_tag<Record>};
 }
 
+consteval Command command(std::string_view name, Family family, std::uint8_t number, std::uint32_t size)
+{
+    return {.name = name, .family = family, .number = number, .size = size, .record = nullptr};
+}
+
 // clang-format off
 inline constexpr std::array catalogue{
-    //      record                       name                     family         number
-    command<hxa_ioctl_ioc_get_version_t>("IOCMD_IOC_GET_VERSION", common_family, 0x01),
-    command<hxa_ioctl_ioc_get_inst_t>   ("IOCMD_IOC_GET_INST",    common_family, 0x02),
-    command<hxa_ioctl_ioc_attr_t>       ("IOCMD_IOC_GET_ATTR",    common_family, 0x06),
-    command<hxa_ioctl_ioc_info_t>       ("IOCMD_IOC_GET_INFO",    common_family, 0x07),
-    command<hxa_ioctl_aen_t>            ("IOCMD_AEN_SYNC",        common_family, 0x2A),
-    command<hxa_ioctl_port_attr_t>      ("IOCMD_PORT_GET_ATTR",   common_family, 0x2D),
+    //      record                       name                          family              no., size without record
+    command<hxa_ioctl_ioc_get_version_t>("IOCMD_IOC_GET_VERSION",      common_family,      0x01),
+    command<hxa_ioctl_ioc_get_inst_t>(   "IOCMD_IOC_GET_INST",         common_family,      0x02),
+    command<hxa_ioctl_gen_t>(            "IOCMD_IOC_ENABLE",           common_family,      0x03),
+    command<hxa_ioctl_gen_t>(            "IOCMD_IOC_DISABLE",          common_family,      0x04),
+    command<hxa_ioctl_ioc_attr_t>(       "IOCMD_IOC_GET_ATTR",         common_family,      0x06),
+    command<hxa_ioctl_ioc_info_t>(       "IOCMD_IOC_GET_INFO",         common_family,      0x07),
+    command(                             "IOCMD_IOC_GET_STATS",        common_family,      0x08, 84),
+    command<hxa_ioctl_gen_t>(            "IOCMD_IOC_RESET_STATS",      common_family,      0x09),
+    command(                             "IOCMD_IOC_SET_POWER",        common_family,      0x0A, 16),
+    command(                             "IOCMD_IOC_SET_ADAPTER_NAME", common_family,      0x0C, 72),
+    command(                             "IOCMD_IOC_SET_PORT_NAME",    common_family,      0x0D, 72),
+    command(                             "IOCMD_DIAG_REGREAD",         common_family,      0x0E, 32),
+    command(                             "IOCMD_DIAG_REGWRITE",        common_family,      0x10, 24),
+    command(                             "IOCMD_DIAG_TEMP",            common_family,      0x11, 8),
+    command(                             "IOCMD_DIAG_MEMTEST",         common_family,      0x13, 56),
+    command(                             "IOCMD_DIAG_LOOPBACK",        common_family,      0x14, 48),
+    command(                             "IOCMD_DIAG_FWPING",          common_family,      0x15, 56),
+    command(                             "IOCMD_DIAG_QUEUETEST",       common_family,      0x16, 24),
+    command(                             "IOCMD_DIAG_SFP",             common_family,      0x18, 224),
+    command(                             "IOCMD_DIAG_LED",             common_family,      0x19, 24),
+    command(                             "IOCMD_DIAG_BEACON",          common_family,      0x1A, 20),
+    command(                             "IOCMD_DIAG_LL_LOOPBACK",     common_family,      0x1B, 44),
+    command(                             "IOCMD_DIAG_LB_STAT",         common_family,      0x1C, 8),
+    command(                             "IOCMD_AEN_GET",              event_family,       0x29, 88),
+    command<hxa_ioctl_aen_t>(            "IOCMD_AEN_SYNC",             common_family,      0x2A),
+    command<hxa_ioctl_gen_t>(            "IOCMD_PORT_ENABLE",          common_family,      0x2B),
+    command<hxa_ioctl_gen_t>(            "IOCMD_PORT_DISABLE",         common_family,      0x2C),
+    command<hxa_ioctl_port_attr_t>(      "IOCMD_PORT_GET_ATTR",        common_family,      0x2D),
+    command(                             "IOCMD_PORT_GET_STATS",       common_family,      0x2E, 24),
+    command<hxa_ioctl_gen_t>(            "IOCMD_PORT_RESET_STATS",     common_family,      0x31),
+    command(                             "IOCMD_PORT_CFG_TOPO",        common_family,      0x32, 16),
+    command(                             "IOCMD_PORT_CFG_SPEED",       common_family,      0x33, 16),
+    command(                             "IOCMD_PORT_CFG_ALPA",        common_family,      0x34, 16),
+    command(                             "IOCMD_PORT_CLR_ALPA",        common_family,      0x35, 16),
+    command(                             "IOCMD_PORT_CFG_MAXFRSZ",     common_family,      0x36, 8),
+    command(                             "IOCMD_PORT_TRUNK_ENABLE",    common_family,      0x37, 8),
+    command(                             "IOCMD_PORT_TRUNK_DISABLE",   common_family,      0x38, 8),
+    command(                             "IOCMD_PORT_CFG_RNID",        common_family,      0x39, 56),
+    command(                             "IOCMD_PORT_GET_RNID",        common_family,      0x3A, 56),
+    command(                             "IOCMD_SFP_MEDIA",            common_family,      0x3F, 12),
+    command(                             "IOCMD_SFP_SPEED",            common_family,      0x40, 12),
+    command(                             "IOCMD_ETHPORT_GET_STATS",    common_family,      0x42, 288),
+    command(                             "IOCMD_ETHPORT_GET_ATTR",     common_family,      0x43, 24),
+    command(                             "IOCMD_IOCFC_GET_ATTR",       iocfc_family,       0x01, 64),
+    command(                             "IOCMD_IOCFC_GET_STATS",      iocfc_family,       0x02, 472),
+    command<hxa_ioctl_gen_t>(            "IOCMD_IOCFC_RESET_STATS",    iocfc_family,       0x03),
+    command(                             "IOCMD_IOCFC_SET_INTR",       iocfc_family,       0x04, 16),
+    command(                             "IOCMD_LPORT_GET_ATTR",       lport_family,       0x01, 232),
+    command(                             "IOCMD_LPORT_GET_STATS",      lport_family,       0x02, 192),
+    command(                             "IOCMD_LPORT_RESET_STATS",    lport_family,       0x03, 16),
+    command(                             "IOCMD_LPORT_GET_RPORTS",     lport_family,       0x04, 32),
+    command(                             "IOCMD_RPORT_ADD",            rport_family,       0x01, 24),
+    command(                             "IOCMD_RPORT_REMOVE",         rport_family,       0x02, 24),
+    command(                             "IOCMD_RPORT_GET_STATS",      rport_family,       0x03, 288),
+    command(                             "IOCMD_RPORT_RESET_STATS",    rport_family,       0x04, 24),
+    command(                             "IOCMD_RPORT_GET_ATTR",       rport_family,       0x05, 344),
+    command(                             "IOCMD_RPORT_GET_SCSI_ADDR",  rport_family,       0x06, 40),
+    command(                             "IOCMD_RPORT_SET_SPEED",      rport_family,       0x07, 32),
+    command(                             "IOCMD_FLASH_GET_ATTR",       flash_family,       0x01, 528),
+    command(                             "IOCMD_FLASH_ERASE_PART",     flash_family,       0x02, 24),
+    command(                             "IOCMD_FLASH_UPDATE_PART",    flash_family,       0x03, 24),
+    command(                             "IOCMD_FLASH_READ_PART",      flash_family,       0x04, 24),
+    command(                             "IOCMD_FLASH_MFG_INFO",       flash_family,       0x05, 264),
+    command<hxa_ioctl_gen_t>(            "IOCMD_FLASH_ENABLE_OPTROM",  flash_family,       0x06),
+    command<hxa_ioctl_gen_t>(            "IOCMD_FLASH_DISABLE_OPTROM", flash_family,       0x07),
+    command(                             "IOCMD_SCSI_CMND",            passthrough_family, 0x01, 80),
+    command(                             "IOCMD_FCPT",                 passthrough_family, 0x02, 96),
+    command(                             "IOCMD_ITNIM_GET_ATTR",       itnim_family,       0x01, 56),
+    command(                             "IOCMD_ITNIM_GET_STATS",      itnim_family,       0x02, 168),
+    command(                             "IOCMD_ITNIM_RESET_STATS",    itnim_family,       0x03, 24),
+    command(                             "IOCMD_FCOE_GET_STATS",       fcoe_family,        0x01, 368),
+    command<hxa_ioctl_gen_t>(            "IOCMD_FCOE_RESET_STATS",     fcoe_family,        0x02),
 };
 // clang-format on
 

@@ -1,10 +1,19 @@
 #include "hxal/records/commands.h"
 #include "simulated_host.h"
 
+#include <algorithm>
 #include <random>
 
 namespace
 {
+
+// Whether the simulated drivers answer the command at all.
+bool is_answered(const hxal::Command& command)
+{
+    constexpr std::string_view answered[] = {"IOCMD_IOC_GET_VERSION", "IOCMD_IOC_GET_INST", "IOCMD_IOC_GET_ATTR",
+                                             "IOCMD_IOC_GET_INFO",    "IOCMD_AEN_SYNC",     "IOCMD_PORT_GET_ATTR"};
+    return std::ranges::find(answered, command.name) != std::end(answered);
+}
 
 class Hostile_Driver : public Simulated_Host
 {
@@ -14,6 +23,9 @@ protected:
     {
         hxasim::clear_faults();
         for (const hxal::Command& command : hxal::catalogue)
+        {
+            if (!is_answered(command))
+                continue;
             for (const std::optional<int> instance : {std::optional(0), std::optional(1), std::optional<int>()})
             {
                 const std::size_t kept = random() % 8 == 0 ? 0 : command.name == "IOCMD_IOC_GET_INST" ? 9 : 8;
@@ -22,6 +34,7 @@ protected:
                 hxasim::inject(
                     {.command = std::string(command.name), .instance = instance, .answer = {{kept, std::move(bytes)}}});
             }
+        }
     }
 
     static void use_adapter(int ad)
