@@ -22,6 +22,7 @@ public:
     Operations& operator=(const Operations&) = delete;
 
     // Class operations, answered from the module's meta-data. An empty class name means: from the top of the tree.
+    // An unknown class is CIM_ERR_NOT_FOUND to get_class and CIM_ERR_INVALID_CLASS to every other operation (DSP0200).
     virtual const zmlr::Meta_Class* get_class(const std::string& name_space, const std::string& class_name) = 0;
     virtual std::vector<const zmlr::Meta_Class*> enumerate_classes(const std::string& name_space, const std::string& class_name,
                                                                    bool deep_inheritance) = 0;

@@ -137,7 +137,7 @@ def errors():
     wrong = pywbem.CIMInstanceName
     good = dict(zip(FC_PORT_KEYS, ["ZEMLAR_ComputerSystem", "nowhere", "ZEMLAR_FCPort", "0000000000000000"]))
     yield "unknown class", lambda c: c.EnumerateInstances("ZEMLAR_Nothing"), pywbem.CIM_ERR_INVALID_CLASS
-    yield "unknown class, get class", lambda c: c.GetClass("CIM_Nothing"), pywbem.CIM_ERR_INVALID_CLASS
+    yield "unknown class, get class", lambda c: c.GetClass("CIM_Nothing"), pywbem.CIM_ERR_NOT_FOUND
     yield "unknown class, names", lambda c: c.EnumerateClassNames(ClassName="CIM_Nothing"), pywbem.CIM_ERR_INVALID_CLASS
     yield "unknown name space", lambda c: c.EnumerateInstances("ZEMLAR_FCPort", "root/nowhere"), pywbem.CIM_ERR_INVALID_NAMESPACE
     yield "no such instance", lambda c: c.GetInstance(wrong("ZEMLAR_FCPort", good)), pywbem.CIM_ERR_NOT_FOUND
