@@ -17,13 +17,7 @@ class Adapters : public Inventory_Test
 protected:
     static Instance_Array controllers() { return FCHBAManager::getFCHBAManager().getInstances(CLASSID_PortController); }
 
-    static std::vector<std::string> values(const char* property)
-    {
-        std::vector<std::string> texts;
-        for (const Instance* controller : controllers())
-            texts.push_back(value_of(controller, property));
-        return texts;
-    }
+    static std::vector<std::string> values(const char* property) { return values_of(controllers(), property); }
 };
 
 } // namespace

@@ -17,14 +17,7 @@ class FC_Ports : public Inventory_Test
 protected:
     static Instance_Array ports() { return FCHBAManager::getFCHBAManager().getInstances(CLASSID_FCPort); }
 
-    static std::vector<std::string> values(const Instance_Array& instances, const char* property)
-    {
-        std::vector<std::string> texts;
-        for (const Instance* port : instances)
-            texts.push_back(value_of(port, property));
-        return texts;
-    }
-    static std::vector<std::string> values(const char* property) { return values(ports(), property); }
+    static std::vector<std::string> values(const char* property) { return values_of(ports(), property); }
 };
 
 } // namespace
@@ -55,15 +48,15 @@ TEST_F(FC_Ports, Are_Described_Property_By_Property)
     PermanentAddress = "100000051E100001"
     SupportedMaximumTransmissionUnit = 2112
 )");
-    EXPECT_THAT(values(all, "DeviceID"),
+    EXPECT_THAT(values_of(all, "DeviceID"),
                 ElementsAre(R"("100000051E100000")", R"("100000051E100001")", R"("100000051E100100")", R"("100000051E100101")",
                             R"("100000051E100200")", R"("100000051E100201")", R"("100000051E100300")", R"("100000051E100301")"));
-    EXPECT_THAT(values(all, "PortNumber"), ElementsAre("0", "1", "0", "1", "0", "1", "0", "1"));
-    EXPECT_THAT(values(all, "PortType"), ElementsAre("10", "10", "11", "10", "10", "10", "10", "10"));
-    EXPECT_THAT(values(all, "Speed"), ElementsAre("10000000000", "0", "2000000000", "0", "10000000000", "0", "0", "0"));
-    EXPECT_THAT(values(all, "MaxSpeed"), ElementsAre("10000000000", "10000000000", "4000000000", "4000000000", "10000000000",
-                                                     "10000000000", "8000000000", "8000000000"));
-    EXPECT_THAT(values(all, "SupportedMaximumTransmissionUnit"),
+    EXPECT_THAT(values_of(all, "PortNumber"), ElementsAre("0", "1", "0", "1", "0", "1", "0", "1"));
+    EXPECT_THAT(values_of(all, "PortType"), ElementsAre("10", "10", "11", "10", "10", "10", "10", "10"));
+    EXPECT_THAT(values_of(all, "Speed"), ElementsAre("10000000000", "0", "2000000000", "0", "10000000000", "0", "0", "0"));
+    EXPECT_THAT(values_of(all, "MaxSpeed"), ElementsAre("10000000000", "10000000000", "4000000000", "4000000000", "10000000000",
+                                                        "10000000000", "8000000000", "8000000000"));
+    EXPECT_THAT(values_of(all, "SupportedMaximumTransmissionUnit"),
                 ElementsAre("2112", "2112", "2112", "2112", "1024", "2112", "2112", "2112"));
 }
 
@@ -130,11 +123,11 @@ TEST_F(FC_Ports, Are_Found_By_Their_Adapter)
 {
     plug_text(R"({"adapters": [{"kind": "cna"}, {"kind": "fc-hba"}]})");
     const FCHBAManager& manager = FCHBAManager::getFCHBAManager();
-    EXPECT_THAT(values(manager.getFCPortInstancesByAdapter("00051e200001"), "DeviceID"),
+    EXPECT_THAT(values_of(manager.getFCPortInstancesByAdapter("00051e200001"), "DeviceID"),
                 ElementsAre(R"("100000051E100000")", R"("100000051E100001")"));
-    EXPECT_THAT(values(manager.getFCPortInstancesByAdapter("200000051E100100"), "PortNumber"), ElementsAre("0", "1"));
+    EXPECT_THAT(values_of(manager.getFCPortInstancesByAdapter("200000051E100100"), "PortNumber"), ElementsAre("0", "1"));
     log();
-    EXPECT_THAT(values(manager.getFCPortInstancesByAdapter("00051E999999"), "DeviceID"), IsEmpty());
+    EXPECT_THAT(values_of(manager.getFCPortInstancesByAdapter("00051E999999"), "DeviceID"), IsEmpty());
     EXPECT_THAT(log(), Contains("WARN PortHelper: Failed to get adapterId"));
 }
 

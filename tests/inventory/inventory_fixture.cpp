@@ -156,6 +156,14 @@ std::string value_of(const Instance* instance, const char* property)
     return text_of(instance, find_property(instance->meta_class, property));
 }
 
+std::vector<std::string> values_of(const Instance_Array& instances, const char* property)
+{
+    std::vector<std::string> texts;
+    for (const Instance* instance : instances)
+        texts.push_back(value_of(instance, property));
+    return texts;
+}
+
 std::string describe(const Instance* instance)
 {
     const Meta_Class* meta_class = instance->meta_class;

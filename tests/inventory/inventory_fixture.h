@@ -35,7 +35,8 @@ protected:
 std::string describe(const Instance* instance);
 std::string describe(const Instance_Array& instances);
 
-// The first instance's property in the form that describe() gives it; empty when it is null.
+// A property in the form that describe() gives it; empty when it is null.
 std::string value_of(const Instance* instance, const char* property);
+std::vector<std::string> values_of(const Instance_Array& instances, const char* property);
 
 } // namespace zmlr
