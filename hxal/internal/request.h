@@ -1,9 +1,7 @@
 // Requests to a driver: build a record, then send it. Every request of the library leaves through send().
 //
 //     auto record = request_for<hxa_ioctl_port_attr_t>(*ioc);
-//     if (const hxa_status_t sent = send(*ioc, "IOCMD_PORT_GET_ATTR", record); sent != HXA_STATUS_OK)
-//         return sent;                 // the call failed, the record is as it was
-//     return record.status;            // what the driver says
+//     return exchange(*ioc, "IOCMD_PORT_GET_ATTR", record, &hxa_ioctl_port_attr_t::attr, attr);
 #pragma once
 
 #include "hxal/ioc.h"
@@ -46,6 +44,34 @@ template <typename Record>
 hxa_status_t send(const hxal_s& ioc, Command_Name<std::type_identity_t<Record>> command, Record& record)
 {
     return transfer(ioc, command.row, &record);
+}
+
+// Sends the record: the status of errno when the call fails, else what the driver says.
+template <typename Record>
+hxa_status_t exchange(const hxal_s& ioc, Command_Name<std::type_identity_t<Record>> command, Record& record)
+{
+    const hxa_status_t sent = send(ioc, command, record);
+    return sent == HXA_STATUS_OK ? record.status : sent;
+}
+
+// The same, and copies a field of the answer out, whatever the driver says; a call that fails leaves the caller's buffer alone.
+template <typename Record, typename Output>
+hxa_status_t exchange(const hxal_s& ioc, Command_Name<std::type_identity_t<Record>> command, Record& record,
+                      Output Record::*field, Output* output)
+{
+    if (const hxa_status_t sent = send(ioc, command, record); sent != HXA_STATUS_OK)
+        return sent;
+    *output = record.*field;
+    return record.status;
+}
+
+// A request that carries nothing but the instance.
+inline hxa_status_t request(const hxal_t* ioc, Command_Name<hxa_ioctl_gen_t> command)
+{
+    if (!ioc)
+        return HXA_STATUS_EINVAL;
+    auto record = request_for<hxa_ioctl_gen_t>(*ioc);
+    return exchange(*ioc, command, record);
 }
 
 } // namespace hxal
