@@ -1,6 +1,5 @@
 #include "runtime/instance.h"
 #include "runtime/mutex.h"
-#include "runtime/thread_context.h"
 #include "tests/runtime/sample_classes.h"
 
 #include <gtest/gtest.h>
@@ -45,19 +44,6 @@ TEST(Mutex, is_held_by_one_thread_at_a_time)
             mutex.unlock();
         in_threads(1, [&] { EXPECT_EQ(mutex.try_lock(), -1); });
     }
-}
-
-TEST(Thread_Context, each_thread_has_its_own_stack)
-{
-    Thread_Context lower, upper;
-    Thread_Context::push(&lower);
-    Thread_Context::push(&upper);
-    EXPECT_EQ(Thread_Context::top(), &upper);
-    in_threads(1, [] { EXPECT_EQ(Thread_Context::top(), nullptr); });
-    Thread_Context::pop();
-    EXPECT_EQ(Thread_Context::top(), &lower);
-    Thread_Context::pop();
-    EXPECT_EQ(Thread_Context::top(), nullptr);
 }
 
 TEST(Counts, threads_share_values_and_instances)

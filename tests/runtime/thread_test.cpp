@@ -1,0 +1,209 @@
+#include "runtime/thread.h"
+#include "runtime/thread_context.h"
+#include "runtime/time.h"
+
+#include <gtest/gtest.h>
+
+#include <atomic>
+#include <cerrno>
+#include <csignal>
+#include <memory>
+#include <mutex>
+#include <stdexcept>
+#include <string>
+#include <utility>
+
+using namespace zmlr;
+
+namespace
+{
+
+// What happened to contexts, in its order, whichever thread it happened in.
+class Events
+{
+public:
+    void add(const std::string& event)
+    {
+        const std::lock_guard guard(_mutex);
+        _text += event + " ";
+    }
+
+    std::string text()
+    {
+        const std::lock_guard guard(_mutex);
+        return _text;
+    }
+
+private:
+    std::mutex _mutex;
+    std::string _text;
+};
+
+// Serves threads; there is no server behind it.
+class Recording_Context : public Thread_Context
+{
+public:
+    explicit Recording_Context(Events& events, Thread_Context* child = nullptr) : _events(events), _child(child) {}
+    ~Recording_Context() override { _events.add("delete"); }
+
+    Thread_Context* thread_create_hook(void*) override
+    {
+        _events.add("create");
+        return std::exchange(_child, nullptr);
+    }
+    void thread_start_hook() noexcept override { _events.add(top() == this ? "start" : "start-elsewhere"); }
+    void thread_exit_hook() noexcept override { _events.add(top() == this ? "exit" : "exit-elsewhere"); }
+
+    int instance_enumerator_create(const char*, const Instance*, Instance_Enumerator_Rep*&) override { return -1; }
+    void instance_enumerator_destroy(Instance_Enumerator_Rep*) override {}
+    bool instance_enumerator_more(const Instance_Enumerator_Rep*) override { return false; }
+    void instance_enumerator_next(Instance_Enumerator_Rep*) override {}
+    Ref<Instance> instance_enumerator_get(const Instance_Enumerator_Rep*) override { return {}; }
+    Ref<Instance> get_instance(const char*, const Instance*) override { return {}; }
+    int create_instance(const char*, const Instance*) override { return -1; }
+    int delete_instance(const char*, const Instance*) override { return -1; }
+    int modify_instance(const char*, const Instance*) override { return -1; }
+    int invoke_method(const char*, const Instance*, Instance*) override { return -1; }
+    void allow_unload(bool) override {}
+    bool get_username(String&) override { return false; }
+
+private:
+    Events& _events;
+    Thread_Context* _child;
+};
+
+// Runs a procedure in a joined thread and returns its result.
+void* in_thread(Thread::Proc proc, void* arg = nullptr)
+{
+    Thread thread;
+    void* result = nullptr;
+    EXPECT_EQ(Thread::create_joinable(thread, proc, arg), 0);
+    EXPECT_EQ(Thread::join(thread, result), 0);
+    return result;
+}
+
+void* top_of_stack(void*) { return Thread_Context::top(); }
+
+TEST(Thread_Context, each_thread_has_its_own_stack)
+{
+    Events events;
+    Recording_Context lower(events), upper(events);
+    Thread_Context::push(&lower);
+    Thread_Context::push(&upper);
+    EXPECT_EQ(Thread_Context::top(), &upper);
+    EXPECT_EQ(in_thread(top_of_stack), nullptr) << "the hook supplied none";
+    Thread_Context::pop();
+    EXPECT_EQ(Thread_Context::top(), &lower);
+    Thread_Context::pop();
+    EXPECT_EQ(Thread_Context::top(), nullptr);
+}
+
+TEST(Thread, runs_in_the_context_that_its_creator_supplies)
+{
+    struct Case
+    {
+        const char* name;
+        Thread::Proc proc;
+        void* result;
+    };
+    static int value;
+    const Case cases[] = {
+        {"returns", [](void* arg) { return arg; }, &value},
+        {"exits", [](void* arg) -> void* { Thread::exit(arg); }, &value},
+        {"throws", [](void*) -> void* { throw std::runtime_error("no"); }, nullptr},
+        {"throws no exception", [](void*) -> void* { throw 1; }, nullptr},
+    };
+    for (const Case& c : cases)
+    {
+        SCOPED_TRACE(c.name);
+        Events events;
+        Recording_Context creator(events, new Recording_Context(events));
+        Thread_Context::push(&creator);
+        EXPECT_EQ(in_thread(c.proc, &value), c.result);
+        Thread_Context::pop();
+        EXPECT_EQ(events.text(), "create start exit delete ");
+    }
+}
+
+TEST(Thread, of_a_thread_without_context_has_none) { EXPECT_EQ(in_thread(top_of_stack), nullptr); }
+
+TEST(Thread, knows_itself)
+{
+    Thread thread;
+    EXPECT_FALSE(Thread::equal(Thread::self(), thread));
+    EXPECT_TRUE(Thread::equal(Thread::self(), Thread::self()));
+
+    static Thread creator = Thread::self();
+    EXPECT_EQ(in_thread([](void* arg) -> void* { return Thread::equal(creator, Thread::self()) ? arg : nullptr; }, &thread),
+              nullptr);
+}
+
+TEST(Thread, joins_joinable_threads_once)
+{
+    Thread thread;
+    void* result = nullptr;
+    EXPECT_EQ(Thread::join(thread, result), EINVAL) << "unset";
+
+    ASSERT_EQ(Thread::create_joinable(thread, top_of_stack, nullptr), 0);
+    EXPECT_EQ(Thread::join(thread, result), 0);
+    EXPECT_EQ(Thread::join(thread, result), EINVAL) << "joined";
+
+    ASSERT_EQ(Thread::create_detached(thread, top_of_stack, nullptr), 0);
+    EXPECT_EQ(Thread::join(thread, result), EINVAL) << "detached";
+}
+
+// A thread that cannot end before the lock is given back is let go by its handle's next use: nobody waits for it. The thread
+// sanitizer reports it if it were leaked.
+TEST(Thread, used_again_lets_the_thread_before_go)
+{
+    struct Shared
+    {
+        std::mutex mutex;
+        std::atomic<int> ended = 0;
+    };
+    static Shared shared;
+    constexpr Thread::Proc proc = [](void*) -> void*
+    {
+        const std::lock_guard guard(shared.mutex);
+        ++shared.ended;
+        return nullptr;
+    };
+
+    {
+        Thread thread;
+        const std::lock_guard held(shared.mutex);
+        for (int i = 0; i < 3; ++i)
+            ASSERT_EQ(Thread::create_joinable(thread, proc, nullptr), 0);
+    }
+    while (shared.ended < 3)
+        Time::sleep(Time::MSEC);
+}
+
+TEST(Time, sleeps_its_time_through_signals)
+{
+    static const pthread_t sleeper = pthread_self();
+    struct sigaction old, action{};
+    action.sa_handler = [](int) {};
+    sigaction(SIGUSR1, &action, &old);
+
+    const uint64 begin = Time::now();
+    Thread disturber;
+    ASSERT_EQ(Thread::create_joinable(
+                  disturber,
+                  [](void*) -> void*
+                  {
+                      for (int i = 0; i < 10; ++i, Time::sleep(2 * Time::MSEC))
+                          pthread_kill(sleeper, SIGUSR1);
+                      return nullptr;
+                  },
+                  nullptr),
+              0);
+    Time::sleep(50 * Time::MSEC);
+    EXPECT_GE(Time::now() - begin, 50 * Time::MSEC);
+
+    void* result = nullptr;
+    Thread::join(disturber, result);
+    sigaction(SIGUSR1, &old, nullptr);
+}
+
+} // namespace
