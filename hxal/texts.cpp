@@ -3,6 +3,7 @@
 #include "hxal/records/ethport.h"
 #include "hxal/records/flash.h"
 #include "hxal/records/ioc.h"
+#include "hxal/records/itnim.h"
 #include "hxal/records/port.h"
 #include "hxal/records/rport.h"
 #include "hxal/records/sfp.h"

@@ -5,8 +5,17 @@
 #pragma once
 
 #include "hxal/records/aen.h"
+#include "hxal/records/diag.h"
+#include "hxal/records/ethport.h"
+#include "hxal/records/fcoe.h"
+#include "hxal/records/fcpt.h"
 #include "hxal/records/ioc.h"
+#include "hxal/records/itnim.h"
+#include "hxal/records/lport.h"
 #include "hxal/records/port.h"
+#include "hxal/records/port_config.h"
+#include "hxal/records/port_stats.h"
+#include "hxal/records/rport.h"
 
 #include <array>
 #include <cstdint>
@@ -79,42 +88,42 @@ inline constexpr std::array catalogue{
     command(                             "IOCMD_DIAG_LED",             common_family,      0x19, 24),
     command(                             "IOCMD_DIAG_BEACON",          common_family,      0x1A, 20),
     command(                             "IOCMD_DIAG_LL_LOOPBACK",     common_family,      0x1B, 44),
-    command(                             "IOCMD_DIAG_LB_STAT",         common_family,      0x1C, 8),
+    command<hxa_ioctl_diag_lb_stat_t>(   "IOCMD_DIAG_LB_STAT",         common_family,      0x1C),
     command(                             "IOCMD_AEN_GET",              event_family,       0x29, 88),
     command<hxa_ioctl_aen_t>(            "IOCMD_AEN_SYNC",             common_family,      0x2A),
     command<hxa_ioctl_gen_t>(            "IOCMD_PORT_ENABLE",          common_family,      0x2B),
     command<hxa_ioctl_gen_t>(            "IOCMD_PORT_DISABLE",         common_family,      0x2C),
     command<hxa_ioctl_port_attr_t>(      "IOCMD_PORT_GET_ATTR",        common_family,      0x2D),
-    command(                             "IOCMD_PORT_GET_STATS",       common_family,      0x2E, 24),
+    command<hxa_ioctl_port_stats_t>(     "IOCMD_PORT_GET_STATS",       common_family,      0x2E),
     command<hxa_ioctl_gen_t>(            "IOCMD_PORT_RESET_STATS",     common_family,      0x31),
-    command(                             "IOCMD_PORT_CFG_TOPO",        common_family,      0x32, 16),
-    command(                             "IOCMD_PORT_CFG_SPEED",       common_family,      0x33, 16),
-    command(                             "IOCMD_PORT_CFG_ALPA",        common_family,      0x34, 16),
-    command(                             "IOCMD_PORT_CLR_ALPA",        common_family,      0x35, 16),
-    command(                             "IOCMD_PORT_CFG_MAXFRSZ",     common_family,      0x36, 8),
-    command(                             "IOCMD_PORT_TRUNK_ENABLE",    common_family,      0x37, 8),
-    command(                             "IOCMD_PORT_TRUNK_DISABLE",   common_family,      0x38, 8),
-    command(                             "IOCMD_PORT_CFG_RNID",        common_family,      0x39, 56),
-    command(                             "IOCMD_PORT_GET_RNID",        common_family,      0x3A, 56),
+    command<hxa_ioctl_port_cfg_topo_t>(  "IOCMD_PORT_CFG_TOPO",        common_family,      0x32),
+    command<hxa_ioctl_port_cfg_speed_t>( "IOCMD_PORT_CFG_SPEED",       common_family,      0x33),
+    command<hxa_ioctl_port_alpa_t>(      "IOCMD_PORT_CFG_ALPA",        common_family,      0x34),
+    command<hxa_ioctl_port_alpa_t>(      "IOCMD_PORT_CLR_ALPA",        common_family,      0x35),
+    command<hxa_ioctl_port_cfg_maxfrsize_t>("IOCMD_PORT_CFG_MAXFRSZ",     common_family,      0x36),
+    command<hxa_ioctl_port_trunk_t>(     "IOCMD_PORT_TRUNK_ENABLE",    common_family,      0x37),
+    command<hxa_ioctl_port_trunk_t>(     "IOCMD_PORT_TRUNK_DISABLE",   common_family,      0x38),
+    command<hxa_ioctl_port_rnid_t>(      "IOCMD_PORT_CFG_RNID",        common_family,      0x39),
+    command<hxa_ioctl_port_rnid_t>(      "IOCMD_PORT_GET_RNID",        common_family,      0x3A),
     command(                             "IOCMD_SFP_MEDIA",            common_family,      0x3F, 12),
     command(                             "IOCMD_SFP_SPEED",            common_family,      0x40, 12),
-    command(                             "IOCMD_ETHPORT_GET_STATS",    common_family,      0x42, 288),
-    command(                             "IOCMD_ETHPORT_GET_ATTR",     common_family,      0x43, 24),
+    command<hxa_ioctl_ethport_stats_t>(  "IOCMD_ETHPORT_GET_STATS",    common_family,      0x42),
+    command<hxa_ioctl_ethport_attr_t>(   "IOCMD_ETHPORT_GET_ATTR",     common_family,      0x43),
     command(                             "IOCMD_IOCFC_GET_ATTR",       iocfc_family,       0x01, 64),
     command(                             "IOCMD_IOCFC_GET_STATS",      iocfc_family,       0x02, 472),
     command<hxa_ioctl_gen_t>(            "IOCMD_IOCFC_RESET_STATS",    iocfc_family,       0x03),
     command(                             "IOCMD_IOCFC_SET_INTR",       iocfc_family,       0x04, 16),
-    command(                             "IOCMD_LPORT_GET_ATTR",       lport_family,       0x01, 232),
-    command(                             "IOCMD_LPORT_GET_STATS",      lport_family,       0x02, 192),
-    command(                             "IOCMD_LPORT_RESET_STATS",    lport_family,       0x03, 16),
-    command(                             "IOCMD_LPORT_GET_RPORTS",     lport_family,       0x04, 32),
-    command(                             "IOCMD_RPORT_ADD",            rport_family,       0x01, 24),
-    command(                             "IOCMD_RPORT_REMOVE",         rport_family,       0x02, 24),
-    command(                             "IOCMD_RPORT_GET_STATS",      rport_family,       0x03, 288),
-    command(                             "IOCMD_RPORT_RESET_STATS",    rport_family,       0x04, 24),
-    command(                             "IOCMD_RPORT_GET_ATTR",       rport_family,       0x05, 344),
-    command(                             "IOCMD_RPORT_GET_SCSI_ADDR",  rport_family,       0x06, 40),
-    command(                             "IOCMD_RPORT_SET_SPEED",      rport_family,       0x07, 32),
+    command<hxa_ioctl_lport_attr_t>(     "IOCMD_LPORT_GET_ATTR",       lport_family,       0x01),
+    command<hxa_ioctl_lport_stats_t>(    "IOCMD_LPORT_GET_STATS",      lport_family,       0x02),
+    command<hxa_ioctl_lport_reset_stats_t>("IOCMD_LPORT_RESET_STATS",    lport_family,       0x03),
+    command<hxa_ioctl_lport_get_rports_t>("IOCMD_LPORT_GET_RPORTS",     lport_family,       0x04),
+    command<hxa_ioctl_rport_t>(          "IOCMD_RPORT_ADD",            rport_family,       0x01),
+    command<hxa_ioctl_rport_t>(          "IOCMD_RPORT_REMOVE",         rport_family,       0x02),
+    command<hxa_ioctl_rport_stats_t>(    "IOCMD_RPORT_GET_STATS",      rport_family,       0x03),
+    command<hxa_ioctl_rport_reset_stats_t>("IOCMD_RPORT_RESET_STATS",    rport_family,       0x04),
+    command<hxa_ioctl_rport_attr_t>(     "IOCMD_RPORT_GET_ATTR",       rport_family,       0x05),
+    command<hxa_ioctl_rport_scsi_addr_t>("IOCMD_RPORT_GET_SCSI_ADDR",  rport_family,       0x06),
+    command<hxa_ioctl_rport_set_speed_t>("IOCMD_RPORT_SET_SPEED",      rport_family,       0x07),
     command(                             "IOCMD_FLASH_GET_ATTR",       flash_family,       0x01, 528),
     command(                             "IOCMD_FLASH_ERASE_PART",     flash_family,       0x02, 24),
     command(                             "IOCMD_FLASH_UPDATE_PART",    flash_family,       0x03, 24),
@@ -123,11 +132,11 @@ inline constexpr std::array catalogue{
     command<hxa_ioctl_gen_t>(            "IOCMD_FLASH_ENABLE_OPTROM",  flash_family,       0x06),
     command<hxa_ioctl_gen_t>(            "IOCMD_FLASH_DISABLE_OPTROM", flash_family,       0x07),
     command(                             "IOCMD_SCSI_CMND",            passthrough_family, 0x01, 80),
-    command(                             "IOCMD_FCPT",                 passthrough_family, 0x02, 96),
-    command(                             "IOCMD_ITNIM_GET_ATTR",       itnim_family,       0x01, 56),
-    command(                             "IOCMD_ITNIM_GET_STATS",      itnim_family,       0x02, 168),
-    command(                             "IOCMD_ITNIM_RESET_STATS",    itnim_family,       0x03, 24),
-    command(                             "IOCMD_FCOE_GET_STATS",       fcoe_family,        0x01, 368),
+    command<hxa_ioctl_fcpt_t>(           "IOCMD_FCPT",                 passthrough_family, 0x02),
+    command<hxa_ioctl_itnim_attr_t>(     "IOCMD_ITNIM_GET_ATTR",       itnim_family,       0x01),
+    command<hxa_ioctl_itnim_stats_t>(    "IOCMD_ITNIM_GET_STATS",      itnim_family,       0x02),
+    command<hxa_ioctl_itnim_reset_stats_t>("IOCMD_ITNIM_RESET_STATS",    itnim_family,       0x03),
+    command<hxa_ioctl_fcport_stats_t>(   "IOCMD_FCOE_GET_STATS",       fcoe_family,        0x01),
     command<hxa_ioctl_gen_t>(            "IOCMD_FCOE_RESET_STATS",     fcoe_family,        0x02),
 };
 // clang-format on
