@@ -16,9 +16,19 @@ constexpr std::array<unsigned char, 256> make_lower_table()
     return table;
 }
 
+constexpr std::array<signed char, 256> make_digit_table()
+{
+    std::array<signed char, 256> table{};
+    for (unsigned i = 0; i < table.size(); ++i)
+        table[i] = static_cast<signed char>(i >= '0' && i <= '9' ? i - '0' : i >= 'A' && i <= 'F' ? i - 'A' + 10 : -1);
+    return table;
+}
+
 inline constexpr std::array<unsigned char, 256> lower_table = make_lower_table();
+inline constexpr std::array<signed char, 256> digit_table = make_digit_table();
 
 constexpr unsigned char to_lower(char c) { return lower_table[static_cast<unsigned char>(c)]; }
+constexpr int digit_value(char c) { return digit_table[static_cast<unsigned char>(c)]; } // -1: none; A-F in upper case only
 constexpr bool is_digit(char c) { return c >= '0' && c <= '9'; }
 constexpr bool is_space(char c) { return c == ' ' || (c >= '\t' && c <= '\r'); }
 

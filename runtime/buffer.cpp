@@ -2,8 +2,8 @@
 
 #include "runtime/assert.h"
 #include "runtime/capacity.h"
+#include "runtime/number.h"
 
-#include <charconv>
 #include <cstdio>
 #include <cstring>
 #include <new>
@@ -43,9 +43,10 @@ void Buffer::append(const char* text, std::size_t n) { insert(_size, text, n); }
 
 void Buffer::append_uint64(uint64 x)
 {
-    char digits[20];
-    const auto written = std::to_chars(digits, digits + sizeof(digits), x);
-    append(digits, static_cast<std::size_t>(written.ptr - digits));
+    char buffer[number_text_size];
+    uint32 size = 0;
+    const char* digits = uint64_to_str(buffer, x, size);
+    append(digits, size);
 }
 
 void Buffer::insert(std::size_t pos, const char* text, std::size_t n)

@@ -93,4 +93,8 @@ bool eqi(const char* a, const char* b);
 std::size_t strlcpy(char* dst, const char* src, std::size_t size);
 std::size_t strlcat(char* dst, const char* src, std::size_t size);
 
+// Finds the first token of the text: what follows leading separators up to the next separator or the end. 0 with the token's
+// first character and the one behind its last, or -1 (and nothing written) when there are separators only.
+int find_token(const char* text, const char* separators, const char*& start, const char*& end);
+
 } // namespace zmlr

@@ -33,4 +33,14 @@ std::size_t strlcat(char* dst, const char* src, std::size_t size)
     return used == size ? size : used + strlcpy(dst + used, src, size - used);
 }
 
+int find_token(const char* text, const char* separators, const char*& start, const char*& end)
+{
+    const char* first = text + std::strspn(text, separators);
+    if (!*first)
+        return -1;
+    start = first;
+    end = first + std::strcspn(first, separators);
+    return 0;
+}
+
 } // namespace zmlr

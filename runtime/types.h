@@ -54,6 +54,9 @@ inline constexpr uint32 num_types = 14;
 // Lower-case CIM names ("boolean" ... "datetime"), indexed by Type.
 extern const char* const type_name[num_types];
 
+// The type of a name, compared without regard to case: 0, or -1 (and nothing written) for an unknown or empty name.
+int type_name_to_type(const char* name, Type& type);
+
 // Bytes of a value of each type in an instance, indexed by Type. A String and a Datetime are one handle of pointer size.
 extern const uint8 type_size[num_types];
 
