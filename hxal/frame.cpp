@@ -1,5 +1,7 @@
 #include "hxal/frame.h"
 
+#include "hxal/config/parser.h"
+#include "hxal/config/writer.h"
 #include "hxal/internal/frame.h"
 
 #include <atomic>
@@ -7,6 +9,8 @@
 
 namespace
 {
+
+constexpr char config_path[] = "/etc/hxa.conf";
 
 // Atomic because the event thread and any caller may meet in them; neither guards anything else.
 constinit std::atomic<hxa_aen_app_t> application_id{hxa_aen_app_tessik};
@@ -41,6 +45,10 @@ int hxal_libinit(hxa_aen_app_t app)
 }
 
 void hxal_libexit(void) {}
+
+hxa_status_t hxal_libload(void) { return hxal_config_load(config_path); }
+void hxal_libsync(void) { hxal_config_sync(config_path); }
+void hxal_libunload(void) { hxal_config_unload(); }
 
 void hxal_set_last_error(hxa_status_t status) { last_status = status; }
 hxa_status_t hxal_get_last_error(void) { return last_status; }

@@ -15,6 +15,14 @@ extern "C"
     // Ends the use of the library. There is nothing to release.
     void hxal_libexit(void);
 
+    // The drivers' configuration file, "/etc/hxa.conf": reads it into the model (hxal/config/model.h), writes it from there,
+    // ends the use of the model. A client loads before it changes settings, best after its first scan, and syncs afterwards;
+    // whoever never syncs changes the drivers only. Loading answers HXA_STATUS_OK, also where there is no file. How writing went
+    // is not told here: hxal_config_sync() does. Ending keeps the model: a later client of the process finds it.
+    hxa_status_t hxal_libload(void);
+    void hxal_libsync(void);
+    void hxal_libunload(void);
+
     // The last error, one cell for the process: the scans and the adapter naming set it, nothing clears it. The last writer
     // wins, so read it right after the call that failed.
     void hxal_set_last_error(hxa_status_t status);

@@ -1,0 +1,142 @@
+// Replacing the file, so that at every moment either the old or the new one is there, whole.
+#include "hxal/config/writer.h"
+
+#include <cerrno>
+#include <climits>
+#include <cstdio>
+#include <cstdlib>
+#include <cstring>
+#include <fcntl.h>
+#include <sys/stat.h>
+#include <unistd.h>
+#include <utility>
+
+namespace
+{
+
+// What is at a path now.
+struct Old_File
+{
+    bool can_be_replaced = false;
+    bool exists = false;
+    struct stat status = {};
+};
+
+bool reaches_nothing(const char* path)
+{
+    struct stat status;
+    return ::lstat(path, &status) != 0 && errno == ENOENT;
+}
+
+// The path behind all links, or the path itself where nothing is yet. A link that leads nowhere has none.
+bool resolve(const char* path, char (&target)[PATH_MAX])
+{
+    if (::realpath(path, target))
+        return true;
+    const std::size_t length = std::strlen(path);
+    if (!reaches_nothing(path) || length >= sizeof target)
+        return false;
+    std::memcpy(target, path, length + 1);
+    return true;
+}
+
+// Opened for writing, because that is the permission asked for, but not written. Not blocking: it may be a FIFO.
+Old_File look_at(const char* target)
+{
+    const int descriptor = ::open(target, O_WRONLY | O_CLOEXEC | O_NOCTTY | O_NOFOLLOW | O_NONBLOCK);
+    if (descriptor < 0)
+        return {.can_be_replaced = errno == ENOENT};
+    Old_File old = {.exists = true};
+    old.can_be_replaced = ::fstat(descriptor, &old.status) == 0 && S_ISREG(old.status.st_mode);
+    ::close(descriptor);
+    return old;
+}
+
+// A file of a new name beside the target, removed unless it takes the target's place.
+class Temporary_File
+{
+public:
+    explicit Temporary_File(const char* target)
+    {
+        std::snprintf(name, sizeof name, "%s.XXXXXX", target);
+        const int descriptor = ::mkostemp(name, O_CLOEXEC);
+        if (descriptor < 0)
+            return;
+        made = true;
+        file = ::fdopen(descriptor, "w");
+        if (!file)
+            ::close(descriptor);
+    }
+
+    ~Temporary_File()
+    {
+        const int error = errno;
+        if (file)
+            std::fclose(file);
+        if (made)
+            ::unlink(name);
+        errno = error;
+    }
+
+    Temporary_File(const Temporary_File&) = delete;
+    Temporary_File& operator=(const Temporary_File&) = delete;
+
+    std::FILE* stream() const { return file; }
+
+    bool take_owner_and_mode(const struct stat& old) const
+    {
+        return ::fchown(::fileno(file), old.st_uid, old.st_gid) == 0 && ::fchmod(::fileno(file), old.st_mode & 07777) == 0;
+    }
+
+    bool replace(const char* target)
+    {
+        const bool flushed = std::fflush(file) == 0 && !std::ferror(file) && ::fsync(::fileno(file)) == 0;
+        const bool closed = std::fclose(std::exchange(file, nullptr)) == 0;
+        made = !(flushed && closed && ::rename(name, target) == 0);
+        return !made;
+    }
+
+private:
+    char name[PATH_MAX + sizeof ".XXXXXX"] = {};
+    bool made = false;
+    std::FILE* file = nullptr;
+};
+
+// Makes the new name last through a crash. The file is whole either way.
+void flush_directory_of(char (&target)[PATH_MAX])
+{
+    char* slash = std::strrchr(target, '/');
+    if (slash)
+        slash[slash == target ? 1 : 0] = '\0';
+    const int descriptor = ::open(slash ? target : ".", O_RDONLY | O_DIRECTORY | O_CLOEXEC);
+    if (descriptor < 0)
+        return;
+    ::fsync(descriptor);
+    ::close(descriptor);
+}
+
+bool is_full(int error) { return error == ENOSPC || error == EDQUOT; }
+
+} // namespace
+
+hxa_status_t hxal_config_sync(const char* path)
+{
+    char target[PATH_MAX];
+    if (!path || !*path || !resolve(path, target))
+        return HXA_STATUS_EFOPEN;
+    const Old_File old = look_at(target);
+    if (!old.can_be_replaced)
+        return HXA_STATUS_EFOPEN;
+
+    Temporary_File temporary(target);
+    if (!temporary.stream())
+        return is_full(errno) ? HXA_STATUS_FAILED : HXA_STATUS_EFOPEN;
+    hxal_config_ad_update(temporary.stream());
+    hxal_config_ioc_update(temporary.stream());
+    if (old.exists && !temporary.take_owner_and_mode(old.status))
+        return HXA_STATUS_FAILED;
+    if (!temporary.replace(target))
+        return HXA_STATUS_FAILED;
+    flush_directory_of(target);
+    return HXA_STATUS_OK;
+}

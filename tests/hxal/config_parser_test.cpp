@@ -1,0 +1,274 @@
+// What a line, and a whole file, does to the model.
+#include "config_model.h"
+
+#include <gmock/gmock.h>
+
+#include <sys/stat.h>
+#include <thread>
+
+namespace
+{
+
+using testing::ElementsAre;
+using testing::IsEmpty;
+using Config_Parser = Config_Model;
+
+TEST_F(Config_Parser, stores_every_setting_of_an_instance)
+{
+    struct Row
+    {
+        const char* line;
+        int code;
+        const char* line_written; // null: the setting is absent
+    };
+    const Row rows[] = {
+        {"hxa3-port-wwn = 10:00:00:05:1e:10:00:00", 3, "hxa3-port-wwn = \"10:00:00:05:1e:10:00:00\";"},
+        {"hxn3-port-mac=00:05:1e:20:00:00;", 4, "hxn3-port-mac = \"00:05:1e:20:00:00\";"},
+        {"hxa3-port-name = \"uplink A\";", 5, "hxa3-port-name = \"uplink A\";"},
+        {"hxn3-port-name = eth", 6, "hxn3-port-name = \"eth\";"},
+        {"hxa3-port-speed = 8;", 7, "hxa3-port-speed = 8;"},
+        {"hxa3-port-speed = fast", 7, "hxa3-port-speed = 0;"},
+        {"hxa3-port-topology = p2p", 8, "hxa3-port-topology = \"p2p\";"},
+        {"hxa3-port-topology = ring", 8, nullptr},
+        {"hxa3-port-hardalpa = 0x1f;", 9, "hxa3-port-hardalpa = 0x1f;"},
+        {"hxa3-port-hardalpa = 1F;", 9, "hxa3-port-hardalpa = 0x1f;"},
+        {"hxa3-port-hardalpa = 0x100;", 9, "hxa3-port-hardalpa = 0x0;"},
+        {"hxa3-port-maxfrsize = 2048;", 10, "hxa3-port-maxfrsize = 2048;"},
+        {"hxa3-port-maxfrsize = 65535;", 10, "hxa3-port-maxfrsize = 65535;"},
+        {"hxa3-port-maxfrsize = 65536;", 10, "hxa3-port-maxfrsize = 0;"},
+        {"hxa3-port-trunk = 0, 1", 11, "hxa3-port-trunk = 0, 1;"},
+        {"hxa3-port-trunk = ;", 11, "hxa3-port-trunk = "},
+        {"hxa3-port-enable = FALSE", 12, "hxa3-port-enable = \"FALSE\";"},
+        {"hxa3-port-enable = false", 12, nullptr},
+        {"hxa3-ipfc-enable = TRUE", 13, "hxa3-ipfc-enable = \"TRUE\";"},
+        {"hxa3-log-level = Warning", 14, "hxa3-log-level = \"Warning\";"},
+        {"hxa3-log-level = None", 14, nullptr},
+        {"hxa3-vf-enable = TRUE", 15, "hxa3-vf-enable = \"TRUE\""},
+        {"hxa3-vf-default = 7", 16, "hxa3-vf-default = 7;"},
+        {"hxa3-vf-list = 15,1, 16", 17, "hxa3-vf-list = 1, 15;"},
+        {"hxa3-vport-7 = pw, nw, sym, role, 9", 18, "hxa3-vport-7 = \"pw,nw,sym,role,9\";"},
+        {"hxa3-vport = pw,,,role", 18, "hxa3-vport-0 = \"pw,,,role,0\";"},
+        {"hxa3-vport-7 = ,nw,sym,role,9", 18, nullptr},
+        {"hxa3-auth-policy = on", 19, "hxa3-auth-policy = \"on\";"},
+        {"hxa3-auth-algo = sm", 20, "hxa3-auth-algo = \"sm\";"},
+        {"hxa3-auth-group = 256", 21, "hxa3-auth-group = 256;"},
+        {"hxa3-auth-secretsource = TACACS", 22, "hxa3-auth-secretsource = \"TACACS\";"},
+        {"hxa3-auth-encrypt = 1,22,333", 23, "hxa3-auth-encrypt = \"1,22,333\";"},
+        {"hxa3-pathtov = 30", 25, "hxa3-pathtov = 30;"},
+        {"hxa3-qdepth = 32", 26, "hxa3-qdepth = 32;"},
+        {"hxa3-qos = TRUE", 27, "hxa3-qos = \"TRUE\";"},
+        {"hxa3-ratelim = TRUE", 28, "hxa3-ratelim = \"TRUE\";"},
+        {"hxa3-ratelim-defspeed = 2", 29, "hxa3-ratelim-defspeed = 2;"},
+        {"hxa3-coalesce = off", 30, "hxa3-coalesce = \"off\";"},
+        {"hxa3-delay = 1125", 31, "hxa3-delay = 1125;"},
+        {"hxa3-latency = 225", 32, "hxa3-latency = 225;"},
+        {"hxa3-persistent-binding = TRUE", 33, "hxa3-persistent-binding = \"TRUE\";"},
+    };
+    for (const Row& row : rows)
+    {
+        empty_model();
+        hxal_config_parse(row.line);
+        EXPECT_EQ(has(ioc(3).flags, row.code), row.line_written != nullptr) << row.line;
+        EXPECT_EQ(settings(), row.line_written ? std::vector<std::string>{row.line_written} : std::vector<std::string>{})
+            << row.line;
+    }
+}
+
+TEST_F(Config_Parser, stores_values_as_numbers)
+{
+    parse({"hxa3-port-trunk = 0, 1", "hxa3-port-topology = auto", "hxa3-log-level = Info", "hxa3-auth-algo = ms",
+           "hxa3-auth-secretsource = RADIUS", "hxa3-port-hardalpa = 0x1f"});
+    EXPECT_EQ(ioc(3).trunking, 3u);
+    EXPECT_EQ(ioc(3).topology, uint32_t{HXA_PPORT_TOPOLOGY_AUTO});
+    EXPECT_EQ(ioc(3).log, HXA_LOG_INFO);
+    EXPECT_EQ(ioc(3).authalgo, uint32_t{HXA_AUTH_ALGO_MS});
+    EXPECT_EQ(ioc(3).authssource, uint32_t{HXA_AUTH_SECSRC_RADIUS});
+    EXPECT_EQ(ioc(3).alpa, 31);
+}
+
+TEST_F(Config_Parser, forgets_a_setting_whose_later_word_is_none)
+{
+    parse({"hxa3-qos = TRUE", "hxa3-qos = maybe"});
+    EXPECT_FALSE(has(ioc(3).flags, HXAL_CONFIG_QOS));
+}
+
+TEST_F(Config_Parser, ignores_what_does_not_fit)
+{
+    for (const char* line : {"",
+                             " ",
+                             "=",
+                             "-",
+                             "hxa",
+                             "hxa-",
+                             "hxa3-port-speed",
+                             "hxa3-=8",
+                             "hxa3-port-speeds = 8",
+                             "hxa128-port-speed = 8",
+                             "hxa200-port-name = x;",
+                             "hxa2147483648-port-speed = 8",
+                             "hxa4294967296-port-speed = 8",
+                             "hxn3-port-speed = 8",
+                             "hxn3-vport-1 = a,b,c,d,1",
+                             "hxa3-port-mac = 00:05",
+                             "port-mac = 00:05",
+                             "port-name = x",
+                             "vport-1 = a,b,c,d,1",
+                             "adapter-SN1",
+                             "adapter = x",
+                             "name = x",
+                             "num-ioses = 5"})
+        hxal_config_parse(line);
+    hxal_config_parse(nullptr);
+    EXPECT_THAT(settings(), IsEmpty());
+    EXPECT_EQ(hxal_config_ad_get_num() + hxal_config_ioc_get_num(), 0);
+}
+
+TEST_F(Config_Parser, takes_a_line_for_the_first_kind_that_it_contains)
+{
+    parse({"hxn5-port-name = \"hxa-uplink\"", "note hxa4-port-name = \"adapter-x\"", "qos = TRUE hxa7-"});
+    EXPECT_STREQ(ioc(5).name, "hxa-uplink");
+    EXPECT_STREQ(ioc(4).name, "");
+    EXPECT_EQ(hxal_config_ad_lookup("port"), 0);
+    EXPECT_FALSE(has(hxal_config_get()->config_all, HXAL_CONFIG_QOS));
+}
+
+TEST_F(Config_Parser, makes_an_entry_of_every_adapter_line)
+{
+    parse({"adapter-SN0123456789-name = \"Blue\";", "adapter-SN2-power = 2;", "adapter-SN0123456789-power = 3;"});
+    EXPECT_EQ(hxal_config_ad_get_num(), 3);
+    EXPECT_EQ(hxal_config_ad_lookup("SN0123456789"), 0);
+    EXPECT_EQ(hxal_config_ad_lookup("SN012345678"), 0) << "as an adapter record keeps it";
+    EXPECT_EQ(hxal_config_ad_lookup("SN2"), 1);
+    EXPECT_EQ(hxal_config_ad_lookup("SN3"), -1);
+    EXPECT_EQ(hxal_config_ad_lookup(nullptr), -1);
+    EXPECT_THAT(settings(), ElementsAre("adapter-SN0123456789-name = \"Blue\";", "adapter-SN2-power = 2;",
+                                        "adapter-SN0123456789-power = 3;"));
+    parse({"adapter-SN4-power = 1;"}); // writing has made entry 0 the next
+    EXPECT_EQ(hxal_config_ad_lookup("SN4"), 0);
+}
+
+TEST_F(Config_Parser, stops_at_128_adapters)
+{
+    for (int i = 0; i < 129; ++i)
+        hxal_config_parse(("adapter-SN" + std::to_string(i) + "-power = 1;").c_str());
+    hxal_config_ad_add("SN200");
+    EXPECT_EQ(hxal_config_ad_get_num(), 128);
+    EXPECT_EQ(hxal_config_ad_lookup("SN127"), 127);
+    EXPECT_EQ(hxal_config_ad_lookup("SN128") & hxal_config_ad_lookup("SN200"), -1);
+}
+
+TEST_F(Config_Parser, gives_a_key_without_instance_to_the_entries_so_far)
+{
+    parse({"port-speed = 2;"});
+    EXPECT_FALSE(has(ioc(0).flags, HXAL_CONFIG_PORT_SPEED));
+    parse({"hxa0-port-wwn = 10:00:00:05:1e:10:00:00", "hxa5-port-wwn = 10:00:00:05:1e:10:00:01", "hxn1-port-mac = 00:05",
+           "adapter-SN1-name = x", "port-speed = 4;", "port-topology = loop", "power = 2"});
+    EXPECT_TRUE(has(hxal_config_get()->config_all, HXAL_CONFIG_PORT_SPEED));
+    for (int idx : {0, 1}) // as many as have a WWN, from 0 on
+        EXPECT_EQ(ioc(idx).speed, 4u) << idx;
+    EXPECT_EQ(ioc(2).speed + ioc(5).speed, 0u);
+    EXPECT_EQ(adapter(0).power, 2u);
+    EXPECT_EQ(adapter(1).power, 0u);
+    parse({"port-topology = ring"});
+    EXPECT_FALSE(has(hxal_config_get()->config_all, HXAL_CONFIG_PORT_TOPOLOGY));
+    EXPECT_FALSE(has(ioc(0).flags, HXAL_CONFIG_PORT_TOPOLOGY));
+}
+
+TEST_F(Config_Parser, reads_the_tuning_numbers)
+{
+    const std::pair<const char*, int hxal_config_tuning_t::*> rows[] = {
+        {"msix-disable", &hxal_config_tuning_t::msix_disable},
+        {"num-rports", &hxal_config_tuning_t::num_rports},
+        {"num-ios", &hxal_config_tuning_t::num_ios},
+        {"num-tms", &hxal_config_tuning_t::num_tms},
+        {"num-fcxps", &hxal_config_tuning_t::num_fcxps},
+        {"num-ufbufs", &hxal_config_tuning_t::num_ufbufs},
+        {"reqq-size", &hxal_config_tuning_t::reqq_size},
+        {"rspq-size", &hxal_config_tuning_t::rspq_size},
+        {"num-sgpgs", &hxal_config_tuning_t::num_sgpgs},
+        {"ioc-auto-recover", &hxal_config_tuning_t::ioc_auto_recover},
+        {"ipfc-disable", &hxal_config_tuning_t::ipfc_disable},
+        {"rport-del-timeout", &hxal_config_tuning_t::rport_del_timeout},
+        {"dma-relaxed-ordering", &hxal_config_tuning_t::dma_relaxed_ordering},
+        {"pcie-max-read-reqsz", &hxal_config_tuning_t::pcie_max_read_reqsz},
+    };
+    int value = 10;
+    for (const auto& [key, member] : rows)
+    {
+        hxal_config_parse((std::string(key) + " = " + std::to_string(++value) + ";").c_str());
+        EXPECT_EQ(hxal_config_get()->tuning.*member, value) << key;
+    }
+    EXPECT_THAT(settings(), IsEmpty());
+}
+
+TEST_F(Config_Parser, keeps_virtual_ports_by_their_wwn)
+{
+    parse(
+        {"hxa1-vport-4 = 10:00:AB, n, first, r, 1", "hxa1-vport-0 = x, n, second, r", "hxa1-vport-5 = 10:0:ab, m, third, s, 2"});
+    hxal_config_set_vportdata(1, "y,n,fourth,r,70000");
+    hxal_config_set_vportdata(1, "x,n,fifth,r,3");
+    hxal_config_set_vportdata(128, "z,n,sixth,r,3");
+    EXPECT_THAT(settings(), ElementsAre("hxa1-vport-5 = \"10:0:ab,m,third,s,2\";", "hxa1-vport-0 = \"x,n,fifth,r,3\";",
+                                        "hxa1-vport-1 = \"y,n,fourth,r,0\";"));
+    EXPECT_EQ(ioc(1).vpcount, 3);
+    for (int i = 0; i < 300; ++i)
+        hxal_config_set_vportdata(2, ("port " + std::to_string(i) + ",,,,").c_str());
+    EXPECT_EQ(ioc(2).vpcount, 255);
+    EXPECT_EQ(ioc(3).vpcount, 0);
+}
+
+TEST_F(Config_Parser, sets_single_values)
+{
+    hxal_config_set_data(HXAL_CONFIG_AD_SERIAL, 127, "SN127");
+    hxal_config_set_data(HXAL_CONFIG_AD_NAME, 127, std::string(200, 'n').c_str());
+    hxal_config_set_data(HXAL_CONFIG_PORT_WWN, 127, std::string(40, '1').c_str());
+    for (const auto& [code, idx] : {std::pair{7, -1}, {7, 128}, {1, -1}, {0, 128}, {-1, 0}, {18, 0}, {24, 0}, {34, 0}, {99, 0}})
+        hxal_config_set_data(code, idx, "8");
+    hxal_config_set_data(7, 0, nullptr);
+    EXPECT_THAT(settings(), ElementsAre("adapter-SN127-name = \"" + std::string(127, 'n') + "\";",
+                                        "hxa127-port-wwn = \"" + std::string(31, '1') + "\";"));
+}
+
+TEST_F(Config_Parser, reads_a_file_by_lines_of_511_characters)
+{
+    const std::string comment = "#" + std::string(510, 'x');
+    load(comment + "hxa1-port-speed = 4;\n"                                        // the tail of a comment is a line
+         + "hxa2-port-speed = 8; # " + std::string(600, ' ') + "\n"                // cut within: no number at its end
+         + "#hxa3-port-speed = 8;\n" + std::string("hxa4-port-speed = 8\0;\n", 22) // a NUL ends the text
+         + std::string("\0hxa5-port-speed = 8;\n", 22)                             // and may be all of it
+         + " #hxa6-port-speed = 8;\nhxa7-port-speed = 2");
+    EXPECT_THAT(settings(), ElementsAre("hxa1-port-speed = 4;", "hxa2-port-speed = 0;", "hxa4-port-speed = 8;",
+                                        "hxa6-port-speed = 8;", "hxa7-port-speed = 2;"));
+}
+
+TEST_F(Config_Parser, leaves_the_model_alone_when_there_is_no_file_to_read)
+{
+    parse({"hxa1-port-speed = 4;"});
+    ASSERT_EQ(::mkfifo(path("fifo").c_str(), 0600), 0);
+    for (const std::string& what : {path("missing"), path("."), path("fifo"), std::string("/dev/zero"), std::string()})
+        EXPECT_EQ(hxal_config_load(what.c_str()), HXA_STATUS_OK) << what;
+    EXPECT_EQ(hxal_config_load(nullptr), HXA_STATUS_OK);
+    EXPECT_THAT(settings(), ElementsAre("hxa1-port-speed = 4;"));
+}
+
+TEST_F(Config_Parser, ends_in_a_file_that_grows_and_in_one_of_any_size)
+{
+    const std::string growing = file("growing", std::string(100000, '\n'));
+    std::jthread writer(
+        [&](const std::stop_token& stop)
+        {
+            std::ofstream stream(growing, std::ios::app);
+            while (!stop.stop_requested())
+                stream << std::string(4096, '\n') << std::flush;
+        });
+    EXPECT_EQ(hxal_config_load(growing.c_str()), HXA_STATUS_OK);
+    writer.request_stop();
+    writer.join();
+
+    const std::string huge = file("huge", "hxa1-port-speed = 4;\n");
+    std::filesystem::resize_file(huge, std::uintmax_t{1} << 40);
+    EXPECT_EQ(hxal_config_load(huge.c_str()), HXA_STATUS_OK);
+    EXPECT_THAT(settings(), ElementsAre("hxa1-port-speed = 4;"));
+}
+
+} // namespace
