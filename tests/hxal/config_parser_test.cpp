@@ -212,7 +212,7 @@ TEST_F(Config_Parser, keeps_virtual_ports_by_their_wwn)
                                         "hxa1-vport-1 = \"y,n,fourth,r,0\";"));
     EXPECT_EQ(ioc(1).vpcount, 3);
     for (int i = 0; i < 300; ++i)
-        hxal_config_set_vportdata(2, ("port " + std::to_string(i) + ",,,,").c_str());
+        hxal_config_set_vportdata(2, ("10:" + std::to_string(i / 10) + ":" + std::to_string(i % 10) + ",,,,").c_str());
     EXPECT_EQ(ioc(2).vpcount, 255);
     EXPECT_EQ(ioc(3).vpcount, 0);
 }
