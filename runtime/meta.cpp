@@ -1,6 +1,7 @@
 #include "runtime/meta.h"
 
 #include "runtime/features.h"
+#include "runtime/name_index.h"
 #include "runtime/string.h"
 
 #include <span>
@@ -15,6 +16,11 @@ template <class T> bool is_named(const T* meta, const char* name) { return eqi(m
 
 const Meta_Feature* find_in(const Meta_Record* record, const char* name, uint32 kind_mask)
 {
+    if (const Record_Entry* entry = find_entry(record))
+    {
+        const Meta_Feature* feature = find_feature(*entry, name);
+        return feature && (feature->flags & kind_mask) != 0 ? feature : nullptr;
+    }
     for (const Meta_Feature* feature : features_of(record))
         if ((feature->flags & kind_mask) != 0 && is_named(feature, name))
             return feature;
@@ -42,6 +48,9 @@ const Meta_Class* find_meta_class(const Meta_Repository* repository, const char*
 {
     if (!repository)
         return nullptr;
+    const Repository_Index* index = &own_repository_index;
+    if (index && index->repository == repository)
+        return find_meta_class(*index, name);
     for (const Meta_Class* meta_class : std::span(repository->meta_classes, repository->num_meta_classes))
         if (is_named(meta_class, name))
             return meta_class;
@@ -50,9 +59,11 @@ const Meta_Class* find_meta_class(const Meta_Repository* repository, const char*
 
 const Meta_Class* find_meta_class(const Meta_Class* meta_class, const char* name)
 {
-    for (const Meta_Class* c = meta_class; c; c = c->super_meta_class)
-        if (is_named(c, name))
-            return c;
+    // The ancestors of an indexed class are indexed too, and no two classes there share a name.
+    if (!find_entry(meta_class))
+        for (const Meta_Class* c = meta_class; c; c = c->super_meta_class)
+            if (is_named(c, name))
+                return c;
     return find_meta_class(meta_class->meta_repository, name);
 }
 
@@ -114,8 +125,8 @@ void ref(const Meta_Class* meta_class)
 
 void unref(const Meta_Class* meta_class)
 {
-    if (Atomic_get(&meta_class->refs) != 0)
-        Atomic_dec_and_test(const_cast<Atomic*>(&meta_class->refs));
+    if (Atomic_get(&meta_class->refs) != 0 && Atomic_dec_and_test(const_cast<Atomic*>(&meta_class->refs)))
+        delete meta_class;
 }
 
 } // namespace zmlr

@@ -139,7 +139,8 @@ inline const Meta_Property* as_property(const Meta_Feature* feature) { return st
 inline const Meta_Reference* as_reference(const Meta_Feature* feature) { return static_cast<const Meta_Reference*>(feature); }
 inline const Meta_Method* as_method(const Meta_Feature* feature) { return static_cast<const Meta_Method*>(feature); }
 
-// Look-up; names are compared without regard to case. Each returns null (or the stated value) when nothing matches.
+// Look-up; names are compared without regard to case. Each returns null (or the stated value) when nothing matches. In the
+// module's own repository one full comparison of names decides (name_index.h).
 const Meta_Class* find_meta_class(const Meta_Repository* repository, const char* name);
 const Meta_Class* find_meta_class(const Meta_Class* meta_class, const char* name); // itself, an ancestor, or its repository
 bool is_subclass(const Meta_Class* ancestor, const Meta_Class* descendant);
@@ -151,9 +152,13 @@ const Meta_Method* find_method(const Meta_Class* meta_class, const char* name);
 const Meta_Feature* find_parameter(const Meta_Method* meta_method, const char* name,
                                    uint32 kind_mask = Flag_Property | Flag_Reference);
 const Meta_Reference* find_reference(const Meta_Method* meta_method, const char* name);
-bool has_feature(const Meta_Class* meta_class, uint32 kind_mask); // whether any feature has a flag of the mask
-uint32 flag_name_to_index(const char* name);                      // the bit of a flag name, 0xFFFFFFFF when unknown
+uint32 flag_name_to_index(const char* name); // the bit of a flag name, 0xFFFFFFFF when unknown
 
+// Whether any feature has a flag of the mask. (The name with leading underscores is a builtin of clang.)
+bool has_feature(const Meta_Class* meta_class, uint32 kind_mask);
+
+// Counts leave a static class alone. A class made at run time comes from `new` with a count of 1: the last unref deletes the
+// record; what it points to is its maker's, and must live as long.
 void ref(const Meta_Class* meta_class);
 void unref(const Meta_Class* meta_class);
 
