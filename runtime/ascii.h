@@ -4,6 +4,7 @@
 #include "runtime/types.h"
 
 #include <array>
+#include <string_view>
 
 namespace zmlr::ascii
 {
@@ -19,8 +20,9 @@ constexpr std::array<unsigned char, 256> make_lower_table()
 constexpr std::array<signed char, 256> make_digit_table()
 {
     std::array<signed char, 256> table{};
-    for (unsigned i = 0; i < table.size(); ++i)
-        table[i] = static_cast<signed char>(i >= '0' && i <= '9' ? i - '0' : i >= 'A' && i <= 'F' ? i - 'A' + 10 : -1);
+    table.fill(-1);
+    for (signed char value = 0; const char digit : std::string_view("0123456789ABCDEF"))
+        table[static_cast<unsigned char>(digit)] = value++;
     return table;
 }
 

@@ -1,5 +1,7 @@
 #include "runtime/file_lock.h"
 
+#include "runtime/regular_file.h"
+
 #include <cerrno>
 #include <cstdio>
 #include <unistd.h>
@@ -30,7 +32,7 @@ int request(int fd, struct flock& lock)
 } // namespace
 
 File_Lock::File_Lock(const char* path) noexcept
-    : _rep{whole_file(F_WRLCK), whole_file(F_UNLCK), open(path, O_WRONLY | O_CREAT | O_CLOEXEC, 0600)}
+    : _rep{whole_file(F_WRLCK), whole_file(F_UNLCK), open_regular(path, O_WRONLY | O_CREAT, 0600)}
 {
 }
 

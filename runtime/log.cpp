@@ -4,6 +4,7 @@
 #include "runtime/datetime.h"
 #include "runtime/file_lock.h"
 #include "runtime/log_options.h"
+#include "runtime/regular_file.h"
 #include "runtime/string.h"
 
 #include <cerrno>
@@ -82,7 +83,7 @@ void open_files(const char* home, const char* name)
     std::unique_ptr<File_Lock> lock(new (std::nothrow) File_Lock(messages_lock));
     if (!lock || !lock->okay())
         return;
-    _os = open(messages, O_WRONLY | O_APPEND | O_CREAT | O_CLOEXEC, 0644);
+    _os = open_regular(messages, O_WRONLY | O_APPEND | O_CREAT, 0644);
     if (_os >= 0)
         _lock = lock.release();
 }

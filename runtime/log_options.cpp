@@ -1,17 +1,34 @@
 #include "runtime/log_options.h"
 
 #include "runtime/ascii.h"
+#include "runtime/regular_file.h"
 #include "runtime/string.h"
 
 #include <cstdio>
 #include <cstring>
+#include <fcntl.h>
 #include <memory>
+#include <unistd.h>
 
 namespace zmlr
 {
 
 namespace
 {
+
+constexpr int max_lines = 1024; // a file of any length ends here
+
+using File = std::unique_ptr<std::FILE, int (*)(std::FILE*)>;
+
+// Null for what is no plain file: a pipe would have us wait for its writer, a device may never end.
+File open_options(const char* path)
+{
+    const int fd = open_regular(path, O_RDONLY, 0);
+    std::FILE* file = fd < 0 ? nullptr : fdopen(fd, "r");
+    if (fd >= 0 && !file)
+        close(fd);
+    return {file, std::fclose};
+}
 
 const char* skip_space(const char* text)
 {
@@ -42,9 +59,9 @@ const char* value_in(const char* line, const char* name)
 
 bool _get_opt_value(const char* path, const char* name, char (&value)[option_line_size]) noexcept
 {
-    const std::unique_ptr<std::FILE, int (*)(std::FILE*)> file(std::fopen(path, "re"), std::fclose);
+    const File file = open_options(path);
     char line[option_line_size];
-    while (file && std::fgets(line, sizeof(line), file.get()))
+    for (int i = 0; i < max_lines && file && std::fgets(line, sizeof(line), file.get()); ++i)
     {
         trim_end(line);
         if (const char* found = value_in(line, name))

@@ -9,11 +9,13 @@
 
 #include <cerrno>
 #include <chrono>
+#include <cstdint>
 #include <cstdio>
 #include <cstdlib>
 #include <filesystem>
 #include <map>
 #include <string>
+#include <sys/stat.h>
 #include <thread>
 #include <vector>
 
@@ -142,8 +144,8 @@ TEST(Log, traces_scopes_on_every_way_out)
 TEST(Log, lines_of_processes_and_threads_never_mix)
 {
     constexpr int num_processes = 2;
-    constexpr int num_threads = 4;
-    constexpr int num_lines = 100;
+    constexpr int num_threads = 8;
+    constexpr int num_lines = 50;
     const Home home;
     home.options("LOG_LEVEL=INFO\n");
 
@@ -202,18 +204,47 @@ TEST(Log, waits_for_another_process_that_holds_the_lock)
     EXPECT_FALSE(File_Lock(home.path("no such directory/lock").c_str()).okay());
 }
 
-TEST(Log, stays_off_when_its_directory_cannot_be_made)
+// Everything but a plain file is refused at once, and nothing is read without end.
+TEST(Log, stays_off_when_something_else_has_the_name_of_a_file)
 {
-    const Home home;
-    home.options("LOG_LEVEL=DBG\n");
-    ASSERT_TRUE(home.run(
-        [&]
-        {
-            std::fclose(std::fopen(home.path(".cimple").c_str(), "w"));
-            log_one_of_each();
-            if (log_wanted(LL_FATAL))
-                std::abort();
-        }));
+    namespace fs = std::filesystem;
+    const struct
+    {
+        const char* name;
+        const char* file;
+        void (*make)(const std::string& path);
+    } rows[] = {
+        {"options: a directory", ".cimplerc", [](const std::string& path) { fs::create_directory(path); }},
+        {"options: a pipe", ".cimplerc", [](const std::string& path) { mkfifo(path.c_str(), 0600); }},
+        {"options: an endless device", ".cimplerc", [](const std::string& path) { fs::create_symlink("/dev/zero", path); }},
+        {"options: a terabyte of nothing", ".cimplerc",
+         [](const std::string& path)
+         {
+             std::fclose(std::fopen(path.c_str(), "w"));
+             fs::resize_file(path, std::uintmax_t{1} << 40);
+         }},
+        {"directory: a file", ".cimple", [](const std::string& path) { std::fclose(std::fopen(path.c_str(), "w")); }},
+        {"log: a pipe", ".cimple/messages", [](const std::string& path) { mkfifo(path.c_str(), 0600); }},
+        {"log: a directory", ".cimple/messages", [](const std::string& path) { fs::create_directory(path); }},
+        {"lock: a pipe", ".cimple/messages.lock", [](const std::string& path) { mkfifo(path.c_str(), 0600); }},
+    };
+    for (const auto& row : rows)
+    {
+        const Home home;
+        const fs::path path(home.path(row.file));
+        if (path.filename() != ".cimplerc")
+            home.options("LOG_LEVEL=DBG\n");
+        fs::create_directory(path.parent_path());
+        row.make(path);
+        EXPECT_TRUE(home.run(
+            [&]
+            {
+                log_one_of_each();
+                if (log_wanted(LL_FATAL))
+                    std::abort(); // from now on a call must cost next to nothing
+            }))
+            << row.name;
+    }
 }
 
 TEST(Log, level_and_directory_can_be_set_by_code)
