@@ -46,23 +46,6 @@ hxal_t* first_of(hxal_t* list)
     return port_0 ? port_0 : list;
 }
 
-bool is_in_state(const hxal_t* ioc, hxa_ioc_state_t state)
-{
-    hxa_ioc_attr_t attr;
-    return hxal_ioc_get_attr(ioc, &attr) == HXA_STATUS_OK && attr.state == state;
-}
-
-hxa_boolean_t all_in_state(const hxal_adapter_t* ad, hxa_ioc_state_t state)
-{
-    if (!ad)
-        return HXA_FALSE;
-    for (int port = 0; port < ad->port_count; ++port)
-        for (const hxal_t* ioc : {hxal_adapter_get_fcioc(ad, port), hxal_adapter_get_ethioc(ad, port)})
-            if (ioc && !is_in_state(ioc, state))
-                return HXA_FALSE;
-    return HXA_TRUE;
-}
-
 } // namespace
 
 void hxal_adapter_lib_init(void) {}
@@ -222,23 +205,6 @@ void hxal_adapter_get_hw_path(const hxal_adapter_t* ad, char* hwpath)
     if (ad)
         hxal::copy_out(hwpath, ad->adapter_hwpath);
 }
-
-const char* hxal_adapter_get_name(unsigned ad)
-{
-    if (ad > hxal_adapter_get_num())
-        return nullptr;
-    hxal_adapter_t* adapter = hxal_adapter_open_idx(static_cast<int>(ad));
-    const hxal_t* ioc = hxal_adapter_get_first_ioc(adapter);
-    if (!ioc)
-        return nullptr;
-    hxa_ioctl_ioc_info_t info;
-    if (hxal_ioc_get_info(ioc, &info) == HXA_STATUS_OK)
-        hxal::copy_text(adapter->name, info.name);
-    return adapter->name;
-}
-
-hxa_boolean_t hxal_adapter_is_enabled(int ad) { return all_in_state(hxal_adapter_open_idx(ad), HXA_IOC_OPERATIONAL); }
-hxa_boolean_t hxal_adapter_is_disabled(int ad) { return all_in_state(hxal_adapter_open_idx(ad), HXA_IOC_DISABLED); }
 
 void hxal_adapter_update_ioc(int ad, const hxal_t* ioc)
 {

@@ -85,10 +85,32 @@ extern "C"
     // Asks the first IOC for the adapter's name, stores it and returns it; the stored one when the request fails. None: null.
     const char* hxal_adapter_get_name(unsigned ad);
 
+    // Names the adapter: its first IOC's driver, then the other driver through port 0, if there is one; at most 64
+    // characters reach them. What they accept becomes the adapter's `name` (63 characters) and is recorded in the
+    // configuration. The result is the last error:
+    //     HXA_STATUS_OK           named
+    //     HXA_STATUS_NO_ADAPTER   there is no such adapter, or it has no IOC
+    //     HXA_STATUS_FAILED       a request failed
+    //     HXA_STATUS_EINVAL       no name
+    //     what the driver says    it refuses the name
+    void hxal_adapter_set_name(unsigned ad, const char* name);
+
     // Whether every IOC of the adapter answers that it is operational, or disabled. A request that fails is a no; the IOCs
     // behind the first no are not asked.
     hxa_boolean_t hxal_adapter_is_enabled(int ad);
     hxa_boolean_t hxal_adapter_is_disabled(int ad);
+
+    // Start and stop every IOC of the adapter one after another, port by port, the FC or FCoE IOC of a port first, also behind
+    // one that fails; each may take 20 s (see hxal_ioc_enable()). They return HXA_STATUS_OK, or of what failed the last, or
+    //     HXA_STATUS_FAILED         there is no such adapter
+    //     HXA_STATUS_AD_IS_ENABLE   all its IOCs were enabled before; enabling asks for their attributes first
+    // An IOC that is enabled already is no failure of enabling; one that is disabled already is one of disabling.
+    hxa_status_t hxal_adapter_enable(int ad);
+    hxa_status_t hxal_adapter_disable(int ad);
+
+    // Sets the power state through the first IOC, in the same order, that accepts it, and records it in the configuration. When
+    // none does: what the last one answered, HXA_STATUS_FAILED without any. HXA_STATUS_EINVAL without an adapter.
+    hxa_status_t hxal_adapter_set_power(const hxal_adapter_t* ad, hxa_pm_ds_t state);
 
     // After a scan of the IOCs alone: gives the descriptor of `ioc` to the first FC copy of the adapter (to the first Ethernet
     // copy when `ioc` is an Ethernet IOC).

@@ -11,9 +11,9 @@
 // be opened), HXA_STATUS_VERSION_FAIL (the driver refused this library), anything else: a general failure.
 //
 // Statuses.  A request returns HXA_STATUS_OK or says what failed: the call to the driver (a status mapped from errno; the
-//            caller's buffer is untouched) or the driver itself (its own status, unchanged; the buffer is filled all the
-//            same). No request is repeated, also not an interrupted one (HXA_STATUS_EINTR). A null pointer where a
-//            request needs a handle or a buffer is HXA_STATUS_EINVAL, without a request.
+//            caller's buffer is untouched, but for hxal_ioc_get_info()'s) or the driver itself (its own status, unchanged;
+//            the buffer is filled all the same). No request is repeated, also not an interrupted one (HXA_STATUS_EINTR). A
+//            null pointer where a request needs a handle or a buffer is HXA_STATUS_EINVAL, without a request.
 // Ownership. The library owns every handle, adapter record and text it returns. They stay valid until the next scan.
 // Look-ups.  A null or out-of-range argument finds nothing; each look-up names its answer for "none". Texts are compared
 //            byte by byte: "Blue" is not "blue".
@@ -33,5 +33,6 @@
 #include "hxal/config/writer.h"
 #include "hxal/frame.h"
 #include "hxal/ioc.h"
+#include "hxal/iocfc.h"
 #include "hxal/port.h"
 #include "hxal/texts.h"

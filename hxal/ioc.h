@@ -93,11 +93,33 @@ extern "C"
     // Asks the driver for the MAC in use, stores it in the handle and returns it; the stored one when the request fails.
     mac_t hxal_ioc_get_current_mac(hxal_t* ioc);
 
-    // Requests, one each. hxal_ioc_compare_versions() answers HXA_STATUS_OK also for a driver of another version that serves
-    // this library all the same, with a warning on standard output; a request that fails is HXA_STATUS_EIO.
+    // Requests, one each: a null handle, name or output is HXA_STATUS_EINVAL without a request.
+
+    // Whether the driver behind the IOC serves this library. A driver of another version that does is HXA_STATUS_OK with a
+    // warning on standard output; a request that fails is HXA_STATUS_EIO.
     hxa_status_t hxal_ioc_compare_versions(const hxal_t* ioc);
+
+    // Reads identity, names and addresses. The request is made in `info` itself: also a call that fails overwrites it.
     hxa_status_t hxal_ioc_get_info(const hxal_t* ioc, hxa_ioctl_ioc_info_t* info);
-    hxa_status_t hxal_ioc_get_attr(const hxal_t* ioc, hxa_ioc_attr_t* attr); // prints a message when the request fails
+
+    // Reads the attributes of card, driver and PCI function, with the IOC's state. Prints a message when the call fails.
+    hxa_status_t hxal_ioc_get_attr(const hxal_t* ioc, hxa_ioc_attr_t* attr);
+
+    // Read and clear what driver and firmware count.
+    hxa_status_t hxal_ioc_get_stats(const hxal_t* ioc, hxa_ioc_stats_t* stats);
+    hxa_status_t hxal_ioc_reset_stats(const hxal_t* ioc);
+
+    // Sets the power state.
+    hxa_status_t hxal_ioc_set_power(const hxal_t* ioc, hxa_pm_ds_t state);
+
+    // Names the port: at most 64 characters reach the driver. What it accepts becomes the handle's `port_name` (63
+    // characters) and is recorded in the configuration.
+    hxa_status_t hxal_ioc_set_name(hxal_t* ioc, const char* name);
+
+    // Start and stop the IOC. What the driver refuses is answered at once. Else they read the attributes once a second, until
+    // the IOC is operational or disabled: HXA_STATUS_OK, or HXA_STATUS_FAILED after 20 s. They block as long.
+    hxa_status_t hxal_ioc_enable(const hxal_t* ioc);
+    hxa_status_t hxal_ioc_disable(const hxal_t* ioc);
 
 #ifdef __cplusplus
 }

@@ -1,4 +1,5 @@
 #include "hxal/internal/request.h"
+#include "hxal/internal/text.h"
 
 #include <cerrno>
 #include <cstdio>
@@ -27,11 +28,8 @@ hxa_status_t hxal_ioc_get_info(const hxal_t* ioc, hxa_ioctl_ioc_info_t* info)
 {
     if (!ioc || !info)
         return HXA_STATUS_EINVAL;
-    auto record = hxal::request_for<hxa_ioctl_ioc_info_t>(*ioc);
-    if (const hxa_status_t sent = hxal::send(*ioc, "IOCMD_IOC_GET_INFO", record); sent != HXA_STATUS_OK)
-        return sent;
-    *info = record;
-    return record.status;
+    *info = hxal::request_for<hxa_ioctl_ioc_info_t>(*ioc);
+    return hxal::exchange(*ioc, "IOCMD_IOC_GET_INFO", *info);
 }
 
 hxa_status_t hxal_ioc_get_attr(const hxal_t* ioc, hxa_ioc_attr_t* attr)
@@ -46,6 +44,34 @@ hxa_status_t hxal_ioc_get_attr(const hxal_t* ioc, hxa_ioc_attr_t* attr)
     }
     *attr = record.attr;
     return record.status;
+}
+
+hxa_status_t hxal_ioc_get_stats(const hxal_t* ioc, hxa_ioc_stats_t* stats)
+{
+    return hxal::read(ioc, "IOCMD_IOC_GET_STATS", &hxa_ioctl_ioc_stats_t::stats, stats);
+}
+
+hxa_status_t hxal_ioc_reset_stats(const hxal_t* ioc) { return hxal::request(ioc, "IOCMD_IOC_RESET_STATS"); }
+
+hxa_status_t hxal_ioc_set_power(const hxal_t* ioc, hxa_pm_ds_t state)
+{
+    if (!ioc)
+        return HXA_STATUS_EINVAL;
+    auto record = hxal::request_for<hxa_ioctl_ioc_power_t>(*ioc);
+    record.power = state;
+    return hxal::exchange(*ioc, "IOCMD_IOC_SET_POWER", record);
+}
+
+hxa_status_t hxal_ioc_set_name(hxal_t* ioc, const char* name)
+{
+    if (!ioc || !name)
+        return HXA_STATUS_EINVAL;
+    auto record = hxal::request_for<hxa_ioctl_ioc_set_adapter_name_t>(*ioc);
+    hxal::put_text(record.name, name);
+    const hxa_status_t status = hxal::exchange(*ioc, "IOCMD_IOC_SET_PORT_NAME", record);
+    if (status == HXA_STATUS_OK)
+        hxal::keep_text(ioc->port_name, name);
+    return status;
 }
 
 mac_t hxal_ioc_get_current_mac(hxal_t* ioc)

@@ -54,16 +54,32 @@ template <auto function> consteval Row row(std::string_view name, Target target,
             .answer = answer_with<function>};
 }
 
-constexpr std::array<Field, 4> application_input{Field{.offset = offsetof(hxa_ioctl_aen_t, app_id), .size = 4}};
+constexpr std::array<Field, 4> input(std::size_t offset, std::size_t size) { return {Field{.offset = offset, .size = size}}; }
+
+constexpr auto application = input(offsetof(hxa_ioctl_aen_t, app_id), 4);
+constexpr auto power = input(offsetof(hxa_ioctl_ioc_power_t, power), 4);
+constexpr auto name = input(offsetof(hxa_ioctl_ioc_set_adapter_name_t, name), 64);
+constexpr auto interrupts = input(offsetof(hxa_ioctl_iocfc_intr_t, attr), sizeof(hxa_iocfc_intr_attr_t));
 
 // clang-format off
 constexpr std::array rows{
-    row<answer_version>        ("IOCMD_IOC_GET_VERSION", Target::driver),
-    row<answer_instances>      ("IOCMD_IOC_GET_INST",    Target::driver),
-    row<answer_ioc_attributes> ("IOCMD_IOC_GET_ATTR",    Target::ioc),
-    row<answer_ioc_info>       ("IOCMD_IOC_GET_INFO",    Target::ioc),
-    row<answer_event_sync>     ("IOCMD_AEN_SYNC",        Target::driver, application_input),
-    row<answer_port_attributes>("IOCMD_PORT_GET_ATTR",   Target::ioc),
+    row<answer_version>                ("IOCMD_IOC_GET_VERSION",      Target::driver),
+    row<answer_instances>              ("IOCMD_IOC_GET_INST",         Target::driver),
+    row<answer_ioc_enable>             ("IOCMD_IOC_ENABLE",           Target::ioc),
+    row<answer_ioc_disable>            ("IOCMD_IOC_DISABLE",          Target::ioc),
+    row<answer_ioc_attributes>         ("IOCMD_IOC_GET_ATTR",         Target::ioc),
+    row<answer_ioc_info>               ("IOCMD_IOC_GET_INFO",         Target::ioc),
+    row<answer_ioc_statistics>         ("IOCMD_IOC_GET_STATS",        Target::ioc),
+    row<answer_ioc_reset_statistics>   ("IOCMD_IOC_RESET_STATS",      Target::ioc),
+    row<answer_ioc_power>              ("IOCMD_IOC_SET_POWER",        Target::ioc,    power),
+    row<answer_adapter_name>           ("IOCMD_IOC_SET_ADAPTER_NAME", Target::ioc,    name),
+    row<answer_port_name>              ("IOCMD_IOC_SET_PORT_NAME",    Target::ioc,    name),
+    row<answer_event_sync>             ("IOCMD_AEN_SYNC",             Target::driver, application),
+    row<answer_port_attributes>        ("IOCMD_PORT_GET_ATTR",        Target::ioc),
+    row<answer_iocfc_attributes>       ("IOCMD_IOCFC_GET_ATTR",       Target::ioc),
+    row<answer_iocfc_statistics>       ("IOCMD_IOCFC_GET_STATS",      Target::ioc),
+    row<answer_iocfc_reset_statistics> ("IOCMD_IOCFC_RESET_STATS",    Target::ioc),
+    row<answer_iocfc_interrupts>       ("IOCMD_IOCFC_SET_INTR",       Target::ioc,    interrupts),
 };
 // clang-format on
 

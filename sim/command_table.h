@@ -77,6 +77,17 @@ void answer_instances(Call& call, hxa_ioctl_ioc_get_inst_t& record);
 void answer_event_sync(Call& call, hxa_ioctl_aen_t& record);
 void answer_ioc_info(Call& call, hxa_ioctl_ioc_info_t& record); // ioc_commands.cpp
 void answer_ioc_attributes(Call& call, hxa_ioctl_ioc_attr_t& record);
+void answer_ioc_enable(Call& call, hxa_ioctl_gen_t& record);
+void answer_ioc_disable(Call& call, hxa_ioctl_gen_t& record);
+void answer_ioc_statistics(Call& call, hxa_ioctl_ioc_stats_t& record);
+void answer_ioc_reset_statistics(Call& call, hxa_ioctl_gen_t& record);
+void answer_ioc_power(Call& call, hxa_ioctl_ioc_power_t& record);
+void answer_adapter_name(Call& call, hxa_ioctl_ioc_set_adapter_name_t& record);
+void answer_port_name(Call& call, hxa_ioctl_ioc_set_adapter_name_t& record);
+void answer_iocfc_attributes(Call& call, hxa_ioctl_iocfc_attr_t& record); // iocfc_commands.cpp
+void answer_iocfc_interrupts(Call& call, hxa_ioctl_iocfc_intr_t& record);
+void answer_iocfc_statistics(Call& call, hxa_ioctl_iocfc_stats_t& record);
+void answer_iocfc_reset_statistics(Call& call, hxa_ioctl_gen_t& record);
 void answer_port_attributes(Call& call, hxa_ioctl_port_attr_t& record); // port_commands.cpp
 
 } // namespace hxasim

@@ -8,6 +8,24 @@
 namespace hxasim
 {
 
+namespace
+{
+
+constexpr hxa_iocfc_intr_attr_t usual_interrupts{.coalesce = HXA_TRUE, .latency = 225, .delay = 1125};
+
+// The driver has booted and enabled the IOC once.
+void count_start(hxa_ioc_stats_t& stats)
+{
+    stats.drv_stats.ioc_boots = 1;
+    stats.drv_stats.ioc_enables = 1;
+    stats.drv_stats.enable_reqs = 1;
+    stats.drv_stats.enable_replies = 1;
+    stats.fw_stats.cfg_reqs = 1;
+    stats.fw_stats.enable_reqs = 1;
+}
+
+} // namespace
+
 Host::Host(Scenario scenario) : _scenario(std::move(scenario))
 {
     for (auto& adapter : _scenario.adapters)
@@ -36,6 +54,22 @@ void Host::add_port(Adapter& adapter, std::uint8_t number)
          .port_number = number,
          .pci_function = static_cast<std::uint32_t>(adapter.ports.size()) + number,
          .state = &port.eth_ioc_state});
+}
+
+void Host::add(Ioc ioc)
+{
+    ioc.adapter_name = ioc.adapter->name;
+    ioc.port_name = ioc.port->name;
+    ioc.interrupts = usual_interrupts;
+    count_start(ioc.stats);
+    _iocs[static_cast<std::size_t>(ioc.node)].push_back(std::move(ioc));
+}
+
+void Host::name_adapter(const Ioc& told, const std::string& name)
+{
+    for (auto& ioc : _iocs[static_cast<std::size_t>(told.node)])
+        if (ioc.adapter == told.adapter)
+            ioc.adapter_name = name;
 }
 
 Ioc* Host::find(Node node, std::uint32_t instance)

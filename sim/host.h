@@ -3,7 +3,10 @@
 
 #include "sim/scenario.h"
 
+#include "hxal/records/iocfc.h"
+
 #include <array>
+#include <string>
 #include <vector>
 
 namespace hxasim
@@ -20,6 +23,15 @@ struct Ioc
     std::uint8_t port_number;   // on its adapter
     std::uint32_t pci_function; // FC functions first, then the Ethernet functions
     std::uint32_t* state;       // hxa_ioc_state_t
+
+    // What its driver keeps of it: the names are those of one driver, the other one has its own.
+    std::string adapter_name = {};
+    std::string port_name = {};
+    hxa_iocfc_intr_attr_t interrupts{};
+    hxa_ioc_stats_t stats{};
+    hxa_iocfc_stats_t fc_stats{};
+    std::uint32_t next_state = 0; // the state it is on the way to ...
+    std::uint32_t settle = 0;     // ... and how many attribute requests will see it there
 };
 
 class Host
@@ -35,8 +47,11 @@ public:
 
     Ioc* find(Node node, std::uint32_t instance); // null when there is none
 
+    // A driver keeps one name for a card, whichever of its IOCs is told.
+    void name_adapter(const Ioc& told, const std::string& name);
+
 private:
-    void add(const Ioc& ioc) { _iocs[static_cast<std::size_t>(ioc.node)].push_back(ioc); }
+    void add(Ioc ioc);
     void add_port(Adapter& adapter, std::uint8_t number);
 
     Scenario _scenario;

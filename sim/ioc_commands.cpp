@@ -92,6 +92,23 @@ void put_pci(hxa_ioc_pci_attr_t& field, const Ioc& ioc)
     put_text(field.chip_rev, ioc.adapter->hw_version);
 }
 
+// An enable or a disable takes its time; who asks for the attributes sees it pass.
+void start(Ioc& ioc, hxa_ioc_state_t passing, hxa_ioc_state_t next)
+{
+    *ioc.state = ioc.port->ioc_settle > 0 ? passing : next;
+    ioc.next_state = next;
+    ioc.settle = ioc.port->ioc_settle;
+}
+
+// The last of the requests that see the passing state is followed by the next one.
+std::uint32_t observed_state(Ioc& ioc)
+{
+    const auto observed = *ioc.state;
+    if (ioc.settle > 0 && --ioc.settle == 0)
+        *ioc.state = ioc.next_state;
+    return observed;
+}
+
 } // namespace
 
 void answer_ioc_info(Call& call, hxa_ioctl_ioc_info_t& record)
@@ -101,21 +118,67 @@ void answer_ioc_info(Call& call, hxa_ioctl_ioc_info_t& record)
     put_text(record.serialnum, adapter.serial);
     put_text(record.hwpath, adapter.hwpath + "." + std::to_string(ioc.pci_function));
     put_text(record.adapter_hwpath, adapter.hwpath);
-    put_text(record.name, adapter.name);
-    put_text(record.port_name, ioc.port->name);
+    put_text(record.name, ioc.adapter_name);
+    put_text(record.port_name, ioc.port_name);
     put_addresses(record, ioc);
     record.ioc_type = ioc.type;
 }
 
 void answer_ioc_attributes(Call& call, hxa_ioctl_ioc_attr_t& record)
 {
-    const auto& ioc = *call.ioc;
+    auto& ioc = *call.ioc;
     record.attr.ioc_type = ioc.type;
-    record.attr.state = *ioc.state;
+    record.attr.state = observed_state(ioc);
     record.attr.port_id = ioc.port_number;
     put_card(record.attr.adapter_attr, ioc);
     put_software(record.attr.driver_attr, ioc);
     put_pci(record.attr.pci_attr, ioc);
 }
+
+void answer_ioc_enable(Call& call, hxa_ioctl_gen_t& record)
+{
+    auto& ioc = *call.ioc;
+    ++ioc.stats.drv_stats.enable_reqs;
+    record.status = *ioc.state == HXA_IOC_OPERATIONAL ? HXA_STATUS_IOC_ENABLED : HXA_STATUS_OK;
+    if (record.status != HXA_STATUS_OK)
+        return;
+    ++ioc.stats.drv_stats.ioc_enables;
+    ++ioc.stats.drv_stats.enable_replies;
+    ++ioc.stats.fw_stats.enable_reqs;
+    start(ioc, HXA_IOC_HWINIT, HXA_IOC_OPERATIONAL);
+}
+
+void answer_ioc_disable(Call& call, hxa_ioctl_gen_t& record)
+{
+    auto& ioc = *call.ioc;
+    ++ioc.stats.drv_stats.disable_reqs;
+    record.status = *ioc.state == HXA_IOC_DISABLED ? HXA_STATUS_IOC_DISABLED : HXA_STATUS_OK;
+    if (record.status != HXA_STATUS_OK)
+        return;
+    ++ioc.stats.drv_stats.ioc_disables;
+    ++ioc.stats.drv_stats.disable_replies;
+    ++ioc.stats.fw_stats.disable_reqs;
+    start(ioc, HXA_IOC_DISABLING, HXA_IOC_DISABLED);
+}
+
+void answer_ioc_statistics(Call& call, hxa_ioctl_ioc_stats_t& record)
+{
+    ++call.ioc->stats.fw_stats.stats_reqs;
+    record.stats = call.ioc->stats;
+}
+
+void answer_ioc_reset_statistics(Call& call, hxa_ioctl_gen_t&) { call.ioc->stats = {}; }
+
+void answer_ioc_power(Call&, hxa_ioctl_ioc_power_t& record)
+{
+    record.status = record.power <= HXA_PM_DS_D3 ? HXA_STATUS_OK : HXA_STATUS_EINVAL;
+}
+
+void answer_adapter_name(Call& call, hxa_ioctl_ioc_set_adapter_name_t& record)
+{
+    call.host.name_adapter(*call.ioc, get_text(record.name));
+}
+
+void answer_port_name(Call& call, hxa_ioctl_ioc_set_adapter_name_t& record) { call.ioc->port_name = get_text(record.name); }
 
 } // namespace hxasim

@@ -6,6 +6,7 @@
 #include <algorithm>
 #include <array>
 #include <cstring>
+#include <string>
 #include <string_view>
 
 namespace hxasim
@@ -17,6 +18,9 @@ template <std::size_t size> void put_text(char (&field)[size], std::string_view 
     std::memset(field, 0, size);
     std::memcpy(field, text.data(), std::min(size, text.size()));
 }
+
+// The text of a field that may lack its terminator.
+template <std::size_t size> std::string get_text(const char (&field)[size]) { return {field, strnlen(field, size)}; }
 
 inline void put_address(wwn_t& field, const std::array<std::uint8_t, 8>& wwn) { std::memcpy(&field, wwn.data(), wwn.size()); }
 inline void put_address(mac_t& field, const std::array<std::uint8_t, 6>& mac) { std::memcpy(field.mac, mac.data(), mac.size()); }

@@ -170,6 +170,7 @@ void Scenario_Reader::read_port(Json_Object& object, Adapter& adapter)
     port.max_frame_size = static_cast<std::uint16_t>(object.number("max_frame_size", 0xFFFF, port.max_frame_size));
     port.beacon = object.boolean("beacon", port.beacon);
     port.ioc_state = object.choice("ioc_state", ioc_state_words, max_u32, port.ioc_state);
+    port.ioc_settle = object.number("ioc_settle", 1000, port.ioc_settle);
     port.fc_instance = _fc_instances.take(object, "fc_instance");
     if (adapter.converged())
     {

@@ -61,6 +61,7 @@ struct Port
     bool beacon = false;
     std::uint32_t ioc_state = 0;
     std::uint32_t eth_ioc_state = 0;
+    std::uint32_t ioc_settle = 0; // attribute requests that see an IOC on its way, after an enable or a disable
     std::uint32_t fc_instance = 0;
     std::uint32_t eth_instance = 0; // of a converged adapter
 };

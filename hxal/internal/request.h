@@ -74,4 +74,14 @@ inline hxa_status_t request(const hxal_t* ioc, Command_Name<hxa_ioctl_gen_t> com
     return exchange(*ioc, command, record);
 }
 
+// A request that carries nothing but the instance and brings a field.
+template <typename Record, typename Output>
+hxa_status_t read(const hxal_t* ioc, Command_Name<std::type_identity_t<Record>> command, Output Record::*field, Output* output)
+{
+    if (!ioc || !output)
+        return HXA_STATUS_EINVAL;
+    auto record = request_for<Record>(*ioc);
+    return exchange(*ioc, command, record, field, output);
+}
+
 } // namespace hxal

@@ -8,13 +8,24 @@
 namespace hxal
 {
 
-// Copies a driver's text into a field of ours, cut where it does not fit, and fills the rest with zeros.
-template <std::size_t To, std::size_t From> void copy_text(char (&to)[To], const char (&from)[From])
+// Fills a field with the first characters of a text, which may be its own, and zeros behind them.
+template <std::size_t To> void fill_text(char (&to)[To], const char* from, std::size_t length)
 {
-    const std::size_t length = std::min(::strnlen(from, From), To - 1);
-    std::memcpy(to, from, length);
+    std::memmove(to, from, length);
     std::memset(to + length, 0, To - length);
 }
+
+// Copies a driver's text into a field of ours, cut to leave room for the terminator.
+template <std::size_t To, std::size_t From> void copy_text(char (&to)[To], const char (&from)[From])
+{
+    fill_text(to, from, std::min(::strnlen(from, From), To - 1));
+}
+
+// Copies a caller's text into a field of ours, cut to leave room for the terminator.
+template <std::size_t To> void keep_text(char (&to)[To], const char* from) { fill_text(to, from, ::strnlen(from, To - 1)); }
+
+// Copies a caller's text into a field of a driver's record, which needs no terminator: only what does not fit is cut.
+template <std::size_t To> void put_text(char (&to)[To], const char* from) { fill_text(to, from, ::strnlen(from, To)); }
 
 // Whether a caller's text, which may be missing, is the text of a field. A full field may have been cut: what the caller has
 // beyond it does not count.

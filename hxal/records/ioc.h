@@ -1,4 +1,5 @@
-// Records about one I/O controller: driver version, instances present, identity (info) and attributes.
+// Records about one I/O controller: driver version, instances present, identity (info), attributes, counters, power state
+// and names.
 #pragma once
 
 #include "hxal/records/header.h"
@@ -173,3 +174,76 @@ typedef struct
 } hxa_ioctl_ioc_attr_t;
 static_assert(sizeof(hxa_ioctl_ioc_attr_t) == 1608, "hxa_ioctl_ioc_attr_t");
 static_assert(offsetof(hxa_ioctl_ioc_attr_t, attr) == 8, "hxa_ioctl_ioc_attr_t");
+
+// What the firmware of an IOC counts.
+typedef struct
+{
+    uint32_t hb_count;      //  0  heart beats
+    uint32_t cfg_reqs;      //  4
+    uint32_t enable_reqs;   //  8
+    uint32_t disable_reqs;  // 12
+    uint32_t stats_reqs;    // 16
+    uint32_t clrstats_reqs; // 20
+    uint32_t unknown_reqs;  // 24
+    uint32_t ic_reqs;       // 28  interrupt coalescing
+} hxa_fw_ioc_stats_t;
+static_assert(sizeof(hxa_fw_ioc_stats_t) == 32, "hxa_fw_ioc_stats_t");
+
+// What the driver of an IOC counts.
+typedef struct
+{
+    uint32_t ioc_isrs;        //  0  interrupts
+    uint32_t ioc_enables;     //  4
+    uint32_t ioc_disables;    //  8
+    uint32_t ioc_hbfails;     // 12
+    uint32_t ioc_boots;       // 16
+    uint32_t stats_tmos;      // 20
+    uint32_t hb_count;        // 24
+    uint32_t disable_reqs;    // 28
+    uint32_t enable_reqs;     // 32
+    uint32_t disable_replies; // 36
+    uint32_t enable_replies;  // 40
+} hxa_drv_ioc_stats_t;
+static_assert(sizeof(hxa_drv_ioc_stats_t) == 44, "hxa_drv_ioc_stats_t");
+
+typedef struct
+{
+    hxa_drv_ioc_stats_t drv_stats; //  0
+    hxa_fw_ioc_stats_t fw_stats;   // 44
+} hxa_ioc_stats_t;
+static_assert(sizeof(hxa_ioc_stats_t) == 76, "hxa_ioc_stats_t");
+static_assert(offsetof(hxa_ioc_stats_t, fw_stats) == 44, "hxa_ioc_stats_t");
+
+// IOCMD_IOC_GET_STATS.
+typedef struct
+{
+    hxa_status_t status;   //  0
+    uint16_t hxad_num;     //  4
+    uint16_t rsvd;         //  6
+    hxa_ioc_stats_t stats; //  8
+} hxa_ioctl_ioc_stats_t;
+static_assert(sizeof(hxa_ioctl_ioc_stats_t) == 84, "hxa_ioctl_ioc_stats_t");
+static_assert(offsetof(hxa_ioctl_ioc_stats_t, stats) == 8, "hxa_ioctl_ioc_stats_t");
+
+// IOCMD_IOC_SET_POWER.
+typedef struct
+{
+    hxa_status_t status; //  0
+    uint16_t hxad_num;   //  4
+    uint16_t rsvd;       //  6
+    uint32_t power;      //  8  hxa_pm_ds_t
+    uint32_t rsvd1;      // 12
+} hxa_ioctl_ioc_power_t;
+static_assert(sizeof(hxa_ioctl_ioc_power_t) == 16, "hxa_ioctl_ioc_power_t");
+static_assert(offsetof(hxa_ioctl_ioc_power_t, power) == 8, "hxa_ioctl_ioc_power_t");
+
+// IOCMD_IOC_SET_ADAPTER_NAME and IOCMD_IOC_SET_PORT_NAME.
+typedef struct
+{
+    hxa_status_t status; //  0
+    uint16_t hxad_num;   //  4
+    uint16_t rsvd;       //  6
+    char name[64];       //  8  a name of 64 characters has no terminator
+} hxa_ioctl_ioc_set_adapter_name_t;
+static_assert(sizeof(hxa_ioctl_ioc_set_adapter_name_t) == 72, "hxa_ioctl_ioc_set_adapter_name_t");
+static_assert(offsetof(hxa_ioctl_ioc_set_adapter_name_t, name) == 8, "hxa_ioctl_ioc_set_adapter_name_t");

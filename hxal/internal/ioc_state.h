@@ -1,0 +1,12 @@
+// What an IOC answers about its state.
+#pragma once
+
+#include "hxal/ioc.h"
+
+namespace hxal
+{
+
+// Whether the IOC answers, with one request, that it is in this state. A request that fails is a no.
+bool is_in_state(const hxal_s& ioc, hxa_ioc_state_t state);
+
+} // namespace hxal
