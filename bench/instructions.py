@@ -1,4 +1,4 @@
-"""Counts the instructions of one enumeration under callgrind, per host size: instructions.py PROGRAM."""
+"""Counts the instructions of one iteration of benchmarks under callgrind: instructions.py PROGRAM..."""
 
 import re
 import subprocess
@@ -6,8 +6,11 @@ import sys
 import tempfile
 from pathlib import Path
 
-ADAPTERS = [1, 4, 16, 64]
-PORTS_PER_ADAPTER = 2
+# By program: the benchmarks to count, and how many of which unit one iteration handles.
+MEASURED = {
+    "enumerate_fc_ports": [(f"enumerate_fc_ports/{adapters}", 2 * adapters, "port") for adapters in [1, 4, 16, 64]],
+    "log_call": [("suppressed_log_call", 100_000, "call")],
+}
 
 
 def instructions(program, benchmark):
@@ -31,12 +34,11 @@ def instructions(program, benchmark):
 
 
 def main():
-    program = sys.argv[1]
-    print(f"\n{'adapters':>8} {'ports':>6} {'instructions':>14} {'per port':>10}")
-    for adapters in ADAPTERS:
-        ports = adapters * PORTS_PER_ADAPTER
-        total = instructions(program, f"enumerate_fc_ports/{adapters}")
-        print(f"{adapters:>8} {ports:>6} {total:>14,} {total // ports:>10,}")
+    print(f"\n{'benchmark':<24} {'instructions':>14} {'per unit':>12}")
+    for program in sys.argv[1:]:
+        for benchmark, units, unit in MEASURED[Path(program).name]:
+            total = instructions(program, benchmark)
+            print(f"{benchmark:<24} {total:>14,} {total / units:>12,.1f}/{unit}")
 
 
 if __name__ == "__main__":
