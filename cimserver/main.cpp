@@ -1,13 +1,17 @@
-// zmlr-cimserver: serves a CIM provider module to CIM-XML clients on the loopback interface.
+// zmlr-cimserver: serves a CIM provider module to CIM-XML clients.
 //
 // Exit status: 0 after a clean stop, 1 when it cannot serve or a request did not end in time, 2 for a wrong command line.
 #include "cimserver/broker/module.h"
+#include "cimserver/broker/principal.h"
 #include "cimserver/cimxml/http_server.h"
+#include "cimserver/cimxml/listener.h"
 #include "cimserver/cimxml/service.h"
-#include "cimserver/cimxml/version.h"
 #include "cimserver/module_operations.h"
+#include "cimserver/options.h"
+#include "cimserver/security/credentials.h"
+#include "cimserver/security/password_prompt.h"
+#include "cimserver/security/tls_identity.h"
 
-#include <CLI/CLI.hpp>
 #include <semaphore.h>
 
 #include <chrono>
@@ -15,43 +19,22 @@
 #include <cstdio>
 #include <cstdlib>
 #include <exception>
+#include <memory>
+#include <stdexcept>
 #include <string>
 
 namespace
 {
 
+using namespace cimserver;
+
 // How long a stop waits for the requests that run.
 constexpr std::chrono::seconds stop_grace{10};
 
-constexpr int exit_usage = 2; // a command line that cannot be served
+constexpr std::uint16_t http_port = 5988; // as registered for WBEM
+constexpr std::uint16_t https_port = 5989;
 
 sem_t stop_asked;
-
-struct Options
-{
-    std::string module;
-    std::uint16_t port = 5988;
-    cimserver::Http_Limits limits;
-};
-
-void declare(CLI::App& app, Options& options)
-{
-    app.set_version_flag("--version", std::string("zmlr-cimserver ") + cimserver::version());
-    app.add_option("--module", options.module, "the provider module to serve (a shared library)")->required();
-    app.add_option("--port", options.port, "TCP port on 127.0.0.1; 0 picks a free one")->capture_default_str();
-    app.add_option("--max-request", options.limits.request_bytes, "largest request, in bytes")
-        ->check(CLI::Range(std::size_t{1024}, std::size_t{1} << 30))
-        ->capture_default_str();
-    app.add_option("--max-connections", options.limits.connections, "connections served at once")
-        ->check(CLI::Range(1, 10000))
-        ->capture_default_str();
-    app.add_option("--max-waiting", options.limits.waiting_requests, "requests that may wait for a worker")
-        ->check(CLI::Range(1, 100000))
-        ->capture_default_str();
-    app.add_option("--workers", options.limits.workers, "requests answered at once")
-        ->check(CLI::Range(1, 256))
-        ->capture_default_str();
-}
 
 void ask_to_stop(int) { sem_post(&stop_asked); }
 
@@ -71,15 +54,45 @@ void wait_for_stop()
     }
 }
 
+Http_Endpoint endpoint_of(const Options& options)
+{
+    Http_Endpoint endpoint{options.address, http_port, std::nullopt};
+    if (!options.certificate.empty())
+    {
+        endpoint.tls = read_tls_identity(options.certificate, options.key);
+        endpoint.port = https_port;
+    }
+    endpoint.port = options.port.value_or(endpoint.port);
+    return endpoint;
+}
+
+// Null when nobody has to prove who he is.
+std::unique_ptr<Credentials> credentials_of(const Options& options)
+try
+{
+    return options.no_auth ? nullptr : std::make_unique<Credentials>(options.users);
+}
+catch (const std::runtime_error& error)
+{
+    throw std::runtime_error(std::string(error.what()) + " (--add-user NAME adds a user to the file)");
+}
+
 void serve(const Options& options)
 {
     handle_signals();
-    cimserver::Module module(options.module);
-    cimserver::Module_Operations operations(module);
-    cimserver::Service service(operations);
-    cimserver::Http_Server server(options.port, options.limits,
-                                  [&](const cimserver::Http_Request& request) { return service.answer(request); });
-    std::fprintf(stderr, "zmlr-cimserver: listening on 127.0.0.1:%u\n", static_cast<unsigned>(server.port()));
+    const Http_Endpoint endpoint = endpoint_of(options);
+    const auto credentials = credentials_of(options);
+    Module module(options.module);
+    Module_Operations operations(module);
+    Service service(operations);
+    Http_Server server(endpoint, options.limits, credentials.get(),
+                       [&](const Http_Request& request)
+                       {
+                           const Principal_Scope principal(request.user);
+                           return service.answer(request);
+                       });
+    std::fprintf(stderr, "zmlr-cimserver: listening on %s%s\n", endpoint_text(endpoint.address, server.port()).c_str(),
+                 endpoint.tls ? " (TLS)" : "");
 
     wait_for_stop();
     if (!server.stop(stop_grace))
@@ -92,23 +105,20 @@ void serve(const Options& options)
 } // namespace
 
 int main(int argc, char** argv)
+try
 {
-    CLI::App app("Serves a CIM provider module to CIM-XML clients on the loopback interface.", "zmlr-cimserver");
-    Options options;
-    declare(app, options);
-    try
-    {
-        app.parse(argc, argv);
-        serve(options);
-        return EXIT_SUCCESS;
-    }
-    catch (const CLI::ParseError& error) // a request for help, too
-    {
-        return app.exit(error) == EXIT_SUCCESS ? EXIT_SUCCESS : exit_usage;
-    }
-    catch (const std::exception& error)
-    {
-        std::fprintf(stderr, "zmlr-cimserver: %s\n", error.what());
-        return EXIT_FAILURE;
-    }
+    const auto options = read_options(argc, argv);
+    if (const int* status = std::get_if<int>(&options))
+        return *status;
+    const auto& read = std::get<Options>(options);
+    if (read.add_user)
+        store_user(read.users, *read.add_user, ask_password());
+    else
+        serve(read);
+    return EXIT_SUCCESS;
+}
+catch (const std::exception& error)
+{
+    std::fprintf(stderr, "zmlr-cimserver: %s\n", error.what());
+    return EXIT_FAILURE;
 }

@@ -15,11 +15,12 @@ STOP_TIMEOUT = 30  # seconds
 class SimulatedServer:
     """Starts script/server on a free port; `lines` collects what it says on standard error."""
 
-    def __init__(self, scenario="mixed", environment=None):
+    def __init__(self, scenario="mixed", environment=None, options=None):
+        """`options`, if any, replace --no-auth on the server's command line."""
         self.lines = []
         self._listening = threading.Event()
         self._process = subprocess.Popen(
-            [ROOT / "script/server", "--scenario", scenario, "--port", "0"],
+            [ROOT / "script/server", "--scenario", scenario, "--port", "0", *(["--", *options] if options else [])],
             stdin=subprocess.DEVNULL,
             stdout=subprocess.PIPE,
             stderr=subprocess.PIPE,
@@ -41,7 +42,7 @@ class SimulatedServer:
     def _collect(self, stream):
         for line in stream:
             self.lines.append(line.rstrip("\n"))
-            listening = re.search(r"listening on 127\.0\.0\.1:(\d+)", line)
+            listening = re.search(r"listening on \S+:(\d+)", line)
             if listening:
                 self.port = int(listening[1])
                 self.url = f"http://127.0.0.1:{self.port}"

@@ -1,12 +1,14 @@
 #include "cimserver/broker/request.h"
 
+#include "cimserver/broker/principal.h"
+
 namespace cimserver
 {
 
 Request::Request(CMPIFlags flags) : _context(make<Context_Object>())
 {
     _context.entries.push_back({CMPIInvocationFlags, {CMPI_uint32, std::uint64_t{flags}}});
-    _context.entries.push_back({CMPIPrincipal, {CMPI_string, "root"}}); // clients are not told apart on loopback
+    _context.entries.push_back({CMPIPrincipal, {CMPI_string, Principal_Scope::current()}});
 }
 
 } // namespace cimserver

@@ -2,12 +2,19 @@
 
 #include <charconv>
 #include <cstdint>
+#include <memory>
 
 namespace cimserver
 {
 
 namespace
 {
+
+struct Free_Http_Text
+{
+    void operator()(char* text) const { MHD_free(text); }
+};
+using Http_Text = std::unique_ptr<char, Free_Http_Text>;
 
 void add_headers(MHD_Response* response, const Http_Answer& answer)
 {
@@ -18,6 +25,8 @@ void add_headers(MHD_Response* response, const Http_Answer& answer)
     }
     if (!answer.cim_error.empty())
         MHD_add_response_header(response, "CIMError", answer.cim_error.c_str());
+    if (answer.status == MHD_HTTP_UNAUTHORIZED)
+        MHD_add_response_header(response, "WWW-Authenticate", "Basic realm=\"zmlr-cimserver\", charset=\"UTF-8\"");
     if (answer.status == MHD_HTTP_METHOD_NOT_ALLOWED)
         MHD_add_response_header(response, "Allow", "POST");
     if (answer.status == MHD_HTTP_SERVICE_UNAVAILABLE)
@@ -30,6 +39,16 @@ std::string header_of(MHD_Connection* connection, const char* name)
 {
     const char* value = MHD_lookup_connection_value(connection, MHD_HEADER_KIND, name);
     return value ? value : "";
+}
+
+std::optional<Login> login_of(MHD_Connection* connection)
+{
+    char* password = nullptr;
+    const Http_Text name(MHD_basic_auth_get_username_password(connection, &password));
+    const Http_Text owned_password(password);
+    if (!name || !password)
+        return std::nullopt;
+    return Login{name.get(), password};
 }
 
 bool announces_more_than(MHD_Connection* connection, std::size_t limit)

@@ -2,10 +2,12 @@
 #pragma once
 
 #include "cimserver/cimxml/http_message.h"
+#include "cimserver/security/credentials.h"
 
 #include <microhttpd.h>
 
 #include <cstddef>
+#include <optional>
 #include <string>
 
 namespace cimserver
@@ -13,6 +15,9 @@ namespace cimserver
 
 // A header's value, empty when the client sent none.
 std::string header_of(MHD_Connection* connection, const char* name);
+
+// The name and password of HTTP Basic; none when the client sent none or nonsense.
+std::optional<Login> login_of(MHD_Connection* connection);
 
 // Whether Content-Length tells of a body beyond the limit.
 bool announces_more_than(MHD_Connection* connection, std::size_t limit);

@@ -13,6 +13,7 @@ struct Http_Request
 {
     std::string cim_operation; // the CIMOperation header; empty when the client sent none
     std::string body;
+    std::string user = "root"; // who asks; a server without credentials does not tell its users apart
 };
 
 struct Http_Answer

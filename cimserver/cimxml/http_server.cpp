@@ -4,6 +4,7 @@
 #include "cimserver/cimxml/http_connection.h"
 #include "cimserver/cimxml/listener.h"
 #include "cimserver/cimxml/worker_pool.h"
+#include "cimserver/security/credentials.h"
 
 #include <microhttpd.h>
 
@@ -15,6 +16,7 @@
 #include <string_view>
 #include <system_error>
 #include <utility>
+#include <vector>
 
 namespace cimserver
 {
@@ -33,10 +35,12 @@ constexpr unsigned spare_connections = 64;
 // A client hears of a refused body only when it has sent all of it. One that goes on beyond this many times the limit is cut.
 constexpr std::size_t max_excess = 4;
 
-// One request on its way: filled by the byte mover, answered by a worker while the connection is suspended.
+// One request on its way: filled by the byte mover, answered by a worker while the connection is suspended. One that is
+// answered already, because its login is refused, is only drained.
 struct Exchange
 {
     Http_Request request;
+    bool verifying = false;   // the login, while the connection is suspended
     std::size_t received = 0; // bytes of the body, kept or not
     bool submitted = false;
     std::optional<Http_Answer> answer;
@@ -44,7 +48,7 @@ struct Exchange
     void receive(std::string_view bytes, std::size_t limit)
     {
         received += bytes.size();
-        if (received <= limit)
+        if (received <= limit && !answer)
             request.body.append(bytes);
         else
             std::string().swap(request.body);
@@ -56,7 +60,7 @@ struct Exchange
 class Http_Server::Daemon
 {
 public:
-    Daemon(std::uint16_t port, const Http_Limits& limits, Http_Handler handler);
+    Daemon(const Http_Endpoint& endpoint, const Http_Limits& limits, Credentials* credentials, Http_Handler handler);
     ~Daemon();
 
     std::uint16_t port() const { return _listener.port(); }
@@ -70,7 +74,11 @@ private:
     static void on_connection(void* self, MHD_Connection* connection, void** context,
                               MHD_ConnectionNotificationCode code) noexcept;
 
+    void start(const Http_Endpoint& endpoint);
     MHD_Result begin(MHD_Connection* connection, std::string_view method, void** context);
+    void log_in(MHD_Connection* connection, Exchange& exchange);
+    void verify(MHD_Connection* connection, Exchange& exchange, const Login& login) noexcept;
+    MHD_Result receive(Exchange& exchange, std::string_view bytes);
     MHD_Result finish(MHD_Connection* connection, Exchange& exchange);
     void submit(MHD_Connection* connection, Exchange& exchange);
     void work(MHD_Connection* connection, Exchange& exchange) noexcept;
@@ -79,6 +87,7 @@ private:
     bool wait_for_answers(Clock::time_point deadline);
 
     const Http_Limits _limits;
+    Credentials* const _credentials;
     const Http_Handler _handler;
     Listener _listener;
     std::atomic<bool> _stopping = false;
@@ -88,30 +97,48 @@ private:
     std::size_t _unanswered = 0; // submitted, the answer not yet sent
 
     Connection_Watch _watch;
+    Worker_Pool _verifiers;
     Worker_Pool _pool;
     MHD_Daemon* _http = nullptr;
 };
 
-Http_Server::Daemon::Daemon(std::uint16_t port, const Http_Limits& limits, Http_Handler handler)
+Http_Server::Daemon::Daemon(const Http_Endpoint& endpoint, const Http_Limits& limits, Credentials* credentials,
+                            Http_Handler handler)
     : _limits(limits)
+    , _credentials(credentials)
     , _handler(std::move(handler))
-    , _listener(port)
+    , _listener(endpoint.address, endpoint.port)
     , _watch({limits.connections, limits.receive, limits.send})
+    , _verifiers(1, limits.waiting_logins)
     , _pool(limits.workers, limits.waiting_requests)
 {
-    const unsigned flags = MHD_USE_EPOLL_INTERNAL_THREAD | MHD_ALLOW_SUSPEND_RESUME;
+    start(endpoint);
+    if (!_http)
+        throw std::system_error(errno, std::generic_category(), "cannot start the HTTP server");
+}
+
+void Http_Server::Daemon::start(const Http_Endpoint& endpoint)
+{
+    std::vector<MHD_OptionItem> tls;
+    if (endpoint.tls)
+        tls = {{MHD_OPTION_HTTPS_MEM_CERT, 0, const_cast<char*>(endpoint.tls->certificate.c_str())},
+               {MHD_OPTION_HTTPS_MEM_KEY, 0, const_cast<char*>(endpoint.tls->key.c_str())},
+               {MHD_OPTION_HTTPS_PRIORITIES, 0, const_cast<char*>(tls_priorities)}};
+    tls.push_back({MHD_OPTION_END, 0, nullptr});
+
+    const unsigned tls_flag = endpoint.tls ? MHD_USE_TLS : MHD_NO_FLAG;
+    const unsigned flags = MHD_USE_EPOLL_INTERNAL_THREAD | MHD_ALLOW_SUSPEND_RESUME | tls_flag;
     // clang-format off
     _http = MHD_start_daemon(flags, 0, nullptr, nullptr, on_request, this,
                              MHD_OPTION_LISTEN_SOCKET, _listener.socket(),
-                             MHD_OPTION_CONNECTION_LIMIT, static_cast<unsigned>(limits.connections) + spare_connections,
+                             MHD_OPTION_CONNECTION_LIMIT, static_cast<unsigned>(_limits.connections) + spare_connections,
                              MHD_OPTION_CONNECTION_MEMORY_LIMIT, head_bytes,
                              MHD_OPTION_STRICT_FOR_CLIENT, 1,
                              MHD_OPTION_NOTIFY_COMPLETED, on_completed, this,
                              MHD_OPTION_NOTIFY_CONNECTION, on_connection, this,
+                             MHD_OPTION_ARRAY, tls.data(),
                              MHD_OPTION_END);
     // clang-format on
-    if (!_http)
-        throw std::system_error(errno, std::generic_category(), "cannot start the HTTP server");
 }
 
 Http_Server::Daemon::~Daemon()
@@ -127,7 +154,7 @@ bool Http_Server::Daemon::stop(Clock::time_point deadline)
         return true;
     if (!_stopping.exchange(true))
         refuse_connections();
-    if (!_pool.stop(deadline))
+    if (!_verifiers.stop(deadline) || !_pool.stop(deadline))
         return false;
     wait_for_answers(deadline);
     MHD_stop_daemon(_http);
@@ -157,11 +184,12 @@ MHD_Result Http_Server::Daemon::on_request(void* self, MHD_Connection* connectio
         if (!*context)
             return daemon.begin(connection, method, context);
         auto& exchange = *static_cast<Exchange*>(*context);
+        const bool verified = std::exchange(exchange.verifying, false);
+        if (verified)
+            daemon.enter(connection, Connection_Watch::Phase::receiving);
         if (*size == 0)
-            return daemon.finish(connection, exchange);
-        exchange.receive({data, *size}, daemon._limits.request_bytes);
-        *size = 0;
-        return exchange.received <= max_excess * daemon._limits.request_bytes ? MHD_YES : MHD_NO;
+            return verified ? MHD_YES : daemon.finish(connection, exchange);
+        return daemon.receive(exchange, {data, std::exchange(*size, 0)});
     }
     catch (...)
     {
@@ -203,8 +231,55 @@ MHD_Result Http_Server::Daemon::begin(MHD_Connection* connection, std::string_vi
     enter(connection, Connection_Watch::Phase::receiving);
     auto exchange = std::make_unique<Exchange>();
     exchange->request.cim_operation = header_of(connection, "CIMOperation");
+    if (_credentials)
+        log_in(connection, *exchange);
     *context = exchange.release();
     return MHD_YES;
+}
+
+// A client that is refused is heard to its end all the same: one that still sends might not see the answer.
+void Http_Server::Daemon::log_in(MHD_Connection* connection, Exchange& exchange)
+{
+    const auto login = login_of(connection);
+    if (!login)
+    {
+        exchange.answer = {MHD_HTTP_UNAUTHORIZED, "", ""};
+        return;
+    }
+    exchange.request.user = login->name;
+    if (_credentials->remembers(*login))
+        return;
+
+    Worker_Pool::Job job = [this, connection, &exchange, login] { verify(connection, exchange, *login); };
+    enter(connection, Connection_Watch::Phase::working);
+    MHD_suspend_connection(connection);
+    exchange.verifying = true;
+    if (_verifiers.submit(std::move(job)))
+        return;
+    exchange.answer = {MHD_HTTP_SERVICE_UNAVAILABLE, "", ""};
+    MHD_resume_connection(connection);
+}
+
+void Http_Server::Daemon::verify(MHD_Connection* connection, Exchange& exchange, const Login& login) noexcept
+{
+    try
+    {
+        if (_stopping)
+            exchange.answer = {MHD_HTTP_SERVICE_UNAVAILABLE, "", ""};
+        else if (!_credentials->verify(login))
+            exchange.answer = {MHD_HTTP_UNAUTHORIZED, "", ""};
+    }
+    catch (...)
+    {
+        exchange.answer = {MHD_HTTP_INTERNAL_SERVER_ERROR, "", ""};
+    }
+    MHD_resume_connection(connection);
+}
+
+MHD_Result Http_Server::Daemon::receive(Exchange& exchange, std::string_view bytes)
+{
+    exchange.receive(bytes, _limits.request_bytes);
+    return exchange.received <= max_excess * _limits.request_bytes ? MHD_YES : MHD_NO;
 }
 
 // Called when the body is complete, and again when the answer is there.
@@ -259,8 +334,8 @@ void Http_Server::Daemon::enter(MHD_Connection* connection, Connection_Watch::Ph
     _watch.enter(static_cast<Connection_Watch::Connection*>(context), phase);
 }
 
-Http_Server::Http_Server(std::uint16_t port, const Http_Limits& limits, Http_Handler handler)
-    : _daemon(std::make_unique<Daemon>(port, limits, std::move(handler)))
+Http_Server::Http_Server(const Http_Endpoint& endpoint, const Http_Limits& limits, Credentials* credentials, Http_Handler handler)
+    : _daemon(std::make_unique<Daemon>(endpoint, limits, credentials, std::move(handler)))
 {
 }
 

@@ -1,4 +1,8 @@
-// The HTTP server of the CIM-XML service: POST to any path, on the loopback interface.
+// The HTTP server of the CIM-XML service: POST to any path.
+//
+// With credentials every request is asked for HTTP Basic, before its body is kept: 401 without a login or with a wrong one.
+// Logins that have to be verified by their hash wait apart from the requests of users who are known, so that nobody without a
+// password can take the workers from those; 503 when too many wait.
 //
 // One thread moves bytes for all connections, a few workers run the handler, so neither a slow client nor a slow operation
 // keeps others from being served. What passes a limit is refused with a status: 413 for a body beyond request_bytes (told
@@ -8,20 +12,33 @@
 #pragma once
 
 #include "cimserver/cimxml/http_message.h"
+#include "cimserver/security/tls_identity.h"
 
 #include <chrono>
 #include <cstddef>
 #include <cstdint>
 #include <memory>
+#include <optional>
+#include <string>
 
 namespace cimserver
 {
+
+class Credentials;
+
+struct Http_Endpoint
+{
+    std::string address = "127.0.0.1"; // numeric, IPv4 or IPv6
+    std::uint16_t port = 0;            // 0 picks a free one
+    std::optional<Tls_Identity> tls;   // none: plain HTTP
+};
 
 struct Http_Limits
 {
     std::size_t request_bytes = std::size_t{1} << 20;
     std::size_t connections = 256;
     std::size_t waiting_requests = 256; // complete, not yet taken by a worker
+    std::size_t waiting_logins = 64;    // to be verified by their hash
     unsigned workers = 8;
     std::chrono::milliseconds receive{30'000}; // for the head of a request, and again for its body
     std::chrono::milliseconds send{120'000};   // for an answer
@@ -30,8 +47,9 @@ struct Http_Limits
 class Http_Server
 {
 public:
-    // Accepts connections when it returns; port 0 picks a free one. Throws std::system_error when the port cannot be had.
-    Http_Server(std::uint16_t port, const Http_Limits& limits, Http_Handler handler);
+    // Accepts connections when it returns. Without credentials (null) everybody may ask; they must outlive the server. Throws
+    // std::system_error when the port cannot be had.
+    Http_Server(const Http_Endpoint& endpoint, const Http_Limits& limits, Credentials* credentials, Http_Handler handler);
     ~Http_Server(); // stops, waiting for running requests without bound
     Http_Server(const Http_Server&) = delete;
     Http_Server& operator=(const Http_Server&) = delete;

@@ -2,15 +2,24 @@
 #pragma once
 
 #include <cstdint>
+#include <string>
 
 namespace cimserver
 {
 
-// A listening IPv4 socket on 127.0.0.1.
+// Whether a text is a numeric IPv4 or IPv6 address, and whether only this host can reach it (127.0.0.0/8, ::1).
+bool is_address(const std::string& text);
+bool is_loopback(const std::string& address);
+
+// "127.0.0.1:5988", "[::1]:5988".
+std::string endpoint_text(const std::string& address, std::uint16_t port);
+
+// A listening TCP socket.
 class Listener
 {
 public:
-    explicit Listener(std::uint16_t port); // 0 picks a free one; throws std::system_error when the port cannot be had
+    // Port 0 picks a free one. Throws std::system_error when the port cannot be had on the address, a numeric one.
+    Listener(const std::string& address, std::uint16_t port);
     ~Listener();
     Listener(const Listener&) = delete;
     Listener& operator=(const Listener&) = delete;
@@ -23,7 +32,7 @@ public:
     void refuse();
 
 private:
-    int _socket;
+    int _socket = -1;
     std::uint16_t _port = 0;
 };
 

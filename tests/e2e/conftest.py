@@ -36,15 +36,15 @@ def mixed():
 
 @pytest.fixture
 def start(tmp_path):
-    """start(scenario): a server of the test's own; a dict is written to a scenario file first."""
+    """start(scenario): a server of the test's own; a dict is written to a scenario file first. Options replace --no-auth."""
     servers = []
 
-    def start_server(scenario, environment=None):
+    def start_server(scenario, environment=None, options=None):
         if isinstance(scenario, dict):
             path = tmp_path / f"scenario{len(servers)}.json"
             path.write_text(json.dumps(scenario), encoding="utf-8")
             scenario = str(path)
-        server = SimulatedServer(scenario, environment)
+        server = SimulatedServer(scenario, environment, options)
         servers.append(server)
         return Host(server)
 

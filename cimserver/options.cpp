@@ -1,0 +1,82 @@
+#include "cimserver/options.h"
+
+#include "cimserver/cimxml/listener.h"
+#include "cimserver/cimxml/version.h"
+
+#include <CLI/CLI.hpp>
+
+namespace cimserver
+{
+namespace
+{
+
+constexpr int exit_usage = 2;
+
+std::string check_address(const std::string& text) { return is_address(text) ? "" : text + " is no IPv4 or IPv6 address"; }
+
+void declare_access(CLI::App& app, Options& options)
+{
+    app.add_option("--users", options.users, "the file of users and their password hashes")->capture_default_str();
+    app.add_option("--add-user", options.add_user, "add a user to that file, or give one a new password, and end");
+    app.add_flag("--no-auth", options.no_auth, "ask for no credentials (loopback addresses only)");
+    app.add_option("--address", options.address, "the address to listen on; any but loopback needs TLS")
+        ->check(check_address)
+        ->capture_default_str();
+    app.add_option("--port", options.port, "TCP port; 0 picks a free one [5988, with TLS 5989]");
+    app.add_option("--certificate", options.certificate, "serve TLS with this certificate (PEM)");
+    app.add_option("--key", options.key, "the private key of the certificate (PEM)");
+}
+
+void declare_limits(CLI::App& app, Http_Limits& limits)
+{
+    app.add_option("--max-request", limits.request_bytes, "largest request, in bytes")
+        ->check(CLI::Range(std::size_t{1024}, std::size_t{1} << 30))
+        ->capture_default_str();
+    app.add_option("--max-connections", limits.connections, "connections served at once")
+        ->check(CLI::Range(1, 10000))
+        ->capture_default_str();
+    app.add_option("--max-waiting", limits.waiting_requests, "requests that may wait for a worker")
+        ->check(CLI::Range(1, 100000))
+        ->capture_default_str();
+    app.add_option("--workers", limits.workers, "requests answered at once")->check(CLI::Range(1, 256))->capture_default_str();
+}
+
+void check(const Options& options)
+{
+    if (options.add_user)
+        return;
+    if (options.module.empty())
+        throw CLI::RequiredError("--module");
+    if (options.certificate.empty() != options.key.empty())
+        throw CLI::ValidationError("--certificate and --key are given together or not at all");
+    if (is_loopback(options.address))
+        return;
+    if (options.no_auth)
+        throw CLI::ValidationError("--no-auth is for loopback addresses only: other hosts reach " + options.address);
+    if (options.certificate.empty())
+        throw CLI::ValidationError("other hosts reach " + options.address + ": that needs TLS (--certificate and --key)");
+}
+
+} // namespace
+
+std::variant<Options, int> read_options(int argc, char** argv)
+{
+    CLI::App app("Serves a CIM provider module to CIM-XML clients.", "zmlr-cimserver");
+    Options options;
+    app.set_version_flag("--version", std::string("zmlr-cimserver ") + version());
+    app.add_option("--module", options.module, "the provider module to serve (a shared library)");
+    declare_access(app, options);
+    declare_limits(app, options.limits);
+    try
+    {
+        app.parse(argc, argv);
+        check(options);
+        return options;
+    }
+    catch (const CLI::ParseError& error) // a request for help, too
+    {
+        return app.exit(error) == 0 ? 0 : exit_usage;
+    }
+}
+
+} // namespace cimserver

@@ -1,0 +1,252 @@
+"""Who may ask: credentials, TLS, and what the server refuses to start with."""
+
+import base64
+import os
+import pty
+import socket
+import ssl
+import subprocess
+import threading
+import time
+
+import pytest
+import pywbem
+
+from tools.simulated_server import ROOT
+from tools.wbemcli import Wbemcli, WbemcliError
+
+REQUEST = (ROOT / "tests/e2e/enumerate_host.xml").read_bytes()
+PASSWORD = "open sésame"
+
+
+@pytest.fixture(scope="session")
+def program(mixed):
+    """The server's command line without the options that this file is about."""
+    arguments = mixed.server.arguments()
+    return [arguments[0], "--module", arguments[arguments.index("--module") + 1], "--port", "0"]
+
+
+@pytest.fixture
+def users(program, tmp_path):
+    """A file with the user "admin"."""
+    file = tmp_path / "private/users"
+    add_user(program, file, "admin", PASSWORD)
+    return file
+
+
+@pytest.fixture(scope="session")
+def identity(tmp_path_factory):
+    """A certificate of 127.0.0.1 and its key."""
+    folder = tmp_path_factory.mktemp("identity")
+    certificate, key = folder / "certificate.pem", folder / "key.pem"
+    subprocess.run(
+        ["openssl", "req", "-x509", "-newkey", "ec", "-pkeyopt", "ec_paramgen_curve:prime256v1", "-nodes", "-days", "2"]
+        + ["-subj", "/CN=test", "-addext", "subjectAltName=IP:127.0.0.1", "-out", certificate, "-keyout", key],
+        capture_output=True,
+        check=True,
+    )
+    return certificate, key
+
+
+def add_user(program, file, name, password):
+    command = [program[0], "--add-user", name, "--users", file]
+    return subprocess.run(command, input=password + "\n", capture_output=True, text=True, timeout=60, check=True)
+
+
+def basic(name, password):
+    return "Basic " + base64.b64encode(f"{name}:{password}".encode()).decode()
+
+
+def post(port, authorization=None, body=REQUEST, tls=None):
+    """The answer to one request, as text."""
+    headers = f"Authorization: {authorization}\r\n" if authorization else ""
+    head = f"POST /cimom HTTP/1.1\r\nHost: x\r\n{headers}Connection: close\r\nContent-Length: {len(body)}\r\n\r\n"
+    with socket.create_connection(("127.0.0.1", port), timeout=60) as plain:
+        connection = tls.wrap_socket(plain, server_hostname="127.0.0.1") if tls else plain
+        with connection:
+            connection.sendall(head.encode() + body)
+            return b"".join(iter(lambda: connection.recv(65536), b"")).decode()
+
+
+def status(*arguments, **keywords):
+    return int(post(*arguments, **keywords).split(" ")[1])
+
+
+def test_only_users_are_served(start, users):
+    server = start("fc-hba", options=["--users", str(users)]).server
+    refusal = post(server.port)
+    assert refusal.startswith("HTTP/1.1 401 ")
+    assert 'WWW-Authenticate: Basic realm="' in refusal
+    for authorization, expected in [
+        (basic("admin", "wrong"), 401),
+        (basic("nobody", PASSWORD), 401),
+        (basic("admin", PASSWORD[:-1]), 401),
+        (basic("admin", PASSWORD + "x"), 401),
+        (basic("admin", ""), 401),
+        (basic("", PASSWORD), 401),
+        ("Basic !!!", 401),
+        ("Basic", 401),
+        ("Bearer " + basic("admin", PASSWORD)[6:], 401),
+        (basic("admin", "x" * 20000), 401),
+        (basic("admin", PASSWORD), 200),
+    ]:
+        assert status(server.port, authorization) == expected, authorization
+        assert status(server.port, authorization) == expected, "again, with what is remembered"
+    assert status(server.port, body=b"x" * 900_000) == 401, "the answer comes after the body"
+
+    good = pywbem.WBEMConnection(server.url, ("admin", PASSWORD), default_namespace="root/zemlar")
+    assert len(good.EnumerateInstanceNames("ZEMLAR_FCPort")) == 2
+    with pytest.raises(pywbem.AuthError):
+        pywbem.WBEMConnection(server.url, ("admin", "wrong"), default_namespace="root/zemlar").EnumerateClassNames()
+    with pytest.raises(WbemcliError):
+        Wbemcli(server.port).enumerate_instance_names("ZEMLAR_FCPort")
+
+
+def test_a_name_that_does_not_exist_takes_as_long_as_a_wrong_password(start, users):
+    port = start("fc-hba", options=["--users", str(users)]).server.port
+
+    def fastest(name):
+        times = []
+        for _ in range(5):
+            begin = time.monotonic()
+            assert status(port, basic(name, "wrong")) == 401
+            times.append(time.monotonic() - begin)
+        return min(times)
+
+    assert fastest("nobody") > fastest("admin") / 3
+
+
+def test_wrong_passwords_keep_no_user_out(start, users):
+    port = start("fc-hba", options=["--users", str(users)]).server.port
+    assert status(port, basic("admin", PASSWORD)) == 200
+    over = threading.Event()
+    refusals = []
+
+    def guess():
+        while not over.is_set():
+            refusals.append(status(port, basic("admin", "wrong")))
+
+    guessers = [threading.Thread(target=guess) for _ in range(80)]
+    for guesser in guessers:
+        guesser.start()
+    try:
+        assert [status(port, basic("admin", PASSWORD)) for _ in range(100)] == [200] * 100
+    finally:
+        over.set()
+        for guesser in guessers:
+            guesser.join()
+    assert set(refusals) <= {401, 503} and 401 in refusals
+
+
+def test_a_change_of_the_file_counts_at_once(start, program, users):
+    port = start("fc-hba", options=["--users", str(users)]).server.port
+    assert status(port, basic("admin", PASSWORD)) == 200
+    add_user(program, users, "admin", "another")
+    add_user(program, users, "second", "one more")
+    assert status(port, basic("admin", PASSWORD)) == 401
+    assert status(port, basic("admin", "another")) == status(port, basic("second", "one more")) == 200
+
+    users.chmod(0o640)
+    assert status(port, basic("admin", "another")) == 401, "nobody is let in by a file that others may read"
+    users.chmod(0o600)
+    assert status(port, basic("admin", "another")) == 200
+    users.write_text("", encoding="utf-8")
+    assert status(port, basic("admin", "another")) == 401
+
+
+def test_add_user_keeps_a_private_file_of_hashes(program, users):
+    assert users.stat().st_mode & 0o777 == 0o600
+    assert users.parent.stat().st_mode & 0o777 == 0o700
+    before = users.read_text(encoding="utf-8")
+    assert before.startswith("admin:$y$") and PASSWORD not in before
+    add_user(program, users, "zoë", "x")
+    after = users.read_text(encoding="utf-8")
+    assert after.startswith(before) and after.splitlines()[1].startswith("zoë:$y$")
+    assert os.listdir(users.parent) == ["users"], "nothing temporary is left"
+
+    for name, password in [("", "x"), ("a:b", "x"), ("a\nb", "x"), ("a" * 65, "x"), ("a", ""), ("a", "x" * 512), ("a", "\x03")]:
+        with pytest.raises(subprocess.CalledProcessError):
+            add_user(program, users, name, password)
+    for spoilt in ["admin", "admin:plain", after + after.splitlines()[0], ":$y$j9T$x$y"]:
+        users.write_text(spoilt, encoding="utf-8")
+        with pytest.raises(subprocess.CalledProcessError):
+            add_user(program, users, "other", "x")
+        assert users.read_text(encoding="utf-8") == spoilt, "what is damaged is not overwritten"
+
+
+def test_a_terminal_does_not_show_the_password(program, tmp_path):
+    for again, code in [("secret", 0), ("secrets", 1)]:
+        terminal, line = pty.openpty()
+        command = [program[0], "--add-user", "admin", "--users", tmp_path / "t/users"]
+        process = subprocess.Popen(command, stdin=line, stdout=line, stderr=line)
+        os.close(line)
+        seen = b""
+        for prompt, typed in [(b"Password: ", "secret"), (b"again: ", again)]:
+            while not seen.endswith(prompt):
+                seen += os.read(terminal, 1024)
+            os.write(terminal, typed.encode() + b"\n")
+        assert process.wait(60) == code
+        assert b"secret" not in seen + os.read(terminal, 1024)
+        os.close(terminal)
+
+
+@pytest.mark.filterwarnings("ignore:ssl.TLSVersion.TLSv1_1")
+def test_tls(start, users, identity, monkeypatch):
+    for name in ("REQUESTS_CA_BUNDLE", "CURL_CA_BUNDLE"):
+        monkeypatch.delenv(name, raising=False)  # they would come before ca_certs
+    certificate, key = identity
+    options = ["--users", str(users), "--certificate", str(certificate), "--key", str(key), "--address", "0.0.0.0"]
+    server = start("fc-hba", options=options).server
+    url = server.url.replace("http:", "https:")
+    client = pywbem.WBEMConnection(url, ("admin", PASSWORD), default_namespace="root/zemlar", ca_certs=str(certificate))
+    assert len(client.EnumerateInstanceNames("ZEMLAR_FCPort")) == 2
+
+    trusting = ssl.create_default_context(cafile=certificate)
+    assert status(server.port, tls=trusting) == 401
+    old = ssl.create_default_context(cafile=certificate)
+    old.set_ciphers("ALL:@SECLEVEL=0")
+    old.minimum_version = old.maximum_version = ssl.TLSVersion.TLSv1_1
+    with pytest.raises(ssl.SSLError):
+        status(server.port, tls=old)
+    with socket.create_connection(("127.0.0.1", server.port), timeout=60) as plain:
+        plain.sendall(b"POST / HTTP/1.1\r\n\r\n")
+        assert not plain.recv(4096).startswith(b"HTTP/")
+    with socket.create_connection(("127.0.0.1", server.port), timeout=60):  # a silent one holds nobody up
+        assert status(server.port, basic("admin", PASSWORD), tls=trusting) == 200
+    assert server.stop() == 0
+
+
+def test_refuses_to_start_unsafe(program, users, identity, tmp_path):
+    certificate, key = map(str, identity)
+    file = str(users)
+    other_key = tmp_path / "other.pem"
+    subprocess.run(["openssl", "genpkey", "-algorithm", "ed25519", "-out", other_key], check=True)
+    open_key = tmp_path / "open.pem"
+    open_key.write_bytes((identity[1]).read_bytes())
+    open_key.chmod(0o644)
+    shared = tmp_path / "shared"
+    shared.write_bytes(users.read_bytes())
+    shared.chmod(0o640)
+    empty = tmp_path / "empty"
+    empty.touch(0o600)
+    spoilt = tmp_path / "spoilt"
+    spoilt.touch(0o600)
+    spoilt.write_text("admin:secret\n", encoding="utf-8")
+    for options, code, told in [
+        (["--users", str(tmp_path / "missing")], 1, "--add-user"),
+        (["--users", str(shared)], 1, "0600"),
+        (["--users", str(empty)], 1, "names no user"),
+        (["--users", str(spoilt)], 1, "line 1"),
+        (["--users", str(tmp_path)], 1, "no regular file"),
+        (["--no-auth", "--address", "0.0.0.0", "--certificate", certificate, "--key", key], 2, "--no-auth"),
+        (["--users", file, "--address", "0.0.0.0"], 2, "TLS"),
+        (["--users", file, "--address", "::"], 2, "TLS"),
+        (["--users", file, "--address", "localhost"], 2, "localhost"),
+        (["--users", file, "--certificate", certificate], 2, "--key"),
+        (["--users", file, "--certificate", certificate, "--key", str(other_key)], 1, str(other_key)),
+        (["--users", file, "--certificate", certificate, "--key", str(open_key)], 1, "0640"),
+        (["--users", file, "--certificate", key, "--key", key], 1, key),
+        (["--users", file, "--certificate", str(tmp_path / "missing"), "--key", key], 1, "missing"),
+    ]:
+        done = subprocess.run([*program, *options], capture_output=True, text=True, timeout=60, check=False)
+        assert (done.returncode, told in done.stderr) == (code, True), (options, done.stderr)
