@@ -1,3 +1,4 @@
+#include "runtime/model_path.h"
 #include "runtime/value.h"
 #include "tests/runtime/sample_classes.h"
 
@@ -100,6 +101,14 @@ TEST(Memory, runs_out_without_a_leak)
             const Value copied = value;
             const Ref<Sample_Link> made(create<Sample_Link>());
             copied.get(made.ptr(), find_reference(source->meta_class, "Others"));
+        });
+    fail_each_allocation_of(
+        [&]
+        {
+            String path;
+            EXPECT_EQ(instance_to_model_path(source.ptr(), path), 0);
+            const Ref<Instance> read(model_path_to_instance(source->meta_class, path.c_str()));
+            EXPECT_TRUE(read);
         });
     fail_each_allocation_of(
         [&]

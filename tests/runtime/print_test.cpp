@@ -1,9 +1,9 @@
 #include "runtime/array.h"
 #include "runtime/print.h"
+#include "tests/runtime/printed.h"
 
 #include <gtest/gtest.h>
 
-#include <cstdlib>
 #include <limits>
 #include <string>
 
@@ -11,18 +11,6 @@ using namespace zmlr;
 
 namespace
 {
-
-template <class Print> std::string printed(Print print)
-{
-    char* text = nullptr;
-    std::size_t size = 0;
-    std::FILE* stream = open_memstream(&text, &size);
-    print(stream);
-    std::fclose(stream);
-    const std::string result(text, size);
-    std::free(text);
-    return result;
-}
 
 template <class T> std::string scalar(const T& x)
 {

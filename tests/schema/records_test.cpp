@@ -9,7 +9,6 @@
 #include "schema/ZEMLAR_ObjectManager.h"
 #include "schema/ZEMLAR_PhysicalPackage.h"
 #include "schema/ZEMLAR_SCSIProtocolEndpoint.h"
-#include "schema/repository.h"
 
 #include <gtest/gtest.h>
 
@@ -105,19 +104,6 @@ TEST(Records, values_of_the_card)
     EXPECT_EQ(generic<real32>(package.ptr(), "Height"), 0.5F);
     EXPECT_EQ(generic<String>(package.ptr(), "FRUNumber"), "FRU1");
     EXPECT_EQ(package->RemovalConditions.value, 2);
-}
-
-TEST(Records, every_class_and_every_parameter_record_can_be_made_and_destroyed)
-{
-    for (uint32 i = 0; i < meta_repository().num_meta_classes; i++)
-    {
-        const Meta_Class* meta_class = meta_repository().meta_classes[i];
-        Ref<Instance> made(create(meta_class, true));
-        EXPECT_TRUE(identical(made.ptr(), Ref<Instance>(clone(made.ptr())).ptr())) << meta_class->name;
-        for (uint32 f = 0; f < meta_class->num_meta_features; f++)
-            if (is_method(meta_class->meta_features[f]))
-                Ref<Instance>(create(as_method(meta_class->meta_features[f])));
-    }
 }
 
 TEST(Records, parameter_records)

@@ -1,0 +1,195 @@
+#include "runtime/model_path.h"
+
+#include "tests/runtime/sample_classes.h"
+
+#include <gtest/gtest.h>
+
+#include <string>
+
+using namespace zmlr;
+using namespace sample;
+
+namespace
+{
+
+// What a path is written as after it has been read, or "-" when it is not one.
+std::string rewritten(const Meta_Class* meta_class, const std::string& path)
+{
+    const Ref<Instance> instance(model_path_to_instance(meta_class, path.c_str()));
+    String again;
+    if (!instance || instance_to_model_path(instance.ptr(), again) != 0)
+        return "-";
+    return again.c_str();
+}
+
+// A class named Keyed whose only feature is a key K of the type.
+struct Keyed
+{
+    explicit Keyed(Type type, sint16 subscript = 0)
+        : key(*property<Sample_Element>("Delta"))
+        , meta_class(Sample_Setting::static_meta_class)
+    {
+        key.name = "K";
+        key.flags |= Flag_Key;
+        key.type = static_cast<uint16>(type);
+        key.subscript = subscript;
+        meta_class.name = "Keyed";
+        meta_class.meta_features = features;
+        meta_class.num_meta_features = 1;
+        meta_class.size = sizeof(Sample_Element);
+    }
+
+    Meta_Property key;
+    const Meta_Feature* features[1] = {&key};
+    Meta_Class meta_class;
+};
+
+TEST(Model_Path, values_of_every_type)
+{
+    const struct
+    {
+        Type type;
+        const char* text;
+        const char* canonical; // "-": refused
+    } rows[] = {
+        {BOOLEAN, "true", "true"},
+        {BOOLEAN, "False", "false"},
+        {BOOLEAN, "1", "-"},
+        {UINT8, "255", "255"},
+        {UINT8, "0x1F", "31"},
+        {UINT8, "256", "-"},
+        {UINT8, "", "-"},
+        {UINT8, " 1", "-"},
+        {SINT8, "-128", "-128"},
+        {SINT8, "+5", "5"},
+        {SINT8, "128", "-"},
+        {UINT16, "65535", "65535"},
+        {UINT16, "-1", "-"},
+        {SINT16, "-0x10", "-16"},
+        {UINT32, "4294967295", "4294967295"},
+        {SINT32, "-2147483648", "-2147483648"},
+        {UINT64, "18446744073709551615", "18446744073709551615"},
+        {UINT64, "18446744073709551616", "-"},
+        {SINT64, "-9223372036854775808", "-9223372036854775808"},
+        {REAL32, "1.5", "1.500000"},
+        {REAL32, "1", "-"},
+        {REAL64, "-.25", "-0.250000"},
+        {REAL64, "1.5e3", "1500.000000"},
+        {REAL64, "nan", "-"},
+        {CHAR16, "'a'", "'a'"},
+        {CHAR16, "','", "','"},
+        {CHAR16, "'''", "'''"},
+        {CHAR16, "'ab'", "-"},
+        {CHAR16, "'", "-"},
+        {CHAR16, "'a", "-"},
+        {CHAR16, "a", "-"},
+        {STRING, R"("a, b.c=d")", R"("a, b.c=d")"},
+        {STRING, R"("")", R"("")"},
+        {STRING, R"("a\nb")", "-"},
+        {STRING, R"("a\)", "-"},
+        {STRING, R"("a)", "-"},
+        {STRING, "a", "-"},
+        {STRING, R"("a"b)", "-"},
+        {DATETIME, "00000001023000.000000:000", "00000001023000.000000:000"},
+        {DATETIME, "00000001023000.000000:00", "-"},
+        {DATETIME, "\"00000001023000.000000:000\"", "-"},
+    };
+    for (const auto& row : rows)
+    {
+        const Keyed keyed(row.type);
+        const std::string expected = row.canonical == std::string("-") ? "-" : std::string("Keyed.K=") + row.canonical;
+        EXPECT_EQ(rewritten(&keyed.meta_class, std::string("keyed.k=") + row.text), expected) << row.text;
+    }
+
+    const Keyed array(UINT32, -1);
+    EXPECT_EQ(rewritten(&array.meta_class, "Keyed.K=1"), "-");
+    String path;
+    EXPECT_EQ(instance_to_model_path(Ref<Instance>(create(&array.meta_class, false)).ptr(), path), -1);
+}
+
+TEST(Model_Path, the_largest_real_is_written_whole)
+{
+    const Keyed keyed(REAL64);
+    const std::string path = rewritten(&keyed.meta_class, "Keyed.K=-1.7976931348623157e308");
+    EXPECT_EQ(path.size(), std::string("Keyed.K=-.000000").size() + 309);
+    EXPECT_EQ(rewritten(&keyed.meta_class, path), path);
+}
+
+TEST(Model_Path, references_are_quoted_paths)
+{
+    String path;
+    EXPECT_EQ(instance_to_model_path(linked(element("a"), disk("d")).ptr(), path), 0);
+    const std::string written = R"(Sample_Link.Antecedent="Sample_Element.Name=\"a\"",Dependent="Sample_Disk.Name=\"d\"")";
+    EXPECT_EQ(path, written.c_str());
+    EXPECT_EQ(rewritten(&Sample_Link::static_meta_class, written), written);
+
+    // The keys in another order, a class of the repository, a subclass at the far end, escapes of both levels.
+    const Ref<Instance> read(model_path_to_instance(
+        &Sample_Person::static_meta_class,
+        R"(sample_link.DEPENDENT="Sample_Disk.Name=\"d\"",Antecedent="Sample_Disk.Name=\"C:\\\\ \\\"x\\\"\"")"));
+    const auto* link = cast<Sample_Link>(static_cast<const Instance*>(read.ptr()));
+    ASSERT_NE(link, nullptr);
+    EXPECT_EQ(link->Antecedent->meta_class, &Sample_Disk::static_meta_class);
+    EXPECT_EQ(link->Antecedent->Name.value, R"(C:\ "x")");
+    EXPECT_TRUE(link->Note.null);
+
+    EXPECT_EQ(instance_to_model_path(linked(element("a"), {}).ptr(), path), -1);
+    const Ref<Sample_Element> nameless(create<Sample_Element>());
+    EXPECT_EQ(instance_to_model_path(linked(nameless, disk("d")).ptr(), path), -1);
+    EXPECT_EQ(instance_to_model_path(Ref<Sample_Setting>(create<Sample_Setting>()).ptr(), path), -1);
+}
+
+TEST(Model_Path, a_key_that_is_left_out_is_null)
+{
+    const Ref<Instance> read(
+        model_path_to_instance(&Sample_Link::static_meta_class, R"(Sample_Link.Dependent="Sample_Disk.Name=\"d\"")"));
+    ASSERT_TRUE(read);
+    EXPECT_FALSE(keys_non_null(read.ptr()));
+}
+
+TEST(Model_Path, what_is_no_path_is_refused)
+{
+    const std::string quotes(10000, '"');
+    std::string nested;
+    for (int i = 0; i < 10000; ++i)
+        nested += R"(Sample_Link.Antecedent=\")";
+    const std::string rows[] = {
+        "",
+        ".",
+        "Sample_Element",
+        "Sample_Element.",
+        "Sample_Element.=",
+        "Sample_Element.Name",
+        "Sample_Element.Name=",
+        R"(Sample_Element.Name="a",)",
+        R"(Sample_Element.Name="a" )",
+        R"( Sample_Element.Name="a")",
+        R"(Sample_Element Name="a")",
+        R"(Sample_Element.Name="a",Name="a")",
+        R"(Sample_Element.Name="a",Size=1)", // no key
+        R"(Sample_Element.Name="a",Reset=1)",
+        R"(Sample_Element.Nam="a")",
+        R"(Sample_Gone.Name="a")",
+        R"(1Sample_Element.Name="a")",
+        R"(Sample_Link.Antecedent=Sample_Element.Name="a")",
+        R"(Sample_Link.Antecedent="Sample_Person.Name=\"a\"")", // of another class
+        R"(Sample_Link.Dependent="Sample_Element.Name=\"a\"")", // of a superclass only
+        R"(Sample_Link.Antecedent="Sample_Element.Name=\"a\"",Antecedent="Sample_Element.Name=\"a\"")",
+        R"(Sample_Link.Antecedent="Sample_Element.Name=\"a")",
+        R"(Sample_Link.Antecedent="Instance.Name=\"a\"")",
+        "Sample_Element.Name=" + quotes,
+        "Sample_Link.Antecedent=\"" + nested,
+        "Sample_Link.Antecedent=\"" + nested + "\"",
+        std::string(1 << 20, 'a'),
+        std::string(1 << 20, '\\'),
+        "Sample_Element.Name=\"" + std::string(1 << 20, '\xFF'),
+    };
+    for (const std::string& row : rows)
+        EXPECT_EQ(model_path_to_instance(&Sample_Element::static_meta_class, row.c_str()), nullptr) << row.substr(0, 100);
+
+    const std::string name(1 << 20, 'a');
+    EXPECT_EQ(rewritten(&Sample_Element::static_meta_class, "Sample_Element.Name=\"" + name + "\""),
+              "Sample_Element.Name=\"" + name + "\"");
+}
+
+} // namespace
