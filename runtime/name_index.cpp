@@ -10,8 +10,7 @@ namespace
 
 template <class Entry> std::span<const Entry> with_hash(std::span<const Entry> entries, uint32 hash)
 {
-    const auto found = std::ranges::equal_range(entries, hash, {}, &Entry::hash);
-    return {found.begin(), found.end()};
+    return {std::ranges::lower_bound(entries, hash, {}, &Entry::hash), std::ranges::upper_bound(entries, hash, {}, &Entry::hash)};
 }
 
 } // namespace

@@ -125,17 +125,39 @@ TEST(Thread, runs_in_the_context_that_its_creator_supplies)
     }
 }
 
+TEST(Thread, that_cannot_be_created_leaves_nothing_behind)
+{
+    pthread_attr_t usual, endless;
+    ASSERT_EQ(pthread_getattr_default_np(&usual), 0);
+    pthread_attr_init(&endless);
+    pthread_attr_setstacksize(&endless, std::size_t{1} << 46);
+    ASSERT_EQ(pthread_setattr_default_np(&endless), 0);
+
+    Events events;
+    Recording_Context creator(events, new Recording_Context(events));
+    Thread_Context::push(&creator);
+    Thread thread;
+    EXPECT_EQ(Thread::create_joinable(thread, top_of_stack, nullptr), EAGAIN);
+    Thread_Context::pop();
+    pthread_setattr_default_np(&usual);
+    EXPECT_EQ(events.text(), "create delete ");
+    void* result = nullptr;
+    EXPECT_EQ(Thread::join(thread, result), EINVAL);
+}
+
 TEST(Thread, of_a_thread_without_context_has_none) { EXPECT_EQ(in_thread(top_of_stack), nullptr); }
 
 TEST(Thread, knows_itself)
 {
-    Thread thread;
-    EXPECT_FALSE(Thread::equal(Thread::self(), thread));
-    EXPECT_TRUE(Thread::equal(Thread::self(), Thread::self()));
-
     static Thread creator = Thread::self();
-    EXPECT_EQ(in_thread([](void* arg) -> void* { return Thread::equal(creator, Thread::self()) ? arg : nullptr; }, &thread),
-              nullptr);
+    EXPECT_TRUE(Thread::equal(creator, Thread::self()));
+    EXPECT_FALSE(Thread::equal(creator, Thread()));
+    in_thread(
+        [](void*) -> void*
+        {
+            EXPECT_FALSE(Thread::equal(creator, Thread::self()));
+            return nullptr;
+        });
 }
 
 TEST(Thread, joins_joinable_threads_once)
