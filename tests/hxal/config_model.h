@@ -1,20 +1,14 @@
-// A test on the configuration model, which the library never empties: it starts empty, and files go to a directory of its own.
+// The configuration model from outside: emptied, which the library never does, and as the library writes it.
 #pragma once
 
 #include "hxal/config/internal/state.h"
-#include "hxal/hxal.h"
-
-#include <gtest/gtest.h>
+#include "hxal/config/writer.h"
 
 #include <cstdio>
 #include <cstdlib>
-#include <filesystem>
-#include <fstream>
-#include <iterator>
 #include <memory>
 #include <string>
 #include <utility>
-#include <vector>
 
 inline void empty_model()
 {
@@ -37,69 +31,3 @@ inline std::string written()
     const std::unique_ptr<char, decltype(&std::free)> owner(text, std::free);
     return {text, size};
 }
-
-// The settings in it: the lines that are no comment.
-inline std::vector<std::string> settings()
-{
-    std::vector<std::string> lines;
-    const std::string text = written();
-    for (std::size_t begin = 0, end; (end = text.find('\n', begin)) != text.npos; begin = end + 1)
-        if (end > begin && text[begin] != '#')
-            lines.push_back(text.substr(begin, end - begin));
-    return lines;
-}
-
-class Config_Model : public testing::Test
-{
-protected:
-    Config_Model() { empty_model(); }
-    ~Config_Model() override
-    {
-        empty_model();
-        std::filesystem::remove_all(directory);
-    }
-
-    static const hxal_ioc_config_t& ioc(int idx) { return hxal_config_get()->iocs[idx]; }
-    static const hxal_ad_config_t& adapter(int idx) { return hxal_config_get()->adapters[idx]; }
-    static bool has(const uint32_t (&flags)[4], int code) { return hxal::config::has(flags, code); }
-
-    static void parse(std::initializer_list<const char*> lines)
-    {
-        for (const char* line : lines)
-            hxal_config_parse(line);
-    }
-
-    std::string path(const std::string& name) const { return directory / name; }
-
-    std::string file(const std::string& name, const std::string& content) const
-    {
-        std::ofstream(path(name), std::ios::binary) << content;
-        return path(name);
-    }
-
-    static std::string content(const std::string& path)
-    {
-        std::ifstream stream(path, std::ios::binary);
-        return {std::istreambuf_iterator<char>(stream), {}};
-    }
-
-    std::vector<std::string> names() const
-    {
-        std::vector<std::string> found;
-        for (const auto& entry : std::filesystem::directory_iterator(directory))
-            found.push_back(entry.path().filename());
-        return found;
-    }
-
-    // Loads what a file of this content says.
-    void load(const std::string& text) const { hxal_config_load(file("hxa.conf", text).c_str()); }
-
-private:
-    static std::filesystem::path make_directory()
-    {
-        std::string name = std::filesystem::temp_directory_path() / "hxal_config.XXXXXX";
-        return ::mkdtemp(name.data()) ? name : "";
-    }
-
-    const std::filesystem::path directory = make_directory();
-};

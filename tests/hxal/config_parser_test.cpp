@@ -1,7 +1,5 @@
 // What a line, and a whole file, does to the model.
-#include "config_model.h"
-
-#include <gmock/gmock.h>
+#include "config_fixture.h"
 
 #include <sys/stat.h>
 #include <thread>

@@ -1,5 +1,5 @@
 // The helpers that take the file's texts apart.
-#include "config_model.h"
+#include "config_fixture.h"
 
 #include <climits>
 #include <cstring>

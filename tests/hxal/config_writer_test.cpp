@@ -1,0 +1,168 @@
+// The file as it is written, whole.
+#include "config_fixture.h"
+
+#include <random>
+
+namespace
+{
+
+using testing::ElementsAre;
+
+class Config_Writer : public Config_Model
+{
+protected:
+    static std::string golden(const std::string& name) { return content(std::string(CONFIG_FILES) + "/" + name); }
+};
+
+TEST_F(Config_Writer, writes_what_each_instance_has)
+{
+    load(golden("instances.conf"));
+    EXPECT_EQ(written(), golden("instances.conf"));
+}
+
+TEST_F(Config_Writer, writes_once_what_all_instances_have)
+{
+    load(golden("for_all.conf"));
+    EXPECT_EQ(written(), golden("for_all.conf"));
+}
+
+TEST_F(Config_Writer, writes_headings_only_of_an_empty_model)
+{
+    EXPECT_EQ(written(), golden("empty.conf"));
+    hxal_config_ad_update(nullptr);
+    hxal_config_ioc_update(nullptr);
+    vport_traverse(nullptr, 0);
+}
+
+TEST_F(Config_Writer, writes_per_instance_what_has_no_line_for_all)
+{
+    parse({"hxa0-port-wwn = 10:00", "hxa1-port-wwn = 10:01", "port-hardalpa = 0x1"});
+    EXPECT_THAT(settings(), ElementsAre("hxa0-port-wwn = \"10:00\";", "hxa1-port-wwn = \"10:01\";", "hxa0-port-hardalpa = 0x1;",
+                                        "hxa1-port-hardalpa = 0x1;"));
+}
+
+TEST_F(Config_Writer, leaves_out_a_value_without_word)
+{
+    parse({"auth-algo = md5", "auth-secretsource = LOCAL", "log-level = Error", "port-topology = loop"}); // reach no entry
+    EXPECT_THAT(settings(), ElementsAre("port-topology = \"none\";", "log-level = \"None\";"));
+}
+
+TEST_F(Config_Writer, keeps_a_text_on_its_line)
+{
+    hxal_config_set_data(HXAL_CONFIG_AD_SERIAL, 0, "S\nN");
+    hxal_config_set_data(HXAL_CONFIG_AD_NAME, 0, "a\";\nqos = \"TRUE\";\x7F\x1B");
+    hxal_config_set_data(HXAL_CONFIG_PORT_NAME, 0, "gr\xC3\xBC\xC3\x9F");
+    EXPECT_THAT(settings(),
+                ElementsAre("adapter-S?N-name = \"a\";?qos = \"TRUE\";??\";", "hxa0-port-name = \"gr\xC3\xBC\xC3\x9F\";"));
+}
+
+TEST_F(Config_Writer, writes_the_virtual_ports_of_one_entry)
+{
+    parse({"hxa1-vport-2 = a,b,c,d,1", "hxa2-vport-0 = e,f,g,h,2"});
+    char text[64] = {};
+    std::FILE* file = ::fmemopen(text, sizeof text, "w");
+    for (int idx : {-1, 0, 2, 128})
+        vport_traverse(file, idx);
+    std::fclose(file);
+    EXPECT_STREQ(text, "hxa2-vport-0 = \"e,f,g,h,2\";\n");
+}
+
+// A model of arbitrary settings, made as a file could make it.
+class Random_Model
+{
+public:
+    explicit Random_Model(unsigned seed) : random(seed) {}
+
+    void fill()
+    {
+        for (int adapters = below(5), i = 0; i <= adapters; ++i)
+        {
+            parse("adapter-" + text(12) + "-name = " + text(127));
+            parse("adapter-" + text(11) + "-power = " + std::to_string(below(4)));
+        }
+        for (int iocs = below(8), i = 0; i <= iocs; ++i)
+            parse("hxa" + std::to_string(below(128)) + "-port-wwn = " + wwn());
+        for (int lines = below(400), i = 0; i < lines; ++i)
+            parse(below(12) ? "hxa" + std::to_string(below(128)) + "-" + setting() : setting());
+        for (int lines = below(20), i = 0; i < lines; ++i)
+            parse("hxn" + std::to_string(below(128)) + (below(2) ? "-port-name = " + text(127) : "-port-mac = " + text(31)));
+        for (int lines = below(20), i = 0; i < lines; ++i)
+            parse("hxa" + std::to_string(below(8)) + "-vport-" + std::to_string(below(300)) + " = " + wwn() + "," + wwn() + "," +
+                  (below(3) ? text(127) : "") + "," + text(15) + "," + std::to_string(below(65536)));
+        if (below(2))
+            parse("power = " + std::to_string(below(4)));
+    }
+
+private:
+    static void parse(const std::string& line) { hxal_config_parse(line.c_str()); }
+
+    int below(int end) { return std::uniform_int_distribution(0, end - 1)(random); }
+
+    std::string text(int longest)
+    {
+        constexpr std::string_view letters = "bcefgijkmoqsuvwyzBCE0123456789_.:"; // no word that tells the kind of a line
+        std::string made(static_cast<std::size_t>(1 + below(longest)), ' ');
+        for (char& letter : made)
+            letter = letters[static_cast<std::size_t>(below(static_cast<int>(letters.size())))];
+        return made;
+    }
+
+    std::string wwn() { return "10:00:00:05:1e:10:" + std::to_string(below(10)) + ":" + std::to_string(below(10)); }
+    std::string decimal(int end) { return std::to_string(below(end)); }
+    std::string list(int end) { return below(5) ? decimal(end) + ", " + decimal(end) : ""; }
+    std::string one_of(std::initializer_list<const char*> words) { return words.begin()[below(static_cast<int>(words.size()))]; }
+
+    std::string setting()
+    {
+        switch (below(14))
+        {
+        case 0:
+            return "port-speed = " + decimal(20);
+        case 1:
+            return "port-topology = " + one_of({"none", "p2p", "loop", "auto", "ring"});
+        case 2:
+            return "port-hardalpa = 0x" + decimal(100);
+        case 3:
+            return "port-trunk = " + list(32);
+        case 4:
+            return "vf-list = " + list(16);
+        case 5:
+            return one_of({"port-maxfrsize = ", "vf-default = ", "pathtov = ", "qdepth = ", "delay = ", "latency = "}) +
+                   decimal(70000);
+        case 6:
+            return one_of({"port-enable = ", "ipfc-enable = ", "vf-enable = ", "qos = ", "ratelim = ", "persistent-binding = "}) +
+                   one_of({"TRUE", "FALSE", "true"});
+        case 7:
+            return "log-level = " + one_of({"Critical", "Error", "Warning", "Info", "None"});
+        case 8:
+            return one_of({"auth-policy = ", "coalesce = "}) + one_of({"on", "off"});
+        case 9:
+            return "auth-algo = " + one_of({"md5", "sha1", "ms", "sm"});
+        case 10:
+            return one_of({"auth-group = ", "ratelim-defspeed = "}) + decimal(300);
+        case 11:
+            return "auth-secretsource = " + one_of({"LOCAL", "RADIUS", "TACACS"});
+        case 12:
+            return "auth-encrypt = " + decimal(1000) + "," + decimal(1000);
+        default:
+            return "qdepth = 0";
+        }
+    }
+
+    std::mt19937 random;
+};
+
+TEST_F(Config_Writer, writes_the_same_bytes_of_what_was_read_from_them)
+{
+    for (unsigned seed = 0; seed < 200; ++seed)
+    {
+        empty_model();
+        Random_Model(seed).fill();
+        const std::string first = written();
+        empty_model();
+        load(first);
+        ASSERT_EQ(written(), first) << seed;
+    }
+}
+
+} // namespace
