@@ -22,6 +22,8 @@
 // Threads.   No list is locked. Requests and look-ups may run on any number of threads, but the calls that store what
 //            they read (hxal_adapter_get_name, hxal_ioc_get_current_mac, hxal_adapter_update_ioc) one at a time for an
 //            adapter or handle, and a scan alone: it replaces what the others are looking at.
+// Settings.  What a driver accepts lasts until it is reloaded. It is also recorded in the model of the drivers' configuration
+//            file (hxal/config/model.h, which has a lock of its own); hxal_libsync() makes it last.
 // Messages.  The few messages of the library go to standard output.
 #pragma once
 
