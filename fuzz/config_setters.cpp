@@ -16,7 +16,7 @@ class Host
 public:
     Host(const uint8_t* data, size_t size) : bytes(data, size) {}
 
-    bool is_at_end() const { return bytes.remaining_bytes() == 0; }
+    bool is_at_end() { return bytes.remaining_bytes() == 0; }
 
     void change()
     {
