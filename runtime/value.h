@@ -6,6 +6,7 @@
 #include "runtime/types.h"
 
 #include <concepts>
+#include <cstdio>
 #include <utility>
 #include <variant>
 
@@ -98,6 +99,10 @@ public:
     // Stores the value into a property or reference; -1 and a warning when instance, type or referenced class do not fit. An
     // instance stored gets one more reference; a null value unsets a reference.
     int get(Instance* instance, const Meta_Feature* feature) const;
+
+    // Writes the debug text: type, null flag and what is held, as a block.
+    void fprint(std::FILE* stream) const;
+    void print() const; // to standard output
 
     static constexpr Type array_of(Type scalar) { return static_cast<Type>(scalar + 128); }
 

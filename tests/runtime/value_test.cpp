@@ -1,7 +1,9 @@
 #include "runtime/value.h"
 
+#include "tests/runtime/printed.h"
 #include "tests/runtime/sample_classes.h"
 
+#include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
 using namespace zmlr;
@@ -166,6 +168,21 @@ TEST(Value, refuses_what_does_not_fit_and_changes_nothing)
     EXPECT_EQ(e->Size.value, 1U);
     EXPECT_EQ(wide.get(nullptr, find_property(e->meta_class, "Size")), -1);
     EXPECT_EQ(Value().get(e.ptr(), find_method(e->meta_class, "Reset")), -1);
+}
+
+TEST(Value, prints_what_it_holds)
+{
+    Value value;
+    const auto text = [&value] { return printed([&](std::FILE* stream) { value.fprint(stream); }); };
+    EXPECT_EQ(text(), "Value\n{\n    type=NONE\n    null=true\n}\n");
+    value.set_value("a\n");
+    EXPECT_EQ(text(), "Value\n{\n    type=STRING\n    null=false\n    \"a\\n\"\n}\n");
+    value.set_value(Array<uint32>{1, 2});
+    value.null(true);
+    EXPECT_EQ(text(), "Value\n{\n    type=UINT32_ARRAY\n    null=true\n    { 1, 2 }\n}\n");
+    value.set_value(Array<Instance*>{create<Sample_Disk>(), nullptr});
+    EXPECT_THAT(text(),
+                ::testing::MatchesRegex("Value\n\\{\n    type=INSTANCE_ARRAY\n    null=false\nSample_Disk\n(.|\n)*NULL\n\\}\n"));
 }
 
 } // namespace
