@@ -1,3 +1,4 @@
+#include "runtime/mutex.h"
 #include "runtime/thread.h"
 #include "runtime/thread_context.h"
 #include "runtime/time.h"
@@ -123,6 +124,30 @@ TEST(Thread, runs_in_the_context_that_its_creator_supplies)
         Thread_Context::pop();
         EXPECT_EQ(events.text(), "create start exit delete ");
     }
+}
+
+TEST(ThreadDeathTest, must_leave_its_stack_of_contexts_as_it_was)
+{
+    const auto leave_one_more = []
+    {
+        static Events events;
+        static Recording_Context creator(events, new Recording_Context(events)), forgotten(events);
+        Thread_Context::push(&creator);
+        in_thread(
+            [](void*) -> void*
+            {
+                Thread_Context::push(&forgotten);
+                return nullptr;
+            });
+    };
+    EXPECT_DEATH(leave_one_more(), "assert: context == Thread_Context::top\\(\\)");
+    EXPECT_DEATH(Thread_Context::pop(), "assert: context != 0");
+}
+
+TEST(MutexDeathTest, is_not_given_back_by_who_does_not_hold_it)
+{
+    Mutex mutex(true);
+    EXPECT_DEATH(mutex.unlock(), "unlock\\(\\): assert: pthread_mutex_unlock\\(&\\(\\(MutexRep\\*\\)_rep\\)->mutex\\) == 0");
 }
 
 TEST(Thread, that_cannot_be_created_leaves_nothing_behind)
