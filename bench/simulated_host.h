@@ -2,7 +2,7 @@
 #pragma once
 
 #include "cimserver/broker/module.h"
-#include "cimserver/module_operations.h"
+#include "cimserver/name_spaces.h"
 
 #include <memory>
 
@@ -25,7 +25,7 @@ public:
 
 private:
     std::unique_ptr<cimserver::Module> _module;
-    std::unique_ptr<cimserver::Module_Operations> _operations;
+    std::unique_ptr<cimserver::Name_Spaces> _operations;
 };
 
 } // namespace bench

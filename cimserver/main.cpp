@@ -6,7 +6,7 @@
 #include "cimserver/cimxml/http_server.h"
 #include "cimserver/cimxml/listener.h"
 #include "cimserver/cimxml/service.h"
-#include "cimserver/module_operations.h"
+#include "cimserver/name_spaces.h"
 #include "cimserver/options.h"
 #include "cimserver/security/credentials.h"
 #include "cimserver/security/password_prompt.h"
@@ -83,7 +83,7 @@ void serve(const Options& options)
     const Http_Endpoint endpoint = endpoint_of(options);
     const auto credentials = credentials_of(options);
     Module module(options.module);
-    Module_Operations operations(module);
+    Name_Spaces operations(module);
     Service service(operations);
     Http_Server server(endpoint, options.limits, credentials.get(),
                        [&](const Http_Request& request)

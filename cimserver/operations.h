@@ -8,11 +8,35 @@
 #include "runtime/meta.h"
 
 #include <string>
+#include <utility>
 #include <vector>
 
 namespace cimserver
 {
 
+// A value in a request that is none of its type: CIM_ERR_INVALID_PARAMETER.
+class Type_Error : public Cim_Error
+{
+public:
+    explicit Type_Error(std::string description) : Cim_Error(CIM_ERR_INVALID_PARAMETER, std::move(description)) {}
+};
+
+// What a client asks of an association traversal; an empty text asks nothing.
+struct Association_Filter
+{
+    std::string association_class; // or a superclass of it
+    std::string result_class;      // of the object at the other end, or a superclass of it
+    std::string role;              // the reference that names the source
+    std::string result_role;       // the reference that names the object at the other end
+};
+
+struct Method_Result
+{
+    Value return_value;
+    std::vector<Named_Value> out; // the output parameters that the provider gave
+};
+
+// An operation that an implementation does not override is CIM_ERR_NOT_SUPPORTED.
 class Operations
 {
 public:
@@ -37,8 +61,38 @@ public:
     // may come untyped (string, boolean, or a number as text): they are converted to the class's key types.
     virtual Instance get_instance(const Object_Path& path, const Property_List& properties) = 0;
 
-    // An extrinsic method of a class or an instance: whether it can be called at all.
-    virtual void invoke_method(const Object_Path& path, const std::string& method) = 0;
+    // Changes of instances, by the provider of the class. The values of an instance may come untyped, as the keys may; an
+    // array may hold texts, an embedded instance may be the text of its INSTANCE element. They are converted to the types of
+    // the class. A value that does not fit is CIM_ERR_INVALID_PARAMETER; a property that the class has not is that too in
+    // create_instance, and CIM_ERR_NO_SUCH_PROPERTY in modify_instance.
+    virtual Object_Path create_instance(const Instance& instance);                           // the path needs no keys
+    virtual void modify_instance(const Instance& instance, const Property_List& properties); // no list: those it holds
+    virtual void delete_instance(const Object_Path& path);
+
+    // Answered through the two operations on whole instances, with their errors. CIM_ERR_NO_SUCH_PROPERTY when the class has
+    // no such property; CIM_ERR_TYPE_MISMATCH when the new value is none of its type.
+    Value get_property(const Object_Path& path, const std::string& property);
+    void set_property(const Object_Path& path, const std::string& property, const Value& value);
+
+    // The instances of a query's class that meet it; which queries that are is the providers' affair.
+    virtual std::vector<Instance> exec_query(const std::string& name_space, const std::string& query,
+                                             const std::string& language);
+
+    // Association traversal, from an instance: the union over every association class that can concern it and that the filter
+    // admits, each object once, with the path of its own name space. A class that the filter names must exist:
+    // CIM_ERR_INVALID_PARAMETER. An instance that does not exist has no associations.
+    virtual std::vector<Instance> associators(const Object_Path& path, const Association_Filter& filter,
+                                              const Property_List& properties);
+    virtual std::vector<Object_Path> associator_names(const Object_Path& path, const Association_Filter& filter);
+
+    // The same for the associations themselves: only the filter's association class and role count.
+    virtual std::vector<Instance> references(const Object_Path& path, const Association_Filter& filter,
+                                             const Property_List& properties);
+    virtual std::vector<Object_Path> reference_names(const Object_Path& path, const Association_Filter& filter);
+
+    // An extrinsic method of an instance, or with a path without keys of a class. Values as in create_instance; a parameter
+    // that the method has not, or takes nothing in, is CIM_ERR_INVALID_PARAMETER.
+    virtual Method_Result invoke_method(const Object_Path& path, const std::string& method, const std::vector<Named_Value>& in);
 };
 
 } // namespace cimserver

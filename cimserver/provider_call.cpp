@@ -20,11 +20,11 @@ catch (const Failure&)
 
 } // namespace
 
-Name_List::Name_List(const Property_List& properties, const Property_Layout& layout) : _absent(!properties)
+Name_List::Name_List(const Property_List& properties, const Property_Layout* layout) : _absent(!properties)
 {
     if (properties)
         for (const std::string& name : *properties)
-            if (layout.find(name))
+            if (!layout || layout->find(name))
                 _names.push_back(name.c_str());
     _names.push_back(nullptr);
 }
@@ -70,13 +70,18 @@ void Instance_Sink::take_instance(const Instance_Object& instance)
             path.keys.push_back({slots[slot].name, instance.value(slot)});
 }
 
-Provider_Call::Provider_Call(const Class_Entry& provider, std::string name_space, Result_Sink& sink, CMPIFlags flags,
-                             std::vector<Named_Value> keys)
+Provider_Call::Provider_Call(const Class_Entry& provider, Object_Path path, Result_Sink& sink, CMPIFlags flags)
     : _provider(provider)
     , _request(flags)
     , _result(make<Result_Object>(sink).face())
-    , _path(make<Path_Object>(Object_Path{"", std::move(name_space), provider.meta_class->name, std::move(keys)}).face())
+    , _path(make<Path_Object>(std::move(path)).face())
 {
+}
+
+void Provider_Call::check_offered(bool offered) const
+{
+    if (!offered)
+        throw Cim_Error(CIM_ERR_NOT_SUPPORTED, std::string(_provider.registration->provider_name) + " does not offer this");
 }
 
 void Provider_Call::check(const CMPIStatus& status) const

@@ -11,12 +11,12 @@
 namespace cimserver
 {
 
-// A property list as a provider takes it: only names of properties of its class. No list is a null pointer. The texts are
-// those of the list, which must outlive it.
+// A property list as a provider takes it, less the names that a class has not, if one is given. No list is a null pointer. The
+// texts are those of the list, which must outlive it.
 class Name_List
 {
 public:
-    Name_List(const Property_List& properties, const Property_Layout& layout);
+    explicit Name_List(const Property_List& properties, const Property_Layout* layout = nullptr);
 
     const char** names() { return _absent ? nullptr : _names.data(); }
 
@@ -82,22 +82,33 @@ private:
     Selection _selection;
 };
 
-// The context, the result and the path of a call; what the provider makes lives as long as this. The path names the
-// provider's own class.
+// Keeps what a method returns.
+class Data_Sink : public Result_Sink
+{
+public:
+    void take_data(const Value& data) override { value = data; }
+
+    Value value;
+};
+
+// The context, the result and the path of a call; what the provider makes lives as long as this.
 class Provider_Call
 {
 public:
-    Provider_Call(const Class_Entry& provider, std::string name_space, Result_Sink& sink, CMPIFlags flags,
-                  std::vector<Named_Value> keys = {});
+    Provider_Call(const Class_Entry& provider, Object_Path path, Result_Sink& sink, CMPIFlags flags = 0);
 
-    const CMPIContext* context() { return _request.context(); }
-    const CMPIResult* result() const { return _result; }
-    const CMPIObjectPath* path() const { return _path; }
-
-    // Throws the Cim_Error that a status other than OK means.
-    void check(const CMPIStatus& status) const;
+    // Calls a function of the provider's table with the interface, the context, the result, the path and the arguments. Throws
+    // the Cim_Error that a status other than OK means; CIM_ERR_NOT_SUPPORTED when the table has no such function.
+    template <class MI, class Function, class... Arguments> void run(MI* mi, Function function, Arguments... arguments)
+    {
+        check_offered(function != nullptr);
+        check(function(mi, _request.context(), _result, _path, arguments...));
+    }
 
 private:
+    void check_offered(bool offered) const;
+    void check(const CMPIStatus& status) const;
+
     const Class_Entry& _provider;
     Request _request;
     CMPIResult* _result;

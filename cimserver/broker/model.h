@@ -76,7 +76,10 @@ inline constexpr int CIM_ERR_INVALID_PARAMETER = 4;
 inline constexpr int CIM_ERR_INVALID_CLASS = 5;
 inline constexpr int CIM_ERR_NOT_FOUND = 6;
 inline constexpr int CIM_ERR_NOT_SUPPORTED = 7;
+inline constexpr int CIM_ERR_ALREADY_EXISTS = 11;
 inline constexpr int CIM_ERR_NO_SUCH_PROPERTY = 12;
+inline constexpr int CIM_ERR_TYPE_MISMATCH = 13;
+inline constexpr int CIM_ERR_INVALID_QUERY = 15;
 inline constexpr int CIM_ERR_METHOD_NOT_AVAILABLE = 16;
 inline constexpr int CIM_ERR_METHOD_NOT_FOUND = 17;
 

@@ -111,6 +111,13 @@ CMPIInstanceMI* Module::instance_mi(const Class_Entry& entry)
     return interface(entry, &Provider::instance_mi, "_Create_InstanceMI");
 }
 
+CMPIAssociationMI* Module::association_mi(const Class_Entry& entry)
+{
+    return interface(entry, &Provider::association_mi, "_Create_AssociationMI");
+}
+
+CMPIMethodMI* Module::method_mi(const Class_Entry& entry) { return interface(entry, &Provider::method_mi, "_Create_MethodMI"); }
+
 template <class MI> MI* Module::interface(const Class_Entry& entry, std::atomic<MI*> Provider::*slot, const char* suffix)
 {
     Provider& provider = *_providers.at(&entry);

@@ -13,7 +13,7 @@ unsigned feature_index(const zmlr::Meta_Class& meta_class, std::string_view name
     return meta_class.num_meta_features;
 }
 
-const zmlr::Meta_Class* origin_of(const zmlr::Meta_Class& meta_class, std::string_view feature)
+const zmlr::Meta_Class* describing_class_of(const zmlr::Meta_Class& meta_class, std::string_view feature)
 {
     for (const zmlr::Meta_Class* ancestor = &meta_class; ancestor; ancestor = ancestor->super_meta_class)
     {
@@ -24,6 +24,15 @@ const zmlr::Meta_Class* origin_of(const zmlr::Meta_Class& meta_class, std::strin
             return ancestor;
     }
     return nullptr;
+}
+
+const zmlr::Meta_Class* origin_of(const zmlr::Meta_Class& meta_class, std::string_view feature)
+{
+    const zmlr::Meta_Class* origin = nullptr;
+    for (const zmlr::Meta_Class* ancestor = &meta_class; ancestor; ancestor = ancestor->super_meta_class)
+        if (feature_index(*ancestor, feature) < ancestor->num_meta_features)
+            origin = ancestor;
+    return origin;
 }
 
 } // namespace cimserver

@@ -14,8 +14,11 @@ unsigned feature_index(const zmlr::Meta_Class& meta_class, std::string_view name
 // Whether the class itself declares or overrides its feature at the index.
 inline bool is_local(const zmlr::Meta_Class& meta_class, unsigned index) { return meta_class.locals[index].local != 0; }
 
-// The class that declares a feature or last overrides it: the class itself or its nearest ancestor. Null when the class has
-// no such feature.
+// The class that introduces a feature: the farthest ancestor that has it. Null when the class has no such feature.
 const zmlr::Meta_Class* origin_of(const zmlr::Meta_Class& meta_class, std::string_view feature);
+
+// The class whose words describe a feature: that which declares it or last overrides it. Null when the class has no such
+// feature.
+const zmlr::Meta_Class* describing_class_of(const zmlr::Meta_Class& meta_class, std::string_view feature);
 
 } // namespace cimserver

@@ -1,6 +1,8 @@
 #include "cimserver/cimxml/object_reader.h"
 
 #include "cimserver/broker/names.h"
+#include "cimserver/cimxml/http_message.h"
+#include "cimserver/cimxml/request_rules.h"
 
 #include <charconv>
 
@@ -113,7 +115,77 @@ Object_Path read_full_path(const Xml_Element& element)
     return path;
 }
 
+Value read_array(const Xml_Element& element, CMPIType element_type, const std::string& name_space)
+{
+    std::vector<Value> elements;
+    for (const Xml_Element& child : element.children)
+        elements.push_back(child.name == "VALUE.NULL" ? Value{element_type, {}} : read_value(child, name_space));
+    return {static_cast<CMPIType>(element_type | CMPI_ARRAY), std::move(elements)};
+}
+
+Value instance_value(Instance instance) { return {CMPI_instance, std::make_shared<const Instance>(std::move(instance))}; }
+
+Named_Value read_property(const Xml_Element& element, const std::string& name_space)
+{
+    Named_Value property{*element.attribute("NAME"), {}};
+    for (const Xml_Element& child : element.children)
+    {
+        if (child.name == "QUALIFIER")
+            continue;
+        if (property.value.type != CMPI_null)
+            fail("property with two values: " + property.name);
+        property.value = read_value(child, name_space);
+    }
+    return property;
+}
+
 } // namespace
+
+Value read_value(const Xml_Element& element, const std::string& name_space)
+{
+    if (element.name == "VALUE")
+        return text_value(element.text);
+    if (element.name == "VALUE.ARRAY")
+        return read_array(element, CMPI_string, name_space);
+    if (element.name == "VALUE.REFARRAY")
+        return read_array(element, CMPI_ref, name_space);
+    if (element.name == "INSTANCE" || element.name == "VALUE.NAMEDINSTANCE")
+        return instance_value(read_instance(element, name_space));
+    if (element.name == "CLASS")
+        fail("a class is no value here");
+    return {CMPI_ref, std::make_shared<const Object_Path>(read_path(element, name_space))};
+}
+
+Instance read_instance(const Xml_Element& element, const std::string& name_space)
+{
+    const bool named = element.name == "VALUE.NAMEDINSTANCE";
+    const Xml_Element& body = named ? element.children.back() : element;
+    if (body.name != "INSTANCE" || (named && element.children.front().name != "INSTANCENAME"))
+        fail("malformed " + element.name);
+
+    Instance instance;
+    instance.path = {"", name_space, *body.attribute("CLASSNAME"), {}};
+    if (named)
+        instance.path = read_path(element.children.front(), name_space);
+    for (const Xml_Element& child : body.children)
+        if (child.name != "QUALIFIER")
+            instance.properties.push_back(read_property(child, name_space));
+    return instance;
+}
+
+Instance read_embedded_instance(const std::string& text)
+try
+{
+    const Xml_Element element = read_xml(text);
+    if (element.name != "INSTANCE")
+        fail("no embedded instance but a " + element.name);
+    check_rules(element);
+    return read_instance(element, "");
+}
+catch (const Http_Refusal&)
+{
+    fail("an embedded instance that cannot be read");
+}
 
 std::string read_name_space(const Xml_Element& element)
 {

@@ -2,7 +2,9 @@
 
 #include "cimserver/cimxml/meta_search.h"
 #include "cimserver/cimxml/value_text.h"
+#include "cimserver/host_name.h"
 
+#include <algorithm>
 #include <optional>
 
 namespace cimserver
@@ -65,15 +67,6 @@ void write_local_path(Xml_Writer& writer, const Object_Path& path)
 {
     writer.start("LOCALINSTANCEPATH");
     write_local_name_space(writer, path.name_space);
-    write_instance_name(writer, path);
-    writer.end();
-}
-
-void write_full_path(Xml_Writer& writer, const Object_Path& path)
-{
-    writer.start("INSTANCEPATH").start("NAMESPACEPATH").element("HOST", path.host);
-    write_local_name_space(writer, path.name_space);
-    writer.end();
     write_instance_name(writer, path);
     writer.end();
 }
@@ -173,6 +166,24 @@ void write_instance_at(Xml_Writer& writer, const Instance& instance, const zmlr:
     writer.end();
 }
 
+const Object_Path* target_of(const Value& value)
+{
+    const auto* reference = std::get_if<Reference>(&value.content);
+    return reference ? reference->get() : nullptr;
+}
+
+// Nothing when an element is null: clients know no null inside an array.
+void write_reference_array(Xml_Writer& writer, const Value& value)
+{
+    const auto* elements = std::get_if<std::vector<Value>>(&value.content);
+    if (!elements || !std::ranges::all_of(*elements, target_of))
+        return;
+    writer.start("VALUE.REFARRAY");
+    for (const Value& element : *elements)
+        write_reference(writer, *target_of(element));
+    writer.end();
+}
+
 } // namespace
 
 void write_instance_name(Xml_Writer& writer, const Object_Path& path)
@@ -191,7 +202,24 @@ void write_reference(Xml_Writer& writer, const Object_Path& path)
     else if (path.host.empty())
         write_local_path(writer, path);
     else
-        write_full_path(writer, path);
+        write_instance_path(writer, path);
+    writer.end();
+}
+
+void write_instance_path(Xml_Writer& writer, const Object_Path& path)
+{
+    writer.start("INSTANCEPATH").start("NAMESPACEPATH").element("HOST", path.host.empty() ? host_name() : path.host);
+    write_local_name_space(writer, path.name_space);
+    writer.end();
+    write_instance_name(writer, path);
+    writer.end();
+}
+
+void write_object_with_path(Xml_Writer& writer, const Instance& instance, const zmlr::Meta_Class* origins)
+{
+    writer.start("VALUE.OBJECTWITHPATH");
+    write_instance_path(writer, instance.path);
+    write_instance(writer, instance, origins);
     writer.end();
 }
 
@@ -201,5 +229,38 @@ void write_instance(Xml_Writer& writer, const Instance& instance, const zmlr::Me
 }
 
 void write_value(Xml_Writer& writer, const Value& value) { write_value_at(writer, value, 0); }
+
+void write_any_value(Xml_Writer& writer, const Value& value)
+{
+    if (value.type == CMPI_ref)
+    {
+        if (const Object_Path* path = target_of(value))
+            write_reference(writer, *path);
+    }
+    else if (value.type == (CMPI_ref | CMPI_ARRAY))
+        write_reference_array(writer, value);
+    else
+        write_value(writer, value);
+}
+
+bool can_be_sent(const Value& value)
+{
+    if (!cim_type_name(value.type))
+        return false;
+    Xml_Writer writer;
+    write_any_value(writer, value);
+    return !writer.take().empty();
+}
+
+void write_output_parameter(Xml_Writer& writer, const Named_Value& parameter)
+{
+    if (!can_be_sent(parameter.value))
+        return;
+    writer.start("PARAMVALUE").attribute("NAME", parameter.name).attribute("PARAMTYPE", cim_type_name(parameter.value.type));
+    if ((parameter.value.type & ~CMPI_ARRAY) == CMPI_instance)
+        writer.attribute("EmbeddedObject", "instance");
+    write_any_value(writer, parameter.value);
+    writer.end();
+}
 
 } // namespace cimserver

@@ -20,7 +20,20 @@ void write_reference(Xml_Writer& writer, const Object_Path& path);
 // INSTANCE. With a class, each property carries its CLASSORIGIN.
 void write_instance(Xml_Writer& writer, const Instance& instance, const zmlr::Meta_Class* origins = nullptr);
 
+// INSTANCEPATH. A path that names no host is on this one.
+void write_instance_path(Xml_Writer& writer, const Object_Path& path);
+
+// VALUE.OBJECTWITHPATH: INSTANCEPATH and INSTANCE.
+void write_object_with_path(Xml_Writer& writer, const Instance& instance, const zmlr::Meta_Class* origins);
+
 // VALUE or VALUE.ARRAY of anything but references; nothing for a null value and for one that cannot be sent.
 void write_value(Xml_Writer& writer, const Value& value);
+
+// The same, and VALUE.REFERENCE or VALUE.REFARRAY for references.
+void write_any_value(Xml_Writer& writer, const Value& value);
+bool can_be_sent(const Value& value); // whether that writes anything
+
+// PARAMVALUE with the type; nothing for a value that cannot be sent.
+void write_output_parameter(Xml_Writer& writer, const Named_Value& parameter);
 
 } // namespace cimserver

@@ -52,10 +52,36 @@ std::string Parameters::optional_class_name(std::string_view name) const
 
 Object_Path Parameters::instance_name(std::string_view name) const
 {
-    const Xml_Element* value = value_of(name, "INSTANCENAME");
-    if (!value)
-        fail("missing parameter", name);
-    return read_path(*value, name_space());
+    return read_path(required(name, "INSTANCENAME"), name_space());
+}
+
+Object_Path Parameters::object_name(std::string_view name) const
+{
+    const Xml_Element* parameter = find(name);
+    if (parameter && !parameter->children.empty() && parameter->children.front().name == "CLASSNAME")
+        throw Cim_Error(CIM_ERR_NOT_SUPPORTED, "associations of classes are not told, only of instances");
+    return instance_name(name);
+}
+
+Instance Parameters::instance(std::string_view name) const { return read_instance(required(name, "INSTANCE"), name_space()); }
+
+Instance Parameters::named_instance(std::string_view name) const
+{
+    return read_instance(required(name, "VALUE.NAMEDINSTANCE"), name_space());
+}
+
+std::string Parameters::text(std::string_view name) const { return required(name, "VALUE").text; }
+
+std::string Parameters::optional_text(std::string_view name) const
+{
+    const Xml_Element* value = value_of(name, "VALUE");
+    return value ? value->text : std::string();
+}
+
+Value Parameters::value(std::string_view name) const
+{
+    const Xml_Element* parameter = find(name);
+    return parameter && !parameter->children.empty() ? read_value(parameter->children.front(), name_space()) : Value();
 }
 
 bool Parameters::boolean(std::string_view name, bool default_value) const
@@ -87,6 +113,14 @@ const Xml_Element* Parameters::find(std::string_view name) const
     return nullptr;
 }
 
+const Xml_Element& Parameters::required(std::string_view name, std::string_view element) const
+{
+    const Xml_Element* value = value_of(name, element);
+    if (!value)
+        fail("missing parameter", name);
+    return *value;
+}
+
 const Xml_Element* Parameters::value_of(std::string_view name, std::string_view element) const
 {
     const Xml_Element* parameter = find(name);
@@ -95,6 +129,16 @@ const Xml_Element* Parameters::value_of(std::string_view name, std::string_view 
     if (parameter->children.front().name != element)
         fail("parameter of another type than " + std::string(element), name);
     return &parameter->children.front();
+}
+
+std::vector<Named_Value> read_arguments(const Cimxml_Request& method_call, const std::string& name_space)
+{
+    std::vector<Named_Value> arguments;
+    for (const Xml_Element& parameter : method_call.call.children)
+        if (parameter.name == "PARAMVALUE")
+            arguments.push_back(
+                {name_of(parameter), parameter.children.empty() ? Value() : read_value(parameter.children.front(), name_space)});
+    return arguments;
 }
 
 } // namespace cimserver

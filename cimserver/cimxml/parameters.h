@@ -1,4 +1,5 @@
-// The parameters of an intrinsic operation, read by name and type (DSP0200). Names are compared without regard to case.
+// The parameters of an intrinsic operation, read by name and type (DSP0200), and the arguments of a method. Names are compared
+// without regard to case.
 #pragma once
 
 #include "cimserver/broker/model.h"
@@ -7,6 +8,7 @@
 #include <span>
 #include <string>
 #include <string_view>
+#include <vector>
 
 namespace cimserver
 {
@@ -24,14 +26,25 @@ public:
     std::string class_name(std::string_view name) const;          // throws when left out
     std::string optional_class_name(std::string_view name) const; // "" when left out
     Object_Path instance_name(std::string_view name) const;       // throws when left out
+    Object_Path object_name(std::string_view name) const;         // of an instance; a class is CIM_ERR_NOT_SUPPORTED
+    Instance instance(std::string_view name) const;               // an INSTANCE; throws when left out
+    Instance named_instance(std::string_view name) const;         // a VALUE.NAMEDINSTANCE; throws when left out
+    std::string text(std::string_view name) const;                // throws when left out
+    std::string optional_text(std::string_view name) const;       // "" when left out
+    Value value(std::string_view name) const;                     // null when left out
     bool boolean(std::string_view name, bool default_value) const;
     Property_List property_list(std::string_view name) const;
 
 private:
     const Xml_Element* find(std::string_view name) const; // the IPARAMVALUE
     const Xml_Element* value_of(std::string_view name, std::string_view element) const;
+    const Xml_Element& required(std::string_view name, std::string_view element) const;
 
     const Cimxml_Request& _request;
 };
+
+// The arguments of a METHODCALL, untyped; references that name no name space take the one given. What an argument says of its
+// type is passed over: the method knows it.
+std::vector<Named_Value> read_arguments(const Cimxml_Request& method_call, const std::string& name_space);
 
 } // namespace cimserver

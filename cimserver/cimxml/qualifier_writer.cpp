@@ -161,7 +161,7 @@ void write_feature_qualifiers(Xml_Writer& writer, const zmlr::Meta_Class& meta_c
         write_boolean(writer, "Read", false, {});
     if (overrides(meta_class, index))
         write_text(writer, "Override", feature.name, {true, false});
-    if (const zmlr::Meta_Class* origin = origin_of(meta_class, feature.name))
+    if (const zmlr::Meta_Class* origin = describing_class_of(meta_class, feature.name))
         write_rows(writer, *origin, feature.name);
 }
 

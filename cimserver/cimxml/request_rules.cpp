@@ -16,7 +16,7 @@ enum class Content
 {
     elements, // only the children listed
     text,     // character data only
-    opaque    // whatever it holds is for operations that are not served
+    opaque    // whatever it holds is for operations that are not served, or says nothing that counts
 };
 
 struct Rule
@@ -40,7 +40,7 @@ constexpr Rule rules[] = {
                                                           "LOCALINSTANCEPATH", "INSTANCENAME"}, {}},
     {"VALUE.REFARRAY",        Content::elements, 0, any, {"VALUE.REFERENCE", "VALUE.NULL"}, {}},
     {"VALUE.NULL",            Content::elements, 0, 0,   {}, {}},
-    {"VALUE.NAMEDINSTANCE",   Content::opaque,   0, 0,   {}, {}},
+    {"VALUE.NAMEDINSTANCE",   Content::elements, 2, 2,   {"INSTANCENAME", "INSTANCE"}, {}},
     {"NAMESPACEPATH",         Content::elements, 2, 2,   {"HOST", "LOCALNAMESPACEPATH"}, {}},
     {"LOCALNAMESPACEPATH",    Content::elements, 1, any, {"NAMESPACE"}, {}},
     {"HOST",                  Content::text,     0, 0,   {}, {}},
@@ -54,7 +54,12 @@ constexpr Rule rules[] = {
     {"KEYBINDING",            Content::elements, 1, 1,   {"KEYVALUE", "VALUE.REFERENCE"}, {"NAME"}},
     {"KEYVALUE",              Content::text,     0, 0,   {}, {}},
     {"CLASS",                 Content::opaque,   0, 0,   {}, {}},
-    {"INSTANCE",              Content::opaque,   0, 0,   {}, {}},
+    {"INSTANCE",              Content::elements, 0, any, {"QUALIFIER", "PROPERTY", "PROPERTY.ARRAY", "PROPERTY.REFERENCE"},
+                                                         {"CLASSNAME"}},
+    {"QUALIFIER",             Content::opaque,   0, 0,   {}, {}},
+    {"PROPERTY",              Content::elements, 0, any, {"QUALIFIER", "VALUE"}, {"NAME", "TYPE"}},
+    {"PROPERTY.ARRAY",        Content::elements, 0, any, {"QUALIFIER", "VALUE.ARRAY"}, {"NAME", "TYPE"}},
+    {"PROPERTY.REFERENCE",    Content::elements, 0, any, {"QUALIFIER", "VALUE.REFERENCE"}, {"NAME"}},
     {"QUALIFIER.DECLARATION", Content::opaque,   0, 0,   {}, {}},
     {"CIM",                   Content::elements, 1, 1,   {"MESSAGE"}, {"CIMVERSION", "DTDVERSION"}},
     {"MESSAGE",               Content::elements, 1, 1,   {"SIMPLEREQ", "MULTIREQ"}, {"ID", "PROTOCOLVERSION"}},

@@ -43,7 +43,7 @@ TEST_F(Life, UnloadingLeavesNothingBehind)
     const auto round = []
     {
         cimserver::Module module(module_path);
-        cimserver::Module_Operations operations(module);
+        cimserver::Name_Spaces operations(module);
         EXPECT_GT(operations.enumerate_instances(name_space, "ZEMLAR_FCPort", true, std::nullopt).size(), 0U);
     };
     round();

@@ -55,7 +55,7 @@ void Loaded_Module::load_text(const std::string& json)
 void Loaded_Module::load_module()
 {
     _module = std::make_unique<cimserver::Module>(module_path);
-    _operations = std::make_unique<cimserver::Module_Operations>(*_module);
+    _operations = std::make_unique<cimserver::Name_Spaces>(*_module);
 }
 
 // A module that is still mapped would not look at the new host.

@@ -2,7 +2,7 @@
 #pragma once
 
 #include "cimserver/broker/module.h"
-#include "cimserver/module_operations.h"
+#include "cimserver/name_spaces.h"
 #include "sim/hxasim.h"
 
 #include <gtest/gtest.h>
@@ -45,5 +45,5 @@ private:
     void unload();
 
     std::unique_ptr<cimserver::Module> _module;
-    std::unique_ptr<cimserver::Module_Operations> _operations;
+    std::unique_ptr<cimserver::Name_Spaces> _operations;
 };

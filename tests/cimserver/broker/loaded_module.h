@@ -1,7 +1,7 @@
 // A fixture with the test module loaded and its operations on top.
 #pragma once
 
-#include "cimserver/module_operations.h"
+#include "cimserver/name_spaces.h"
 #include "test_module.h"
 
 #include <dlfcn.h>
@@ -77,7 +77,7 @@ protected:
 
     Test_Module test_module;
     Module module{TEST_MODULE};
-    Module_Operations operations{module};
+    Name_Spaces operations{module};
 };
 
 } // namespace cimserver

@@ -50,7 +50,7 @@ TEST(Module_Loading, cleans_its_interfaces_up_and_unloads)
         const Test_Module test_module;
         {
             Module module(TEST_MODULE);
-            Module_Operations operations(module);
+            Name_Spaces operations(module);
             EXPECT_EQ(test_module.state().live_interfaces, 0);
             operations.enumerate_instance_names("root/zemlar", "TST_Disk");
             operations.enumerate_instance_names("root/zemlar", "TST_Disk");
@@ -74,7 +74,7 @@ TEST(Module_Loading, z_leaves_a_module_in_memory_that_asks_for_it)
         const Test_Module test_module;
         test_module.state().cleanup_rc = CMPI_RC_NEVER_UNLOAD;
         Module module(TEST_MODULE);
-        Module_Operations operations(module);
+        Name_Spaces operations(module);
         operations.enumerate_instance_names("root/zemlar", "TST_Disk");
     }
     EXPECT_TRUE(is_loaded());

@@ -69,7 +69,7 @@ public:
         return instances.front();
     }
 
-    void invoke_method(const Object_Path& path, const std::string& method) override
+    Method_Result invoke_method(const Object_Path& path, const std::string& method, const std::vector<Named_Value>&) override
     {
         last_path = path;
         throw Cim_Error(CIM_ERR_METHOD_NOT_FOUND, "unknown method: " + method);

@@ -129,7 +129,7 @@ TEST(object_writer, writes_every_kind_of_property)
     write_instance(writer, instance, &test::TST_Port);
     EXPECT_EQ(writer.take(),
               "<INSTANCE CLASSNAME=\"TST_Port\">"
-              "<PROPERTY NAME=\"Name\" TYPE=\"string\" CLASSORIGIN=\"TST_Port\"><VALUE>a\nb</VALUE></PROPERTY>"
+              "<PROPERTY NAME=\"Name\" TYPE=\"string\" CLASSORIGIN=\"TST_Element\"><VALUE>a\nb</VALUE></PROPERTY>"
               "<PROPERTY NAME=\"Status\" TYPE=\"string\" CLASSORIGIN=\"TST_Element\"></PROPERTY>"
               "<PROPERTY NAME=\"Empty\" TYPE=\"string\"><VALUE></VALUE></PROPERTY>"
               "<PROPERTY NAME=\"When\" TYPE=\"datetime\"></PROPERTY>"

@@ -1,0 +1,180 @@
+#include "cimserver/object_conversion.h"
+
+#include "cimserver/cimxml/object_reader.h"
+#include "cimserver/cimxml/value_text.h"
+#include "cimserver/class_view.h"
+#include "cimserver/key_conversion.h"
+#include "cimserver/operations.h"
+#include "cimserver/value_conversion.h"
+
+#include <span>
+#include <unordered_set>
+
+namespace cimserver
+{
+namespace
+{
+
+// Instances in instances: each level is escaped once more by a client, and none means a deep one.
+constexpr int max_embedding = 4;
+
+using Features = std::span<const zmlr::Meta_Feature* const>;
+
+Features features_of(const zmlr::Meta_Record& record) { return {record.meta_features, record.num_meta_features}; }
+
+const zmlr::Meta_Feature* find_value_feature(const zmlr::Meta_Record& record, std::string_view name)
+{
+    for (const zmlr::Meta_Feature* feature : features_of(record))
+        if (!zmlr::is_method(feature) && equal_names(feature->name, name))
+            return feature;
+    return nullptr;
+}
+
+std::string described(CMPIType type)
+{
+    if ((type & CMPI_ARRAY) != 0)
+        return std::string("array of ") + cim_type_name(type);
+    return (type == CMPI_instance) ? "embedded instance" : cim_type_name(type);
+}
+
+class Converter
+{
+public:
+    Converter(const Repository& repository, const std::string& name_space) : _repository(repository), _name_space(name_space) {}
+
+    // The value for a feature, null when it is null. Throws Type_Error.
+    Value value(const zmlr::Meta_Feature& feature, const Value& given)
+    {
+        const CMPIType type = cmpi_type(feature);
+        Value result{type, {}};
+        if (given.null())
+            return result;
+        result.content = (type & CMPI_ARRAY) != 0 ? array(feature, given) : scalar(feature, type, given);
+        if (result.null())
+            throw Type_Error("the value of " + std::string(feature.name) + " is no " + described(type));
+        return result;
+    }
+
+    std::vector<Named_Value> properties(const Class_Entry& entry, const std::vector<Named_Value>& given, int unknown_property)
+    {
+        std::vector<Named_Value> result;
+        std::unordered_set<const zmlr::Meta_Feature*> seen;
+        for (const Named_Value& property : given)
+        {
+            const zmlr::Meta_Feature* feature = find_value_feature(*entry.meta_class, property.name);
+            if (!feature)
+                throw Cim_Error(unknown_property,
+                                "class " + std::string(entry.meta_class->name) + " has no property " + property.name);
+            if (!seen.insert(feature).second)
+                throw Type_Error("property given twice: " + property.name);
+            result.push_back({feature->name, value(*feature, property.value)});
+        }
+        return result;
+    }
+
+private:
+    Value::Content scalar(const zmlr::Meta_Feature& feature, CMPIType type, const Value& given)
+    {
+        if (type == CMPI_ref)
+            return typed_reference(_repository, *zmlr::as_reference(&feature), given, _name_space);
+        if (type == CMPI_instance)
+            return embedded(*zmlr::as_reference(&feature), given);
+        return scalar_content(given, type);
+    }
+
+    // Null when one element is none of the type; an element that is null stays so.
+    Value::Content array(const zmlr::Meta_Feature& feature, const Value& given)
+    {
+        const auto* elements = std::get_if<std::vector<Value>>(&given.content);
+        if (!elements)
+            return {};
+        const CMPIType type = cmpi_type(feature) & static_cast<CMPIType>(~CMPI_ARRAY);
+        std::vector<Value> result;
+        result.reserve(elements->size());
+        for (const Value& element : *elements)
+        {
+            result.push_back({type, element.null() ? Value::Content() : scalar(feature, type, element)});
+            if (!element.null() && result.back().null())
+                return {};
+        }
+        return result;
+    }
+
+    Value::Content embedded(const zmlr::Meta_Reference& reference, const Value& given)
+    {
+        if (const auto* text = std::get_if<std::string>(&given.content))
+            return embedded(reference, read_embedded_instance(*text));
+        const auto* instance = std::get_if<std::shared_ptr<const Instance>>(&given.content);
+        return instance && *instance ? embedded(reference, **instance) : Value::Content();
+    }
+
+    Value::Content embedded(const zmlr::Meta_Reference& reference, const Instance& instance)
+    {
+        const Class_Entry* entry = _repository.find(instance.path.class_name);
+        if (!entry || !are_related(entry->meta_class, reference.meta_class))
+            return {};
+        if (_depth == max_embedding)
+            throw Type_Error("the embedded instances are nested too deeply");
+
+        ++_depth;
+        Instance result{{"", _name_space, entry->meta_class->name, {}},
+                        properties(*entry, instance.properties, CIM_ERR_INVALID_PARAMETER)};
+        --_depth;
+        return std::make_shared<const Instance>(std::move(result));
+    }
+
+    const Repository& _repository;
+    const std::string& _name_space;
+    int _depth = 0;
+};
+
+// The keys of a new instance's path: those that the client gave there, else the key properties.
+std::vector<Named_Value> known_keys(const Repository& repository, const Class_Entry& entry, const Instance& instance,
+                                    const std::vector<Named_Value>& properties)
+{
+    if (!instance.path.keys.empty())
+        return typed_keys(repository, entry, instance.path);
+    std::vector<Named_Value> keys;
+    for (const Property_Layout::Slot& slot : entry.layout->slots())
+        if (const Named_Value* property = slot.key ? find_named(properties, slot.name) : nullptr;
+            property && !property->value.null())
+            keys.push_back(*property);
+    return keys;
+}
+
+} // namespace
+
+Instance typed_instance(const Repository& repository, const Class_Entry& entry, const Instance& instance, int unknown_property)
+{
+    Instance result{{"", instance.path.name_space, entry.meta_class->name, {}}, {}};
+    Converter converter(repository, result.path.name_space);
+    result.properties = converter.properties(entry, instance.properties, unknown_property);
+    result.path.keys = known_keys(repository, entry, instance, result.properties);
+    return result;
+}
+
+std::vector<Named_Value> typed_arguments(const Repository& repository, const zmlr::Meta_Method& method,
+                                         const std::vector<Named_Value>& in, const std::string& name_space)
+{
+    const auto refuse = [&](const std::string& reason, const std::string& parameter)
+    { throw Type_Error("method " + std::string(method.name) + ": " + reason + ": " + parameter); };
+
+    std::unordered_set<const zmlr::Meta_Feature*> seen;
+    for (const Named_Value& argument : in)
+    {
+        const zmlr::Meta_Feature* parameter = find_value_feature(method, argument.name);
+        if (!parameter || (parameter->flags & zmlr::Flag_In) == 0)
+            refuse("it has no such input parameter", argument.name);
+        if (!seen.insert(parameter).second)
+            refuse("parameter given twice", argument.name);
+    }
+
+    Converter converter(repository, name_space);
+    std::vector<Named_Value> result;
+    for (const zmlr::Meta_Feature* parameter : features_of(method))
+        if (const Named_Value* argument = find_named(in, parameter->name))
+            result.push_back({parameter->name, converter.value(*parameter, argument->value)});
+    return result;
+}
+
+} // namespace cimserver

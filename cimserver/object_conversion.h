@@ -1,0 +1,25 @@
+// The instances and arguments of a request, checked against their class and converted to its types.
+#pragma once
+
+#include "cimserver/broker/repository.h"
+
+#include <string>
+#include <vector>
+
+namespace cimserver
+{
+
+// The instance with the names and types of its class and all the keys in its path that it has: those of the path, else the
+// properties that are keys. Values are converted as operations.h tells; a property that is not given stays away.
+//
+// Throws Type_Error for a value that is none of its type and for a property given twice, and a Cim_Error with the code
+// `unknown_property` for one that the class has not.
+Instance typed_instance(const Repository& repository, const Class_Entry& entry, const Instance& instance, int unknown_property);
+
+// The input arguments with the names and types of the method's parameters, in their order. References without a name space
+// take the one given. Throws Type_Error for a value that is none of its type, an argument given twice and one that the method
+// does not take.
+std::vector<Named_Value> typed_arguments(const Repository& repository, const zmlr::Meta_Method& method,
+                                         const std::vector<Named_Value>& in, const std::string& name_space);
+
+} // namespace cimserver
