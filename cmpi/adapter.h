@@ -13,8 +13,17 @@
 
 #include <cmpift.h>
 
+#include <vector>
+
 namespace zmlr
 {
+
+// A name space with active indication filters.
+struct Name_Space_Entry
+{
+    String name;
+    uint32 count; // filters
+};
 
 class CMPI_Adapter : public Provider_Handle
 {
@@ -51,7 +60,7 @@ public:
     static CMPIStatus execQuery(CMPIInstanceMI* mi, const CMPIContext* context, const CMPIResult* result,
                                 const CMPIObjectPath* path, const char* query, const char* language) noexcept;
 
-    // ---- what servers call: methods, associations, indications (each answers CMPI_RC_ERR_NOT_SUPPORTED) ----
+    // ---- what servers call: methods, associations, indications ----
 
     static CMPIStatus methodCleanup(CMPIMethodMI* mi, const CMPIContext* context, CMPIBoolean terminating) noexcept;
     static CMPIStatus invokeMethod(CMPIMethodMI* mi, const CMPIContext* context, const CMPIResult* result,
@@ -87,8 +96,11 @@ public:
     CMPI_Static_Data* sd;
     uint32 load_count = 1; // interfaces that the server holds
     bool allow_unload = true;
+    std::vector<Name_Space_Entry> name_spaces; // in the order of their first filters
     const Meta_Class* mc = nullptr;
-    Mutex lock{true}; // held for the whole of a request
+    bool indications_enabled = false;
+    Mutex lock{true};              // held for the whole of a request
+    Mutex indication_switch{true}; // held while indications are enabled or disabled; comes before `lock`
 
 private:
     void attach(const char* provider_name);

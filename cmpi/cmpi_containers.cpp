@@ -4,6 +4,8 @@
 #include "cmpi/converter.h"
 #include "runtime/log.h"
 
+#include <utility>
+
 namespace zmlr
 {
 
@@ -56,7 +58,7 @@ int CMPI_Container::get_value(uint32 index, Value::Type expected, Value& value)
         ZMLR_LOG(LL_WARN, "cmpi_to_cimple_value() failed");
         return -1;
     }
-    if (value.type() != expected)
+    if (value.type() != expected && !stands_for(value, expected))
     {
         ZMLR_LOG(LL_WARN, "type mismatch on %s: %s/%s", name.c_str(), name_of(expected), name_of(value.type()));
         return -1;
@@ -105,7 +107,7 @@ int CMPIInstance_Container::fetch(uint32 index, CMPIData& data, String& name)
     return -1;
 }
 
-int CMPIInstance_Container::put(const char* name, const CMPI_Data& data)
+int CMPIInstance_Container::put(const char* name, CMPI_Data& data)
 {
     if (okay(CMSetProperty(_instance, name, data.value(), data.type())))
         return 0;
@@ -137,13 +139,59 @@ int CMPIObjectPath_Container::fetch(uint32 index, CMPIData& data, String& name)
     return -1;
 }
 
-int CMPIObjectPath_Container::put(const char* name, const CMPI_Data& data)
+int CMPIObjectPath_Container::put(const char* name, CMPI_Data& data)
 {
     // Only paths that we made, which are not constant, are written.
     if (okay(CMAddKey(const_cast<CMPIObjectPath*>(_path), name, data.value(), data.type())))
         return 0;
     ZMLR_LOG(LL_WARN, "CMAddKey() failed");
     return -1;
+}
+
+// ---- arguments ----
+
+CMPIArgs_Container::CMPIArgs_Container(const Meta_Repository* repository, const CMPIBroker* broker, const char* name_space,
+                                       const CMPIArgs* args)
+    : CMPI_Container(repository, broker, name_space)
+    , _args(args)
+{
+}
+
+uint32 CMPIArgs_Container::get_size() { return _args ? CMGetArgCount(_args, nullptr) : 0; }
+
+int CMPIArgs_Container::fetch(uint32 index, CMPIData& data, String& name)
+{
+    if (!in_bounds(index, get_size()))
+        return -1;
+    CMPIStatus status = {CMPI_RC_OK, nullptr};
+    CMPIString* cmpi_name = nullptr;
+    data = CMGetArgAt(_args, index, &cmpi_name, &status);
+    if (okay(status) && take_name(cmpi_name, name))
+        return 0;
+    ZMLR_LOG(LL_WARN, "CMGetArgAt() failed");
+    return -1;
+}
+
+int CMPIArgs_Container::put(const char* name, CMPI_Data& data)
+{
+    if (eqi(name, "return_value"))
+    {
+        _return_value = std::move(data);
+        return 0;
+    }
+    if (!_args || okay(CMAddArg(_args, name, data.value(), data.type())))
+        return 0;
+    ZMLR_LOG(LL_WARN, "CMAddArg() failed");
+    return -1;
+}
+
+// Servers deliver untyped nulls as booleans.
+bool CMPIArgs_Container::stands_for(Value& value, Value::Type expected) const
+{
+    if (value.type() != Value::BOOLEAN || expected != Value::INSTANCE_ARRAY)
+        return false;
+    value.set_null(Value::INSTANCE_ARRAY);
+    return true;
 }
 
 } // namespace zmlr

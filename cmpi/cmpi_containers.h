@@ -1,4 +1,4 @@
-// The containers around CMPI objects: an instance's properties and an object path's keys.
+// The containers around CMPI objects: an instance's properties, an object path's keys, a method's arguments.
 //
 // A container borrows the object it wraps. `name_space` is where references without a name space of their own point to.
 #pragma once
@@ -24,7 +24,10 @@ public:
 private:
     // Each answers 0, or -1 and a log line.
     virtual int fetch(uint32 index, CMPIData& data, String& name) = 0;
-    virtual int put(const char* name, const CMPI_Data& data) = 0;
+    virtual int put(const char* name, CMPI_Data& data) = 0;
+
+    // Whether a value that is not of the expected type stands for one that is, which it then becomes.
+    virtual bool stands_for(Value&, Value::Type) const { return false; }
 
     const CMPIBroker* _broker;
     String _name_space;
@@ -40,7 +43,7 @@ public:
 
 private:
     int fetch(uint32 index, CMPIData& data, String& name) override;
-    int put(const char* name, const CMPI_Data& data) override;
+    int put(const char* name, CMPI_Data& data) override;
 
     const CMPIInstance* _instance;
 };
@@ -56,9 +59,28 @@ public:
 
 private:
     int fetch(uint32 index, CMPIData& data, String& name) override;
-    int put(const char* name, const CMPI_Data& data) override;
+    int put(const char* name, CMPI_Data& data) override;
 
     const CMPIObjectPath* _path;
+};
+
+// A container without arguments (null) is empty, and drops what it is given. What is set under the name "return_value" is no
+// argument: it goes into a slot of its own.
+class CMPIArgs_Container : public CMPI_Container
+{
+public:
+    CMPIArgs_Container(const Meta_Repository* repository, const CMPIBroker* broker, const char* name_space, const CMPIArgs* args);
+
+    uint32 get_size() override;
+    CMPI_Data& return_value() { return _return_value; }
+
+private:
+    int fetch(uint32 index, CMPIData& data, String& name) override;
+    int put(const char* name, CMPI_Data& data) override;
+    bool stands_for(Value& value, Value::Type expected) const override;
+
+    const CMPIArgs* _args;
+    CMPI_Data _return_value;
 };
 
 } // namespace zmlr

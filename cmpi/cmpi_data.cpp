@@ -1,7 +1,17 @@
 #include "cmpi/cmpi_data.h"
 
+#include <utility>
+
 namespace zmlr
 {
+
+CMPI_Data& CMPI_Data::operator=(CMPI_Data&& x) noexcept
+{
+    std::swap(_data, x._data);
+    std::swap(_owner, x._owner);
+    std::swap(_elements, x._elements);
+    return *this;
+}
 
 void CMPI_Data::set(CMPIType type, const CMPIValue& value)
 {
@@ -61,13 +71,14 @@ bool CMPI_Data::adopt(CMPIInstance* instance)
     return true;
 }
 
-bool CMPI_Data::adopt(CMPIArray* array, CMPIType element_type)
+bool CMPI_Data::adopt(CMPIArray* array, CMPIType element_type, std::vector<CMPI_Data> elements)
 {
     if (!array)
         return false;
     CMPIValue value = {};
     value.array = array;
     own(static_cast<CMPIType>(element_type | CMPI_ARRAY), value);
+    _elements = std::move(elements);
     return true;
 }
 
@@ -87,6 +98,7 @@ void CMPI_Data::release()
         release_object(_data.value.ref);
     else
         release_object(_data.value.inst);
+    _elements.clear();
 }
 
 } // namespace zmlr

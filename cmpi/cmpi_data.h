@@ -5,18 +5,21 @@
 
 #include <cmpimacs.h>
 
+#include <vector>
+
 namespace zmlr
 {
 
-// Releases its string, datetime, path, instance or array at its end: brokers copy what is set as a property or key, and a
-// long enumeration must not pile up objects until its request is over.
+// Releases its string, datetime, path, instance or array at its end, an array before its elements: brokers copy what is set
+// as a property, key or argument. A long enumeration must not pile up objects until its request is over, nor a thread that
+// delivers alerts until it ends.
 class CMPI_Data
 {
 public:
     CMPI_Data() = default;
     ~CMPI_Data() { release(); }
-    CMPI_Data(const CMPI_Data&) = delete;
-    CMPI_Data& operator=(const CMPI_Data&) = delete;
+    CMPI_Data(CMPI_Data&& x) noexcept { *this = std::move(x); }
+    CMPI_Data& operator=(CMPI_Data&& x) noexcept;
 
     // A value without an object behind it.
     void set(CMPIType type, const CMPIValue& value);
@@ -27,13 +30,10 @@ public:
     bool adopt(CMPIDateTime* datetime);
     bool adopt(CMPIObjectPath* path);
     bool adopt(CMPIInstance* instance);
-    bool adopt(CMPIArray* array, CMPIType element_type);
+    bool adopt(CMPIArray* array, CMPIType element_type, std::vector<CMPI_Data> elements);
 
     CMPIType type() const { return _data.type; }
     const CMPIValue* value() const { return CMIsNullValue(_data) ? nullptr : &_data.value; }
-
-    // Gives the object up: it is the broker's to free from now on.
-    void leave() { _owner = false; }
 
 private:
     void own(CMPIType type, const CMPIValue& value);
@@ -41,6 +41,7 @@ private:
 
     CMPIData _data = {CMPI_null, CMPI_nullValue, {}};
     bool _owner = false;
+    std::vector<CMPI_Data> _elements; // of the array
 };
 
 } // namespace zmlr

@@ -3,6 +3,7 @@
 #include "cmpi/cmpi_containers.h"
 #include "runtime/log.h"
 
+#include <utility>
 #include <vector>
 
 namespace zmlr
@@ -71,31 +72,57 @@ CMPIrc make_cmpi_instance(const CMPIBroker* broker, const Instance* instance, co
     return CMPI_RC_OK;
 }
 
+namespace
+{
+
+// Fills an instance (a new one of meta_class when it is empty) from a container and places it in the name space.
+CMPIrc take(Container& container, const Meta_Class* meta_class, uint32 mask, const String& name_space, Ref<Instance>& instance)
+{
+    if (container.convert(meta_class, mask, instance) != 0)
+        return CMPI_RC_ERR_FAILED;
+    __set_name_space_recursive(instance.ptr(), name_space.c_str(), false);
+    return CMPI_RC_OK;
+}
+
+} // namespace
+
 CMPIrc make_cimple_instance(const CMPIBroker* broker, const Meta_Class* meta_class, const CMPIObjectPath* path,
                             const CMPIInstance* cmpi_instance, Ref<Instance>& instance)
 {
+    instance.reset();
     if (!cmpi_instance)
         return CMPI_RC_ERR_FAILED;
     const String name_space = name_space_of(path);
     CMPIInstance_Container container(meta_class->meta_repository, broker, name_space.c_str(), cmpi_instance);
-    Ref<Instance> made;
-    if (container.convert(meta_class, 0, made) != 0)
-        return CMPI_RC_ERR_FAILED;
-    __set_name_space_recursive(made.ptr(), name_space.c_str(), false);
-    instance = std::move(made);
-    return CMPI_RC_OK;
+    return take(container, meta_class, 0, name_space, instance);
 }
 
 CMPIrc make_cimple_reference(const CMPIBroker* broker, const Meta_Class* meta_class, const CMPIObjectPath* path,
                              Ref<Instance>& instance)
 {
+    instance.reset();
     const String name_space = name_space_of(path);
     CMPIObjectPath_Container container(meta_class->meta_repository, broker, name_space.c_str(), path);
-    Ref<Instance> made;
-    if (container.convert(meta_class, Flag_Key, made) != 0)
+    return take(container, meta_class, Flag_Key, name_space, instance);
+}
+
+CMPIrc make_cimple_method(const CMPIBroker* broker, const Meta_Class* meta_class, const Meta_Method* meta_method,
+                          const CMPIObjectPath* path, const CMPIArgs* in, Ref<Instance>& method)
+{
+    method.reset(create(meta_method));
+    const String name_space = name_space_of(path);
+    CMPIArgs_Container container(meta_class->meta_repository, broker, name_space.c_str(), in);
+    return take(container, nullptr, Flag_In, name_space, method);
+}
+
+// Nothing is looked up on the way out: there is no repository.
+CMPIrc make_cmpi_method(const CMPIBroker* broker, const char* name_space, const Instance* method, CMPIArgs* out,
+                        CMPI_Data& return_value)
+{
+    CMPIArgs_Container container(nullptr, broker, name_space, out);
+    if (container.convert(method, Flag_Out) != 0)
         return CMPI_RC_ERR_FAILED;
-    __set_name_space_recursive(made.ptr(), name_space.c_str(), false);
-    instance = std::move(made);
+    return_value = std::move(container.return_value());
     return CMPI_RC_OK;
 }
 

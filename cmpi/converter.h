@@ -32,6 +32,16 @@ CMPIrc make_cimple_instance(const CMPIBroker* broker, const Meta_Class* meta_cla
 CMPIrc make_cimple_reference(const CMPIBroker* broker, const Meta_Class* meta_class, const CMPIObjectPath* path,
                              Ref<Instance>& instance);
 
+// The parameter record of a method of meta_class with the input arguments (null: none): parameters that no argument names,
+// outputs and the return value are null. Name spaces as for make_cimple_instance.
+CMPIrc make_cimple_method(const CMPIBroker* broker, const Meta_Class* meta_class, const Meta_Method* meta_method,
+                          const CMPIObjectPath* path, const CMPIArgs* in, Ref<Instance>& method);
+
+// The non-null outputs of a parameter record become arguments in `out` (null: nobody asks), its return value `return_value`,
+// which stays empty when the method set none.
+CMPIrc make_cmpi_method(const CMPIBroker* broker, const char* name_space, const Instance* method, CMPIArgs* out,
+                        CMPI_Data& return_value);
+
 // Data become a value of the matching type; a null value if their state says so. References become instances with the keys
 // of the referenced object, embedded objects whole instances: their classes are looked up in the repository.
 int cmpi_to_cimple_value(const Meta_Repository* repository, const CMPIBroker* broker, const char* name_space,

@@ -1,4 +1,5 @@
 // The instance interface of an adapter.
+#include "cmpi/answer.h"
 #include "cmpi/cmpi_objects.h"
 #include "cmpi/converter.h"
 #include "cmpi/request.h"
@@ -10,47 +11,25 @@ namespace zmlr
 namespace
 {
 
-// What the enumeration callbacks work with.
-struct Enumeration
+CMPIrc send_path(const Answer& answer, Instance* object)
 {
-    const CMPIBroker* broker;
-    const CMPIResult* result;
-    String name_space; // of the request's path
-    const char** properties;
-    CMPIrc rc = CMPI_RC_OK; // of the first object that could not be converted
-};
-
-bool return_object_path(Instance* instance, Enum_Instances_Status, void* client_data)
-{
-    const Ref<Instance> object(instance);
-    auto& e = *static_cast<Enumeration*>(client_data);
-    if (!object || e.rc != CMPI_RC_OK)
-        return false;
-
     CMPI_Ptr<CMPIObjectPath> path;
-    e.rc = make_cmpi_object_path(e.broker, object.ptr(), e.name_space.c_str(), path);
-    if (e.rc != CMPI_RC_OK)
-        return false;
-    CMReturnObjectPath(e.result, path.get());
-    return true;
+    const CMPIrc rc = make_cmpi_object_path(answer.broker, object, answer.name_space.c_str(), path);
+    if (rc == CMPI_RC_OK)
+        CMReturnObjectPath(answer.result, path.get());
+    return rc;
 }
 
-bool return_instance(Instance* instance, Enum_Instances_Status, void* client_data)
+CMPIrc send_instance(const Answer& answer, Instance* object)
 {
-    const Ref<Instance> object(instance);
-    auto& e = *static_cast<Enumeration*>(client_data);
-    if (!object || e.rc != CMPI_RC_OK)
-        return false;
-
     CMPI_Ptr<CMPIObjectPath> path;
     CMPI_Ptr<CMPIInstance> cmpi_instance;
-    e.rc = make_cmpi_object_path(e.broker, object.ptr(), e.name_space.c_str(), path);
-    if (e.rc == CMPI_RC_OK)
-        e.rc = make_cmpi_instance(e.broker, object.ptr(), e.name_space.c_str(), path.get(), e.properties, cmpi_instance);
-    if (e.rc != CMPI_RC_OK)
-        return false;
-    CMReturnInstance(e.result, cmpi_instance.get());
-    return true;
+    CMPIrc rc = make_cmpi_object_path(answer.broker, object, answer.name_space.c_str(), path);
+    if (rc == CMPI_RC_OK)
+        rc = make_cmpi_instance(answer.broker, object, answer.name_space.c_str(), path.get(), answer.properties, cmpi_instance);
+    if (rc == CMPI_RC_OK)
+        CMReturnInstance(answer.result, cmpi_instance.get());
+    return rc;
 }
 
 // An instance with the keys of the request's path. Its class is the requested one.
@@ -69,24 +48,25 @@ CMPIrc make_instance(const CMPI_Adapter& adapter, const CMPIObjectPath* path, co
 
 // ---- the requests ----
 
-CMPIrc enumerate_names(CMPI_Adapter& adapter, const CMPIResult* result, const CMPIObjectPath* path)
+CMPIrc enumerate_names(CMPI_Adapter& adapter, const CMPIContext* context, const CMPIResult* result, const CMPIObjectPath* path)
 {
     Ref<Instance> model;
     CMPIrc rc = make_model(adapter, path, model);
     if (rc != CMPI_RC_OK)
         return rc;
 
-    Enumeration enumeration{adapter.broker, result, name_space_of(path), nullptr};
-    const auto status = adapter.enum_instances(model.ptr(), return_object_path, &enumeration);
+    Answer answer{adapter.broker, context, result, name_space_of(path), nullptr};
+    const auto status = adapter.enum_instances(model.ptr(), answer_with<send_path>, &answer);
     rc = to_rc(status);
     if (rc == CMPI_RC_OK)
-        rc = enumeration.rc;
+        rc = answer.rc;
     if (rc == CMPI_RC_OK && status == ENUM_INSTANCES_OK)
         CMReturnDone(result);
     return rc;
 }
 
-CMPIrc enumerate(CMPI_Adapter& adapter, const CMPIResult* result, const CMPIObjectPath* path, const char** properties)
+CMPIrc enumerate(CMPI_Adapter& adapter, const CMPIContext* context, const CMPIResult* result, const CMPIObjectPath* path,
+                 const char** properties)
 {
     Ref<Instance> model;
     CMPIrc rc = make_model(adapter, path, model);
@@ -95,10 +75,10 @@ CMPIrc enumerate(CMPI_Adapter& adapter, const CMPIResult* result, const CMPIObje
     if (properties)
         filter_properties(model.ptr(), properties, true);
 
-    Enumeration enumeration{adapter.broker, result, name_space_of(path), properties};
-    rc = to_rc(adapter.enum_instances(model.ptr(), return_instance, &enumeration));
+    Answer answer{adapter.broker, context, result, name_space_of(path), properties};
+    rc = to_rc(adapter.enum_instances(model.ptr(), answer_with<send_instance>, &answer));
     if (rc == CMPI_RC_OK)
-        rc = enumeration.rc;
+        rc = answer.rc;
     if (rc == CMPI_RC_OK)
         CMReturnDone(result);
     return rc;
@@ -189,14 +169,14 @@ CMPIStatus CMPI_Adapter::instanceCleanup(CMPIInstanceMI* mi, const CMPIContext* 
 CMPIStatus CMPI_Adapter::enumInstanceNames(CMPIInstanceMI* mi, const CMPIContext* context, const CMPIResult* result,
                                            const CMPIObjectPath* path) noexcept
 {
-    const auto work = [&](CMPI_Adapter& adapter) { return enumerate_names(adapter, result, path); };
+    const auto work = [&](CMPI_Adapter& adapter) { return enumerate_names(adapter, context, result, path); };
     return serve("enumInstanceNames", mi, context, work);
 }
 
 CMPIStatus CMPI_Adapter::enumInstances(CMPIInstanceMI* mi, const CMPIContext* context, const CMPIResult* result,
                                        const CMPIObjectPath* path, const char** properties) noexcept
 {
-    const auto work = [&](CMPI_Adapter& adapter) { return enumerate(adapter, result, path, properties); };
+    const auto work = [&](CMPI_Adapter& adapter) { return enumerate(adapter, context, result, path, properties); };
     return serve("enumInstances", mi, context, work);
 }
 

@@ -10,20 +10,32 @@
 namespace zmlr
 {
 
-// Runs work(adapter), which answers a CMPIrc, as the handler `name` of the interface.
+// Runs work(adapter), which answers a CMPIrc, traced and under the adapter's lock.
+template <class Work> CMPIrc locked(const char* name, CMPI_Adapter* adapter, Work work)
+{
+    const Auto_Mutex guard(adapter->lock);
+    ent(name);
+    const CMPIrc answer = shielded(name, [&] { return work(*adapter); });
+    ret(name, answer);
+    return answer;
+}
+
+// Runs work(adapter) as the handler `name` of the interface.
 template <class MI, class Work> CMPIStatus serve(const char* name, MI* mi, const CMPIContext* context, Work work) noexcept
 {
     const auto request = [&]
     {
         CMPI_Adapter* adapter = CMPI_Adapter::of(mi);
         const CMPI_Thread_Context_Pusher pusher(adapter->broker, context, adapter);
-        const Auto_Mutex guard(adapter->lock);
-        ent(name);
-        const CMPIrc answer = shielded(name, [&] { return work(*adapter); });
-        ret(name, answer);
-        return answer;
+        return locked(name, adapter, work);
     };
     return {shielded(name, request), nullptr};
+}
+
+// The same without a thread context, for what never reaches the provider.
+template <class MI, class Work> CMPIStatus serve_alone(const char* name, MI* mi, Work work) noexcept
+{
+    return {shielded(name, [&] { return locked(name, CMPI_Adapter::of(mi), work); }), nullptr};
 }
 
 // The common cleanup, traced as the cleanup function `name`. The adapter's lock is not taken: the adapter may end here, and a

@@ -88,4 +88,68 @@ CMPIrc to_rc(Delete_Instance_Status status)
     }
 }
 
+CMPIrc to_rc(Enum_Associators_Status status)
+{
+    switch (status)
+    {
+    case ENUM_ASSOCIATORS_FAILED:
+        return CMPI_RC_ERR_FAILED;
+    case ENUM_ASSOCIATORS_UNSUPPORTED:
+        return CMPI_RC_ERR_NOT_SUPPORTED;
+    case ENUM_ASSOCIATORS_ACCESS_DENIED:
+        return CMPI_RC_ERR_ACCESS_DENIED;
+    default:
+        return CMPI_RC_OK;
+    }
+}
+
+CMPIrc to_rc(Enum_Associator_Names_Status status)
+{
+    switch (status)
+    {
+    case ENUM_ASSOCIATOR_NAMES_FAILED:
+        return CMPI_RC_ERR_FAILED;
+    case ENUM_ASSOCIATOR_NAMES_UNSUPPORTED:
+        return CMPI_RC_ERR_NOT_SUPPORTED;
+    case ENUM_ASSOCIATOR_NAMES_ACCESS_DENIED:
+        return CMPI_RC_ERR_ACCESS_DENIED;
+    default:
+        return CMPI_RC_OK;
+    }
+}
+
+CMPIrc to_rc(Enum_References_Status status)
+{
+    switch (status)
+    {
+    case ENUM_REFERENCES_FAILED:
+        return CMPI_RC_ERR_FAILED;
+    case ENUM_REFERENCES_UNSUPPORTED:
+        return CMPI_RC_ERR_NOT_SUPPORTED;
+    case ENUM_REFERENCES_ACCESS_DENIED:
+        return CMPI_RC_ERR_ACCESS_DENIED;
+    default:
+        return CMPI_RC_OK;
+    }
+}
+
+CMPIrc to_rc(Invoke_Method_Status status)
+{
+    switch (status)
+    {
+    case INVOKE_METHOD_FAILED:
+        return CMPI_RC_ERR_FAILED;
+    case INVOKE_METHOD_UNSUPPORTED:
+        return CMPI_RC_ERR_NOT_SUPPORTED;
+    case INVOKE_METHOD_ACCESS_DENIED:
+        return CMPI_RC_ERR_ACCESS_DENIED;
+    default:
+        return CMPI_RC_OK;
+    }
+}
+
+CMPIrc to_rc(Enable_Indications_Status status) { return status == ENABLE_INDICATIONS_FAILED ? CMPI_RC_ERR_FAILED : CMPI_RC_OK; }
+
+CMPIrc to_rc(Disable_Indications_Status status) { return status == DISABLE_INDICATIONS_FAILED ? CMPI_RC_ERR_FAILED : CMPI_RC_OK; }
+
 } // namespace zmlr

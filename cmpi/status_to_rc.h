@@ -16,5 +16,11 @@ CMPIrc to_rc(Get_Instance_Status status);
 CMPIrc to_rc(Create_Instance_Status status);
 CMPIrc to_rc(Modify_Instance_Status status);
 CMPIrc to_rc(Delete_Instance_Status status);
+CMPIrc to_rc(Enum_Associators_Status status);
+CMPIrc to_rc(Enum_Associator_Names_Status status);
+CMPIrc to_rc(Enum_References_Status status);
+CMPIrc to_rc(Invoke_Method_Status status);
+CMPIrc to_rc(Enable_Indications_Status status);
+CMPIrc to_rc(Disable_Indications_Status status);
 
 } // namespace zmlr

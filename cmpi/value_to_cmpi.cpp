@@ -5,6 +5,8 @@
 #include "runtime/log.h"
 
 #include <cstring>
+#include <utility>
+#include <vector>
 
 namespace zmlr
 {
@@ -98,16 +100,16 @@ template <class T> int to_cmpi_array(const Target& target, CMPIType element_type
     CMPI_Ptr<CMPIArray> array(CMNewArray(target.broker, elements.size(), element_type, nullptr));
     if (!array)
         return failed("CMNewArray() failed");
+    std::vector<CMPI_Data> made(elements.size());
     for (uint32 i = 0; i < elements.size(); ++i)
     {
-        CMPI_Data element;
+        CMPI_Data& element = made[i];
         if (to_cmpi_scalar(target, element_type, elements[i], element) != 0)
             return failed("element conversion failed");
         if (!okay(CMSetArrayElementAt(array.get(), i, element.value(), element.type())))
             return failed("CMSetArrayElementAt() failed");
-        element.leave(); // some servers keep the element itself in the array, others a copy: its life is theirs
     }
-    return data.adopt(array.release(), element_type) ? 0 : -1;
+    return data.adopt(array.release(), element_type, std::move(made)) ? 0 : -1;
 }
 
 template <class T> int to_cmpi(const Target& target, CMPIType element_type, const Value& value, CMPI_Data& data)

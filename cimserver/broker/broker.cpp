@@ -11,13 +11,21 @@ Broker::Broker(const Repository& repository)
 {
 }
 
-Operations& Broker::operations() const
+namespace
 {
-    Operations* operations = _operations;
-    if (!operations)
+
+template <class T> T& named(T* whoever)
+{
+    if (!whoever)
         throw Failure{CMPI_RC_ERR_NOT_SUPPORTED};
-    return *operations;
+    return *whoever;
 }
+
+} // namespace
+
+Operations& Broker::operations() const { return named(_operations.load()); }
+
+Indication_Sink& Broker::indication_sink() const { return named(_indication_sink.load()); }
 
 const Broker& broker_of(const CMPIBroker* face)
 {

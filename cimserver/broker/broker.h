@@ -1,9 +1,11 @@
 // Broker: what the server lends to the module: the CMPI broker with its three function tables.
 //
-// Objects can be made and examined, threads attached, and instances read back through the server (up-calls), on any thread
-// and from within a request. Everything else a provider may call answers CMPI_RC_ERR_NOT_SUPPORTED.
+// Objects can be made and examined, threads attached, indications delivered, and instances read back through the server
+// (up-calls), on any thread and from within a request. Everything else a provider may call answers
+// CMPI_RC_ERR_NOT_SUPPORTED.
 #pragma once
 
+#include "cimserver/broker/model.h"
 #include "cimserver/broker/repository.h"
 
 #include <cmpift.h>
@@ -14,6 +16,20 @@ namespace cimserver
 {
 
 class Operations;
+
+// Takes the indications that providers raise.
+class Indication_Sink
+{
+public:
+    Indication_Sink() = default;
+    virtual ~Indication_Sink() = default;
+    Indication_Sink(const Indication_Sink&) = delete;
+    Indication_Sink& operator=(const Indication_Sink&) = delete;
+
+    // Called on a thread of the module, which holds its provider's lock meanwhile: must neither wait for a listener nor call
+    // the provider. What it throws becomes the module's return code (Failure's own; CMPI_RC_ERR_FAILED for any other).
+    virtual void deliver(const std::string& name_space, const Instance& indication) = 0;
+};
 
 class Broker
 {
@@ -30,10 +46,15 @@ public:
     void set_operations(Operations* operations) { _operations = operations; }
     Operations& operations() const; // throws Failure NOT_SUPPORTED when nobody is named
 
+    // Who takes indications; null (as at first): nobody. Whoever is named must stay until the module is closed.
+    void set_indication_sink(Indication_Sink* sink) { _indication_sink = sink; }
+    Indication_Sink& indication_sink() const; // throws Failure NOT_SUPPORTED when nobody is named
+
 private:
     CMPIBroker _face;
     const Repository& _repository;
     std::atomic<Operations*> _operations = nullptr;
+    std::atomic<Indication_Sink*> _indication_sink = nullptr;
 };
 
 // The broker behind its handle. Throws INVALID_HANDLE.

@@ -118,6 +118,11 @@ CMPIAssociationMI* Module::association_mi(const Class_Entry& entry)
 
 CMPIMethodMI* Module::method_mi(const Class_Entry& entry) { return interface(entry, &Provider::method_mi, "_Create_MethodMI"); }
 
+CMPIIndicationMI* Module::indication_mi(const Class_Entry& entry)
+{
+    return interface(entry, &Provider::indication_mi, "_Create_IndicationMI");
+}
+
 template <class MI> MI* Module::interface(const Class_Entry& entry, std::atomic<MI*> Provider::*slot, const char* suffix)
 {
     Provider& provider = *_providers.at(&entry);

@@ -39,11 +39,12 @@ public:
     const Repository& repository() const { return _repository; }
     Broker& broker() { return _broker; }
 
-    // The interfaces of a served class; null when the module offers none of the kind for it. Safe from any thread; an up-call
-    // of the factory may come back here. Throws Cim_Error when the factory fails.
+    // The interfaces of a served class; null when the module does not offer that kind for it. Safe from any thread; an
+    // up-call of the factory may come back here. Throws Cim_Error when the factory fails.
     CMPIInstanceMI* instance_mi(const Class_Entry& entry);
     CMPIAssociationMI* association_mi(const Class_Entry& entry);
     CMPIMethodMI* method_mi(const Class_Entry& entry);
+    CMPIIndicationMI* indication_mi(const Class_Entry& entry);
 
     // Keeps the module loaded while a request runs. Throws Cim_Error once the module is being closed.
     class Use
@@ -73,6 +74,7 @@ private:
         std::atomic<CMPIInstanceMI*> instance_mi = nullptr;
         std::atomic<CMPIAssociationMI*> association_mi = nullptr;
         std::atomic<CMPIMethodMI*> method_mi = nullptr;
+        std::atomic<CMPIIndicationMI*> indication_mi = nullptr;
         bool being_made = false;
     };
 

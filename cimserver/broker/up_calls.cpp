@@ -130,9 +130,16 @@ CMPIInstance* get_instance(const CMPIBroker* broker, const CMPIContext* context,
                                  });
 }
 
-CMPIStatus deliver_indication(const CMPIBroker*, const CMPIContext*, const char*, const CMPIInstance*) noexcept
+CMPIStatus deliver_indication(const CMPIBroker* broker, const CMPIContext* context, const char* name_space,
+                              const CMPIInstance* indication) noexcept
 {
-    return not_supported();
+    return answer(
+        [&]
+        {
+            object<Context_Object>(context);
+            const auto& instance = object<Instance_Object>(indication);
+            broker_of(broker).indication_sink().deliver(required(name_space), instance.model());
+        });
 }
 
 CMPIObjectPath* create_instance(const CMPIBroker*, const CMPIContext*, const CMPIObjectPath*, const CMPIInstance*,
