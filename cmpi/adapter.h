@@ -5,6 +5,7 @@
 // code without a message. No exception leaves them.
 #pragma once
 
+#include "cmpi/gate.h"
 #include "cmpi/provider_handle.h"
 #include "cmpi/static_data.h"
 #include "runtime/assert.h"
@@ -13,6 +14,8 @@
 
 #include <cmpift.h>
 
+#include <atomic>
+#include <memory>
 #include <vector>
 
 namespace zmlr
@@ -95,11 +98,13 @@ public:
     const CMPIBroker* broker; // the one of the first factory call: servers may have one per provider
     CMPI_Static_Data* sd;
     uint32 load_count = 1; // interfaces that the server holds
-    bool allow_unload = true;
+    std::atomic<bool> allow_unload = true;
     std::vector<Name_Space_Entry> name_spaces; // in the order of their first filters
     const Meta_Class* mc = nullptr;
     bool indications_enabled = false;
-    Mutex lock{true};              // held for the whole of a request
+    Gate requests;                                                // every request is inside
+    std::shared_ptr<Gate> broker_gate = std::make_shared<Gate>(); // provider threads are inside while they use the broker
+    Mutex lock{true};                                             // held for the whole of a request
     Mutex indication_switch{true}; // held while indications are enabled or disabled; comes before `lock`
 
 private:

@@ -195,7 +195,7 @@ CMPIrc answer_references(const Association_Request& request, void (*prepare_mode
 CMPIStatus CMPI_Adapter::associationCleanup(CMPIAssociationMI* mi, const CMPIContext*, CMPIBoolean terminating) noexcept
 {
     constexpr const char* name = "associationCleanup";
-    return {shielded(name, [&] { return traced_cleanup(name, CMPI_Adapter::of(mi), terminating); }), nullptr};
+    return {shielded(name, [&] { return traced_cleanup(name, leaving(mi), terminating); }), nullptr};
 }
 
 CMPIStatus CMPI_Adapter::associators(CMPIAssociationMI* mi, const CMPIContext* context, const CMPIResult* result,

@@ -3,23 +3,38 @@
 #include "cmpi/cmpi_trace.h"
 #include "cmpi/shell.h"
 
-#include <memory>
-#include <mutex>
+#include <atomic>
 
 namespace zmlr
 {
 
+constinit std::recursive_mutex life_lock;
+
 namespace
 {
 
-// Recursive: a provider that loads may call into the server, which may ask for another provider of this module.
-constinit std::recursive_mutex life_lock;
+// Counts the adapters that have gone, for factories that wait for one to.
+constinit std::atomic<unsigned> departures = 0;
 
 template <class MI, class FT> MI* hand_out(MI& mi, FT& ft, CMPI_Static_Data* sd)
 {
     mi.hdl = sd;
     mi.ft = &ft;
     return &mi;
+}
+
+// Takes the lock when no adapter, or one that stays, is attached to the static data.
+std::unique_lock<std::recursive_mutex> lock_settled(const CMPI_Static_Data* sd)
+{
+    for (;;)
+    {
+        std::unique_lock lock(life_lock);
+        if (!sd->adapter || !sd->adapter->requests.is_shut())
+            return lock;
+        const unsigned seen = departures;
+        lock.unlock();
+        departures.wait(seen);
+    }
 }
 
 void* interface_of(CMPI_Static_Data* sd, char kind)
@@ -43,21 +58,31 @@ void* interface_of(CMPI_Static_Data* sd, char kind)
 
 CMPIrc cleanup(CMPI_Adapter* adapter, bool terminating)
 {
-    const std::lock_guard guard(life_lock);
-    if (!terminating && !adapter->allow_unload)
-        return CMPI_RC_DO_NOT_UNLOAD;
-    if (adapter->load_count != 1)
     {
-        --adapter->load_count;
-        return CMPI_RC_OK;
+        const std::lock_guard guard(life_lock);
+        if (!terminating && !adapter->allow_unload)
+            return CMPI_RC_DO_NOT_UNLOAD;
+        if (adapter->load_count != 1)
+        {
+            --adapter->load_count;
+            return CMPI_RC_OK;
+        }
+        adapter->requests.shut();
     }
-    const std::unique_ptr<CMPI_Adapter> last(adapter);
+    adapter->requests.wait();
     const auto unload = [&]
     {
-        last->unload();
+        adapter->unload();
         return CMPI_RC_OK;
     };
     shielded("unload", unload); // the adapter goes in any case: nobody asks for the status
+    adapter->broker_gate->shut();
+    adapter->broker_gate->wait();
+
+    const std::lock_guard guard(life_lock);
+    delete adapter;
+    ++departures;
+    departures.notify_all();
     return CMPI_RC_OK;
 }
 
@@ -70,7 +95,7 @@ int cimple_cmpi_adapter(char, zmlr::CMPI_Static_Data* sd, const zmlr::Registrati
     *mi = nullptr;
     const auto attach = [&]
     {
-        const std::lock_guard guard(life_lock);
+        const auto lock = lock_settled(sd);
         if (sd->adapter)
             ++sd->adapter->load_count;
         else

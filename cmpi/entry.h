@@ -1,18 +1,49 @@
 // The way of a CIM server into a provider and out of it: what every factory function calls, and what every cleanup ends in.
 //
-// Both hold one lock of the process, so that factories of one provider may race. (A provider that unloads must not wait for
-// a thread that may ask the server for another interface of this module.)
+// One lock of the process guards which adapters there are, so that factories and cleanups may race. Nobody waits for another
+// thread while holding it.
 #pragma once
 
 #include "cmpi/adapter.h"
 
+#include <mutex>
+
 namespace zmlr
 {
 
+// Recursive: a provider that loads may call into the server, which may ask for another provider of this module.
+extern constinit std::recursive_mutex life_lock;
+
 // What a cleanup function of any interface does: keeps everything and answers CMPI_RC_DO_NOT_UNLOAD while unloading is not
-// allowed (a terminating server is not asked), else gives up one interface; with the last one the provider is unloaded and
-// the adapter destroyed.
+// allowed (a terminating server is not asked), else gives up one interface. With the last one the provider goes: requests
+// that still run are waited for and new ones refused, the provider is unloaded, its threads leave the broker for good, and
+// the adapter is destroyed. Not to be called from within a request of the same provider.
 CMPIrc cleanup(CMPI_Adapter* adapter, bool terminating);
+
+// A request's hold on the adapter of its interface, which stays for this long.
+class Adapter_Use
+{
+public:
+    template <class MI> explicit Adapter_Use(MI* mi)
+    {
+        const std::lock_guard guard(life_lock);
+        CMPI_Adapter* adapter = CMPI_Adapter::of(mi);
+        if (adapter->requests.enter())
+            _adapter = adapter;
+    }
+    ~Adapter_Use()
+    {
+        if (_adapter)
+            _adapter->requests.leave();
+    }
+    Adapter_Use(const Adapter_Use&) = delete;
+    Adapter_Use& operator=(const Adapter_Use&) = delete;
+
+    CMPI_Adapter* adapter() const { return _adapter; } // null when the adapter is going
+
+private:
+    CMPI_Adapter* _adapter = nullptr;
+};
 
 } // namespace zmlr
 

@@ -66,20 +66,24 @@ void deliver(const CMPI_Thread_Context& thread_context, const Instance* indicati
 // What the provider calls for each indication that it raises, on a thread of its own, and once with null at the end.
 bool _indication_proc(Instance* instance, void* client_data) noexcept
 {
+    const Ref<Instance> indication(instance);
+    if (!indication)
+        return false;
+    const auto* thread_context = static_cast<CMPI_Thread_Context*>(Thread_Context::top());
+    check(thread_context != nullptr, "thread_context != 0");
+    const Gate_Pass pass(thread_context->gate());
+    if (!pass)
+        return false; // the adapter is gone
+
     const auto work = [&]
     {
         auto& adapter = *static_cast<CMPI_Adapter*>(client_data);
-        const Ref<Instance> indication(instance);
         const Auto_Mutex guard(adapter.lock);
-        const auto* thread_context = static_cast<CMPI_Thread_Context*>(Thread_Context::top());
-        check(thread_context != nullptr, "thread_context != 0");
         const auto entries = adapter.name_spaces; // a delivery may come back and change them
         for (const Name_Space_Entry& entry : entries)
             deliver(*thread_context, indication.ptr(), entry.name.c_str());
         return CMPI_RC_OK;
     };
-    if (!instance)
-        return false;
     shielded("_indication_proc", work);
     return true;
 }

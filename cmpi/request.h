@@ -20,12 +20,15 @@ template <class Work> CMPIrc locked(const char* name, CMPI_Adapter* adapter, Wor
     return answer;
 }
 
-// Runs work(adapter) as the handler `name` of the interface.
+// Runs work(adapter) as the handler `name` of the interface. A request that comes when the adapter is going fails.
 template <class MI, class Work> CMPIStatus serve(const char* name, MI* mi, const CMPIContext* context, Work work) noexcept
 {
     const auto request = [&]
     {
-        CMPI_Adapter* adapter = CMPI_Adapter::of(mi);
+        const Adapter_Use use(mi);
+        CMPI_Adapter* adapter = use.adapter();
+        if (!adapter)
+            return CMPI_RC_ERR_FAILED;
         const CMPI_Thread_Context_Pusher pusher(adapter->broker, context, adapter);
         return locked(name, adapter, work);
     };
@@ -35,7 +38,19 @@ template <class MI, class Work> CMPIStatus serve(const char* name, MI* mi, const
 // The same without a thread context, for what never reaches the provider.
 template <class MI, class Work> CMPIStatus serve_alone(const char* name, MI* mi, Work work) noexcept
 {
-    return {shielded(name, [&] { return locked(name, CMPI_Adapter::of(mi), work); }), nullptr};
+    const auto request = [&]
+    {
+        const Adapter_Use use(mi);
+        return use.adapter() ? locked(name, use.adapter(), work) : CMPI_RC_ERR_FAILED;
+    };
+    return {shielded(name, request), nullptr};
+}
+
+// The adapter of an interface that is given up: it stays until it is.
+template <class MI> CMPI_Adapter* leaving(MI* mi)
+{
+    const std::lock_guard guard(life_lock);
+    return CMPI_Adapter::of(mi);
 }
 
 // The common cleanup, traced as the cleanup function `name`. The adapter's lock is not taken: the adapter may end here, and a
@@ -54,7 +69,7 @@ CMPIStatus serve_cleanup(const char* name, MI* mi, const CMPIContext* context, C
 {
     const auto request = [&]
     {
-        CMPI_Adapter* adapter = CMPI_Adapter::of(mi);
+        CMPI_Adapter* adapter = leaving(mi);
         const CMPI_Thread_Context_Pusher pusher(adapter->broker, context, adapter);
         return traced_cleanup(name, adapter, terminating);
     };

@@ -1,6 +1,9 @@
-// CMPI_Thread_Context: what the calling thread works in: the broker, the CMPI context of the request and the adapter.
+// CMPI_Thread_Context: what the calling thread works in: the broker, the CMPI context of the request and the adapter; and
+// through them the calls of providers into the CIM server.
 #pragma once
 
+#include "cmpi/cmpi_objects.h"
+#include "cmpi/gate.h"
 #include "runtime/thread_context.h"
 
 #include <cmpift.h>
@@ -12,6 +15,9 @@ namespace zmlr
 
 class CMPI_Adapter;
 
+// A request's context borrows the request's CMPI context. A provider thread's owns one that its server made for it; such a
+// thread may outlive adapter and broker: the gate that both share is shut then, and whatever would reach the server answers
+// its failure.
 class CMPI_Thread_Context : public Thread_Context
 {
 public:
@@ -21,32 +27,40 @@ public:
         , _cmpi_adapter(adapter)
     {
     }
+    ~CMPI_Thread_Context() override;
 
     const CMPIBroker* cmpi_broker() const { return _cmpi_broker; }
     const CMPIContext* cmpi_context() const { return _cmpi_context; }
     CMPI_Adapter* cmpi_adapter() const { return _cmpi_adapter; }
+    Gate* gate() const { return _gate.get(); } // to be passed before broker or adapter are used; null for a request's
 
-    // There is no way back into the server yet: a new thread gets no context, and every call answers its failure.
-    Thread_Context* thread_create_hook(void*) override { return nullptr; }
-    void thread_start_hook() noexcept override {}
-    void thread_exit_hook() noexcept override {}
-    int instance_enumerator_create(const char*, const Instance*, Instance_Enumerator_Rep*&) override { return -1; }
-    void instance_enumerator_destroy(Instance_Enumerator_Rep*) override {}
-    bool instance_enumerator_more(const Instance_Enumerator_Rep*) override { return false; }
-    void instance_enumerator_next(Instance_Enumerator_Rep*) override {}
-    Ref<Instance> instance_enumerator_get(const Instance_Enumerator_Rep*) override { return {}; }
-    Ref<Instance> get_instance(const char*, const Instance*) override { return {}; }
-    int create_instance(const char*, const Instance*) override { return -1; }
-    int delete_instance(const char*, const Instance*) override { return -1; }
-    int modify_instance(const char*, const Instance*) override { return -1; }
-    int invoke_method(const char*, const Instance*, Instance*) override { return -1; }
-    void allow_unload(bool) override {}
-    bool get_username(String&) override { return false; }
+    Thread_Context* thread_create_hook(void* arg) override;
+    void thread_start_hook() noexcept override;
+    void thread_exit_hook() noexcept override;
+
+    // The elements are converted to the model's class; one that is no instance ends the enumeration.
+    int instance_enumerator_create(const char* name_space, const Instance* model, Instance_Enumerator_Rep*& rep) override;
+    void instance_enumerator_destroy(Instance_Enumerator_Rep* rep) override;
+    bool instance_enumerator_more(const Instance_Enumerator_Rep* rep) override;
+    void instance_enumerator_next(Instance_Enumerator_Rep* rep) override;
+    Ref<Instance> instance_enumerator_get(const Instance_Enumerator_Rep* rep) override;
+
+    Ref<Instance> get_instance(const char* name_space, const Instance* instance) override;
+    int create_instance(const char* name_space, const Instance* instance) override;
+    int delete_instance(const char* name_space, const Instance* instance) override;
+    int modify_instance(const char* name_space, const Instance* instance) override;
+    int invoke_method(const char* name_space, const Instance* instance, Instance* method) override;
+
+    void allow_unload(bool flag) override;
+    bool get_username(String& username) override;
 
 private:
     const CMPIBroker* _cmpi_broker;
     const CMPIContext* _cmpi_context;
     CMPI_Adapter* _cmpi_adapter;
+    std::shared_ptr<Gate> _gate;
+    CMPI_Ptr<CMPIContext> _prepared; // until the thread is attached: then the server frees it when the thread detaches
+    bool _attached = false;
 };
 
 // Puts a context on the calling thread's stack for a scope. None of the arguments may be null, and contexts pushed

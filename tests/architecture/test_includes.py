@@ -23,6 +23,7 @@ MAY_INCLUDE = {
         "diagnostics",
         "indications",
         "schema",
+        "cmpi/cimom.h",
         "cmpi/provider.h",
         "cmpi/handlers.h",
         "cmpi/status.h",

@@ -235,17 +235,6 @@ TEST_F(Instance_Requests, fail_for_a_class_that_the_provider_does_not_serve)
 
 TEST_F(Instance_Requests, take_a_superclass_for_the_served_class)
 {
-    static const Registration disk_registration = {
-        "Test_Module", "Test_Disk_Provider",
-        [](const Registration* r, int operation, void* a0, void* a1, void* a2, void* a3, void* a4, void* a5, void* a6, void* a7)
-        {
-            const int answer = thing_registration.provider_proc(r, operation, a0, a1, a2, a3, a4, a5, a6, a7);
-            if (operation == OPERATION_GET_META_CLASS)
-                *static_cast<const Meta_Class**>(a0) = &Test_Disk::static_meta_class;
-            return answer;
-        },
-        &Test_Disk::static_meta_class, nullptr};
-    CMPI_Static_Data disk_data = {};
     mi = interface<CMPIInstanceMI>('I', disk_data, disk_registration);
     EXPECT_EQ(enumerate(thing_path("a", "Test_Thing")), CMPI_RC_OK);
     EXPECT_EQ(script.model->meta_class, &Test_Disk::static_meta_class);

@@ -1,5 +1,6 @@
 #include "tests/cmpi/served_provider.h"
 
+#include "cimserver/broker/conversion.h"
 #include "cimserver/broker/objects.h"
 #include "tests/runtime/home.h"
 
@@ -18,6 +19,12 @@ Recorded_Result& recorder(const CMPIResult* result) { return *static_cast<Record
 CMPIStatus return_instance(const CMPIResult* result, const CMPIInstance* instance)
 {
     recorder(result).instances.push_back(cimserver::object<cimserver::Instance_Object>(instance).model());
+    return {CMPI_RC_OK, nullptr};
+}
+
+CMPIStatus return_data(const CMPIResult* result, const CMPIValue* value, CMPIType type)
+{
+    recorder(result).data.push_back(cimserver::from_cmpi(value, type));
     return {CMPI_RC_OK, nullptr};
 }
 
@@ -48,7 +55,7 @@ public:
 
 Logging_Home& logging_home = *static_cast<Logging_Home*>(testing::AddGlobalTestEnvironment(new Logging_Home));
 
-CMPIResultFT result_table = {100, nullptr, nullptr, nullptr, return_instance, return_path, return_done};
+CMPIResultFT result_table = {100, nullptr, nullptr, return_data, return_instance, return_path, return_done};
 
 } // namespace
 
@@ -57,13 +64,14 @@ Recorded_Result::Recorded_Result() : _face{this, &result_table} {}
 void Recorded_Result::clear()
 {
     paths.clear();
+    data.clear();
     instances.clear();
     done = 0;
 }
 
 void Served_Provider::TearDown()
 {
-    for (CMPI_Static_Data* sd : {&thing_data, &link_data})
+    for (CMPI_Static_Data* sd : {&thing_data, &disk_data, &link_data, &alert_data})
         delete sd->adapter;
     EXPECT_EQ(script.providers, 0);
     Script::fresh();

@@ -29,6 +29,7 @@ public:
     void clear();
 
     std::vector<cimserver::Object_Path> paths;
+    std::vector<cimserver::Value> data;
     std::vector<cimserver::Instance> instances;
     int done = 0;
 
@@ -43,7 +44,7 @@ class Served_Provider : public testing::Test
 protected:
     void TearDown() override;
 
-    // Factory calls: the interfaces of either provider.
+    // Factory calls: the interfaces of the providers.
     template <class MI> MI* interface(char kind, CMPI_Static_Data& sd, const Registration& registration)
     {
         void* mi = nullptr;
@@ -52,6 +53,9 @@ protected:
     }
     CMPIInstanceMI* things() { return interface<CMPIInstanceMI>('I', thing_data, thing_registration); }
     CMPIInstanceMI* links() { return interface<CMPIInstanceMI>('I', link_data, link_registration); }
+    CMPIAssociationMI* associations() { return interface<CMPIAssociationMI>('A', link_data, link_registration); }
+    CMPIMethodMI* methods() { return interface<CMPIMethodMI>('M', disk_data, disk_registration); }
+    CMPIIndicationMI* alerts() { return interface<CMPIIndicationMI>('N', alert_data, alert_registration); }
 
     // Objects of the broker, which the request owns.
     CMPIObjectPath* path(const char* class_name) const;
@@ -60,16 +64,19 @@ protected:
     // The value of an item of a recorded path or instance; a failure when there is none.
     static const cimserver::Value& value(const std::vector<cimserver::Named_Value>& items, const char* name);
     static std::string text(const std::vector<cimserver::Named_Value>& items, const char* name);
+    static std::string name_in(const cimserver::Object_Path& path) { return text(path.keys, "Name"); }
 
     // What the work logs at a level ("WARN"), as "source: message".
     static std::vector<std::string> logged(const std::function<void()>& work, const std::string& level = "WARN");
 
     Script& script = Script::fresh();
-    const cimserver::Repository classes{&link_registration};
+    const cimserver::Repository classes{&alert_registration};
     cimserver::Broker broker{classes};
     cimserver::Request request;
     CMPI_Static_Data thing_data = {};
+    CMPI_Static_Data disk_data = {};
     CMPI_Static_Data link_data = {};
+    CMPI_Static_Data alert_data = {};
 };
 
 } // namespace test

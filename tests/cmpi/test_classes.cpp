@@ -21,7 +21,7 @@ constexpr Meta_Property property(Type type, const char* name, std::size_t offset
             nullptr};
 }
 
-constexpr Meta_Reference reference(const char* name, std::size_t offset, bool array, uint32 flags)
+constexpr Meta_Reference reference(const char* name, std::size_t offset, bool array = false, uint32 flags = 0)
 {
     return {{{0}, Flag_Reference | flags, name, nullptr, 0},
             static_cast<uint16>(array),
@@ -64,20 +64,54 @@ constexpr Meta_Reference link_references[] = {
     reference("Details", offsetof(Test_Link, Details), true, Flag_EmbeddedInstance),
 };
 
-struct Thing_Features
+constexpr uint32 in_out = Flag_In | Flag_Out;
+// clang-format off
+constexpr Meta_Property convert_properties[] = {
+    property(UINT8,  "Level",        offsetof(Test_Disk_Convert_method, Level),        false, Flag_In),
+    property(STRING, "Texts",        offsetof(Test_Disk_Convert_method, Texts),        true,  Flag_In),
+    property(SINT64, "Count",        offsetof(Test_Disk_Convert_method, Count),        false, in_out),
+    property(STRING, "Answer",       offsetof(Test_Disk_Convert_method, Answer),       false, Flag_Out),
+    property(UINT16, "Numbers",      offsetof(Test_Disk_Convert_method, Numbers),      true,  Flag_Out),
+    property(STRING, "return_value", offsetof(Test_Disk_Convert_method, return_value), false, Flag_Out),
+};
+constexpr Meta_Reference convert_references[] = {
+    reference("Partner", offsetof(Test_Disk_Convert_method, Partner), false, Flag_In),
+    reference("Others",  offsetof(Test_Disk_Convert_method, Others),  true,  Flag_In),
+    reference("Found",   offsetof(Test_Disk_Convert_method, Found),   false, Flag_Out),
+};
+// clang-format on
+constexpr const Meta_Feature* convert_features[] = {&convert_properties[0], &convert_properties[1], &convert_references[0],
+                                                    &convert_references[1], &convert_properties[2], &convert_properties[3],
+                                                    &convert_properties[4], &convert_references[2], &convert_properties[5]};
+
+constexpr Meta_Property reset_return_value =
+    property(UINT32, "return_value", offsetof(Test_Disk_Reset_method, return_value), false, Flag_Out);
+constexpr const Meta_Feature* reset_features[] = {&reset_return_value};
+
+constexpr Meta_Property alert_properties[] = {
+    property(STRING, "Message", offsetof(Test_Alert, Message)),
+    property(STRING, "Texts", offsetof(Test_Alert, Texts), true),
+};
+constexpr const Meta_Feature* alert_features[] = {&alert_properties[0], &alert_properties[1]};
+
+// A thing's properties, and behind them a disk's methods.
+constexpr uint32 num_disk_features = num_thing_properties + 2;
+struct Disk_Features
 {
-    const Meta_Feature* features[num_thing_properties];
-    constexpr Thing_Features() : features()
+    const Meta_Feature* features[num_disk_features];
+    constexpr Disk_Features() : features()
     {
         for (uint32 i = 0; i < num_thing_properties; ++i)
             features[i] = &thing_properties[i];
+        features[num_thing_properties] = &Test_Disk_Convert_method::static_meta_class;
+        features[num_thing_properties + 1] = &Test_Disk_Reset_method::static_meta_class;
     }
 };
 
-constexpr Thing_Features thing_features;
+constexpr Disk_Features disk_features;
 constexpr const Meta_Feature* link_features[] = {&link_references[0], &link_references[1], &link_note,
                                                  &link_references[2], &link_references[3], &link_references[4]};
-constexpr Meta_Feature_Local locals[num_thing_properties] = {};
+constexpr Meta_Feature_Local locals[num_disk_features] = {};
 
 // A class whose count is not 0 is counted: one is the class itself.
 constexpr Meta_Class make(uint32 flags, const char* name, const Meta_Feature* const* features, uint32 count, std::size_t size,
@@ -90,17 +124,40 @@ constexpr Meta_Class make(uint32 flags, const char* name, const Meta_Feature* co
             &repository};
 }
 
-constexpr const Meta_Class* classes[] = {&Test_Thing::static_meta_class, &Test_Disk::static_meta_class,
-                                         &Test_Link::static_meta_class};
+extern const Meta_Class relation;
+extern const Meta_Class strong_link;
+
+constexpr const Meta_Class* classes[] = {&Test_Thing::static_meta_class,
+                                         &Test_Disk::static_meta_class,
+                                         &Test_Link::static_meta_class,
+                                         &Test_Alert::static_meta_class,
+                                         &relation,
+                                         &strong_link};
 
 } // namespace
 
+// What Test_Link derives from and what derives from it.
+namespace
+{
+constinit const Meta_Class relation = make(Flag_Association, "Test_Relation", nullptr, 0, sizeof(Instance), nullptr, 0);
+constinit const Meta_Class strong_link = make(Flag_Association, "Test_Strong_Link", link_features, std::size(link_features),
+                                              sizeof(Test_Link), &Test_Link::static_meta_class, 2);
+} // namespace
+
+constinit const Meta_Method Test_Disk_Convert_method::static_meta_class = {
+    {{{0}, Flag_Method, "Convert", nullptr, 0}, convert_features, std::size(convert_features), sizeof(Test_Disk_Convert_method)},
+    STRING};
+constinit const Meta_Method Test_Disk_Reset_method::static_meta_class = {
+    {{{0}, Flag_Method | Flag_Static, "Reset", nullptr, 0}, reset_features, 1, sizeof(Test_Disk_Reset_method)}, UINT32};
+
 constinit Meta_Class Test_Thing::static_meta_class =
-    make(0, "Test_Thing", thing_features.features, num_thing_properties, sizeof(Test_Thing), nullptr, 1);
+    make(0, "Test_Thing", disk_features.features, num_thing_properties, sizeof(Test_Thing), nullptr, 1);
 constinit Meta_Class Test_Disk::static_meta_class =
-    make(0, "Test_Disk", thing_features.features, num_thing_properties, sizeof(Test_Disk), &Test_Thing::static_meta_class, 1);
+    make(0, "Test_Disk", disk_features.features, num_disk_features, sizeof(Test_Disk), &Test_Thing::static_meta_class, 1);
 constinit Meta_Class Test_Link::static_meta_class =
-    make(Flag_Association, "Test_Link", link_features, std::size(link_features), sizeof(Test_Link), nullptr, 2);
+    make(Flag_Association, "Test_Link", link_features, std::size(link_features), sizeof(Test_Link), &relation, 2);
+constinit Meta_Class Test_Alert::static_meta_class =
+    make(Flag_Indication, "Test_Alert", alert_features, std::size(alert_features), sizeof(Test_Alert), nullptr, 0);
 
 constinit const Meta_Repository repository = {classes, std::size(classes)};
 

@@ -1,5 +1,5 @@
-// Three classes with meta-data written by hand: a Test_Thing with a property of every type, a Test_Disk derived from it, and
-// a Test_Link that associates two things. Their instances are counted.
+// Classes with meta-data written by hand: a Test_Thing with a property of every type, a Test_Disk derived from it that has
+// methods, a Test_Link that associates two things, a Test_Alert. Their instances are counted.
 #pragma once
 
 #include "runtime/instance.h"
@@ -42,6 +42,29 @@ struct Test_Disk : Test_Thing
     static Meta_Class static_meta_class;
 };
 
+// The parameters of Test_Disk's methods: Convert, one of every kind, and the static Reset.
+struct Test_Disk_Convert_method : Instance
+{
+    Property<uint8> Level;             // in
+    Property<Array<String>> Texts;     // in
+    Test_Thing* Partner;               // in
+    Property<Array<Instance*>> Others; // in, references
+    Property<sint64> Count;            // in and out
+    Property<String> Answer;           // out
+    Property<Array<uint16>> Numbers;   // out
+    Test_Thing* Found;                 // out
+    Property<String> return_value;
+
+    static const Meta_Method static_meta_class;
+};
+
+struct Test_Disk_Reset_method : Instance
+{
+    Property<uint32> return_value;
+
+    static const Meta_Method static_meta_class;
+};
+
 struct Test_Link : Instance
 {
     Test_Thing* Antecedent; // key
@@ -54,13 +77,21 @@ struct Test_Link : Instance
     static Meta_Class static_meta_class;
 };
 
+struct Test_Alert : Instance
+{
+    Property<String> Message;
+    Property<Array<String>> Texts;
+
+    static Meta_Class static_meta_class;
+};
+
 extern const Meta_Repository repository;
 
 Ref<Test_Thing> thing(const char* name);
 Ref<Test_Thing> full_thing(const char* name); // every property has a value
 Ref<Test_Link> make_link(const char* antecedent, const char* dependent);
 
-// Instances alive, of all three classes.
+// Instances alive, of all classes.
 unsigned live_instances();
 
 } // namespace test

@@ -8,14 +8,12 @@ namespace test
 namespace
 {
 
-template <class T, template <class> class Base> class Scripted_Provider : public Base<T>
+// The life of a provider of any kind.
+template <class Base> class Counted_Provider : public Base
 {
 public:
-    Scripted_Provider() { ++Script::get().providers; }
-    ~Scripted_Provider() override { --Script::get().providers; }
-
-    static Scripted_Provider* create() { return new Scripted_Provider; }
-    static int invoke(Scripted_Provider&, const T*, Instance*) { return -1; }
+    Counted_Provider() { ++Script::get().providers; }
+    ~Counted_Provider() override { --Script::get().providers; }
 
     Load_Status load() override
     {
@@ -32,6 +30,13 @@ public:
             Script::get().on_unload();
         return UNLOAD_FAILED; // nobody asks
     }
+};
+
+template <class T, template <class> class Base> class Scripted_Provider : public Counted_Provider<Base<T>>
+{
+public:
+    static Scripted_Provider* create() { return new Scripted_Provider; }
+    static int invoke(Scripted_Provider&, const T*, Instance*) { return -1; }
 
     Get_Instance_Status get_instance(const T* model, T*& instance) override
     {
@@ -80,16 +85,36 @@ public:
 
 using Thing_Provider = Scripted_Provider<Test_Thing, Instance_Provider>;
 
+class Disk_Provider : public Scripted_Provider<Test_Disk, Instance_Provider>
+{
+public:
+    static Disk_Provider* create() { return new Disk_Provider; }
+    static int invoke(Disk_Provider&, const Test_Disk* self, Instance* parameters)
+    {
+        Script& script = Script::get();
+        script.instance.reset(clone(static_cast<const Instance*>(self)));
+        if (script.on_invoke)
+            script.on_invoke(parameters);
+        return script.invoke_method;
+    }
+};
+
 class Link_Provider : public Scripted_Provider<Test_Link, Association_Provider>
 {
 public:
     static Link_Provider* create() { return new Link_Provider; }
     static int invoke(Link_Provider&, const Test_Link*, Instance*) { return -1; }
 
-    Enum_Associator_Names_Status enum_associator_names(const Instance*, const String&, const String&, const String&,
-                                                       Enum_Associator_Names_Handler<Instance>&) override
+    Enum_Associators_Status enum_associators(const Instance*, const String&, const String&, const String&,
+                                             Enum_Associators_Handler<Instance>& handler) override
     {
-        return Script::get().enum_associator_names;
+        return hand_out(handler, Script::get().enum_associators);
+    }
+
+    Enum_Associator_Names_Status enum_associator_names(const Instance*, const String&, const String&, const String&,
+                                                       Enum_Associator_Names_Handler<Instance>& handler) override
+    {
+        return hand_out(handler, Script::get().enum_associator_names);
     }
 
     Enum_References_Status enum_references(const Instance*, const Test_Link*, const String&,
@@ -97,20 +122,56 @@ public:
     {
         return Script::get().enum_references;
     }
+
+private:
+    // A provider that leaves it to others delivers nothing.
+    template <class Handler, class Status> static Status hand_out(Handler& handler, Status status)
+    {
+        if (status == 0)
+            for (const Ref<Instance>& instance : Script::get().associators)
+                if (!handler.handle(clone(instance.ptr())) && !Script::get().deaf)
+                    break;
+        return status;
+    }
 };
 
-int thing_proc(const Registration*, int operation, void* arg0, void* arg1, void* arg2, void* arg3, void* arg4, void* arg5,
-               void* arg6, void* arg7)
+class Alert_Provider : public Counted_Provider<Indication_Provider<Test_Alert>>
 {
-    void* const args[] = {arg0, arg1, arg2, arg3, arg4, arg5, arg6, arg7};
-    return instance_provider_proc<Thing_Provider>(operation, Thing_Provider::create, args);
-}
+public:
+    static Alert_Provider* create() { return new Alert_Provider; }
+    static int invoke(Alert_Provider&, const Test_Alert*, Instance*) { return -1; }
 
-int link_proc(const Registration*, int operation, void* arg0, void* arg1, void* arg2, void* arg3, void* arg4, void* arg5,
-              void* arg6, void* arg7)
+    Enable_Indications_Status enable_indications(Indication_Handler<Test_Alert>* handler) override
+    {
+        std::unique_ptr<Indication_Handler<Test_Alert>> own(handler);
+        Script& script = Script::get();
+        ++script.enables;
+        if (script.enable_indications == ENABLE_INDICATIONS_OK)
+            script.handler = std::move(own);
+        if (script.on_enable)
+            script.on_enable();
+        return script.enable_indications;
+    }
+
+    Disable_Indications_Status disable_indications() override
+    {
+        Script& script = Script::get();
+        ++script.disables;
+        if (script.on_disable)
+            script.on_disable();
+        script.handler.reset();
+        return script.disable_indications;
+    }
+};
+
+// The procedure of a provider, out of the body for its kind.
+template <class P, int (*body)(int, P* (*)(), void* const*)>
+int proc(const Registration*, int operation, void* arg0, void* arg1, void* arg2, void* arg3, void* arg4, void* arg5, void* arg6,
+         void* arg7)
 {
     void* const args[] = {arg0, arg1, arg2, arg3, arg4, arg5, arg6, arg7};
-    return association_provider_proc<Link_Provider>(operation, Link_Provider::create, args);
+    return body(
+        operation, []() -> P* { return P::create(); }, args);
 }
 
 Script script;
@@ -120,9 +181,15 @@ Script script;
 Script& Script::get() { return script; }
 Script& Script::fresh() { return script = Script(); }
 
-constinit const Registration thing_registration = {"Test_Module", "Test_Thing_Provider", thing_proc,
-                                                   &Test_Thing::static_meta_class, nullptr};
-constinit const Registration link_registration = {"Test_Module", "Test_Link_Provider", link_proc, &Test_Link::static_meta_class,
-                                                  &thing_registration};
+// clang-format off
+constinit const Registration thing_registration = {"Test_Module", "Test_Thing_Provider",
+    proc<Thing_Provider, instance_provider_proc<Thing_Provider>>, &Test_Thing::static_meta_class, nullptr};
+constinit const Registration disk_registration = {"Test_Module", "Test_Disk_Provider",
+    proc<Disk_Provider, instance_provider_proc<Disk_Provider>>, &Test_Disk::static_meta_class, &thing_registration};
+constinit const Registration link_registration = {"Test_Module", "Test_Link_Provider",
+    proc<Link_Provider, association_provider_proc<Link_Provider>>, &Test_Link::static_meta_class, &disk_registration};
+constinit const Registration alert_registration = {"Test_Module", "Test_Alert_Provider",
+    proc<Alert_Provider, indication_provider_proc<Alert_Provider>>, &Test_Alert::static_meta_class, &link_registration};
+// clang-format on
 
 } // namespace test

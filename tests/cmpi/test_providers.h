@@ -6,6 +6,7 @@
 #include "tests/cmpi/test_classes.h"
 
 #include <functional>
+#include <memory>
 #include <vector>
 
 namespace test
@@ -23,6 +24,14 @@ struct Script
     Delete_Instance_Status delete_instance = DELETE_INSTANCE_UNSUPPORTED;
     Enum_Associator_Names_Status enum_associator_names = ENUM_ASSOCIATOR_NAMES_UNSUPPORTED;
     Enum_References_Status enum_references = ENUM_REFERENCES_UNSUPPORTED;
+    Enum_Associators_Status enum_associators = ENUM_ASSOCIATORS_UNSUPPORTED;
+    std::vector<Ref<Instance>> associators; // what enum_associators and enum_associator_names deliver, as clones
+    Invoke_Method_Status invoke_method = INVOKE_METHOD_OK;
+    Enable_Indications_Status enable_indications = ENABLE_INDICATIONS_OK;
+    Disable_Indications_Status disable_indications = DISABLE_INDICATIONS_OK;
+    std::function<void(Instance*)> on_invoke; // gets the parameters
+    std::function<void()> on_enable;
+    std::function<void()> on_disable;
     bool deaf = false;             // goes on when told to stop
     std::function<void()> on_load; // called by load()
     std::function<void()> on_enum; // called by enum_instances before it delivers
@@ -36,13 +45,18 @@ struct Script
     int delivered = 0;
     Ref<Instance> model; // of the last request
     Ref<Instance> instance;
+    int enables = 0;
+    int disables = 0;
+    std::unique_ptr<Indication_Handler<Test_Alert>> handler; // while indications are enabled
 
     static Script& get();
     static Script& fresh(); // emptied
 };
 
-// The records of the two providers; Test_Link's is the head of their list.
+// The records of the providers; Test_Alert's is the head of their list.
 extern const Registration thing_registration;
+extern const Registration disk_registration;
 extern const Registration link_registration;
+extern const Registration alert_registration;
 
 } // namespace test

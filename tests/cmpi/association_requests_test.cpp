@@ -1,0 +1,292 @@
+// The association interface as a server calls it.
+#include "cimserver/broker/objects.h"
+#include "tests/cmpi/served_provider.h"
+
+#include <cmpimacs.h>
+#include <gmock/gmock.h>
+
+using namespace test;
+using testing::ElementsAre;
+using testing::SizeIs;
+
+namespace
+{
+
+std::vector<std::string> asked_for; // the property list of the last instance that a provider asked the server for
+
+// The server finds a thing of every name but "gone".
+CMPIInstance* find_thing(const CMPIBroker* broker, const CMPIContext*, const CMPIObjectPath* path, const char** properties,
+                         CMPIStatus* status)
+{
+    asked_for.clear();
+    for (; properties && *properties; ++properties)
+        asked_for.emplace_back(*properties);
+    const auto& name = cimserver::object<cimserver::Path_Object>(path).path.keys.at(0).value;
+    const bool gone = std::get<std::string>(name.content) == "gone";
+    *status = {gone ? CMPI_RC_ERR_NOT_FOUND : CMPI_RC_OK, nullptr};
+    return gone ? nullptr : CMNewInstance(broker, path, nullptr);
+}
+
+class Association_Requests : public Served_Provider
+{
+protected:
+    Association_Requests()
+    {
+        server_calls.getInstance = find_thing;
+        server.bft = &server_calls;
+        server.eft = &objects;
+        link_data.adapter->broker = &server;
+    }
+
+    void offer_links()
+    {
+        for (const auto& [antecedent, dependent] : {std::pair("a", "b"), {"c", "b"}, {"a", "d"}})
+            script.instances.emplace_back(make_link(antecedent, dependent).steal());
+    }
+
+    // The filters of a request, as a client gives them.
+    struct Filters
+    {
+        const char* association_class = "test_link";
+        const char* result_class = nullptr;
+        const char* role = nullptr;
+        const char* result_role = nullptr;
+    };
+    CMPIrc associators(const CMPIObjectPath* source, const Filters& f, const char** properties = nullptr)
+    {
+        result.clear();
+        return CMPI_Adapter::associators(mi, request.context(), result.face(), source, f.association_class, f.result_class,
+                                         f.role, f.result_role, properties)
+            .rc;
+    }
+    CMPIrc associator_names(const CMPIObjectPath* source, const Filters& f)
+    {
+        result.clear();
+        return CMPI_Adapter::associatorNames(mi, request.context(), result.face(), source, f.association_class, f.result_class,
+                                             f.role, f.result_role)
+            .rc;
+    }
+    CMPIrc references(const CMPIObjectPath* source, const Filters& f, const char** properties = nullptr)
+    {
+        result.clear();
+        return CMPI_Adapter::references(mi, request.context(), result.face(), source, f.association_class, f.role, properties).rc;
+    }
+    CMPIrc reference_names(const CMPIObjectPath* source, const Filters& f)
+    {
+        result.clear();
+        return CMPI_Adapter::referenceNames(mi, request.context(), result.face(), source, f.association_class, f.role).rc;
+    }
+    // The answers of all four, in that order.
+    std::vector<CMPIrc> answers(const CMPIObjectPath* source, const Filters& f)
+    {
+        return {associators(source, f), associator_names(source, f), references(source, f), reference_names(source, f)};
+    }
+
+    // What the last request answered: names of things, links as "antecedent-dependent".
+    std::vector<std::string> found() const
+    {
+        std::vector<std::string> names;
+        for (const auto& path : result.paths)
+            names.push_back(name_of(path));
+        for (const auto& instance : result.instances)
+            names.push_back(name_of(instance.path));
+        return names;
+    }
+    static std::string name_of(const cimserver::Object_Path& path)
+    {
+        if (path.class_name != "Test_Link")
+            return name_in(path);
+        const auto end = [&](const char* role)
+        { return name_in(*std::get<std::shared_ptr<const cimserver::Object_Path>>(value(path.keys, role).content)); };
+        return end("Antecedent") + "-" + end("Dependent");
+    }
+
+    CMPIBroker server = *broker.face();
+    CMPIBrokerFT server_calls = *broker.face()->bft;
+    CMPIBrokerEncFT objects = *broker.face()->eft;
+    CMPIAssociationMI* mi = associations();
+    const CMPIObjectPath* a = thing_path("a");
+    Recorded_Result result;
+};
+
+TEST_F(Association_Requests, are_answered_from_the_enumeration_by_every_filter)
+{
+    offer_links();
+    struct Case
+    {
+        Filters filters;
+        std::vector<std::string> names;
+        std::vector<std::string> links;
+    };
+    const Case cases[] = {
+        {{}, {"b", "d"}, {"a-b", "a-d"}},
+        {{.result_class = "TEST_THING"}, {"b", "d"}, {"a-b", "a-d"}},
+        {{.result_class = "Test_Disk"}, {}, {"a-b", "a-d"}},
+        {{.role = "antecedent"}, {"b", "d"}, {"a-b", "a-d"}},
+        {{.role = "Dependent"}, {}, {}},
+        {{.result_role = "DEPENDENT"}, {"b", "d"}, {"a-b", "a-d"}},
+        {{.result_role = "Antecedent"}, {}, {"a-b", "a-d"}},
+    };
+    for (const Case& c : cases)
+    {
+        EXPECT_EQ(associators(a, c.filters), CMPI_RC_OK);
+        EXPECT_EQ(found(), c.names);
+        EXPECT_EQ(associator_names(a, c.filters), CMPI_RC_OK);
+        EXPECT_EQ(found(), c.names);
+        EXPECT_EQ(references(a, c.filters), CMPI_RC_OK);
+        EXPECT_EQ(found(), c.links);
+        EXPECT_EQ(reference_names(a, c.filters), CMPI_RC_OK);
+        EXPECT_EQ(found(), c.links);
+    }
+    EXPECT_EQ(result.done, 0);
+}
+
+TEST_F(Association_Requests, reach_the_provider_by_no_class_and_by_superclasses)
+{
+    offer_links();
+    struct Case
+    {
+        const char* association_class;
+        CMPIrc rc;
+        int enumerations; // of four requests
+    };
+    const Case cases[] = {
+        {nullptr, CMPI_RC_OK, 4},
+        {"", CMPI_RC_OK, 4},
+        {"TEST_LINK", CMPI_RC_OK, 4},
+        {"Test_Relation", CMPI_RC_OK, 4},                   // the superclass
+        {"Test_Strong_Link", CMPI_RC_OK, 0},                // a subclass: its provider's business
+        {"Test_Thing", CMPI_RC_OK, 0},                      // unrelated
+        {"Test_Unknown", CMPI_RC_ERR_INVALID_PARAMETER, 0}, // nobody's
+    };
+    for (const Case& c : cases)
+    {
+        script.enumerations = 0;
+        EXPECT_THAT(answers(a, {.association_class = c.association_class}), testing::Each(c.rc));
+        EXPECT_EQ(script.enumerations, c.enumerations) << (c.association_class ? c.association_class : "(none)");
+        EXPECT_THAT(result.paths, SizeIs(c.enumerations ? 2 : 0));
+    }
+}
+
+TEST_F(Association_Requests, of_a_source_that_nobody_knows_find_nothing_or_fail)
+{
+    for (const CMPIObjectPath* source :
+         {static_cast<const CMPIObjectPath*>(path("Test_Unknown")), static_cast<const CMPIObjectPath*>(nullptr)})
+        EXPECT_THAT(answers(source, {}),
+                    ElementsAre(CMPI_RC_OK, CMPI_RC_ERR_INVALID_CLASS, CMPI_RC_ERR_INVALID_CLASS, CMPI_RC_ERR_INVALID_CLASS));
+    EXPECT_EQ(script.enumerations, 0);
+}
+
+TEST_F(Association_Requests, have_the_status_of_the_enumeration)
+{
+    offer_links();
+    for (const auto& [status, rc] : {std::pair(ENUM_INSTANCES_FAILED, CMPI_RC_ERR_FAILED),
+                                     {ENUM_INSTANCES_ACCESS_DENIED, CMPI_RC_ERR_ACCESS_DENIED},
+                                     {static_cast<Enum_Instances_Status>(-1), CMPI_RC_OK}})
+    {
+        script.enum_instances = status;
+        EXPECT_THAT(answers(a, {}), testing::Each(rc));
+    }
+}
+
+TEST_F(Association_Requests, have_the_status_of_a_provider_that_answers_itself)
+{
+    // clang-format off
+    const std::pair<Enum_Associators_Status, CMPIrc> associator_rows[] = {
+        {ENUM_ASSOCIATORS_OK, CMPI_RC_OK}, {ENUM_ASSOCIATORS_FAILED, CMPI_RC_ERR_FAILED},
+        {ENUM_ASSOCIATORS_ACCESS_DENIED, CMPI_RC_ERR_ACCESS_DENIED}, {static_cast<Enum_Associators_Status>(-1), CMPI_RC_OK}};
+    const std::pair<Enum_Associator_Names_Status, CMPIrc> name_rows[] = {
+        {ENUM_ASSOCIATOR_NAMES_OK, CMPI_RC_OK}, {ENUM_ASSOCIATOR_NAMES_FAILED, CMPI_RC_ERR_FAILED},
+        {ENUM_ASSOCIATOR_NAMES_ACCESS_DENIED, CMPI_RC_ERR_ACCESS_DENIED}};
+    const std::pair<Enum_References_Status, CMPIrc> reference_rows[] = {
+        {ENUM_REFERENCES_OK, CMPI_RC_OK}, {ENUM_REFERENCES_FAILED, CMPI_RC_ERR_FAILED},
+        {ENUM_REFERENCES_ACCESS_DENIED, CMPI_RC_ERR_ACCESS_DENIED}};
+    // clang-format on
+    for (const auto& [status, rc] : name_rows)
+    {
+        script.enum_associator_names = status;
+        EXPECT_EQ(associator_names(a, {}), rc);
+        EXPECT_EQ(associators(a, {}), rc) << "by way of the names";
+    }
+    for (const auto& [status, rc] : associator_rows)
+        EXPECT_EQ((script.enum_associators = status, associators(a, {})), rc);
+    for (const auto& [status, rc] : reference_rows)
+    {
+        script.enum_references = status;
+        EXPECT_EQ(references(a, {}), rc);
+        EXPECT_EQ(reference_names(a, {}), rc);
+    }
+    EXPECT_EQ(script.enumerations, 0);
+}
+
+TEST_F(Association_Requests, answer_what_the_provider_hands_over_in_its_own_name_space)
+{
+    script.enum_associators = ENUM_ASSOCIATORS_OK;
+    script.enum_associator_names = ENUM_ASSOCIATOR_NAMES_OK;
+    for (const char* name : {"x", "y"})
+        script.associators.emplace_back(full_thing(name).steal());
+    script.associators[1]->__name_space = "root/other";
+
+    const char* list[] = {"Uint8", nullptr};
+    const auto messages = logged([&] { EXPECT_EQ(associators(a, {}, list), CMPI_RC_OK); });
+    EXPECT_THAT(messages, testing::Each("Converter: No ObjectPath built before call to make_CMPI_instance"));
+    EXPECT_THAT(found(), ElementsAre("x", "y"));
+    EXPECT_EQ(result.instances[0].path.name_space, name_space);
+    EXPECT_EQ(result.instances[1].path.name_space, "root/other");
+    EXPECT_THAT(result.instances[1].properties, SizeIs(2)) << "the key and what the list names";
+
+    EXPECT_EQ(associator_names(a, {}), CMPI_RC_OK);
+    EXPECT_THAT(found(), ElementsAre("x", "y"));
+    EXPECT_EQ(result.paths[1].name_space, "root/other");
+}
+
+TEST_F(Association_Requests, fetch_associated_instances_from_the_server)
+{
+    offer_links();
+    const char* list[] = {"Uint8", nullptr};
+    EXPECT_EQ(associators(a, {}, list), CMPI_RC_OK);
+    EXPECT_THAT(found(), ElementsAre("b", "d"));
+    EXPECT_THAT(asked_for, ElementsAre("Uint8"));
+
+    script.instances.emplace(script.instances.begin() + 1, make_link("a", "gone").steal());
+    EXPECT_EQ(associators(a, {}), CMPI_RC_ERR_FAILED) << "the server gives nothing";
+    EXPECT_THAT(found(), ElementsAre("b"));
+}
+
+TEST_F(Association_Requests, leave_keys_to_the_path_when_a_list_is_given)
+{
+    auto link = make_link("a", "b");
+    link->Note.set("note");
+    script.instances.emplace_back(link.steal());
+    const char* list[] = {"Note", "Antecedent", nullptr};
+    EXPECT_EQ(references(a, {}), CMPI_RC_OK);
+    EXPECT_EQ(text(result.instances.at(0).properties, "Note"), "note");
+    EXPECT_EQ(references(a, {}, list), CMPI_RC_OK);
+    EXPECT_THAT(found(), ElementsAre("a-b"));
+    EXPECT_EQ(text(result.instances.at(0).properties, "Note"), "note");
+    const char* nothing[] = {nullptr};
+    EXPECT_EQ(references(a, {}, nothing), CMPI_RC_OK);
+    EXPECT_THAT(found(), ElementsAre("a-b"));
+    EXPECT_THAT(result.instances.at(0).properties, SizeIs(2)) << "the two ends";
+}
+
+TEST_F(Association_Requests, stop_at_what_cannot_be_converted)
+{
+    static int paths_left = 0;
+    objects.newObjectPath = [](const CMPIBroker* b, const char* ns, const char* class_name, CMPIStatus* rc)
+    { return paths_left-- > 0 ? cimserver::encapsulation_table.newObjectPath(b, ns, class_name, rc) : nullptr; };
+    offer_links();
+    for (const bool deaf : {false, true})
+    {
+        script.deaf = deaf;
+        EXPECT_THAT(answers(a, {}), testing::Each(CMPI_RC_ERR_FAILED));
+        script.associators.emplace_back(thing("x").steal());
+        script.enum_associators = ENUM_ASSOCIATORS_OK;
+        EXPECT_EQ(associators(a, {}), CMPI_RC_ERR_FAILED);
+        paths_left = 1;
+        EXPECT_EQ(associator_names(a, {}), CMPI_RC_ERR_FAILED);
+        EXPECT_THAT(result.paths, SizeIs(1));
+    }
+}
+
+} // namespace
