@@ -33,6 +33,8 @@
 #include "hxal/config/setters.h"
 #include "hxal/config/text.h"
 #include "hxal/config/writer.h"
+#include "hxal/boot.h"
+#include "hxal/flash.h"
 #include "hxal/frame.h"
 #include "hxal/ioc.h"
 #include "hxal/iocfc.h"

@@ -60,8 +60,20 @@ constexpr auto application = input(offsetof(hxa_ioctl_aen_t, app_id), 4);
 constexpr auto power = input(offsetof(hxa_ioctl_ioc_power_t, power), 4);
 constexpr auto name = input(offsetof(hxa_ioctl_ioc_set_adapter_name_t, name), 64);
 constexpr auto interrupts = input(offsetof(hxa_ioctl_iocfc_intr_t, attr), sizeof(hxa_iocfc_intr_attr_t));
+constexpr auto manufacturing = input(offsetof(hxa_ioctl_flash_mfg_t, mfg_block), sizeof(hxa_mfg_block_t));
 
 // clang-format off
+constexpr std::array<Field, 4> partition{
+    Field{.offset = offsetof(hxa_ioctl_flash_t, instance), .size = 1},
+    Field{.offset = offsetof(hxa_ioctl_flash_t, type),     .size = 4},
+};
+constexpr std::array<Field, 4> partition_data{
+    partition[0],
+    partition[1],
+    Field{.offset = offsetof(hxa_ioctl_flash_t, buf_ptr), .size = 8},
+    Field{.offset = offsetof(hxa_ioctl_flash_t, bufsz),   .size = 4},
+};
+
 constexpr std::array rows{
     row<answer_version>                ("IOCMD_IOC_GET_VERSION",      Target::driver),
     row<answer_instances>              ("IOCMD_IOC_GET_INST",         Target::driver),
@@ -80,6 +92,13 @@ constexpr std::array rows{
     row<answer_iocfc_statistics>       ("IOCMD_IOCFC_GET_STATS",      Target::ioc),
     row<answer_iocfc_reset_statistics> ("IOCMD_IOCFC_RESET_STATS",    Target::ioc),
     row<answer_iocfc_interrupts>       ("IOCMD_IOCFC_SET_INTR",       Target::ioc,    interrupts),
+    row<answer_flash_attributes>       ("IOCMD_FLASH_GET_ATTR",       Target::ioc),
+    row<answer_flash_erase>            ("IOCMD_FLASH_ERASE_PART",     Target::ioc,    partition),
+    row<answer_flash_update>           ("IOCMD_FLASH_UPDATE_PART",    Target::ioc,    partition_data),
+    row<answer_flash_read>             ("IOCMD_FLASH_READ_PART",      Target::ioc,    partition_data),
+    row<answer_flash_manufacturing>    ("IOCMD_FLASH_MFG_INFO",       Target::ioc,    manufacturing),
+    row<answer_optrom_enable>          ("IOCMD_FLASH_ENABLE_OPTROM",  Target::ioc),
+    row<answer_optrom_disable>         ("IOCMD_FLASH_DISABLE_OPTROM", Target::ioc),
 };
 // clang-format on
 

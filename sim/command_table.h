@@ -88,6 +88,13 @@ void answer_iocfc_attributes(Call& call, hxa_ioctl_iocfc_attr_t& record); // ioc
 void answer_iocfc_interrupts(Call& call, hxa_ioctl_iocfc_intr_t& record);
 void answer_iocfc_statistics(Call& call, hxa_ioctl_iocfc_stats_t& record);
 void answer_iocfc_reset_statistics(Call& call, hxa_ioctl_gen_t& record);
-void answer_port_attributes(Call& call, hxa_ioctl_port_attr_t& record); // port_commands.cpp
+void answer_port_attributes(Call& call, hxa_ioctl_port_attr_t& record);   // port_commands.cpp
+void answer_flash_attributes(Call& call, hxa_ioctl_flash_attr_t& record); // flash_commands.cpp
+void answer_flash_erase(Call& call, hxa_ioctl_flash_t& record);
+void answer_flash_update(Call& call, hxa_ioctl_flash_t& record);
+void answer_flash_read(Call& call, hxa_ioctl_flash_t& record);
+void answer_flash_manufacturing(Call& call, hxa_ioctl_flash_mfg_t& record);
+void answer_optrom_enable(Call& call, hxa_ioctl_gen_t& record);
+void answer_optrom_disable(Call& call, hxa_ioctl_gen_t& record);
 
 } // namespace hxasim

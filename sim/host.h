@@ -18,7 +18,7 @@ struct Ioc
     Node node;
     std::uint32_t type; // hxa_ioc_type_e
     std::uint32_t instance;
-    const Adapter* adapter;
+    Adapter* adapter;
     Port* port;
     std::uint8_t port_number;   // on its adapter
     std::uint32_t pci_function; // FC functions first, then the Ethernet functions

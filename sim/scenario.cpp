@@ -18,6 +18,7 @@ using nlohmann::json;
 
 constexpr std::uint32_t max_u32 = std::numeric_limits<std::uint32_t>::max();
 constexpr std::size_t max_ports = 8;
+constexpr std::uint32_t max_partition_size = 64 * 1024 * 1024;
 
 // The instance numbers of one node as they are given away.
 class Instance_Numbers
@@ -118,6 +119,28 @@ void Scenario_Reader::read_vpd(Json_Object& object, Adapter& adapter)
     adapter.vpd.data = build_vpd(adapter, object.text("fru_number", 16, usual_fru));
 }
 
+Flash_Partition read_partition(Json_Object object)
+{
+    Flash_Partition partition{.type = object.choice("type", flash_part_words, max_u32, 0),
+                              .instance = object.number("instance", 255, 0),
+                              .size = object.number("size", max_partition_size, 65536)};
+    partition.data = object.bytes("data", partition.size);
+    partition.status = object.choice("status", flash_status_words, max_u32,
+                                     partition.data.empty() ? HXA_FLASH_STATUS_EMPTY : HXA_FLASH_STATUS_GOOD);
+    object.done();
+    return partition;
+}
+
+Flash read_flash(Json_Object& object, std::size_t ports)
+{
+    if (!object.has("flash"))
+        return usual_flash(ports);
+    Flash flash;
+    for (auto& partition : object.objects("flash", HXA_FLASH_PART_MAX))
+        flash.partitions.push_back(read_partition(partition));
+    return flash;
+}
+
 void Scenario_Reader::read_adapter(Json_Object& object)
 {
     auto kind = static_cast<Adapter_Kind>(object.word("kind", kind_words));
@@ -134,6 +157,7 @@ void Scenario_Reader::read_adapter(Json_Object& object)
     auto usual_object = Json_Object(usual, object.place());
     for (auto& port : (object.has("ports") ? object : usual_object).objects("ports", max_ports))
         read_port(port, adapter);
+    adapter.flash = read_flash(object, adapter.ports.size());
     object.done();
     _scenario.adapters.push_back(std::move(adapter));
 }

@@ -4,6 +4,7 @@
 // bytes, enumerations as their numbers, speeds in Gbit/s.
 #pragma once
 
+#include "sim/flash.h"
 #include "sim/hxasim.h"
 
 #include <array>
@@ -102,6 +103,7 @@ struct Adapter
     bool cna_capable = false;
     bool is_mezz = false;
     Vpd vpd;
+    Flash flash;
     std::vector<Port> ports;
 
     bool converged() const { return kind != Adapter_Kind::fc_hba; }

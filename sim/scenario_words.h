@@ -66,6 +66,29 @@ inline constexpr std::array topology_words{
     Choice{"auto", HXA_PPORT_TOPOLOGY_AUTO},
 };
 
+inline constexpr std::array flash_part_words{
+    Choice{"optrom",  HXA_FLASH_PART_OPTROM},
+    Choice{"fwimg",   HXA_FLASH_PART_FWIMG},
+    Choice{"fwcfg",   HXA_FLASH_PART_FWCFG},
+    Choice{"drv",     HXA_FLASH_PART_DRV},
+    Choice{"boot",    HXA_FLASH_PART_BOOT},
+    Choice{"asic",    HXA_FLASH_PART_ASIC},
+    Choice{"mfg",     HXA_FLASH_PART_MFG},
+    Choice{"optrom2", HXA_FLASH_PART_OPTROM2},
+    Choice{"vpd",     HXA_FLASH_PART_VPD},
+    Choice{"pbc",     HXA_FLASH_PART_PBC},
+    Choice{"bootovl", HXA_FLASH_PART_BOOTOVL},
+};
+
+inline constexpr std::array flash_status_words{
+    Choice{"good",        HXA_FLASH_STATUS_GOOD},
+    Choice{"not-present", HXA_FLASH_STATUS_NOT_PRESENT},
+    Choice{"uninit",      HXA_FLASH_STATUS_UNINIT},
+    Choice{"bad",         HXA_FLASH_STATUS_BAD},
+    Choice{"empty",       HXA_FLASH_STATUS_EMPTY},
+    Choice{"ckfail",      HXA_FLASH_STATUS_CKFAIL},
+};
+
 inline constexpr std::array errno_words{
     Choice{"EINTR",  EINTR},
     Choice{"EIO",    EIO},

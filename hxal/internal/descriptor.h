@@ -1,4 +1,4 @@
-// An open device node.
+// An open device node or file.
 #pragma once
 
 #include <fcntl.h>
@@ -7,11 +7,12 @@
 namespace hxal
 {
 
-// Opens a node for reading and writing and closes it at the end. is_open() tells whether it could.
+// Opens a path, for reading and writing unless the flags of open(2) say otherwise, and closes it at the end. is_open() tells
+// whether it could.
 class Descriptor
 {
 public:
-    explicit Descriptor(const char* path) : _fd(::open(path, O_RDWR | O_CLOEXEC)) {}
+    explicit Descriptor(const char* path, int flags = O_RDWR, mode_t mode = 0) : _fd(::open(path, flags | O_CLOEXEC, mode)) {}
 
     ~Descriptor()
     {

@@ -9,6 +9,7 @@
 #include "hxal/records/ethport.h"
 #include "hxal/records/fcoe.h"
 #include "hxal/records/fcpt.h"
+#include "hxal/records/flash.h"
 #include "hxal/records/ioc.h"
 #include "hxal/records/iocfc.h"
 #include "hxal/records/itnim.h"
@@ -125,11 +126,11 @@ inline constexpr std::array catalogue{
     command<hxa_ioctl_rport_attr_t>(          "IOCMD_RPORT_GET_ATTR",       rport_family,       0x05),
     command<hxa_ioctl_rport_scsi_addr_t>(     "IOCMD_RPORT_GET_SCSI_ADDR",  rport_family,       0x06),
     command<hxa_ioctl_rport_set_speed_t>(     "IOCMD_RPORT_SET_SPEED",      rport_family,       0x07),
-    command(                                  "IOCMD_FLASH_GET_ATTR",       flash_family,       0x01, 528),
-    command(                                  "IOCMD_FLASH_ERASE_PART",     flash_family,       0x02, 24),
-    command(                                  "IOCMD_FLASH_UPDATE_PART",    flash_family,       0x03, 24),
-    command(                                  "IOCMD_FLASH_READ_PART",      flash_family,       0x04, 24),
-    command(                                  "IOCMD_FLASH_MFG_INFO",       flash_family,       0x05, 264),
+    command<hxa_ioctl_flash_attr_t>(          "IOCMD_FLASH_GET_ATTR",       flash_family,       0x01),
+    command<hxa_ioctl_flash_t>(               "IOCMD_FLASH_ERASE_PART",     flash_family,       0x02),
+    command<hxa_ioctl_flash_t>(               "IOCMD_FLASH_UPDATE_PART",    flash_family,       0x03),
+    command<hxa_ioctl_flash_t>(               "IOCMD_FLASH_READ_PART",      flash_family,       0x04),
+    command<hxa_ioctl_flash_mfg_t>(           "IOCMD_FLASH_MFG_INFO",       flash_family,       0x05),
     command<hxa_ioctl_gen_t>(                 "IOCMD_FLASH_ENABLE_OPTROM",  flash_family,       0x06),
     command<hxa_ioctl_gen_t>(                 "IOCMD_FLASH_DISABLE_OPTROM", flash_family,       0x07),
     command(                                  "IOCMD_SCSI_CMND",            passthrough_family, 0x01, 80),

@@ -1,0 +1,104 @@
+#include "hxal/internal/boot_archive.h"
+
+#include "hxal/internal/descriptor.h"
+#include "hxal/internal/tar_archive.h"
+
+#include <optional>
+#include <sys/stat.h>
+
+namespace hxal
+{
+
+namespace
+{
+
+constexpr const char* description_name = "boot.txt";
+constexpr const char* temporary_path = "./zmlrtmpfile";
+constexpr size_t max_description_size = 1024 * 1024;
+
+bool is_description(const Tar_Member& member) { return member.name.find(description_name) != member.name.npos; }
+
+bool is_regular(int fd)
+{
+    struct stat status;
+    return ::fstat(fd, &status) == 0 && S_ISREG(status.st_mode);
+}
+
+// The unpacked inner archive: a new file of ours for as long as this lives. What stands in its place beforehand is
+// unlinked, and what is planted there in the meantime is not opened.
+class Temporary_File
+{
+public:
+    Temporary_File()
+        : _unlinked(::unlink(temporary_path))
+        , _file(temporary_path, O_RDWR | O_CREAT | O_EXCL | O_NOFOLLOW, S_IRUSR | S_IWUSR)
+    {
+    }
+
+    ~Temporary_File()
+    {
+        if (_file.is_open())
+            ::unlink(temporary_path);
+    }
+
+    Temporary_File(const Temporary_File&) = delete;
+    Temporary_File& operator=(const Temporary_File&) = delete;
+
+    // Leaves the file at its start. False when it could not be created or written.
+    bool fill(const Image& bytes) const
+    {
+        return _file.is_open() && write_all(_file.number(), bytes.data(), bytes.size()) && rewind(_file.number());
+    }
+
+    int number() const { return _file.number(); }
+
+    static bool rewind(int fd) { return ::lseek(fd, 0, SEEK_SET) == 0; }
+
+private:
+    int _unlinked;
+    Descriptor _file;
+};
+
+// Reads the archive that an open file is, from its start: the description, then one member for each image of it.
+hxa_status_t read_archive(int fd, std::vector<HXAL_IMAGE_DATA_T>& images)
+{
+    Tar_Reader reader(fd);
+    Tar_Member member;
+    if (const hxa_status_t read = reader.next(member); read != HXA_STATUS_OK)
+        return read;
+    if (!is_description(member))
+        return HXA_STATUS_FAILED;
+    if (member.data.size() > max_description_size)
+        return HXA_STATUS_ENOMEM;
+    const std::string_view text(reinterpret_cast<const char*>(member.data.data()), member.data.size());
+    if (const hxa_status_t parsed = read_boot_description(text, images); parsed != HXA_STATUS_OK)
+        return parsed;
+    for (HXAL_IMAGE_DATA_T& image : images)
+    {
+        if (const hxa_status_t read = reader.next(member); read != HXA_STATUS_OK)
+            return read;
+        image.ibuf.swap(member.data);
+    }
+    return HXA_STATUS_OK;
+}
+
+} // namespace
+
+hxa_status_t read_boot_archive(const char* path, std::vector<HXAL_IMAGE_DATA_T>& images)
+{
+    // A pipe in place of the file must not hold the caller up.
+    const Descriptor file(path, O_RDONLY | O_NONBLOCK);
+    if (!file.is_open())
+        return HXA_STATUS_FAILED;
+    if (!is_regular(file.number()))
+        return HXA_STATUS_BAD_FILE;
+    Tar_Member first;
+    if (const hxa_status_t read = Tar_Reader(file.number()).next(first); read != HXA_STATUS_OK)
+        return read;
+    if (is_description(first))
+        return Temporary_File::rewind(file.number()) ? read_archive(file.number(), images) : HXA_STATUS_BAD_FILE;
+    const Temporary_File inner;
+    return inner.fill(first.data) ? read_archive(inner.number(), images) : HXA_STATUS_CREATE_FILE;
+}
+
+} // namespace hxal

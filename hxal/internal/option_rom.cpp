@@ -1,0 +1,141 @@
+#include "hxal/internal/option_rom.h"
+
+#include "hxal/frame.h"
+
+#include <algorithm>
+#include <span>
+
+namespace hxal
+{
+
+namespace
+{
+
+// Where the fields stand, in bytes; all are little-endian.
+namespace rom_header
+{
+constexpr size_t data_structure = 24; // offset of the PCI data structure, from the image
+constexpr size_t pnp_header = 26;     // offset of the Plug and Play header, from the image
+constexpr size_t size = 28;
+} // namespace rom_header
+
+namespace data_structure
+{
+constexpr size_t device_id = 6;
+constexpr size_t image_length = 16; // units of 512 bytes
+constexpr size_t code_type = 20;
+constexpr size_t indicator = 21; // bit 7: the last image
+constexpr size_t size = 28;
+} // namespace data_structure
+
+namespace pnp_header
+{
+constexpr size_t length = 5; // units of 16 bytes
+constexpr size_t checksum = 9;
+constexpr size_t device_id = 12; // second half of the Plug and Play device id
+} // namespace pnp_header
+
+constexpr size_t image_length_unit = 512;
+constexpr size_t pnp_length_unit = 16;
+constexpr uint8_t x86_code = 0;
+constexpr uint8_t last_image = 0x80;
+
+using Bytes = std::span<uint8_t>;
+
+uint16_t word_at(Bytes bytes, size_t offset) { return static_cast<uint16_t>(bytes[offset] | bytes[offset + 1] << 8); }
+
+void put_word(Bytes bytes, size_t offset, uint16_t word)
+{
+    bytes[offset] = static_cast<uint8_t>(word);
+    bytes[offset + 1] = static_cast<uint8_t>(word >> 8);
+}
+
+// The bytes from an offset on; empty unless there are at least `size`.
+Bytes structure_at(Bytes bytes, size_t offset, size_t size)
+{
+    return offset <= bytes.size() && bytes.size() - offset >= size ? bytes.subspan(offset) : Bytes();
+}
+
+// Makes the bytes add up to 0 modulo 256 by the one at `at`.
+void put_checksum(Bytes bytes, size_t at)
+{
+    bytes[at] = 0;
+    bytes[at] = static_cast<uint8_t>(hxal_checksum_u8(bytes.data(), static_cast<uint32_t>(bytes.size())));
+}
+
+bool is_patched(uint16_t devid) { return devid == 0x14 || devid == 0x17 || devid == 0x21; }
+
+// The Plug and Play header of an image; empty when there is none, or not all of it.
+Bytes pnp_header_of(Bytes image)
+{
+    const size_t offset = word_at(image, rom_header::pnp_header);
+    const Bytes header = offset == 0 ? Bytes() : structure_at(image, offset, pnp_length_unit);
+    const size_t length = header.empty() ? 0 : header[pnp_header::length] * pnp_length_unit;
+    return length <= header.size() ? header.first(length) : Bytes();
+}
+
+void patch_pnp_header(Bytes header, uint16_t devid)
+{
+    put_word(header, pnp_header::device_id, devid);
+    put_checksum(header, pnp_header::checksum);
+}
+
+// What the walk needs to know of an image before it changes anything.
+struct Rom_Image
+{
+    Bytes bytes; // empty: not all of it is there
+    Bytes data_structure;
+    bool is_x86 = false;
+    bool is_last = false;
+};
+
+Rom_Image image_at(Bytes rom, size_t offset)
+{
+    const Bytes rest = structure_at(rom, offset, rom_header::size);
+    if (rest.empty())
+        return {};
+    const Bytes found = structure_at(rest, word_at(rest, rom_header::data_structure), data_structure::size);
+    const size_t length = found.empty() ? 0 : word_at(found, data_structure::image_length) * image_length_unit;
+    if (length > rest.size())
+        return {};
+    return {.bytes = rest.first(length),
+            .data_structure = found,
+            .is_x86 = !found.empty() && found[data_structure::code_type] == x86_code,
+            .is_last = !found.empty() && (found[data_structure::indicator] & last_image) != 0};
+}
+
+} // namespace
+
+hxa_status_t fit_option_rom(Image& rom, uint16_t devid)
+{
+    const bool patched = is_patched(devid);
+    for (size_t offset = 0;;)
+    {
+        const Rom_Image image = image_at(rom, offset);
+        if (image.bytes.empty())
+            return HXA_STATUS_FAILED;
+        if (patched)
+            put_word(image.data_structure, data_structure::device_id, devid);
+        if (image.is_x86)
+        {
+            const Bytes header = pnp_header_of(image.bytes);
+            if (header.empty())
+                return HXA_STATUS_FAILED;
+            if (!patched)
+                return HXA_STATUS_OK;
+            patch_pnp_header(header, devid);
+        }
+        put_checksum(image.bytes, image.bytes.size() - 1);
+        if (image.is_last)
+            return HXA_STATUS_OK;
+        offset += image.bytes.size();
+    }
+}
+
+void reverse_words(Image& image)
+{
+    for (size_t word = 0; word + 4 <= image.size(); word += 4)
+        std::reverse(image.begin() + static_cast<ptrdiff_t>(word), image.begin() + static_cast<ptrdiff_t>(word) + 4);
+}
+
+} // namespace hxal

@@ -1,0 +1,100 @@
+// Requests to the flash of the card behind an I/O controller.
+#include "sim/caller_memory.h"
+#include "sim/command_table.h"
+#include "sim/flash.h"
+
+#include <cerrno>
+
+namespace hxasim
+{
+
+namespace
+{
+
+// The partition that a request names. Without one the record has its status.
+Flash_Partition* partition_of(const Call& call, hxa_ioctl_flash_t& record)
+{
+    auto* partition = call.ioc->adapter->flash.find(record.type, record.instance);
+    record.status = partition ? HXA_STATUS_OK : HXA_STATUS_EINVAL;
+    return partition;
+}
+
+bool fits(const Flash_Partition& partition, std::int32_t size)
+{
+    return size > 0 && static_cast<std::uint32_t>(size) <= partition.size;
+}
+
+void* buffer_of(const hxa_ioctl_flash_t& record) { return reinterpret_cast<void*>(static_cast<std::uintptr_t>(record.buf_ptr)); }
+
+} // namespace
+
+void answer_flash_attributes(Call& call, hxa_ioctl_flash_attr_t& record)
+{
+    const auto& partitions = call.ioc->adapter->flash.partitions;
+    record.attr.npart = static_cast<std::uint32_t>(partitions.size());
+    std::uint32_t offset = 0;
+    auto* field = record.attr.part;
+    for (const auto& partition : partitions)
+    {
+        field->part_type = partition.type;
+        field->part_instance = partition.instance;
+        field->part_off = offset;
+        field->part_size = partition.size;
+        field->part_len = static_cast<std::uint32_t>(partition.data.size());
+        field->part_status = partition.status;
+        offset += partition.size;
+        ++field;
+    }
+}
+
+void answer_flash_erase(Call& call, hxa_ioctl_flash_t& record)
+{
+    if (auto* partition = partition_of(call, record))
+        erase(*partition);
+}
+
+void answer_flash_update(Call& call, hxa_ioctl_flash_t& record)
+{
+    auto* partition = partition_of(call, record);
+    if (!partition)
+        return;
+    if (!fits(*partition, record.bufsz))
+    {
+        record.status = HXA_STATUS_FLASH_BAD_LEN;
+        return;
+    }
+    std::vector<std::uint8_t> bytes(static_cast<std::size_t>(record.bufsz));
+    if (!copy_from_caller(bytes, buffer_of(record)))
+        return call.refuse(EFAULT, "bad buffer address");
+    write(*partition, bytes);
+}
+
+void answer_flash_read(Call& call, hxa_ioctl_flash_t& record)
+{
+    const auto* partition = partition_of(call, record);
+    if (!partition)
+        return;
+    if (!fits(*partition, record.bufsz))
+    {
+        record.status = HXA_STATUS_FLASH_BAD_LEN;
+        return;
+    }
+    std::vector<std::uint8_t> bytes(static_cast<std::size_t>(record.bufsz));
+    read(*partition, bytes);
+    if (!copy_to_caller(buffer_of(record), bytes))
+        call.refuse(EFAULT, "bad buffer address");
+}
+
+// The manufacturing block is what the partition of that name holds.
+void answer_flash_manufacturing(Call& call, hxa_ioctl_flash_mfg_t& record)
+{
+    const auto* bytes = reinterpret_cast<const std::uint8_t*>(&record.mfg_block);
+    auto* partition = call.ioc->adapter->flash.find(HXA_FLASH_PART_MFG, 0);
+    if (!partition || !write(*partition, {bytes, sizeof(record.mfg_block)}))
+        record.status = HXA_STATUS_NOFLASH;
+}
+
+void answer_optrom_enable(Call& call, hxa_ioctl_gen_t&) { call.ioc->adapter->flash.optrom_enabled = true; }
+void answer_optrom_disable(Call& call, hxa_ioctl_gen_t&) { call.ioc->adapter->flash.optrom_enabled = false; }
+
+} // namespace hxasim
