@@ -28,12 +28,12 @@
 #pragma once
 
 #include "hxal/adapter.h"
+#include "hxal/boot.h"
 #include "hxal/config/model.h"
 #include "hxal/config/parser.h"
 #include "hxal/config/setters.h"
 #include "hxal/config/text.h"
 #include "hxal/config/writer.h"
-#include "hxal/boot.h"
 #include "hxal/flash.h"
 #include "hxal/frame.h"
 #include "hxal/ioc.h"
