@@ -44,6 +44,7 @@ struct Operation
 };
 
 // The tables.
+const std::vector<Operation>& flash_operations();
 const std::vector<Operation>& ioc_operations();
 
 // Bytes as a record holds them.

@@ -136,6 +136,7 @@ protected:
     }
 };
 
+TEST_F(Operations, of_flash) { check_all(flash_operations()); }
 TEST_F(Operations, of_iocs) { check_all(ioc_operations()); }
 
 } // namespace

@@ -23,7 +23,7 @@ const Bytes chain = joined(Rom{.code_type = efi_code, .last = false}.build(), Ro
 
 TEST(OptionRom, writes_the_device_id_and_all_checksums_into_every_image_of_a_patched_card)
 {
-    for (const uint16_t devid : {0x14, 0x17, 0x21})
+    for (const uint16_t devid : std::initializer_list<uint16_t>{0x14, 0x17, 0x21})
     {
         Bytes rom = chain;
         EXPECT_EQ(hxal::fit_option_rom(rom, devid), HXA_STATUS_OK);
