@@ -49,7 +49,7 @@ struct Repository_Index
 [[gnu::weak]] extern const Repository_Index own_repository_index;
 
 // The entries in the order of their hashes.
-template <class Entry, std::size_t N> consteval std::array<Entry, N> by_hash(const Entry (&entries)[N])
+template <class Entry, std::size_t N> constexpr std::array<Entry, N> by_hash(const Entry (&entries)[N])
 {
     std::array<Entry, N> sorted = std::to_array(entries);
     std::ranges::sort(sorted, {}, &Entry::hash);
