@@ -1,4 +1,5 @@
-// What is left when the memory ends in the middle of a scan. This program has an operator new of its own.
+// What is left when the memory ends in the middle of a scan, or of a virtual port's line. This program has an operator new of its
+// own.
 #include "hxal/internal/list.h"
 #include "simulated_host.h"
 
@@ -11,7 +12,10 @@ namespace
 // Fails the n-th allocation (from 1) of the library's own nodes.
 int failing_allocation = 0;
 
-bool is_library_node(std::size_t size) { return size == sizeof(hxal::Ioc_Node) || size == sizeof(hxal_adapter_t); }
+bool is_library_node(std::size_t size)
+{
+    return size == sizeof(hxal::Ioc_Node) || size == sizeof(hxal_adapter_t) || size == sizeof(hxal_vf_config_t);
+}
 
 } // namespace
 
@@ -62,6 +66,17 @@ TEST_F(Memory, that_ends_in_the_adapter_scan_leaves_no_adapter)
     failing_allocation = 0;
     EXPECT_EQ(hxal_adapter_scan(), 1);
     EXPECT_EQ(hxasim::open_descriptors(), 2);
+}
+
+TEST_F(Memory, that_ends_in_a_virtual_port_drops_its_line)
+{
+    failing_allocation = 2;
+    for (const char* line : {"10:01,a,b,c,1", "10:02,a,b,c,1", "10:03,a,b,c,1"})
+        hxal_config_set_vportdata(0, line);
+    const hxal_ioc_config_t& entry = hxal_config_get()->iocs[0];
+    EXPECT_EQ(entry.vpcount, 2);
+    EXPECT_STREQ(entry.vport->next->pwwn, "10:03");
+    EXPECT_EQ(entry.vport->next->next, nullptr);
 }
 
 } // namespace
