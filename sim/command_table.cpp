@@ -110,9 +110,9 @@ const Row* row_of(const hxal::Command& command)
     return found == rows.end() ? nullptr : &*found;
 }
 
-const Row* row_named(std::string_view name)
+const Row* row_named(std::string_view wanted)
 {
-    auto found = std::find_if(rows.begin(), rows.end(), [&](const Row& row) { return row.command->name == name; });
+    auto found = std::find_if(rows.begin(), rows.end(), [&](const Row& row) { return row.command->name == wanted; });
     return found == rows.end() ? nullptr : &*found;
 }
 
