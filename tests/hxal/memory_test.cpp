@@ -29,6 +29,17 @@ bool is_library_node(std::size_t size)
     throw std::bad_alloc();
 }
 
+// The address sanitizer's would not call the one above.
+[[gnu::noinline]] void* operator new(std::size_t size, const std::nothrow_t&) noexcept
+try
+{
+    return operator new(size);
+}
+catch (const std::bad_alloc&)
+{
+    return nullptr;
+}
+
 [[gnu::noinline]] void operator delete(void* memory) noexcept { std::free(memory); }
 [[gnu::noinline]] void operator delete(void* memory, std::size_t) noexcept { std::free(memory); }
 
