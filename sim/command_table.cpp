@@ -62,6 +62,25 @@ constexpr auto name = input(offsetof(hxa_ioctl_ioc_set_adapter_name_t, name), 64
 constexpr auto interrupts = input(offsetof(hxa_ioctl_iocfc_intr_t, attr), sizeof(hxa_iocfc_intr_attr_t));
 constexpr auto manufacturing = input(offsetof(hxa_ioctl_flash_mfg_t, mfg_block), sizeof(hxa_mfg_block_t));
 
+constexpr auto topology = input(offsetof(hxa_ioctl_port_cfg_topo_t, topo), 4);
+constexpr auto speed = input(offsetof(hxa_ioctl_port_cfg_speed_t, speed), 4);
+constexpr auto address = input(offsetof(hxa_ioctl_port_alpa_t, alpa), 1);
+constexpr auto frame_size = input(offsetof(hxa_ioctl_port_cfg_maxfrsize_t, maxfrsize), 2);
+constexpr auto trunk = input(offsetof(hxa_ioctl_port_trunk_t, pp_bmap), 1);
+constexpr auto identity = input(offsetof(hxa_ioctl_port_rnid_t, info), sizeof(hxa_pport_rnid_t));
+constexpr std::array<Field, 4> buffer{Field{.offset = offsetof(hxa_ioctl_port_stats_t, buf_size), .size = 4},
+                                      Field{.offset = offsetof(hxa_ioctl_port_stats_t, buf_ptr), .size = 8}};
+
+// The virtual fabric and one WWN or two, which stand side by side, and what follows them.
+constexpr auto lport = input(offsetof(hxa_ioctl_lport_attr_t, vf_id), 2 + 8);
+constexpr auto rport = input(offsetof(hxa_ioctl_rport_t, vf_id), 2 + 8 + 8);
+constexpr auto rport_list = input(offsetof(hxa_ioctl_lport_get_rports_t, vf_id), 2 + 8 + 8 + 4);
+constexpr std::array<Field, 4> rport_speed{Field{.offset = offsetof(hxa_ioctl_rport_set_speed_t, vf_id), .size = 2 + 4},
+                                           Field{.offset = offsetof(hxa_ioctl_rport_set_speed_t, pwwn), .size = 8 + 8}};
+constexpr std::array<Field, 4> frame{Field{.offset = offsetof(hxa_ioctl_fcpt_t, vf_id), .size = 2 + 8 + 8 + 4 + 4 + 4},
+                                     Field{.offset = offsetof(hxa_ioctl_fcpt_t, fchs), .size = sizeof(fchs_t) + 4 + 4 + 4},
+                                     Field{.offset = offsetof(hxa_ioctl_fcpt_t, reqbuf_ptr), .size = 8 + 8}};
+
 // clang-format off
 constexpr std::array<Field, 4> partition{
     Field{.offset = offsetof(hxa_ioctl_flash_t, instance), .size = 1},
@@ -75,30 +94,63 @@ constexpr std::array<Field, 4> partition_data{
 };
 
 constexpr std::array rows{
-    row<answer_version>                ("IOCMD_IOC_GET_VERSION",      Target::driver),
-    row<answer_instances>              ("IOCMD_IOC_GET_INST",         Target::driver),
-    row<answer_ioc_enable>             ("IOCMD_IOC_ENABLE",           Target::ioc),
-    row<answer_ioc_disable>            ("IOCMD_IOC_DISABLE",          Target::ioc),
-    row<answer_ioc_attributes>         ("IOCMD_IOC_GET_ATTR",         Target::ioc),
-    row<answer_ioc_info>               ("IOCMD_IOC_GET_INFO",         Target::ioc),
-    row<answer_ioc_statistics>         ("IOCMD_IOC_GET_STATS",        Target::ioc),
-    row<answer_ioc_reset_statistics>   ("IOCMD_IOC_RESET_STATS",      Target::ioc),
-    row<answer_ioc_power>              ("IOCMD_IOC_SET_POWER",        Target::ioc,    power),
-    row<answer_adapter_name>           ("IOCMD_IOC_SET_ADAPTER_NAME", Target::ioc,    name),
-    row<answer_port_name>              ("IOCMD_IOC_SET_PORT_NAME",    Target::ioc,    name),
-    row<answer_event_sync>             ("IOCMD_AEN_SYNC",             Target::driver, application),
-    row<answer_port_attributes>        ("IOCMD_PORT_GET_ATTR",        Target::ioc),
-    row<answer_iocfc_attributes>       ("IOCMD_IOCFC_GET_ATTR",       Target::ioc),
-    row<answer_iocfc_statistics>       ("IOCMD_IOCFC_GET_STATS",      Target::ioc),
-    row<answer_iocfc_reset_statistics> ("IOCMD_IOCFC_RESET_STATS",    Target::ioc),
-    row<answer_iocfc_interrupts>       ("IOCMD_IOCFC_SET_INTR",       Target::ioc,    interrupts),
-    row<answer_flash_attributes>       ("IOCMD_FLASH_GET_ATTR",       Target::ioc),
-    row<answer_flash_erase>            ("IOCMD_FLASH_ERASE_PART",     Target::ioc,    partition),
-    row<answer_flash_update>           ("IOCMD_FLASH_UPDATE_PART",    Target::ioc,    partition_data),
-    row<answer_flash_read>             ("IOCMD_FLASH_READ_PART",      Target::ioc,    partition_data),
-    row<answer_flash_manufacturing>    ("IOCMD_FLASH_MFG_INFO",       Target::ioc,    manufacturing),
-    row<answer_optrom_enable>          ("IOCMD_FLASH_ENABLE_OPTROM",  Target::ioc),
-    row<answer_optrom_disable>         ("IOCMD_FLASH_DISABLE_OPTROM", Target::ioc),
+    row<answer_version>               ("IOCMD_IOC_GET_VERSION",      Target::driver),
+    row<answer_instances>             ("IOCMD_IOC_GET_INST",         Target::driver),
+    row<answer_ioc_enable>            ("IOCMD_IOC_ENABLE",           Target::ioc),
+    row<answer_ioc_disable>           ("IOCMD_IOC_DISABLE",          Target::ioc),
+    row<answer_ioc_attributes>        ("IOCMD_IOC_GET_ATTR",         Target::ioc),
+    row<answer_ioc_info>              ("IOCMD_IOC_GET_INFO",         Target::ioc),
+    row<answer_ioc_statistics>        ("IOCMD_IOC_GET_STATS",        Target::ioc),
+    row<answer_ioc_reset_statistics>  ("IOCMD_IOC_RESET_STATS",      Target::ioc),
+    row<answer_ioc_power>             ("IOCMD_IOC_SET_POWER",        Target::ioc,    power),
+    row<answer_adapter_name>          ("IOCMD_IOC_SET_ADAPTER_NAME", Target::ioc,    name),
+    row<answer_port_name>             ("IOCMD_IOC_SET_PORT_NAME",    Target::ioc,    name),
+    row<answer_loopback_status>       ("IOCMD_DIAG_LB_STAT",         Target::ioc),
+    row<answer_event_sync>            ("IOCMD_AEN_SYNC",             Target::driver, application),
+    row<answer_port_enable>           ("IOCMD_PORT_ENABLE",          Target::ioc),
+    row<answer_port_disable>          ("IOCMD_PORT_DISABLE",         Target::ioc),
+    row<answer_port_attributes>       ("IOCMD_PORT_GET_ATTR",        Target::ioc),
+    row<answer_port_statistics>       ("IOCMD_PORT_GET_STATS",       Target::ioc,    buffer),
+    row<answer_port_reset_statistics> ("IOCMD_PORT_RESET_STATS",     Target::ioc),
+    row<answer_port_topology>         ("IOCMD_PORT_CFG_TOPO",        Target::ioc,    topology),
+    row<answer_port_speed>            ("IOCMD_PORT_CFG_SPEED",       Target::ioc,    speed),
+    row<answer_port_hard_address>     ("IOCMD_PORT_CFG_ALPA",        Target::ioc,    address),
+    row<answer_port_any_address>      ("IOCMD_PORT_CLR_ALPA",        Target::ioc),
+    row<answer_port_frame_size>       ("IOCMD_PORT_CFG_MAXFRSZ",     Target::ioc,    frame_size),
+    row<answer_port_trunk>            ("IOCMD_PORT_TRUNK_ENABLE",    Target::ioc,    trunk),
+    row<answer_port_untrunk>          ("IOCMD_PORT_TRUNK_DISABLE",   Target::ioc),
+    row<answer_port_identify>         ("IOCMD_PORT_CFG_RNID",        Target::ioc,    identity),
+    row<answer_port_identification>   ("IOCMD_PORT_GET_RNID",        Target::ioc),
+    row<answer_ethport_statistics>    ("IOCMD_ETHPORT_GET_STATS",    Target::ioc),
+    row<answer_ethport_attributes>    ("IOCMD_ETHPORT_GET_ATTR",     Target::ioc),
+    row<answer_iocfc_attributes>      ("IOCMD_IOCFC_GET_ATTR",       Target::ioc),
+    row<answer_iocfc_statistics>      ("IOCMD_IOCFC_GET_STATS",      Target::ioc),
+    row<answer_iocfc_reset_statistics>("IOCMD_IOCFC_RESET_STATS",    Target::ioc),
+    row<answer_iocfc_interrupts>      ("IOCMD_IOCFC_SET_INTR",       Target::ioc,    interrupts),
+    row<answer_lport_attributes>      ("IOCMD_LPORT_GET_ATTR",       Target::ioc,    lport),
+    row<answer_lport_statistics>      ("IOCMD_LPORT_GET_STATS",      Target::ioc,    lport),
+    row<answer_lport_reset_statistics>("IOCMD_LPORT_RESET_STATS",    Target::ioc,    lport),
+    row<answer_lport_remote_ports>    ("IOCMD_LPORT_GET_RPORTS",     Target::ioc,    rport_list),
+    row<answer_rport_add>             ("IOCMD_RPORT_ADD",            Target::ioc,    rport),
+    row<answer_rport_remove>          ("IOCMD_RPORT_REMOVE",         Target::ioc,    rport),
+    row<answer_rport_statistics>      ("IOCMD_RPORT_GET_STATS",      Target::ioc,    rport),
+    row<answer_rport_reset_statistics>("IOCMD_RPORT_RESET_STATS",    Target::ioc,    rport),
+    row<answer_rport_attributes>      ("IOCMD_RPORT_GET_ATTR",       Target::ioc,    rport),
+    row<answer_rport_scsi_address>    ("IOCMD_RPORT_GET_SCSI_ADDR",  Target::ioc,    rport),
+    row<answer_rport_speed>           ("IOCMD_RPORT_SET_SPEED",      Target::ioc,    rport_speed),
+    row<answer_flash_attributes>      ("IOCMD_FLASH_GET_ATTR",       Target::ioc),
+    row<answer_flash_erase>           ("IOCMD_FLASH_ERASE_PART",     Target::ioc,    partition),
+    row<answer_flash_update>          ("IOCMD_FLASH_UPDATE_PART",    Target::ioc,    partition_data),
+    row<answer_flash_read>            ("IOCMD_FLASH_READ_PART",      Target::ioc,    partition_data),
+    row<answer_flash_manufacturing>   ("IOCMD_FLASH_MFG_INFO",       Target::ioc,    manufacturing),
+    row<answer_optrom_enable>         ("IOCMD_FLASH_ENABLE_OPTROM",  Target::ioc),
+    row<answer_optrom_disable>        ("IOCMD_FLASH_DISABLE_OPTROM", Target::ioc),
+    row<answer_fc_pass_through>       ("IOCMD_FCPT",                 Target::ioc,    frame),
+    row<answer_nexus_attributes>      ("IOCMD_ITNIM_GET_ATTR",       Target::ioc,    rport),
+    row<answer_nexus_statistics>      ("IOCMD_ITNIM_GET_STATS",      Target::ioc,    rport),
+    row<answer_nexus_reset_statistics>("IOCMD_ITNIM_RESET_STATS",    Target::ioc,    rport),
+    row<answer_fcoe_statistics>       ("IOCMD_FCOE_GET_STATS",       Target::ioc),
+    row<answer_fcoe_reset_statistics> ("IOCMD_FCOE_RESET_STATS",     Target::ioc),
 };
 // clang-format on
 

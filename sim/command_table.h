@@ -88,7 +88,40 @@ void answer_iocfc_attributes(Call& call, hxa_ioctl_iocfc_attr_t& record); // ioc
 void answer_iocfc_interrupts(Call& call, hxa_ioctl_iocfc_intr_t& record);
 void answer_iocfc_statistics(Call& call, hxa_ioctl_iocfc_stats_t& record);
 void answer_iocfc_reset_statistics(Call& call, hxa_ioctl_gen_t& record);
-void answer_port_attributes(Call& call, hxa_ioctl_port_attr_t& record);   // port_commands.cpp
+void answer_port_attributes(Call& call, hxa_ioctl_port_attr_t& record); // port_commands.cpp
+void answer_port_enable(Call& call, hxa_ioctl_gen_t& record);
+void answer_port_disable(Call& call, hxa_ioctl_gen_t& record);
+void answer_loopback_status(Call& call, hxa_ioctl_diag_lb_stat_t& record);
+void answer_port_topology(Call& call, hxa_ioctl_port_cfg_topo_t& record); // port_config_commands.cpp
+void answer_port_speed(Call& call, hxa_ioctl_port_cfg_speed_t& record);
+void answer_port_hard_address(Call& call, hxa_ioctl_port_alpa_t& record);
+void answer_port_any_address(Call& call, hxa_ioctl_port_alpa_t& record);
+void answer_port_frame_size(Call& call, hxa_ioctl_port_cfg_maxfrsize_t& record);
+void answer_port_trunk(Call& call, hxa_ioctl_port_trunk_t& record);
+void answer_port_untrunk(Call& call, hxa_ioctl_port_trunk_t& record);
+void answer_port_identify(Call& call, hxa_ioctl_port_rnid_t& record);
+void answer_port_identification(Call& call, hxa_ioctl_port_rnid_t& record);
+void answer_port_statistics(Call& call, hxa_ioctl_port_stats_t& record); // statistics_commands.cpp
+void answer_port_reset_statistics(Call& call, hxa_ioctl_gen_t& record);
+void answer_fcoe_statistics(Call& call, hxa_ioctl_fcport_stats_t& record);
+void answer_fcoe_reset_statistics(Call& call, hxa_ioctl_gen_t& record);
+void answer_lport_statistics(Call& call, hxa_ioctl_lport_stats_t& record);
+void answer_ethport_attributes(Call& call, hxa_ioctl_ethport_attr_t& record); // ethport_commands.cpp
+void answer_ethport_statistics(Call& call, hxa_ioctl_ethport_stats_t& record);
+void answer_lport_attributes(Call& call, hxa_ioctl_lport_attr_t& record); // lport_commands.cpp
+void answer_lport_reset_statistics(Call& call, hxa_ioctl_lport_reset_stats_t& record);
+void answer_lport_remote_ports(Call& call, hxa_ioctl_lport_get_rports_t& record);
+void answer_rport_add(Call& call, hxa_ioctl_rport_t& record); // rport_commands.cpp
+void answer_rport_remove(Call& call, hxa_ioctl_rport_t& record);
+void answer_rport_attributes(Call& call, hxa_ioctl_rport_attr_t& record);
+void answer_rport_statistics(Call& call, hxa_ioctl_rport_stats_t& record);
+void answer_rport_reset_statistics(Call& call, hxa_ioctl_rport_reset_stats_t& record);
+void answer_rport_scsi_address(Call& call, hxa_ioctl_rport_scsi_addr_t& record);
+void answer_rport_speed(Call& call, hxa_ioctl_rport_set_speed_t& record);
+void answer_nexus_attributes(Call& call, hxa_ioctl_itnim_attr_t& record); // itnim_commands.cpp
+void answer_nexus_statistics(Call& call, hxa_ioctl_itnim_stats_t& record);
+void answer_nexus_reset_statistics(Call& call, hxa_ioctl_itnim_reset_stats_t& record);
+void answer_fc_pass_through(Call& call, hxa_ioctl_fcpt_t& record);        // fcpt_commands.cpp
 void answer_flash_attributes(Call& call, hxa_ioctl_flash_attr_t& record); // flash_commands.cpp
 void answer_flash_erase(Call& call, hxa_ioctl_flash_t& record);
 void answer_flash_update(Call& call, hxa_ioctl_flash_t& record);

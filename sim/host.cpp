@@ -79,12 +79,14 @@ Ioc* Host::find(Node node, std::uint32_t instance)
     return found == iocs.end() ? nullptr : &*found;
 }
 
+std::uint32_t& own_state(const Ioc& ioc) { return ioc.type == HXA_IOC_TYPE_LL ? ioc.port->eth_state : ioc.port->state; }
+
 std::uint32_t port_state(const Ioc& ioc)
 {
     switch (*ioc.state)
     {
     case HXA_IOC_OPERATIONAL:
-        return ioc.port->state;
+        return own_state(ioc);
     case HXA_IOC_DISABLED:
         return HXA_PPORT_ST_IOCDIS;
     case HXA_IOC_FWMISMATCH:

@@ -58,6 +58,9 @@ private:
     std::array<std::vector<Ioc>, 2> _iocs; // in the order of the scenario
 };
 
+// The port's own state on the side of this IOC.
+std::uint32_t& own_state(const Ioc& ioc);
+
 // What the port reports through this IOC: its own state while the IOC runs, else that the IOC is down.
 std::uint32_t port_state(const Ioc& ioc);
 

@@ -128,6 +128,21 @@ std::uint32_t Json_Object::number(std::string_view key, std::uint32_t most, std:
     return number(key, most).value_or(otherwise);
 }
 
+std::vector<std::uint64_t> Json_Object::numbers(std::string_view key, std::size_t longest, std::uint64_t most)
+{
+    std::vector<std::uint64_t> numbers;
+    const json* list = find(key);
+    if (!list)
+        return numbers;
+    auto fits = [=](const json& value) { return value.is_number_unsigned() && value.get<std::uint64_t>() <= most; };
+    if (!list->is_array() || list->size() > longest || !std::all_of(list->begin(), list->end(), fits))
+        refuse(place_of(key),
+               "must be a list of at most " + std::to_string(longest) + " whole numbers from 0 to " + std::to_string(most));
+    for (const auto& value : *list)
+        numbers.push_back(value.get<std::uint64_t>());
+    return numbers;
+}
+
 std::uint32_t Json_Object::choice(std::string_view key, std::span<const Choice> words, std::uint32_t most,
                                   std::uint32_t otherwise)
 {

@@ -46,6 +46,9 @@ public:
     std::uint32_t number(std::string_view key, std::uint32_t most, std::uint32_t otherwise);
     std::optional<std::uint32_t> number(std::string_view key, std::uint32_t most);
 
+    // A list of at most `longest` whole numbers from 0 to `most`; an absent key is an empty list.
+    std::vector<std::uint64_t> numbers(std::string_view key, std::size_t longest, std::uint64_t most);
+
     // One of the words, or a bare number up to `most` (drivers deliver values that have no name).
     std::uint32_t choice(std::string_view key, std::span<const Choice> words, std::uint32_t most, std::uint32_t otherwise);
     std::uint32_t word(std::string_view key, std::span<const Choice> words); // required, no bare number

@@ -1,4 +1,4 @@
-// Requests to the physical port behind an I/O controller.
+// Requests to the physical port behind an I/O controller: attributes, and taking it out of service and back.
 #include "sim/command_table.h"
 #include "sim/record_fields.h"
 
@@ -8,16 +8,9 @@ namespace hxasim
 namespace
 {
 
-void put_configuration(hxa_pport_cfg_t& field, const Port& port)
+bool is_out_of_service(std::uint32_t state)
 {
-    field.topology = HXA_PPORT_TOPOLOGY_P2P;
-    field.speed = HXA_PPORT_SPEED_AUTO;
-    field.maxfrsize = port.max_frame_size;
-    field.rx_bbcredit = 8;
-    field.tx_bbcredit = 8;
-    field.trl_def_speed = HXA_PPORT_SPEED_1GBPS;
-    field.path_tov = 30;
-    field.q_depth = 32;
+    return state == HXA_PPORT_ST_DISABLED || state == HXA_PPORT_ST_DISABLING || state == HXA_PPORT_ST_STOPPED;
 }
 
 void put_fibre_channel(hxa_pport_attr_t& field, const Port& port, bool link_up)
@@ -33,7 +26,22 @@ void put_fibre_channel(hxa_pport_attr_t& field, const Port& port, bool link_up)
     if (!link_up)
         return;
     field.topology = port.topology;
-    field.pid = port.address;
+    field.pid = port.base_port.address;
+}
+
+template <typename Change> void for_logical_ports(Port& port, Change change)
+{
+    change(port.base_port);
+    for (auto& logical : port.virtual_ports)
+        change(logical);
+}
+
+// A link that comes up runs with what was configured meanwhile.
+void start_link(Port& port)
+{
+    const auto& configuration = port.configuration;
+    port.speed = configuration.speed == HXA_PPORT_SPEED_AUTO ? port.auto_speed : configuration.speed;
+    port.topology = configuration.topology == HXA_PPORT_TOPOLOGY_AUTO ? port.auto_topology : configuration.topology;
 }
 
 } // namespace
@@ -48,11 +56,50 @@ void answer_port_attributes(Call& call, hxa_ioctl_port_attr_t& record)
     field.speed_supported = port.speed_supported;
     field.speed = link_up ? port.speed : std::uint32_t{HXA_PPORT_SPEED_UNKNOWN};
     field.beacon = port.beacon;
-    put_configuration(field.pport_cfg, port);
+    field.pport_cfg = port.configuration;
     if (ioc.type == HXA_IOC_TYPE_LL)
         field.port_type = HXA_PPORT_TYPE_UNKNOWN;
     else
         put_fibre_channel(field, port, link_up);
+}
+
+void answer_port_enable(Call& call, hxa_ioctl_gen_t& record)
+{
+    auto& port = *call.ioc->port;
+    auto& state = own_state(*call.ioc);
+    if (*call.ioc->state != HXA_IOC_OPERATIONAL)
+        record.status = HXA_STATUS_IOC_NON_OP;
+    else if (state == HXA_PPORT_ST_PREBOOT_DISABLED)
+        record.status = HXA_STATUS_PBC;
+    else if (port.loopback_test)
+        record.status = HXA_STATUS_DIAG_BUSY;
+    else if (is_out_of_service(state))
+    {
+        state = port.link_state;
+        start_link(port);
+        if (call.ioc->node == Node::hxa && state == HXA_PPORT_ST_LINKUP)
+            for_logical_ports(port, [](Logical_Port& logical) { log_in(logical); });
+    }
+}
+
+void answer_port_disable(Call& call, hxa_ioctl_gen_t& record)
+{
+    auto& state = own_state(*call.ioc);
+    if (*call.ioc->state != HXA_IOC_OPERATIONAL)
+        record.status = HXA_STATUS_IOC_NON_OP;
+    else if (state == HXA_PPORT_ST_PREBOOT_DISABLED)
+        record.status = HXA_STATUS_PBC;
+    else
+    {
+        if (call.ioc->node == Node::hxa && state == HXA_PPORT_ST_LINKUP)
+            for_logical_ports(*call.ioc->port, [](Logical_Port& logical) { log_out(logical); });
+        state = HXA_PPORT_ST_DISABLED;
+    }
+}
+
+void answer_loopback_status(Call& call, hxa_ioctl_diag_lb_stat_t& record)
+{
+    record.status = call.ioc->port->loopback_test ? HXA_STATUS_DIAG_BUSY : HXA_STATUS_OK;
 }
 
 } // namespace hxasim

@@ -2,6 +2,7 @@
 
 #include "sim/fault_list.h"
 #include "sim/json_object.h"
+#include "sim/port_scenario.h"
 #include "sim/product_line.h"
 #include "sim/scenario_words.h"
 
@@ -185,14 +186,9 @@ void Scenario_Reader::read_port(Json_Object& object, Adapter& adapter)
     read_addresses(object, port, adapter.converged());
     port.name = object.text("name", 64, port.name);
     port.symbolic_name = object.text("symbolic_name", 256, port.symbolic_name);
-    port.state = object.choice("state", port_state_words, max_u32, port.state);
-    port.speed_supported = object.number("speed_supported", max_u32, port.speed_supported);
-    port.speed = object.number("speed", max_u32, port.speed_supported);
-    port.type = object.choice("type", port_type_words, max_u32, port.type);
-    port.topology = object.choice("topology", topology_words, max_u32, port.topology);
-    port.address = object.number("address", 0xFFFFFF, port.address);
-    port.max_frame_size = static_cast<std::uint16_t>(object.number("max_frame_size", 0xFFFF, port.max_frame_size));
-    port.beacon = object.boolean("beacon", port.beacon);
+    read_link(object, port, adapter.converged());
+    read_counters(object, port, adapter.converged());
+    read_fabric(object, port);
     port.ioc_state = object.choice("ioc_state", ioc_state_words, max_u32, port.ioc_state);
     port.ioc_settle = object.number("ioc_settle", 1000, port.ioc_settle);
     port.fc_instance = _fc_instances.take(object, "fc_instance");

@@ -4,8 +4,16 @@
 // bytes, enumerations as their numbers, speeds in Gbit/s.
 #pragma once
 
+#include "sim/counters.h"
+#include "sim/fabric.h"
 #include "sim/flash.h"
 #include "sim/hxasim.h"
+
+#include "hxal/records/ethport.h"
+#include "hxal/records/fcoe.h"
+#include "hxal/records/port.h"
+#include "hxal/records/port_config.h"
+#include "hxal/records/port_stats.h"
 
 #include <array>
 #include <cstdint>
@@ -16,7 +24,6 @@
 namespace hxasim
 {
 
-using Wwn = std::array<std::uint8_t, 8>;
 using Mac = std::array<std::uint8_t, 6>;
 
 enum class Node : std::uint8_t
@@ -38,6 +45,16 @@ struct Driver
     std::optional<std::uint32_t> instance_count; // unset: the highest instance plus one
 };
 
+// What the hardware and the drivers count on one port. An FC port counts `fc` and `qos`, a converged one the others.
+struct Port_Counters
+{
+    Counters<hxa_pport_fc_stats_t, std::uint64_t> fc;
+    Counters<hxa_fcqos_stats_t, std::uint32_t> qos;
+    Counters<hxa_pport_eth_stats_t, std::uint64_t> ethernet;
+    Counters<hxa_ethport_stats_t, std::uint64_t> ethernet_function;
+    Counters<hxa_fcoe_stats_t, std::uint64_t> fcoe;
+};
+
 struct Port
 {
     std::string name;
@@ -52,14 +69,24 @@ struct Port
     Mac current_mac{};
     Mac fcoe_mac{}; // the FCoE function's own
     Mac fcoe_factory_mac{};
-    std::uint32_t state = 0;
-    std::uint32_t speed = 0;
+    std::uint32_t state = 0;      // of the FC function
+    std::uint32_t eth_state = 0;  // of the Ethernet function
+    std::uint32_t link_state = 0; // of a function in service
+    std::uint32_t speed = 0;      // of the link
+    std::uint32_t auto_speed = 0; // that the link negotiates
     std::uint32_t speed_supported = 0;
     std::uint32_t type = 0;
-    std::uint32_t topology = 0;
-    std::uint32_t address = 0; // 24-bit FC address
-    std::uint16_t max_frame_size = 0;
+    std::uint32_t topology = 0;      // of the link
+    std::uint32_t auto_topology = 0; // that the link negotiates
+    std::uint32_t mtu = 0;           // of the Ethernet function
+    hxa_pport_cfg_t configuration{};
+    hxa_pport_rnid_t identification{};
     bool beacon = false;
+    bool loopback_test = false; // one holds the port
+    Wwn fabric_name{};
+    Logical_Port base_port;
+    std::vector<Logical_Port> virtual_ports;
+    Port_Counters counters;
     std::uint32_t ioc_state = 0;
     std::uint32_t eth_ioc_state = 0;
     std::uint32_t ioc_settle = 0; // attribute requests that see an IOC on its way, after an enable or a disable

@@ -5,7 +5,9 @@
 #include "sim/scenario.h"
 
 #include "hxal/records/ioc.h"
+#include "hxal/records/itnim.h"
 #include "hxal/records/port.h"
+#include "hxal/records/rport.h"
 
 #include <array>
 #include <cerrno>
@@ -87,6 +89,44 @@ inline constexpr std::array flash_status_words{
     Choice{"bad",         HXA_FLASH_STATUS_BAD},
     Choice{"empty",       HXA_FLASH_STATUS_EMPTY},
     Choice{"ckfail",      HXA_FLASH_STATUS_CKFAIL},
+};
+
+inline constexpr std::array remote_port_state_words{
+    Choice{"uninit",      HXA_RPORT_UNINIT},
+    Choice{"offline",     HXA_RPORT_OFFLINE},
+    Choice{"plogi",       HXA_RPORT_PLOGI},
+    Choice{"online",      HXA_RPORT_ONLINE},
+    Choice{"plogi-retry", HXA_RPORT_PLOGI_RETRY},
+    Choice{"nsquery",     HXA_RPORT_NSQUERY},
+    Choice{"adisc",       HXA_RPORT_ADISC},
+    Choice{"logo",        HXA_RPORT_LOGO},
+    Choice{"logo-rcv",    HXA_RPORT_LOGORCV},
+    Choice{"nsdisc",      HXA_RPORT_NSDISC},
+};
+
+inline constexpr std::array remote_port_function_words{
+    Choice{"none",      0},
+    Choice{"initiator", HXA_RPORT_INITIATOR},
+    Choice{"target",    HXA_RPORT_TARGET},
+    Choice{"both",      HXA_RPORT_INITIATOR | HXA_RPORT_TARGET},
+};
+
+inline constexpr std::array qos_priority_words{
+    Choice{"unknown", HXA_QOS_UNKNOWN},
+    Choice{"high",    HXA_QOS_HIGH},
+    Choice{"medium",  HXA_QOS_MED},
+    Choice{"low",     HXA_QOS_LOW},
+};
+
+inline constexpr std::array nexus_state_words{
+    Choice{"offline",     HXA_ITNIM_OFFLINE},
+    Choice{"prli-send",   HXA_ITNIM_PRLI_SEND},
+    Choice{"prli-sent",   HXA_ITNIM_PRLI_SENT},
+    Choice{"prli-retry",  HXA_ITNIM_PRLI_RETRY},
+    Choice{"hcb-online",  HXA_ITNIM_HCB_ONLINE},
+    Choice{"online",      HXA_ITNIM_ONLINE},
+    Choice{"hcb-offline", HXA_ITNIM_HCB_OFFLINE},
+    Choice{"initiator",   HXA_ITNIM_INITIATIOR},
 };
 
 inline constexpr std::array errno_words{
