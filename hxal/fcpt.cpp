@@ -1,7 +1,6 @@
 #include "hxal/fcpt.h"
 
 #include "hxal/internal/request.h"
-#include "hxal/internal/sender_address.h"
 
 hxa_status_t hxal_fcpt(const hxal_t* ioc, uint16_t vf_id, wwn_t lpwwn, wwn_t dpwwn, uint32_t tsecs, hxa_boolean_t cts,
                        fc_cos_t cos, const fchs_t* fchs, const void* reqbuf, uint32_t reqsz, void* rspbuf, uint32_t* rspsz)

@@ -32,7 +32,7 @@ hxa_ioctl_flash_t part_request(const hxal_t& ioc, Part part, const Image& bytes)
     auto record = hxal::request_for<hxa_ioctl_flash_t>(ioc);
     record.type = part.type;
     record.instance = part.instance;
-    record.buf_ptr = reinterpret_cast<uintptr_t>(bytes.data());
+    record.buf_ptr = hxal::sender_address(bytes.data());
     record.bufsz = static_cast<int32_t>(bytes.size());
     return record;
 }

@@ -1,7 +1,6 @@
 #include "hxal/lport.h"
 
 #include "hxal/internal/lport_request.h"
-#include "hxal/internal/sender_address.h"
 
 using hxal::lport_request_for;
 

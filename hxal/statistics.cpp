@@ -1,7 +1,6 @@
 #include "hxal/statistics.h"
 
 #include "hxal/internal/lport_request.h"
-#include "hxal/internal/sender_address.h"
 #include "hxal/internal/text.h"
 
 #include <bit>

@@ -2,10 +2,13 @@
 //
 // The caller's array has room for as many pairs as the operation writes (HXAL_..._STATS). It is written only on
 // HXA_STATUS_OK; any other status, of the call or of the driver, leaves it alone. The pairs come in the order of the driver's
-// counters; names are terminated, for people, and not always unique.
+// counters, which are the fields of their records; names are terminated, for people, and not always unique.
 #pragma once
 
 #include "hxal/ioc.h"
+#include "hxal/records/fcoe.h"
+#include "hxal/records/lport.h"
+#include "hxal/records/port_stats.h"
 
 #ifdef __cplusplus
 extern "C"

@@ -24,8 +24,6 @@ bool fits(const Flash_Partition& partition, std::int32_t size)
     return size > 0 && static_cast<std::uint32_t>(size) <= partition.size;
 }
 
-void* buffer_of(const hxa_ioctl_flash_t& record) { return reinterpret_cast<void*>(static_cast<std::uintptr_t>(record.buf_ptr)); }
-
 } // namespace
 
 void answer_flash_attributes(Call& call, hxa_ioctl_flash_attr_t& record)
@@ -64,7 +62,7 @@ void answer_flash_update(Call& call, hxa_ioctl_flash_t& record)
         return;
     }
     std::vector<std::uint8_t> bytes(static_cast<std::size_t>(record.bufsz));
-    if (!copy_from_caller(bytes, buffer_of(record)))
+    if (!copy_from_caller(bytes, address_of(record.buf_ptr)))
         return call.refuse(EFAULT, "bad buffer address");
     write(*partition, bytes);
 }
@@ -81,7 +79,7 @@ void answer_flash_read(Call& call, hxa_ioctl_flash_t& record)
     }
     std::vector<std::uint8_t> bytes(static_cast<std::size_t>(record.bufsz));
     read(*partition, bytes);
-    if (!copy_to_caller(buffer_of(record), bytes))
+    if (!copy_to_caller(address_of(record.buf_ptr), bytes))
         call.refuse(EFAULT, "bad buffer address");
 }
 

@@ -9,9 +9,6 @@ namespace hxasim
 // Whether the FC function of the port is logged into the fabric.
 inline bool is_on_line(const Ioc& ioc) { return port_state(ioc) == HXA_PPORT_ST_LINKUP; }
 
-// An address of the caller, as a record has it.
-inline void* address_of(std::uint64_t pointer) { return reinterpret_cast<void*>(static_cast<std::uintptr_t>(pointer)); }
-
 // The logical port with this WWN in the record's virtual fabric; null, with the record's status set, when there is none.
 template <typename Record> Logical_Port* logical_port_of(Call& call, Record& record, wwn_t wwn)
 {

@@ -68,7 +68,7 @@ Remote_Port usual_remote_port(const Logical_Port& logical, std::size_t index, st
     auto low = static_cast<std::uint8_t>(index);
     remote.pwwn = {0x21, 0x00, high, 0x05, 0x1F, low, logical.pwwn[6], logical.pwwn[7]};
     remote.nwwn = {0x20, 0x00, high, 0x05, 0x1F, low, logical.pwwn[6], logical.pwwn[7]};
-    remote.address = 0x020000 + static_cast<std::uint32_t>(index);
+    remote.address = 0x200000 + static_cast<std::uint32_t>(index);
     remote.target = targets;
     return remote;
 }
@@ -116,7 +116,7 @@ Logical_Port read_virtual_port(Json_Object& object, const Port& port)
     logical.nwwn = object.address("nwwn", port.nwwn);
     logical.symbolic_name = object.text("symbolic_name", 128, "virtual port " + std::to_string(number));
     logical.virtual_fabric = static_cast<std::uint16_t>(object.number("virtual_fabric", 0xFFFF, 0));
-    logical.address = object.number("address", max_address, port.base_port.address + (std::uint32_t{number} << 16));
+    logical.address = object.number("address", max_address, port.base_port.address + number);
     logical.roles = object.number("roles", max_u32, logical.roles);
     logical.preboot = object.boolean("preboot", false);
     logical.type = HXA_PPORT_TYPE_VPORT;

@@ -115,7 +115,7 @@ Port usual_port(const Adapter& adapter, std::size_t adapter_index, std::size_t n
     port.speed_supported = adapter.max_speed;
     port.type = HXA_PPORT_TYPE_NPORT;
     port.topology = HXA_PPORT_TOPOLOGY_P2P;
-    port.base_port.address = 0x010000 + static_cast<std::uint32_t>(adapter_index << 8 | number);
+    port.base_port.address = 0x010000 + static_cast<std::uint32_t>((adapter_index * 8 + number) << 8);
     port.ioc_state = HXA_IOC_OPERATIONAL;
     port.eth_ioc_state = HXA_IOC_OPERATIONAL;
     return port;

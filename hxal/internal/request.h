@@ -36,6 +36,9 @@ template <typename Record> Record request_for(const hxal_s& ioc)
     return record;
 }
 
+// A buffer's address as a record refers to it: 8 bytes on every host.
+inline uint64_t sender_address(const void* buffer) { return reinterpret_cast<uintptr_t>(buffer); }
+
 // Sends the record under the group byte of the IOC's type; the driver answers in it. HXA_STATUS_OK, or the status of errno,
 // which is left as the call set it. Waits as long as the driver does.
 hxa_status_t transfer(const hxal_s& ioc, const Command& command, void* record);

@@ -46,6 +46,13 @@ struct Operation
 // The tables.
 const std::vector<Operation>& flash_operations();
 const std::vector<Operation>& ioc_operations();
+const std::vector<Operation>& port_operations(); // port_operations.cpp
+const std::vector<Operation>& fcoe_operations();
+const std::vector<Operation>& ethport_operations();
+const std::vector<Operation>& lport_operations(); // fabric_operations.cpp
+const std::vector<Operation>& rport_operations();
+const std::vector<Operation>& itnim_operations();
+const std::vector<Operation>& fcpt_operations();
 
 // Bytes as a record holds them.
 template <typename Value> std::vector<std::uint8_t> bytes_of(const Value& value)

@@ -138,5 +138,12 @@ protected:
 
 TEST_F(Operations, of_flash) { check_all(flash_operations()); }
 TEST_F(Operations, of_iocs) { check_all(ioc_operations()); }
+TEST_F(Operations, of_ports) { check_all(port_operations()); }
+TEST_F(Operations, of_fcoe_functions) { check_all(fcoe_operations()); }
+TEST_F(Operations, of_ethernet_ports) { check_all(ethport_operations()); }
+TEST_F(Operations, of_logical_ports) { check_all(lport_operations()); }
+TEST_F(Operations, of_remote_ports) { check_all(rport_operations()); }
+TEST_F(Operations, of_nexuses) { check_all(itnim_operations()); }
+TEST_F(Operations, of_the_pass_through) { check_all(fcpt_operations()); }
 
 } // namespace

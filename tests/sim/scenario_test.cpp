@@ -73,6 +73,13 @@ TEST_F(Scenarios, name_the_place_of_every_error)
 {
     const std::pair<const char*, const char*> cases[] = {
         {R"([])", "scenario: must be an object"},
+        {R"({"adapters": [{"kind": "fc-hba", "ports": [{"counters": {"fc": [-1]}}]}]})",
+         "adapters[0].ports[0].counters.fc: must be a list of at most 29 whole numbers from 0 to 18446744073709551615"},
+        {R"({"adapters": [{"kind": "fc-hba", "ports": [{"counters": {"ethernet": []}}]}]})",
+         "adapters[0].ports[0].counters.ethernet: unknown key"},
+        {R"({"adapters": [{"kind": "fc-hba", "ports": [{"remote_ports": [{}, {"nexus": {"state": "up"}}]}]}]})",
+         "adapters[0].ports[0].remote_ports[1].nexus.state: must be one of offline, prli-send, prli-sent, prli-retry, "
+         "hcb-online, online, hcb-offline, initiator, or a whole number from 0 to 4294967295"},
         {R"({"adaptors": []})", "adaptors: unknown key"},
         {R"({"adapters": 1})", "adapters: must be a list of at most 128 objects"},
         {R"({"adapters": [{"kind": "cna"}, 7]})", "adapters[1]: must be an object"},

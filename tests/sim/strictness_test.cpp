@@ -48,6 +48,12 @@ const Bad_Request bad_requests[] = {
     {"/dev/hxa", 0xC0284302,    4,   2, EINVAL, "/dev/hxa IOCMD_IOC_GET_INST: byte 4 is 2, must be 0"},
     {"/dev/hxa", 0xC058432A,    0,   1, EINVAL, "/dev/hxa IOCMD_AEN_SYNC: byte 0 is 1, must be 0"},
     {"/dev/hxa", 0xC058432A,   16,   1, EINVAL, "/dev/hxa IOCMD_AEN_SYNC: byte 16 is 1, must be 0"},
+    {"/dev/hxa", 0xC060BA02,   36,   1, EINVAL, "/dev/hxa IOCMD_FCPT instance 0: byte 36 is 1, must be 0"},
+    {"/dev/hxa", 0xC060BA02,   79,   1, EINVAL, "/dev/hxa IOCMD_FCPT instance 0: byte 79 is 1, must be 0"},
+    {"/dev/hxa", 0xC020B207,   12,   1, EINVAL, "/dev/hxa IOCMD_RPORT_SET_SPEED instance 0: byte 12 is 1, must be 0"},
+    // inputs that contradict each other
+    {"/dev/hxa", 0xC018432E,    8,   1, EINVAL, "/dev/hxa IOCMD_PORT_GET_STATS instance 0: buffer of 1 bytes, must be 304"},
+    {"/dev/hxa", 0xC060BA02,   64,   1, EINVAL, "/dev/hxa IOCMD_FCPT instance 0: needs a nexus: 1"},
     // instances and applications that are not there
     {"/dev/hxa", 0xC178432D,    4,   2, ENODEV, "/dev/hxa IOCMD_PORT_GET_ATTR instance 2: no such instance"},
     {"/dev/hxn", 0xC178442D,    5,   1, ENODEV, "/dev/hxn IOCMD_PORT_GET_ATTR instance 256: no such instance"},
@@ -98,6 +104,15 @@ TEST_F(Strictness, answers_bad_addresses_without_touching_them)
     expect_violation("/dev/hxa IOCMD_IOC_GET_ATTR: bad address");
     expect_violation("/dev/hxa IOCMD_IOC_GET_ATTR instance 0: bad address");
     expect_violation("/dev/hxa IOCMD_IOC_GET_ATTR: bad address");
+}
+
+TEST_F(Strictness, answers_bad_addresses_inside_a_record_the_same_way)
+{
+    hxa_ioctl_port_stats_t record{};
+    record.buf_size = sizeof(hxa_pport_stats_t);
+    record.buf_ptr = 16;
+    EXPECT_EQ(send(*hxa, "IOCMD_PORT_GET_STATS", 'C', record), EFAULT);
+    expect_violation("/dev/hxa IOCMD_PORT_GET_STATS instance 0: bad address of the counters");
 }
 
 TEST_F(Strictness, records_requests_with_their_bytes_until_taken)

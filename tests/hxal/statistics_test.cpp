@@ -1,0 +1,187 @@
+// Counters by name: every name beside its counter, converted on status 0 only.
+#include "simulated_host.h"
+
+#include <algorithm>
+#include <cerrno>
+#include <numeric>
+
+namespace
+{
+
+// Port 0: counters that are their own position, from 0.
+std::string counting(std::size_t size)
+{
+    std::string list;
+    for (std::size_t i = 0; i < size; ++i)
+        list += (i == 0 ? "[" : ", ") + std::to_string(i);
+    return list + "]";
+}
+
+class Statistics : public Simulated_Host
+{
+protected:
+    Statistics()
+    {
+        host(R"({"adapters": [
+            {"kind": "fc-hba", "ports": [{"counters": {"fc": )" +
+             counting(29) + R"(, "qos": [8, 9],
+                                                       "logical_port": )" +
+             counting(43) + R"(}}]},
+            {"kind": "cna", "ports": [{"counters": {"ethernet": )" +
+             counting(38) + R"(, "fcoe": )" + counting(45) + R"(}}]}]})");
+        hxal_adapter_scan();
+        fc = hxal_ioc_open_idx(0);
+        fcoe = hxal_ioc_open_idx(1);
+        ethernet = hxal_ioc_open_idx(2);
+        hxasim::take_requests();
+    }
+
+    // The names of the pairs, whose values have to be their positions; the first may have counted on for a second or two. The
+    // pair behind the last has to be untouched.
+    template <typename Pair, typename Read> static std::vector<std::string> names(int count, Read read)
+    {
+        Pair pairs[64];
+        std::memset(pairs, 0xEE, sizeof pairs);
+        EXPECT_EQ(read(pairs), HXA_STATUS_OK);
+        std::vector<std::string> names;
+        for (int i = 0; i < count; ++i)
+        {
+            names.emplace_back(pairs[i].name);
+            EXPECT_TRUE(i == 0 || pairs[i].value == static_cast<unsigned>(i)) << pairs[i].name << " " << pairs[i].value;
+        }
+        EXPECT_LE(pairs[0].value, 120u);
+        EXPECT_EQ(pairs[count].name[0], static_cast<char>(0xEE));
+        return names;
+    }
+
+    static std::vector<std::string> port_names(const hxal_t* ioc, int count)
+    {
+        return names<hxal_stats_long_t>(count, [=](hxal_stats_long_t* pairs) { return hxal_port_get_stats(ioc, pairs); });
+    }
+
+    hxal_t* fc = nullptr;
+    hxal_t* fcoe = nullptr;
+    hxal_t* ethernet = nullptr;
+};
+
+std::size_t index_of(const std::vector<std::string>& names, const char* name)
+{
+    return static_cast<std::size_t>(std::find(names.begin(), names.end(), name) - names.begin());
+}
+
+TEST_F(Statistics, of_a_port_carry_the_names_of_its_kind)
+{
+    const auto of_fc = port_names(fc, HXAL_FC_PORT_STATS);
+    EXPECT_EQ(of_fc[0], "Seconds since stats is reset");
+    EXPECT_EQ(of_fc[3], "TX LIP");
+    EXPECT_EQ(of_fc[offsetof(hxa_pport_fc_stats_t, rx_frames) / 8], "Rx frames");
+    EXPECT_EQ(of_fc[offsetof(hxa_pport_fc_stats_t, loss_of_syncs) / 8], "Loss of sync count");
+    EXPECT_EQ(of_fc[28], "Encoding err frame_8b10b");
+    for (const hxal_t* converged : {fcoe, ethernet})
+    {
+        const auto of_ethernet = port_names(converged, HXAL_ETH_PORT_STATS);
+        EXPECT_EQ(of_ethernet[offsetof(hxa_pport_eth_stats_t, frame_1519_1522) / 8], "Frames 1519-1522 bytes");
+        EXPECT_EQ(of_ethernet[offsetof(hxa_pport_eth_stats_t, rx_bytes) / 8], "Rx bytes");
+        EXPECT_EQ(of_ethernet[34], "Rx fcoe pause");
+        EXPECT_EQ(of_ethernet[37], "Tx FCoE zero pause");
+    }
+}
+
+TEST_F(Statistics, of_fcoe_and_of_logical_ports_carry_their_names)
+{
+    const auto of_fcoe =
+        names<hxal_stats_long_t>(HXAL_FCOE_STATS, [=, this](hxal_stats_long_t* out) { return hxal_fcoe_get_stats(fcoe, out); });
+    EXPECT_EQ(of_fcoe[offsetof(hxa_fcoe_stats_t, disc_fcf_unavail) / 8], "Discovery FCF not avail");
+    EXPECT_EQ(of_fcoe[offsetof(hxa_fcoe_stats_t, txf_ucast) / 8], "Tx FCoE unicast frames");
+    EXPECT_EQ(of_fcoe[44], "Rx broadcast vlan frames");
+
+    const auto of_logical = names<hxal_stats_t>(HXAL_LPORT_STATS, [=, this](hxal_stats_t* out)
+                                                { return hxal_lport_get_stats(fc, 0, fc->pwwn, out); });
+    EXPECT_EQ(of_logical[offsetof(hxa_lport_stats_t, ns_rejects) / 4], "NS command rejects");
+    EXPECT_EQ(of_logical[offsetof(hxa_lport_stats_t, ms_rejects) / 4], "NS command rejects");
+    EXPECT_EQ(index_of(of_logical, "ns_gidft_sent"), offsetof(hxa_lport_stats_t, ns_gidft_sent) / 4);
+    EXPECT_EQ(of_logical[42], "dropped received frames");
+}
+
+// The counters go to a buffer beside the record: 304 bytes, at an address that the record tells.
+TEST_F(Statistics, of_a_port_are_read_with_one_request)
+{
+    hxal_stats_long_t pairs[HXAL_ETH_PORT_STATS];
+    EXPECT_EQ(hxal_port_get_stats(ethernet, pairs), HXA_STATUS_OK);
+    const auto sent = hxasim::take_requests();
+    ASSERT_EQ(sent.size(), 1u);
+    EXPECT_EQ(sent[0].command, 0xC018442Eu);
+    EXPECT_EQ(sent[0].sent[8], 304 & 0xFF);
+    EXPECT_EQ(sent[0].sent[9], 304 >> 8);
+    EXPECT_NE(std::accumulate(&sent[0].sent[16], &sent[0].sent[23] + 1, 0), 0);
+}
+
+TEST_F(Statistics, are_converted_on_status_0_only)
+{
+    hxal_stats_long_t pairs[HXAL_FCOE_STATS];
+    hxal_stats_t short_pairs[HXAL_LPORT_STATS];
+    const auto expect = [&](hxa_status_t status)
+    {
+        std::memset(pairs, 0xEE, sizeof pairs);
+        std::memset(short_pairs, 0xEE, sizeof short_pairs);
+        EXPECT_EQ(hxal_port_get_stats(fc, pairs), status);
+        EXPECT_EQ(hxal_fcoe_get_stats(fcoe, pairs), status);
+        EXPECT_EQ(hxal_lport_get_stats(fc, 0, fc->pwwn, short_pairs), status);
+        const auto* bytes = reinterpret_cast<const unsigned char*>(pairs);
+        EXPECT_EQ(std::count(bytes, bytes + sizeof pairs, 0xEE), static_cast<long>(sizeof pairs));
+        bytes = reinterpret_cast<const unsigned char*>(short_pairs);
+        EXPECT_EQ(std::count(bytes, bytes + sizeof short_pairs, 0xEE), static_cast<long>(sizeof short_pairs));
+    };
+    hxasim::inject({.error = EINTR});
+    expect(HXA_STATUS_EINTR);
+    hxasim::clear_faults();
+    hxasim::inject({.answer = {{0, {HXA_STATUS_DEVBUSY, 0, 0, 0}}}});
+    expect(HXA_STATUS_DEVBUSY);
+
+    hxasim::take_requests();
+    EXPECT_EQ(hxal_port_get_stats(nullptr, pairs), HXA_STATUS_EINVAL);
+    EXPECT_EQ(hxal_port_get_stats(fc, nullptr), HXA_STATUS_EINVAL);
+    EXPECT_EQ(hxal_fcoe_get_stats(nullptr, pairs), HXA_STATUS_EINVAL);
+    EXPECT_EQ(hxal_fcoe_get_stats(fcoe, nullptr), HXA_STATUS_EINVAL);
+    EXPECT_EQ(hxal_lport_get_stats(nullptr, 0, 0, short_pairs), HXA_STATUS_EINVAL);
+    EXPECT_EQ(hxal_lport_get_stats(fc, 0, 0, nullptr), HXA_STATUS_EINVAL);
+    EXPECT_THAT(requests(), testing::IsEmpty());
+}
+
+TEST_F(Statistics, start_again_at_0)
+{
+    hxal_stats_long_t pairs[HXAL_FCOE_STATS];
+    hxal_stats_t short_pairs[HXAL_LPORT_STATS];
+    EXPECT_EQ(hxal_port_reset_stats(fc), HXA_STATUS_OK);
+    EXPECT_EQ(hxal_port_get_stats(fc, pairs), HXA_STATUS_OK);
+    EXPECT_EQ(pairs[28].value, 0u);
+    EXPECT_EQ(hxal_fcoe_reset_stats(fcoe), HXA_STATUS_OK);
+    EXPECT_EQ(hxal_fcoe_get_stats(fcoe, pairs), HXA_STATUS_OK);
+    EXPECT_EQ(pairs[44].value, 0u);
+    EXPECT_EQ(hxal_lport_reset_stats(fc, 0, fc->pwwn), HXA_STATUS_OK);
+    EXPECT_EQ(hxal_lport_get_stats(fc, 0, fc->pwwn, short_pairs), HXA_STATUS_OK);
+    EXPECT_EQ(short_pairs[42].value, 0u);
+}
+
+TEST_F(Statistics, of_an_fc_port_under_fcoe_names_are_its_quality_of_service)
+{
+    hxal_stats_long_t pairs[HXAL_FCOE_STATS];
+    EXPECT_EQ(hxal_fcoe_get_stats(fc, pairs), HXA_STATUS_OK);
+    EXPECT_EQ(pairs[0].value, 8u | uint64_t{9} << 32);
+}
+
+TEST(Name_Value_Pairs, are_made_by_position_and_cut)
+{
+    const std::string longest(70, 'l');
+    const char* names[] = {"first", longest.c_str()};
+    const uint64_t values[] = {UINT64_MAX, 2};
+    hxal_stats_long_t pairs[2];
+    hxal_stats_long_to_nv_pair(values, pairs, names, 2);
+    EXPECT_STREQ(pairs[0].name, "first");
+    EXPECT_EQ(pairs[0].value, UINT64_MAX);
+    EXPECT_EQ(std::string(pairs[1].name), std::string(63, 'l'));
+    hxal_stats_long_to_nv_pair(nullptr, pairs, nullptr, 0);
+    EXPECT_EQ(pairs[1].value, 2u);
+}
+
+} // namespace
