@@ -19,6 +19,8 @@
 //            byte by byte: "Blue" is not "blue".
 // Texts.     A driver's text that fills its field loses its last character to the terminator (a serial number of 12 keeps
 //            11). Looked up is what the field holds: the driver's whole text finds it, and so does the cut one.
+//            In what a request copies out (attributes, names), a text is as the driver left it: it may fill its field without
+//            a terminator.
 // Threads.   No list is locked. Requests and look-ups may run on any number of threads, but the calls that store what
 //            they read (hxal_adapter_get_name, hxal_ioc_get_current_mac, hxal_adapter_update_ioc) one at a time for an
 //            adapter or handle, and a scan alone: it replaces what the others are looking at.

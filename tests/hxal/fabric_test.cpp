@@ -186,8 +186,6 @@ TEST_F(Fabric, averages_the_latency_of_a_nexus)
 
     // min, max, count, clock resolution, sum behind 8 bytes of attributes: in 32 bits, whatever the status, not without a count
     constexpr std::size_t latency = offsetof(hxa_ioctl_itnim_attr_t, attr.io_latency);
-    distort("IOCMD_ITNIM_GET_ATTR", 0, {HXA_STATUS_DEVBUSY, 0, 0, 0});
-    hxasim::clear_faults();
     hxasim::inject({.command = "IOCMD_ITNIM_GET_ATTR",
                     .answer = {{0, {HXA_STATUS_DEVBUSY, 0, 0, 0}}, {latency + 8, {3, 0, 0, 0, 2, 0, 0, 0, 0x01, 0, 0, 0x80}}}});
     EXPECT_EQ(hxal_itnim_get_attr(ioc, 0, base, disks, &attr), HXA_STATUS_DEVBUSY);
