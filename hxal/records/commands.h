@@ -51,13 +51,20 @@ struct Command
     std::string_view name;
     Family family;
     std::uint8_t number;
-    std::uint32_t size; // of the record, in bytes
+    std::uint32_t size; // of the record, in bytes, as the command number tells it
     const char* record; // tag of the record type; null while no operation has its record
 };
 
 template <typename Record> consteval Command command(std::string_view name, Family family, std::uint8_t number)
 {
     return {.name = name, .family = family, .number = number, .size = sizeof(Record), .record = &record_tag<Record>};
+}
+
+// A command whose number tells another size than its record has.
+template <typename Record>
+consteval Command command(std::string_view name, Family family, std::uint8_t number, std::uint32_t size)
+{
+    return {.name = name, .family = family, .number = number, .size = size, .record = &record_tag<Record>};
 }
 
 consteval Command command(std::string_view name, Family family, std::uint8_t number, std::uint32_t size)
@@ -91,7 +98,7 @@ inline constexpr std::array catalogue{
     command(                                  "IOCMD_DIAG_BEACON",          common_family,      0x1A, 20),
     command(                                  "IOCMD_DIAG_LL_LOOPBACK",     common_family,      0x1B, 44),
     command<hxa_ioctl_diag_lb_stat_t>(        "IOCMD_DIAG_LB_STAT",         common_family,      0x1C),
-    command(                                  "IOCMD_AEN_GET",              event_family,       0x29, 88),
+    command<hxal_ioctl_aen_t>(                "IOCMD_AEN_GET",              event_family,       0x29, 88),
     command<hxa_ioctl_aen_t>(                 "IOCMD_AEN_SYNC",             common_family,      0x2A),
     command<hxa_ioctl_gen_t>(                 "IOCMD_PORT_ENABLE",          common_family,      0x2B),
     command<hxa_ioctl_gen_t>(                 "IOCMD_PORT_DISABLE",         common_family,      0x2C),
