@@ -30,6 +30,7 @@
 #pragma once
 
 #include "hxal/adapter.h"
+#include "hxal/aen.h"
 #include "hxal/boot.h"
 #include "hxal/config/model.h"
 #include "hxal/config/parser.h"
