@@ -35,6 +35,17 @@ void set_configuration(Port& port, std::uint16_t max_frame_size)
     configuration.q_depth = 32;
 }
 
+// The record is packed: its WWN cannot be referred to.
+hxa_pport_rnid_t identification_of(const Port& port)
+{
+    wwn_t wwn = 0;
+    put_address(wwn, port.pwwn);
+    hxa_pport_rnid_t identification{};
+    identification.wwn = wwn;
+    identification.unittype = 0x0A; // a host
+    return identification;
+}
+
 template <typename Block, typename Number>
 void read_block(Json_Object& object, std::string_view key, Counters<Block, Number>& counters)
 {
@@ -174,8 +185,7 @@ void read_fabric(Json_Object& object, Port& port)
     base.symbolic_name = port.symbolic_name.substr(0, sizeof(hxa_port_cfg_t::sym_name));
     base.type = port.type;
     base.address = object.number("address", max_address, base.address);
-    put_address(port.identification.wwn, port.pwwn);
-    port.identification.unittype = 0x0A; // a host
+    port.identification = identification_of(port);
     port.fabric_name = object.address("fabric_name", Wwn{0x10, 0x00, 0x00, 0x05, 0x1E, 0xF0, 0x00, 0x00});
     read_remote_ports(object, base);
     for (auto& virtual_port : object.objects("virtual_ports", max_virtual_ports))
