@@ -1,5 +1,6 @@
 // The name of an adapter, which each of its two drivers keeps for itself.
 #include "hxal/adapter.h"
+#include "hxal/config/setters.h"
 #include "hxal/frame.h"
 #include "hxal/internal/addresses.h"
 #include "hxal/internal/request.h"
@@ -41,6 +42,7 @@ hxa_status_t set_name(unsigned ad, const char* name)
         return HXA_STATUS_EINVAL;
     if (const hxa_status_t failed = send_to_both_drivers(*adapter, *first, name); failed != HXA_STATUS_OK)
         return failed;
+    hxal_config_ad_name(adapter->id, name);
     hxal::keep_text(adapter->name, name);
     return HXA_STATUS_OK;
 }

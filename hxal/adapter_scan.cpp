@@ -1,4 +1,5 @@
 #include "hxal/adapter.h"
+#include "hxal/config/model.h"
 #include "hxal/frame.h"
 #include "hxal/internal/adapter_list.h"
 #include "hxal/internal/addresses.h"
@@ -37,6 +38,8 @@ hxal_adapter_t& add_adapter(Adapter_List& list, const hxal_s& ioc, const hxa_ioc
     hxal::list_append(list.head, adapter);
     adapter->id = ++list.count;
     hxal::copy_text(adapter->serial_num, ioc.serialnum);
+    if (hxal_config_ad_lookup(adapter->serial_num) < 0)
+        hxal_config_ad_add(adapter->serial_num);
     hxal::copy_text(adapter->model_descr, attr.adapter_attr.model_descr);
     hxal::copy_text(adapter->adapter_hwpath, ioc.adapter_hwpath);
     adapter->cna_capable = attr.adapter_attr.cna_capable ? HXA_TRUE : HXA_FALSE;

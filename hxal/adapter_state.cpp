@@ -1,5 +1,6 @@
 // What an adapter does with all its IOCs: states and power.
 #include "hxal/adapter.h"
+#include "hxal/config/setters.h"
 #include "hxal/internal/ioc_state.h"
 
 #include <initializer_list>
@@ -79,5 +80,7 @@ hxa_status_t hxal_adapter_set_power(const hxal_adapter_t* ad, hxa_pm_ds_t state)
                  status = hxal_ioc_set_power(&ioc, state);
                  return status != HXA_STATUS_OK;
              });
+    if (status == HXA_STATUS_OK)
+        hxal_config_ad_ps(hxal_config_ad_lookup(ad->serial_num), state);
     return status;
 }

@@ -1,3 +1,4 @@
+#include "hxal/config/setters.h"
 #include "hxal/internal/request.h"
 #include "hxal/internal/text.h"
 
@@ -69,9 +70,11 @@ hxa_status_t hxal_ioc_set_name(hxal_t* ioc, const char* name)
     auto record = hxal::request_for<hxa_ioctl_ioc_set_adapter_name_t>(*ioc);
     hxal::put_text(record.name, name);
     const hxa_status_t status = hxal::exchange(*ioc, "IOCMD_IOC_SET_PORT_NAME", record);
-    if (status == HXA_STATUS_OK)
-        hxal::keep_text(ioc->port_name, name);
-    return status;
+    if (status != HXA_STATUS_OK)
+        return status;
+    hxal_config_ioc_name(ioc, name);
+    hxal::keep_text(ioc->port_name, name);
+    return HXA_STATUS_OK;
 }
 
 mac_t hxal_ioc_get_current_mac(hxal_t* ioc)

@@ -1,3 +1,4 @@
+#include "hxal/config/model.h"
 #include "hxal/frame.h"
 #include "hxal/internal/frame.h"
 #include "hxal/internal/ioc_list.h"
@@ -55,6 +56,8 @@ void fill_fc(hxal_s& ioc, const hxa_ioctl_ioc_info_t& info)
     ioc.factorypwwn = info.factorypwwn;
     ioc.factorynwwn = info.factorynwwn;
     hxal::copy_text(ioc.devpath, fc_node.path);
+    if (hxal_config_ioc_lookup(ioc.pwwn) < 0)
+        hxal_config_ioc_add(ioc.pwwn);
     if (ioc.ioc_type != HXA_IOC_TYPE_FCoE)
         return;
     ioc.mac = info.mac;
@@ -68,6 +71,8 @@ void fill_ethernet(hxal_s& ioc, const hxa_ioctl_ioc_info_t& info)
     ioc.current_mac = info.current_mac;
     hxal::copy_text(ioc.eth_name, info.eth_name);
     hxal::copy_text(ioc.devpath, ethernet_node.path);
+    if (hxal_config_ethioc_lookup(ioc.mac) < 0)
+        hxal_config_ethioc_add(ioc.mac);
 }
 
 void fill(hxal_s& ioc, const hxa_ioctl_ioc_info_t& info, const Device_Node& node)

@@ -1,5 +1,6 @@
 #include "hxal/iocfc.h"
 
+#include "hxal/config/setters.h"
 #include "hxal/internal/request.h"
 
 #include <cstdio>
@@ -40,7 +41,10 @@ hxa_status_t hxal_ioc_intr_set(const hxal_t* ioc, hxa_boolean_t coalesce, uint16
         return HXA_STATUS_EINVAL;
     auto record = hxal::request_for<hxa_ioctl_iocfc_intr_t>(*ioc);
     record.attr = {.coalesce = coalesce, .latency = latency, .delay = delay};
-    return hxal::exchange(*ioc, "IOCMD_IOCFC_SET_INTR", record);
+    const hxa_status_t status = hxal::exchange(*ioc, "IOCMD_IOCFC_SET_INTR", record);
+    if (status == HXA_STATUS_OK)
+        hxal_config_iocfc_intr(ioc, coalesce, delay, latency);
+    return status;
 }
 
 hxa_status_t hxal_iocfc_intr_set(const hxal_t* ioc, hxa_boolean_t coalesce, uint16_t delay, uint16_t latency)

@@ -19,8 +19,8 @@ extern "C"
     hxa_status_t hxal_iocfc_get_stats(const hxal_t* ioc, hxa_iocfc_stats_t* stats);
     hxa_status_t hxal_iocfc_reset_stats(const hxal_t* ioc);
 
-    // Set the interrupt moderation: whether the card holds interrupts back, and for how long (`delay`, `latency`, in the
-    // card's own unit). What the driver accepts is recorded in the configuration. The first form takes any IOC.
+    // Set the interrupt moderation: whether the card holds interrupts back, and for how long (`delay`, `latency`, in
+    // microseconds). What the driver accepts is recorded in the configuration. The first form takes any IOC.
     hxa_status_t hxal_ioc_intr_set(const hxal_t* ioc, hxa_boolean_t coalesce, uint16_t delay, uint16_t latency);
     hxa_status_t hxal_iocfc_intr_set(const hxal_t* ioc, hxa_boolean_t coalesce, uint16_t delay, uint16_t latency);
 

@@ -7,6 +7,7 @@
 // function below; a scenario that cannot be read is told on standard error, and opening a node answers ENODEV.
 #pragma once
 
+#include <chrono>
 #include <cstddef>
 #include <cstdint>
 #include <optional>
@@ -28,6 +29,7 @@ struct Request
     std::vector<std::uint8_t> sent;     // the record as it came in
     std::vector<std::uint8_t> answered; // the record as it went out
     int error = 0;                      // the errno the call failed with, 0 when it succeeded
+    std::chrono::nanoseconds slept{};   // how long the process asked to sleep since the request before
 };
 
 // Bytes that overwrite a part of an answered record: how a test gets a count that lies or a text that does not end.
@@ -72,6 +74,10 @@ std::vector<std::string> violations();
 
 // Open descriptors on the simulated nodes.
 int open_descriptors();
+
+// Shortens the sleeps of the whole process - nanosleep(), usleep(), select() without descriptors - to this part of their time:
+// 1 leaves them, 0 skips them. It begins with HXASIM_TIME_SCALE, or 1. Throws std::runtime_error beyond 0 to 1.
+void set_time_scale(double scale);
 
 } // namespace hxasim
 

@@ -20,7 +20,8 @@ Request as_request(Journal_Entry& entry)
             .instance = entry.instance,
             .sent = std::move(entry.sent),
             .answered = std::move(entry.answered),
-            .error = entry.error};
+            .error = entry.error,
+            .slept = entry.slept};
 }
 
 } // namespace

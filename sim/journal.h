@@ -19,6 +19,7 @@ struct Journal_Entry
     std::vector<std::uint8_t> sent = {};
     std::vector<std::uint8_t> answered = {};
     int error = 0;
+    std::chrono::nanoseconds slept{};
 };
 
 class Journal

@@ -2,6 +2,7 @@
 
 #include "sim/caller_memory.h"
 #include "sim/request_check.h"
+#include "sim/waits.h"
 
 #include <fcntl.h>
 #include <pthread.h>
@@ -74,6 +75,7 @@ void Simulator::replace_host(std::unique_ptr<Host> host)
     ++_host_number;
     _state = _host ? State::loaded : State::absent;
     _journal.clear();
+    take_slept();
     _faults.assign(_host ? _host->faults() : std::vector<Fault>());
 }
 
@@ -119,7 +121,7 @@ int Simulator::request(int descriptor, std::uint32_t code, void* record)
         return EBADF;
     if (found->second.host_number != _host_number)
         return ENODEV;
-    Journal_Entry entry{.node = found->second.node, .code = code};
+    Journal_Entry entry{.node = found->second.node, .code = code, .slept = take_slept()};
     entry.error = answer(found->second, entry, record);
     int error = entry.error;
     _journal.add(std::move(entry));

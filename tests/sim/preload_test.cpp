@@ -46,6 +46,15 @@ TEST(Preload, says_what_is_wrong_with_a_scenario_once_and_has_no_device)
                                                          "/dev/hxa: open: No such device\n/dev/hxn: open: No such device\n");
 }
 
+TEST(Preload, shortens_sleeps_as_the_environment_says)
+{
+    const std::string served = "/dev/hxa: 2\n/dev/hxn: 2\n";
+    const std::string cna = "PROBE_SLEEP=3600 HXASIM_SCENARIO=cna HXASIM_TIME_SCALE=";
+    EXPECT_EQ(run_preloaded(cna + "0.00001"), served);
+    EXPECT_EQ(run_preloaded("HXASIM_SCENARIO=cna PROBE_SLEEP=0 HXASIM_TIME_SCALE=2"),
+              "hxasim: HXASIM_TIME_SCALE=2: must be a number from 0 to 1\n" + served);
+}
+
 TEST(Preload, is_transparent_without_a_scenario) { EXPECT_EQ(run_preloaded(""), run_probe("-u LD_PRELOAD")); }
 
 } // namespace

@@ -1,4 +1,5 @@
-// A program that knows nothing of the simulator: opens both nodes and prints what they say about their instances.
+// A program that knows nothing of the simulator: opens both nodes and prints what they say about their instances, after a sleep
+// of PROBE_SLEEP seconds.
 #include <fcntl.h>
 #include <sys/ioctl.h>
 #include <unistd.h>
@@ -7,7 +8,9 @@
 #include <cerrno>
 #include <cstdint>
 #include <cstdio>
+#include <cstdlib>
 #include <cstring>
+#include <ctime>
 
 namespace
 {
@@ -30,6 +33,11 @@ void probe(const char* path, unsigned long code)
 
 int main()
 {
+    if (const char* seconds = std::getenv("PROBE_SLEEP"))
+    {
+        const timespec pause{.tv_sec = std::atoi(seconds), .tv_nsec = 0};
+        nanosleep(&pause, nullptr);
+    }
     probe("/dev/hxa", 0xC0284302);
     probe("/dev/hxn", 0xC0284402);
 }
