@@ -13,17 +13,6 @@
 #include <iterator>
 #include <vector>
 
-// The settings that are written: the lines that are no comment.
-inline std::vector<std::string> settings()
-{
-    std::vector<std::string> lines;
-    const std::string text = written();
-    for (std::size_t begin = 0, end; (end = text.find('\n', begin)) != text.npos; begin = end + 1)
-        if (end > begin && text[begin] != '#')
-            lines.push_back(text.substr(begin, end - begin));
-    return lines;
-}
-
 class Config_Model : public testing::Test
 {
 protected:

@@ -9,6 +9,7 @@
 #include <memory>
 #include <string>
 #include <utility>
+#include <vector>
 
 inline void empty_model()
 {
@@ -30,4 +31,15 @@ inline std::string written()
     std::fclose(file);
     const std::unique_ptr<char, decltype(&std::free)> owner(text, std::free);
     return {text, size};
+}
+
+// The settings that are written: the lines that are no comment.
+inline std::vector<std::string> settings()
+{
+    std::vector<std::string> lines;
+    const std::string text = written();
+    for (std::size_t begin = 0, end; (end = text.find('\n', begin)) != text.npos; begin = end + 1)
+        if (end > begin && text[begin] != '#')
+            lines.push_back(text.substr(begin, end - begin));
+    return lines;
 }

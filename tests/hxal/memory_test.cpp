@@ -1,47 +1,6 @@
-// What is left when the memory ends in the middle of a scan, or of a virtual port's line. This program has an operator new of its
-// own.
-#include "hxal/internal/list.h"
+// What is left when the memory ends in the middle of a scan, or of a virtual port's line.
+#include "allocations.h"
 #include "simulated_host.h"
-
-#include <cstdlib>
-#include <new>
-
-namespace
-{
-
-// Fails the n-th allocation (from 1) of the library's own nodes.
-int failing_allocation = 0;
-
-bool is_library_node(std::size_t size)
-{
-    return size == sizeof(hxal::Ioc_Node) || size == sizeof(hxal_adapter_t) || size == sizeof(hxal_vf_config_t);
-}
-
-} // namespace
-
-// Not inlined: the compiler would see malloc() through them and take the pairs for mismatched.
-[[gnu::noinline]] void* operator new(std::size_t size)
-{
-    if (failing_allocation > 0 && is_library_node(size) && --failing_allocation == 0)
-        throw std::bad_alloc();
-    if (void* memory = std::malloc(size))
-        return memory;
-    throw std::bad_alloc();
-}
-
-// The address sanitizer's would not call the one above.
-[[gnu::noinline]] void* operator new(std::size_t size, const std::nothrow_t&) noexcept
-try
-{
-    return operator new(size);
-}
-catch (const std::bad_alloc&)
-{
-    return nullptr;
-}
-
-[[gnu::noinline]] void operator delete(void* memory) noexcept { std::free(memory); }
-[[gnu::noinline]] void operator delete(void* memory, std::size_t) noexcept { std::free(memory); }
 
 namespace
 {
@@ -53,7 +12,7 @@ TEST_F(Memory, that_ends_in_a_node_scan_costs_that_node)
     host(one_cna); // allocations 1 and 2: the FC node, 3 and 4: the Ethernet node
     for (int allocation : {1, 2, 3, 4})
     {
-        failing_allocation = allocation;
+        allocations::fail_library_node(allocation);
         EXPECT_EQ(hxal_ioc_scan(), 2) << allocation;
         EXPECT_EQ(hxal_get_last_error(), HXA_STATUS_ENOMEM);
         EXPECT_EQ(hxal_ioc_open_idx(0)->ioc_type, allocation > 2 ? HXA_IOC_TYPE_FCoE : HXA_IOC_TYPE_LL);
@@ -67,21 +26,21 @@ TEST_F(Memory, that_ends_in_the_adapter_scan_leaves_no_adapter)
     host(one_cna); // allocation 5: the adapter, 6 to 9: its IOC copies
     for (int allocation : {5, 6, 9})
     {
-        failing_allocation = allocation;
+        allocations::fail_library_node(allocation);
         EXPECT_EQ(hxal_adapter_scan(), 0) << allocation;
         EXPECT_EQ(hxal_get_last_error(), HXA_STATUS_ENOMEM);
         EXPECT_EQ(hxal_adapter_get_num(), 0u);
         EXPECT_EQ(hxal_ioc_get_num(), 4);
         hxal_set_last_error(HXA_STATUS_OK);
     }
-    failing_allocation = 0;
+    allocations::fail_library_node(0);
     EXPECT_EQ(hxal_adapter_scan(), 1);
     EXPECT_EQ(hxasim::open_descriptors(), 2);
 }
 
 TEST_F(Memory, that_ends_in_a_virtual_port_drops_its_line)
 {
-    failing_allocation = 2;
+    allocations::fail_library_node(2);
     for (const char* line : {"10:01,a,b,c,1", "10:02,a,b,c,1", "10:03,a,b,c,1"})
         hxal_config_set_vportdata(0, line);
     const hxal_ioc_config_t& entry = hxal_config_get()->iocs[0];

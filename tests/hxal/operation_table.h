@@ -37,10 +37,12 @@ struct Operation
     std::size_t size;      // of the record
     Call call;
     std::vector<Sent> sent = {};
-    std::vector<Copied> copied = {};     // none: the operation takes no buffer
-    const char* printed_on_error = "";   // on standard output when the call fails with ENXIO
-    const char* printed_on_refusal = ""; // on standard output when an Ethernet IOC is refused
-    bool in_place = false;               // the record is the caller's buffer, also when the call fails
+    std::vector<Copied> copied = {};           // none: the operation takes no buffer
+    std::vector<std::string> fc_recorded = {}; // lines that status 0 adds to the configuration, for instance 1 of "/dev/hxa"
+    std::vector<std::string> ll_recorded = {}; // the same for instance 1 of "/dev/hxn"
+    const char* printed_on_error = "";         // on standard output when the call fails with ENXIO
+    const char* printed_on_refusal = "";       // on standard output when an Ethernet IOC is refused
+    bool in_place = false;                     // the record is the caller's buffer, also when the call fails
 };
 
 // The tables.

@@ -1,7 +1,9 @@
 // Every operation of the tables against the simulator's record of requests.
+#include "config_model.h"
 #include "operation_table.h"
 #include "simulated_host.h"
 
+#include <algorithm>
 #include <cerrno>
 #include <cstddef>
 
@@ -105,26 +107,38 @@ protected:
         EXPECT_EQ(std::memcmp(buffer.bytes, Buffer().bytes, sizeof buffer.bytes), 0);
     }
 
+    // The settings that came since.
+    static std::vector<std::string> added(const std::vector<std::string>& before)
+    {
+        std::vector<std::string> lines = settings();
+        std::erase_if(lines, [&](const std::string& line) { return std::ranges::count(before, line) > 0; });
+        return lines;
+    }
+
     static void check(const Operation& operation, hxal_t* ioc)
     {
         if (ioc->ioc_type == HXA_IOC_TYPE_LL && operation.ll_group == 0)
             return expect_refused(operation, ioc);
+        const auto before = settings();
         expect_error_passed_on(operation, ioc);
         expect_answer_passed_on(operation, ioc, HXA_STATUS_IOC_NON_OP);
         expect_answer_passed_on(operation, ioc, static_cast<hxa_status_t>(-559038737)); // 0xDEADBEEF
+        EXPECT_EQ(settings(), before) << "recorded although refused";
         expect_answer_passed_on(operation, ioc, HXA_STATUS_OK);
+        EXPECT_EQ(added(before), ioc->ioc_type == HXA_IOC_TYPE_LL ? operation.ll_recorded : operation.fc_recorded);
         if (!operation.copied.empty())
             expect_nothing_sent(operation, ioc, nullptr, HXA_STATUS_EINVAL);
     }
 
     void check_all(const std::vector<Operation>& operations)
     {
-        host(one_cna);
-        ASSERT_EQ(hxal_ioc_scan(), 4);
-        hxasim::take_requests();
         for (const Operation& operation : operations)
             for (int idx : {1, 3})
             {
+                host(one_cna);
+                empty_model();
+                ASSERT_EQ(hxal_ioc_scan(), 4);
+                hxasim::take_requests();
                 hxal_t* ioc = hxal_ioc_open_idx(idx);
                 ASSERT_EQ(ioc->instance, instance);
                 SCOPED_TRACE(std::string(operation.name) + " on " + ioc->devpath);

@@ -18,6 +18,7 @@ class Simulated_Host : public testing::Test
 protected:
     Simulated_Host()
     {
+        hxasim::set_time_scale(0);
         hxal_libinit(hxa_aen_app_cim);
         hxal_set_last_error(HXA_STATUS_OK);
     }
