@@ -10,6 +10,7 @@ from pathlib import Path
 # By program: the benchmarks to measure, and how many of which unit one iteration handles.
 MEASURED = {
     "enumerate_fc_ports": [(f"enumerate_fc_ports/{adapters}", 2 * adapters, "port") for adapters in [1, 4, 16, 64]],
+    "scan": [(f"scan/{iocs}", 2 * iocs, "IOC") for iocs in [1, 16, 128]],
     "runtime_instances": [
         ("life_of_a_port", 1_000, "port"),
         ("key_eq_of_two_ports", 1_000, "call"),
