@@ -22,8 +22,9 @@
 //            In what a request copies out (attributes, names), a text is as the driver left it: it may fill its field without
 //            a terminator.
 // Threads.   No list is locked. Requests and look-ups may run on any number of threads, but the calls that store what
-//            they read (hxal_adapter_get_name, hxal_ioc_get_current_mac, hxal_adapter_update_ioc) one at a time for an
-//            adapter or handle, and a scan alone: it replaces what the others are looking at.
+//            they read or set (hxal_adapter_get_name, hxal_adapter_set_name, hxal_adapter_update_ioc, hxal_ioc_set_name,
+//            hxal_ioc_get_current_mac) one at a time for an adapter or handle, and a scan alone: it replaces what the others
+//            are looking at. Enabling and disabling an IOC or adapter takes seconds.
 // Settings.  What a driver accepts lasts until it is reloaded. It is also recorded in the model of the drivers' configuration
 //            file (hxal/config/model.h, which has a lock of its own); hxal_libsync() makes it last.
 // Messages.  The few messages of the library go to standard output.

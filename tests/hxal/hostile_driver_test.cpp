@@ -53,6 +53,23 @@ protected:
     {
     }
 
+    // Operations of several requests, or that convert what they get.
+    static void use_compositions(hxal_t* ioc)
+    {
+        const wwn_t remote = port_wwn(7, 7);
+        hxal_port_enable(ioc);
+        hxal_port_disable(ioc);
+        hxal_stats_long_t long_counters[45];
+        hxal_port_get_stats(ioc, long_counters);
+        hxal_fcoe_get_stats(ioc, long_counters);
+        hxal_stats_t counters[43];
+        hxal_lport_get_stats(ioc, 0, ioc->pwwn, counters);
+        hxa_rport_attr_t attr;
+        hxal_rport_get_attr(ioc, 0, 0, remote, &attr);
+        hxa_rport_symname_t symname;
+        hxal_get_rport_symname(ioc, 0, 1, ioc->pwwn, remote, &symname);
+    }
+
     static void use_operations(hxal_t* ioc)
     {
         for (const auto table : tables)
@@ -73,7 +90,10 @@ protected:
         for (int port = 0; port < hxal_adapter_get_num_port(ad); ++port)
         {
             hxal_t* ioc = hxal_adapter_get_ioc(hxal_adapter_open_idx(ad), port);
+            if (!ioc)
+                continue;
             use_operations(ioc);
+            use_compositions(ioc);
             hxal_ioc_get_current_mac(ioc);
         }
         const hxal_adapter_t* adapter = hxal_adapter_open_idx(ad);
