@@ -1,4 +1,4 @@
-// The physical port: what is recorded of its settings, what the drivers make of them, and its two functions together.
+// The physical port: what the drivers make of its settings, and its two functions together.
 #include "simulated_host.h"
 
 #include <cerrno>
@@ -30,63 +30,8 @@ protected:
         return attr;
     }
 
-    const hxal_ioc_config_t& recorded() { return hxal_config_get()->iocs[hxal_config_ioc_lookup(ioc->pwwn)]; }
-    bool is_recorded(hxal_config_code_t code) { return recorded().flags[code / 32] >> code % 32 & 1; }
-
     hxal_t* ioc = nullptr;
 };
-
-TEST_F(Port, records_a_setting_that_the_driver_accepts_and_no_other)
-{
-    struct Setting
-    {
-        const char* name;
-        hxal_config_code_t code;
-        hxa_status_t (*set)(const hxal_t*);
-        hxa_status_t (*reset)(const hxal_t*);
-        uint32_t (*value)(const hxal_ioc_config_t&);
-        uint32_t expected;
-    };
-    // clang-format off
-    const Setting settings[] = {
-        {"topology", HXAL_CONFIG_PORT_TOPOLOGY,
-         [](const hxal_t* of) { return hxal_port_cfg_topology(of, HXA_PPORT_TOPOLOGY_LOOP); },
-         nullptr, [](const hxal_ioc_config_t& of) { return of.topology; }, HXA_PPORT_TOPOLOGY_LOOP},
-        {"speed", HXAL_CONFIG_PORT_SPEED, [](const hxal_t* of) { return hxal_port_cfg_speed(of, HXA_PPORT_SPEED_4GBPS); },
-         [](const hxal_t* of) { return hxal_port_cfg_speed(of, HXA_PPORT_SPEED_AUTO); },
-         [](const hxal_ioc_config_t& of) { return of.speed; }, 4},
-        {"hard address", HXAL_CONFIG_PORT_HARDALPA, [](const hxal_t* of) { return hxal_port_cfg_hardalpa(of, 0xE8); },
-         hxal_port_clr_hardalpa, [](const hxal_ioc_config_t& of) { return uint32_t{of.alpa}; }, 0xE8},
-        {"frame size", HXAL_CONFIG_PORT_MAXFRSIZE, [](const hxal_t* of) { return hxal_port_cfg_maxfrsize(of, 1024); },
-         [](const hxal_t* of) { return hxal_port_cfg_maxfrsize(of, 2112); },
-         [](const hxal_ioc_config_t& of) { return uint32_t{of.maxfrsz}; }, 1024},
-        {"trunk", HXAL_CONFIG_PORT_TRUNK, [](const hxal_t* of) { return hxal_port_trunk_enable(of, 3); },
-         hxal_port_trunk_disable, [](const hxal_ioc_config_t& of) { return of.trunking; }, 3},
-        {"service", HXAL_CONFIG_PORT_ENABLE, hxal_fcoe_port_disable, hxal_fcoe_port_enable,
-         [](const hxal_ioc_config_t& of) { return static_cast<uint32_t>(of.enable); }, HXA_FALSE},
-    };
-    // clang-format on
-    if (hxal_config_ioc_lookup(ioc->pwwn) < 0)
-        hxal_config_ioc_add(ioc->pwwn);
-    ASSERT_GE(hxal_config_ioc_lookup(ioc->pwwn), 0);
-    for (const Setting& setting : settings)
-    {
-        SCOPED_TRACE(setting.name);
-        hxasim::inject({.error = EIO, .times = 1});
-        EXPECT_EQ(setting.set(ioc), HXA_STATUS_EIO);
-        EXPECT_FALSE(is_recorded(setting.code)) << "after a failed call";
-        hxasim::inject({.status = HXA_STATUS_FAILED, .times = 1});
-        EXPECT_EQ(setting.set(ioc), HXA_STATUS_FAILED);
-        EXPECT_FALSE(is_recorded(setting.code)) << "after a refusal";
-        EXPECT_EQ(setting.set(ioc), HXA_STATUS_OK);
-        EXPECT_TRUE(is_recorded(setting.code));
-        EXPECT_EQ(setting.value(recorded()), setting.expected);
-        if (!setting.reset)
-            continue;
-        EXPECT_EQ(setting.reset(ioc), HXA_STATUS_OK);
-        EXPECT_FALSE(is_recorded(setting.code)) << "after a reset to the default";
-    }
-}
 
 TEST_F(Port, shows_what_it_was_configured_to)
 {
