@@ -75,7 +75,10 @@ Object_Path Module_Operations::create_instance(const Instance& instance)
     Path_Sink sink(_name_space);
     Provider_Call call(entry, typed.path, sink);
     call.run(mi, mi->ft->createInstance, new_instance(entry, typed));
-    return sink.found.empty() ? typed.path : std::move(sink.found.front());
+    Object_Path made = sink.found.empty() ? typed.path : std::move(sink.found.front());
+    if (made.keys.size() < entry.meta_class->num_keys)
+        throw Cim_Error(CIM_ERR_FAILED, std::string(entry.registration->provider_name) + " made an instance without a full path");
+    return made;
 }
 
 // Without a list, what the client sent is what it wants changed: a provider would take no list for all properties.
@@ -85,7 +88,7 @@ void Module_Operations::modify_instance(const Instance& instance, const Property
     const Target target = target_of(instance.path);
     const Instance typed =
         typed_instance(_module.repository(), target.provider, {target.path, instance.properties}, CIM_ERR_NO_SUCH_PROPERTY);
-    const Property_List changed = properties ? properties : names_of(typed.properties);
+    const Property_List changed = properties ? properties : names_of(instance.properties);
     for (const std::string& name : *changed)
         if (!target.provider.layout->find(name))
             throw Cim_Error(CIM_ERR_NO_SUCH_PROPERTY,

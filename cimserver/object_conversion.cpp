@@ -5,6 +5,7 @@
 #include "cimserver/class_view.h"
 #include "cimserver/key_conversion.h"
 #include "cimserver/operations.h"
+#include "cimserver/path_identity.h"
 #include "cimserver/value_conversion.h"
 
 #include <span>
@@ -128,18 +129,27 @@ private:
     int _depth = 0;
 };
 
-// The keys of a new instance's path: those that the client gave there, else the key properties.
-std::vector<Named_Value> known_keys(const Repository& repository, const Class_Entry& entry, const Instance& instance,
-                                    const std::vector<Named_Value>& properties)
+std::vector<Named_Value> keys_among(const Class_Entry& entry, const std::vector<Named_Value>& properties)
 {
-    if (!instance.path.keys.empty())
-        return typed_keys(repository, entry, instance.path);
     std::vector<Named_Value> keys;
     for (const Property_Layout::Slot& slot : entry.layout->slots())
         if (const Named_Value* property = slot.key ? find_named(properties, slot.name) : nullptr;
             property && !property->value.null())
             keys.push_back(*property);
     return keys;
+}
+
+// An instance that has a path has its keys among its properties, too, and keeps them.
+void add_keys(Instance& instance)
+{
+    for (const Named_Value& key : instance.path.keys)
+    {
+        const Named_Value* property = find_named(instance.properties, key.name);
+        if (!property)
+            instance.properties.push_back(key);
+        else if (path_identity({"", "", "", {*property}}) != path_identity({"", "", "", {key}}))
+            throw Type_Error("the key " + key.name + " cannot be changed");
+    }
 }
 
 } // namespace
@@ -149,7 +159,13 @@ Instance typed_instance(const Repository& repository, const Class_Entry& entry, 
     Instance result{{"", instance.path.name_space, entry.meta_class->name, {}}, {}};
     Converter converter(repository, result.path.name_space);
     result.properties = converter.properties(entry, instance.properties, unknown_property);
-    result.path.keys = known_keys(repository, entry, instance, result.properties);
+    if (instance.path.keys.empty())
+    {
+        result.path.keys = keys_among(entry, result.properties);
+        return result;
+    }
+    result.path.keys = typed_keys(repository, entry, instance.path);
+    add_keys(result);
     return result;
 }
 

@@ -9,11 +9,12 @@
 namespace cimserver
 {
 
-// The instance with the names and types of its class and all the keys in its path that it has: those of the path, else the
-// properties that are keys. Values are converted as operations.h tells; a property that is not given stays away.
+// The instance with the names and types of its class. The keys of its path are checked and stand among its properties too;
+// a path without keys gets those that the properties give. Values are converted as operations.h tells; any other property
+// that is not given stays away.
 //
-// Throws Type_Error for a value that is none of its type and for a property given twice, and a Cim_Error with the code
-// `unknown_property` for one that the class has not.
+// Throws Type_Error for a value that is none of its type, a property given twice and a key that contradicts the path, Key_Error
+// for wrong keys in the path, and a Cim_Error with the code `unknown_property` for a property that the class has not.
 Instance typed_instance(const Repository& repository, const Class_Entry& entry, const Instance& instance, int unknown_property);
 
 // The input arguments with the names and types of the method's parameters, in their order. References without a name space

@@ -1,7 +1,7 @@
 #include "cimserver/value_conversion.h"
 
-#include "cimserver/broker/datetime_text.h"
 #include "cimserver/broker/names.h"
+#include "cimserver/cimxml/value_text.h"
 
 #include <charconv>
 #include <cmath>
@@ -165,7 +165,7 @@ Value::Content datetime_content(const Value& value)
 {
     const auto* text = std::get_if<std::string>(&value.content);
     const std::string datetime(text ? trimmed(*text) : "");
-    return parse_datetime(datetime) ? Value::Content(datetime) : Value::Content();
+    return is_readable_datetime(datetime) ? Value::Content(datetime) : Value::Content();
 }
 
 } // namespace

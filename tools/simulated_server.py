@@ -15,12 +15,16 @@ STOP_TIMEOUT = 30  # seconds
 class SimulatedServer:
     """Starts script/server on a free port; `lines` collects what it says on standard error."""
 
-    def __init__(self, scenario="mixed", environment=None, options=None):
-        """`options`, if any, replace --no-auth on the server's command line."""
+    def __init__(self, scenario="mixed", environment=None, options=None, module=None):
+        """`options`, if any, replace --no-auth on the server's command line; `module` is served instead of the product's."""
         self.lines = []
         self._listening = threading.Event()
         self._process = subprocess.Popen(
-            [ROOT / "script/server", "--scenario", scenario, "--port", "0", *(["--", *options] if options else [])],
+            [
+                *[ROOT / "script/server", "--scenario", scenario, "--port", "0"],
+                *(["--module", module] if module else []),
+                *(["--", *options] if options else []),
+            ],
             stdin=subprocess.DEVNULL,
             stdout=subprocess.PIPE,
             stderr=subprocess.PIPE,

@@ -184,7 +184,7 @@ void Interop_Operations::modify_instance(const Instance& instance, const Propert
     if (properties)
         names = *properties;
     else
-        std::ranges::transform(changes.properties, std::back_inserter(names), &Named_Value::name);
+        std::ranges::transform(instance.properties, std::back_inserter(names), &Named_Value::name);
     for (const std::string& name : names)
         if (!found.entry.layout->find(name))
             throw Cim_Error(CIM_ERR_NO_SUCH_PROPERTY,

@@ -1,6 +1,7 @@
 """Servers and clients for the end-to-end tests. ZMLR_BUILD_DIR names the build under test."""
 
 import json
+import os
 import sys
 from pathlib import Path
 
@@ -9,7 +10,7 @@ import pywbem
 
 sys.path.insert(0, str(Path(__file__).resolve().parents[2]))
 
-from tools.simulated_server import SimulatedServer  # noqa: E402
+from tools.simulated_server import ROOT, SimulatedServer  # noqa: E402
 from tools.wbemcli import Wbemcli  # noqa: E402
 
 NAME_SPACE = "root/zemlar"
@@ -31,6 +32,14 @@ class Host:
 def mixed():
     """The scenario with a CNA, an FC HBA and a mezzanine card; shared by all tests that change nothing."""
     with SimulatedServer("mixed") as server:
+        yield Host(server)
+
+
+@pytest.fixture(scope="session")
+def tst():
+    """A server with the tests' own module. Tests clean up what they make."""
+    build = Path(os.environ.get("ZMLR_BUILD_DIR", ROOT / "build/dev"))
+    with SimulatedServer("fc-hba", module=build / "tests/e2e/module/libtst_module.so") as server:
         yield Host(server)
 
 

@@ -48,14 +48,15 @@ public:
         return boxes().by_name.erase(instance->Name.value.c_str()) == 1 ? DELETE_INSTANCE_OK : DELETE_INSTANCE_NOT_FOUND;
     }
 
-    Invoke_Method_Status EchoScalars(const Class*, Property<boolean>& BooleanValue, Property<uint8>& Uint8Value, Property<sint8>& Sint8Value,
-                                     Property<uint16>& Uint16Value, Property<sint16>& Sint16Value, Property<uint32>& Uint32Value,
-                                     Property<sint32>& Sint32Value, Property<uint64>& Uint64Value, Property<sint64>& Sint64Value,
-                                     Property<real32>& Real32Value, Property<real64>& Real64Value, Property<char16>& Char16Value,
-                                     Property<String>& StringValue, Property<Datetime>& DatetimeValue, Property<uint32>& return_value) override
+    Invoke_Method_Status EchoScalars(const Class*, Property<boolean>& BooleanValue, Property<uint8>& Uint8Value,
+                                     Property<sint8>& Sint8Value, Property<uint16>& Uint16Value, Property<sint16>& Sint16Value,
+                                     Property<uint32>& Uint32Value, Property<sint32>& Sint32Value, Property<uint64>& Uint64Value,
+                                     Property<sint64>& Sint64Value, Property<real32>& Real32Value, Property<real64>& Real64Value,
+                                     Property<char16>& Char16Value, Property<String>& StringValue,
+                                     Property<Datetime>& DatetimeValue, Property<uint32>& return_value) override
     {
-        return_value.set(non_nulls(BooleanValue, Uint8Value, Sint8Value, Uint16Value, Sint16Value, Uint32Value, Sint32Value, Uint64Value, Sint64Value, Real32Value, Real64Value, Char16Value,
-                                   StringValue, DatetimeValue));
+        return_value.set(non_nulls(BooleanValue, Uint8Value, Sint8Value, Uint16Value, Sint16Value, Uint32Value, Sint32Value,
+                                   Uint64Value, Sint64Value, Real32Value, Real64Value, Char16Value, StringValue, DatetimeValue));
         return INVOKE_METHOD_OK;
     }
 
@@ -64,7 +65,8 @@ public:
                                     Property<Array<char16>>& Char16Values, Property<Array<String>>& StringValues,
                                     Property<Array<Datetime>>& DatetimeValues, Property<uint32>& return_value) override
     {
-        return_value.set(non_nulls(BooleanValues, Uint8Values, Sint64Values, Real64Values, Char16Values, StringValues, DatetimeValues));
+        return_value.set(
+            non_nulls(BooleanValues, Uint8Values, Sint64Values, Real64Values, Char16Values, StringValues, DatetimeValues));
         return INVOKE_METHOD_OK;
     }
 

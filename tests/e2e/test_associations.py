@@ -1,0 +1,126 @@
+"""Association traversal on the tests' module: which objects each filter finds, with both clients, and what is refused."""
+
+import pytest
+import pywbem
+from pywbem import CIMInstanceName
+
+WORDS = ' two  "words" \\ and,more=<&> '
+
+
+def box(name, class_name="TST_Box"):
+    return CIMInstanceName(class_name, {"Name": name})
+
+
+def item(name):
+    return CIMInstanceName("TST_Item", {"Name": name})
+
+
+# source, filter, the names of what is found: the red box holds bolt and nut and is labelled with the bolt and the blue box,
+# which holds the item with the words.
+ASSOCIATED = [
+    (box("red"), {}, ["bolt", "nut", "blue"]),
+    (box("red"), {"AssocClass": "TST_Holds"}, ["bolt", "nut"]),
+    (box("red"), {"AssocClass": "tst_LABELS"}, ["bolt", "blue"]),
+    (box("red"), {"AssocClass": "TST_Link"}, ["bolt", "nut", "blue"]),
+    (box("red"), {"AssocClass": "TST_Item"}, []),
+    (box("red"), {"ResultClass": "TST_Item"}, ["bolt", "nut"]),
+    (box("red"), {"ResultClass": "TST_Box"}, ["blue"]),
+    (box("red"), {"ResultClass": "TST_Element"}, ["bolt", "nut", "blue"]),
+    (box("red"), {"ResultClass": "TST_Alert"}, []),
+    (box("red"), {"Role": "container"}, ["bolt", "nut", "blue"]),
+    (box("red"), {"Role": "Content"}, []),
+    (box("red"), {"Role": "Lid"}, []),
+    (box("red"), {"ResultRole": "CONTENT"}, ["bolt", "nut", "blue"]),
+    (box("red"), {"ResultRole": "Container"}, []),
+    (box("red"), {"AssocClass": "TST_Labels", "ResultClass": "TST_Box", "Role": "Container", "ResultRole": "Content"}, ["blue"]),
+    (box("red", "TST_Element"), {}, ["bolt", "nut", "blue"]),
+    (box("red", "tst_box"), {"AssocClass": "TST_Holds"}, ["bolt", "nut"]),
+    (box("blue"), {}, [WORDS, "red"]),
+    (box("blue"), {"Role": "Content"}, ["red"]),
+    (box("blue"), {"Role": "Container"}, [WORDS]),
+    (item("bolt"), {}, ["red"]),
+    (item(WORDS), {}, ["blue"]),
+    (item("   "), {}, []),
+    (box("green"), {}, []),
+]
+
+
+@pytest.mark.parametrize("source,filters,expected", ASSOCIATED)
+def test_associators_find_the_union_once(tst, source, filters, expected):
+    names = tst.pywbem.AssociatorNames(source, **filters)
+    assert sorted(name["Name"] for name in names) == sorted(expected)
+    assert all(name.namespace == "root/zemlar" and name.host for name in names)
+    instances = tst.pywbem.Associators(source, **filters)
+    assert sorted(map(str, names)) == sorted(str(instance.path) for instance in instances)
+    for instance in instances:
+        assert instance["Name"] == instance.path["Name"]
+        again = tst.pywbem.GetInstance(instance.path)
+        assert dict(again) == dict(instance)
+
+
+# source, filter, {(association, container, content)}
+REFERENCES = [
+    (box("red"), {}, {("Holds", "red", "bolt"), ("Holds", "red", "nut"), ("Labels", "red", "bolt"), ("Labels", "red", "blue")}),
+    (box("red"), {"ResultClass": "TST_Holds"}, {("Holds", "red", "bolt"), ("Holds", "red", "nut")}),
+    (box("blue"), {"ResultClass": "TST_Link"}, {("Holds", "blue", WORDS), ("Labels", "red", "blue")}),
+    (box("blue"), {"Role": "CONTENT"}, {("Labels", "red", "blue")}),
+    (item("bolt"), {"Role": "Content"}, {("Holds", "red", "bolt"), ("Labels", "red", "bolt")}),
+    (item("bolt"), {"Role": "Container"}, set()),
+    (item("bolt"), {"ResultClass": "TST_Item"}, set()),
+]
+
+
+@pytest.mark.parametrize("source,filters,expected", REFERENCES)
+def test_references_find_the_associations(tst, source, filters, expected):
+    def triple(path):
+        return path.classname[4:], path["Container"]["Name"], path["Content"]["Name"]
+
+    names = tst.pywbem.ReferenceNames(source, **filters)
+    assert {triple(path) for path in names} == expected
+    assert len(names) == len(expected)
+    instances = tst.pywbem.References(source, **filters)
+    assert {triple(instance.path) for instance in instances} == expected
+    for instance in instances:
+        assert instance["Container"] == instance.path["Container"]
+        assert instance["Container"].namespace == "root/zemlar"
+
+
+def test_property_lists_shorten_objects_never_paths(tst):
+    found = tst.pywbem.Associators(box("red"), AssocClass="TST_Holds", PropertyList=["weight", "Nothing"])
+    assert [dict(instance) for instance in found] == [{"Weight": 1}, {"Weight": 1}]
+    assert [instance.path["Name"] for instance in found] == ["bolt", "nut"]
+    found = tst.pywbem.References(box("red"), ResultClass="TST_Holds", PropertyList=["Position"])
+    assert [dict(instance) for instance in found] == [{"Position": 1}, {"Position": 2}]
+    assert [instance.path["Content"]["Name"] for instance in found] == ["bolt", "nut"]
+    origins = tst.pywbem.Associators(box("red"), AssocClass="TST_Holds", IncludeClassOrigin=True)[0]
+    assert origins.properties["Name"].class_origin == "TST_Element"
+    assert origins.properties["Weight"].class_origin == "TST_Item"
+
+
+@pytest.mark.parametrize(
+    "call,code",
+    [
+        (lambda c: c.Associators(box("red"), AssocClass="TST_Nothing"), 4),
+        (lambda c: c.AssociatorNames(box("red"), ResultClass="TST_Nothing"), 4),
+        (lambda c: c.References(box("red"), ResultClass="TST_Nothing"), 4),
+        (lambda c: c.ReferenceNames(CIMInstanceName("TST_Nothing", {"Name": "red"})), 4),
+        (lambda c: c.AssociatorNames(CIMInstanceName("TST_Box", {"Caption": "red"})), 4),
+        (lambda c: c.AssociatorNames(CIMInstanceName("TST_Box", {"Name": "red", "Colour": "red"})), 4),
+        (lambda c: c.Associators("TST_Box"), 7),
+        (lambda c: c.ReferenceNames(CIMInstanceName("TST_Box", {"Name": "red"}, namespace="root/nowhere")), 3),
+    ],
+)
+def test_errors(tst, call, code):
+    with pytest.raises(pywbem.CIMError) as caught:
+        call(tst.pywbem)
+    assert caught.value.status_code == code
+    assert caught.value.status_description
+
+
+def test_wbemcli_walks_the_same_way(tst):
+    red = "TST_Box.Name=red"
+    assert len(tst.wbemcli.run("ain", red)) == 3
+    assert len([line for line in tst.wbemcli.run("ai", red) if line.startswith("-Name")]) == 3
+    assert len(tst.wbemcli.run("rin", red)) == 4
+    assert sum(line.startswith("-Position") for line in tst.wbemcli.run("ri", red)) == 2
+    assert len(tst.wbemcli.run("ain", red, "-ac", "TST_Link", "-arr", "Content", "-arc", "TST_Box")) == 1

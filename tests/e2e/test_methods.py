@@ -1,0 +1,127 @@
+"""Extrinsic methods of the tests' module: every kind of parameter, out and back, and what is refused."""
+
+from datetime import datetime, timedelta
+
+import pytest
+import pywbem
+from pywbem import CIMDateTime, CIMInstance, CIMInstanceName, CIMParameter
+
+RED = CIMInstanceName("TST_Box", {"Name": "red"})
+BOLT = CIMInstanceName("TST_Item", {"Name": ' two  "words" \\ and,more=<&> '})
+
+
+def host_less(value):
+    """References come back with the name space that they were given by the server."""
+    if isinstance(value, list):
+        return [host_less(element) for element in value]
+    if isinstance(value, CIMInstanceName):
+        return CIMInstanceName(value.classname, value.keybindings)
+    return value
+
+
+SCALARS = [
+    ("BooleanValue", "boolean", [True]),
+    ("Uint8Value", "uint8", [0, 255]),
+    ("Sint8Value", "sint8", [-128, 127]),
+    ("Uint16Value", "uint16", [65535]),
+    ("Sint16Value", "sint16", [-32768]),
+    ("Uint32Value", "uint32", [2**32 - 1]),
+    ("Sint32Value", "sint32", [-(2**31)]),
+    ("Uint64Value", "uint64", [2**64 - 1]),
+    ("Sint64Value", "sint64", [-(2**63), 2**63 - 1]),
+    ("Real32Value", "real32", [1.5]),
+    ("Real64Value", "real64", [1.0 / 3]),
+    ("Char16Value", "char16", ["\u20ac"]),
+    ("StringValue", "string", ["", "  a\n ", "<&>\"'\u00e9"]),
+    ("DatetimeValue", "datetime", [CIMDateTime(timedelta(0)), CIMDateTime(datetime(1999, 12, 31, 23, 59, 59))]),
+]
+ARRAYS = [
+    ("BooleanValues", "boolean", [[True, True], []]),
+    ("Uint8Values", "uint8", [[0, 255]]),
+    ("Sint64Values", "sint64", [[-(2**63), 2**63 - 1]]),
+    ("Real64Values", "real64", [[0.1, -0.0]]),
+    ("Char16Values", "char16", [["a", "\u00e9"]]),
+    ("StringValues", "string", [["", " ", "<&>"], ["x"] * 1000]),
+    ("DatetimeValues", "datetime", [[CIMDateTime(timedelta(days=1))]]),
+]
+OBJECTS = [
+    ("Element", "reference", [RED, BOLT]),
+    ("Elements", "reference", [[RED, BOLT], []]),
+    ("Item", "string", [CIMInstance("TST_Item", {"Name": "<&>"}).tocimxmlstr()]),
+]
+CASES = [("EchoScalars", *row) for row in SCALARS] + [("EchoArrays", *row) for row in ARRAYS]
+CASES += [("EchoObjects", *row) for row in OBJECTS]
+
+
+@pytest.mark.parametrize("method,name,cim_type,values", CASES, ids=[row[1] for row in CASES])
+def test_arguments_come_back_as_they_were_sent(tst, method, name, cim_type, values):
+    for value in values:
+        parameter = CIMParameter(name, cim_type, value=value, is_array=isinstance(value, list))
+        count, out = tst.pywbem.InvokeMethod(method, RED, [parameter])
+        assert count == 1
+        assert {key: host_less(result) for key, result in out.items()} == {name: value}
+
+
+def test_all_arguments_at_once_and_none(tst):
+    parameters = [CIMParameter(name, cim_type, value=values[0]) for name, cim_type, values in SCALARS]
+    assert tst.pywbem.InvokeMethod("echoscalars", RED, parameters)[0] == len(SCALARS)
+    assert tst.pywbem.InvokeMethod("EchoScalars", RED) == (0, {})
+    nulls = [CIMParameter(name, cim_type, value=None) for name, cim_type, _ in SCALARS]
+    assert tst.pywbem.InvokeMethod("EchoScalars", RED, nulls) == (0, {}), "null outputs are left out"
+
+
+def test_false_comes_back_false(tst):
+    # pywbem takes every boolean among the output parameters for true.
+    tst.pywbem.InvokeMethod("EchoScalars", RED, [("BooleanValue", False)])
+    assert '<PARAMVALUE NAME="BooleanValue" PARAMTYPE="boolean"><VALUE>false</VALUE>' in tst.pywbem.last_raw_reply.decode()
+
+
+def test_static_method_and_a_text_returned(tst):
+    parts = [("Parts", ["a", " ", "<b>"]), ("Separator", "&")]
+    assert tst.pywbem.InvokeMethod("Join", "TST_Box", parts)[0] == "a& &<b>"
+    assert tst.pywbem.InvokeMethod("Join", "TST_Box", [("Separator", "&")])[0] is None
+
+
+def test_a_superclass_names_the_object_too(tst):
+    red = CIMInstanceName("TST_Element", {"Name": "red"})
+    assert tst.pywbem.InvokeMethod("EchoScalars", red, [("StringValue", "x")]) == (1, {"StringValue": "x"})
+
+
+def test_a_providers_refusal_keeps_its_code(tst):
+    for status, code in {130: 1, 131: 7, 132: 2}.items():
+        with pytest.raises(pywbem.CIMError) as caught:
+            tst.pywbem.InvokeMethod("Fail", RED, [("Status", pywbem.Uint32(status))])
+        assert caught.value.status_code == code
+    assert tst.pywbem.InvokeMethod("Fail", RED, [("Status", pywbem.Uint32(0))]) == (None, {})
+
+
+def test_wbemcli_calls_methods(tst):
+    printed = tst.wbemcli.run("cm", "TST_Box.Name=red", "EchoScalars.Uint8Value=255,StringValue=hello")
+    assert any(line.rstrip().endswith("2") for line in printed), printed
+
+
+ERRORS = [
+    ("unknown method", RED, "Explode", [], 17),
+    ("a property", RED, "Caption", [], 17),
+    ("unknown class", CIMInstanceName("TST_Nothing", {"Name": "red"}), "Fail", [], 5),
+    ("unknown parameter", RED, "Fail", [("Colour", "red")], 4),
+    ("the return value", RED, "Fail", [("return_value", pywbem.Uint32(1))], 4),
+    ("text for a number", RED, "Fail", [("Status", "many")], 4),
+    ("too large", RED, "Fail", [("Status", pywbem.Uint64(2**32))], 4),
+    ("twice", RED, "Fail", [("Status", pywbem.Uint32(0)), ("STATUS", pywbem.Uint32(0))], 4),
+    ("array for a scalar", RED, "Fail", [("Status", [pywbem.Uint32(0)])], 4),
+    ("reference to another class", RED, "EchoObjects", [("Element", CIMInstanceName("TST_Alert", {"Text": "x"}))], 4),
+    ("reference without a key", RED, "EchoObjects", [("Element", CIMInstanceName("TST_Item", {"Caption": "x"}))], 4),
+    ("text for a reference", RED, "EchoObjects", [("Element", "bolt")], 4),
+    ("path without a key", CIMInstanceName("TST_Box", {"Caption": "red"}), "Fail", [], 4),
+    ("static method of an instance", RED, "Join", [], 1),
+    ("unserved class", "TST_Element", "Fail", [], 17),
+]
+
+
+@pytest.mark.parametrize("target,method,arguments,code", [pytest.param(*row[1:], id=row[0]) for row in ERRORS])
+def test_errors(tst, target, method, arguments, code):
+    with pytest.raises(pywbem.CIMError) as caught:
+        tst.pywbem.InvokeMethod(method, target, arguments)
+    assert caught.value.status_code == code, caught.value
+    assert caught.value.status_description
