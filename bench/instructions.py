@@ -17,6 +17,7 @@ MEASURED = {
         ("find_a_class_by_name", 1_000, "call"),
         ("filter_ten_properties", 1_000, "call"),
     ],
+    "conversion": [("convert_fc_port", 100, "port"), ("bare_broker_calls", 100, "port")],
     "log_call": [("suppressed_log_call", 100_000, "call")],
 }
 

@@ -1,8 +1,7 @@
 // Broker: what the server lends to the module: the CMPI broker with its three function tables.
 //
-// Objects can be made and examined, threads attached, indications delivered, and instances read back through the server
-// (up-calls), on any thread and from within a request. Everything else a provider may call answers
-// CMPI_RC_ERR_NOT_SUPPORTED.
+// Objects can be made and examined, threads attached, indications delivered, and the server's operations called (up-calls),
+// on any thread and from within a request. What this server does not offer answers CMPI_RC_ERR_NOT_SUPPORTED.
 #pragma once
 
 #include "cimserver/broker/model.h"

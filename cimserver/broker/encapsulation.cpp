@@ -80,15 +80,25 @@ CMPIDateTime* new_date_time_from_chars(const CMPIBroker*, const char* text, CMPI
     return answer<CMPIDateTime*>(status, nullptr, [&] { return make<Datetime_Object>(std::string(required(text))).face(); });
 }
 
+// Null when there is no text.
+CMPIArray* array_of_texts(const std::vector<std::string>& texts)
+{
+    std::vector<Value> elements;
+    for (const std::string& text : texts)
+        elements.push_back({CMPI_string, text});
+    return elements.empty() ? nullptr : make<Array_Object>(CMPIType{CMPI_string}, std::move(elements)).face();
+}
+
 CMPISelectExp* new_select_exp(const CMPIBroker*, const char* query, const char*, CMPIArray** projection,
                               CMPIStatus* status) noexcept
 {
     return answer<CMPISelectExp*>(status, nullptr,
                                   [&]
                                   {
+                                      auto& select = make<Select_Object>(required(query));
                                       if (projection)
-                                          *projection = nullptr;
-                                      return make<Select_Object>(required(query)).face();
+                                          *projection = array_of_texts(select.projection);
+                                      return select.face();
                                   });
 }
 

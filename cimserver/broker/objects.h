@@ -151,15 +151,17 @@ public:
     std::size_t next = 0;
 };
 
-// The query of an indication filter; this server does not evaluate it for the provider.
+// The query of an indication filter, "SELECT properties FROM class ..."; this server does not evaluate it for the provider.
 class Select_Object : public Handle<CMPISelectExp, Select_Object>
 {
 public:
     static const Table table;
 
-    explicit Select_Object(std::string query_) : query(std::move(query_)) {}
+    // Throws INVALID_QUERY when the text selects nothing from anything.
+    explicit Select_Object(std::string query_);
 
     const std::string query;
+    const std::vector<std::string> projection; // the selected properties; empty: all
 };
 
 } // namespace cimserver

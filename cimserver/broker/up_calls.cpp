@@ -1,10 +1,12 @@
 // The broker's own table: attaching threads, and requests that a provider sends back through the server.
 #include "cimserver/broker/broker.h"
+#include "cimserver/broker/conversion.h"
 #include "cimserver/broker/objects.h"
 #include "cimserver/broker/return_code.h"
 #include "cimserver/operations.h"
 
 #include <memory>
+#include <utility>
 #include <vector>
 
 namespace cimserver
@@ -84,35 +86,34 @@ template <class T> CMPIEnumeration* enumeration(CMPIType type, std::vector<T> fo
     return make<Enumeration_Object>(type, std::move(elements)).face();
 }
 
+// An up-call that answers several objects of a CMPI type.
+template <class Body>
+CMPIEnumeration* enumerate(const CMPIBroker* broker, const CMPIContext* context, CMPIType type, CMPIStatus* status,
+                           Body body) noexcept
+{
+    return answer<CMPIEnumeration*>(status, nullptr, [&] { return enumeration(type, up_call(broker, context, body)); });
+}
+
 CMPIEnumeration* enumerate_instance_names(const CMPIBroker* broker, const CMPIContext* context, const CMPIObjectPath* self,
                                           CMPIStatus* status) noexcept
 {
-    return answer<CMPIEnumeration*>(status, nullptr,
-                                    [&]
-                                    {
-                                        const Object_Path& path = object<Path_Object>(self).path;
-                                        return enumeration(CMPI_ref, up_call(broker, context,
-                                                                             [&](Operations& operations) {
-                                                                                 return operations.enumerate_instance_names(
-                                                                                     path.name_space, path.class_name);
-                                                                             }));
-                                    });
+    const auto body = [&](Operations& operations)
+    {
+        const Object_Path& path = object<Path_Object>(self).path;
+        return operations.enumerate_instance_names(path.name_space, path.class_name);
+    };
+    return enumerate(broker, context, CMPI_ref, status, body);
 }
 
 CMPIEnumeration* enumerate_instances(const CMPIBroker* broker, const CMPIContext* context, const CMPIObjectPath* self,
                                      const char** properties, CMPIStatus* status) noexcept
 {
-    return answer<CMPIEnumeration*>(status, nullptr,
-                                    [&]
-                                    {
-                                        const Object_Path& path = object<Path_Object>(self).path;
-                                        return enumeration(CMPI_instance, up_call(broker, context,
-                                                                                  [&](Operations& operations) {
-                                                                                      return operations.enumerate_instances(
-                                                                                          path.name_space, path.class_name, true,
-                                                                                          property_list(properties));
-                                                                                  }));
-                                    });
+    const auto body = [&](Operations& operations)
+    {
+        const Object_Path& path = object<Path_Object>(self).path;
+        return operations.enumerate_instances(path.name_space, path.class_name, true, property_list(properties));
+    };
+    return enumerate(broker, context, CMPI_instance, status, body);
 }
 
 CMPIInstance* get_instance(const CMPIBroker* broker, const CMPIContext* context, const CMPIObjectPath* self,
@@ -142,65 +143,136 @@ CMPIStatus deliver_indication(const CMPIBroker* broker, const CMPIContext* conte
         });
 }
 
-CMPIObjectPath* create_instance(const CMPIBroker*, const CMPIContext*, const CMPIObjectPath*, const CMPIInstance*,
-                                CMPIStatus* status) noexcept
+// An instance under a path of its own, as the server's operations take it.
+Instance at(const CMPIObjectPath* path, const CMPIInstance* instance)
 {
-    return not_supported<CMPIObjectPath*>(status, nullptr);
+    Instance result = object<Instance_Object>(instance).model();
+    result.path = object<Path_Object>(path).path;
+    return result;
 }
 
-CMPIStatus modify_instance(const CMPIBroker*, const CMPIContext*, const CMPIObjectPath*, const CMPIInstance*,
-                           const char**) noexcept
+CMPIObjectPath* create_instance(const CMPIBroker* broker, const CMPIContext* context, const CMPIObjectPath* path,
+                                const CMPIInstance* instance, CMPIStatus* status) noexcept
 {
-    return not_supported();
+    const auto body = [&]
+    {
+        const Instance source = at(path, instance);
+        return make<Path_Object>(
+                   up_call(broker, context, [&](Operations& operations) { return operations.create_instance(source); }))
+            .face();
+    };
+    return answer<CMPIObjectPath*>(status, nullptr, body);
 }
 
-CMPIStatus delete_instance(const CMPIBroker*, const CMPIContext*, const CMPIObjectPath*) noexcept { return not_supported(); }
-
-CMPIEnumeration* exec_query(const CMPIBroker*, const CMPIContext*, const CMPIObjectPath*, const char*, const char*,
-                            CMPIStatus* status) noexcept
+CMPIStatus modify_instance(const CMPIBroker* broker, const CMPIContext* context, const CMPIObjectPath* path,
+                           const CMPIInstance* instance, const char** properties) noexcept
 {
-    return not_supported<CMPIEnumeration*>(status, nullptr);
+    return answer(
+        [&]
+        {
+            const Instance source = at(path, instance);
+            up_call(broker, context,
+                    [&](Operations& operations) { operations.modify_instance(source, property_list(properties)); });
+        });
 }
 
-CMPIEnumeration* associators(const CMPIBroker*, const CMPIContext*, const CMPIObjectPath*, const char*, const char*, const char*,
-                             const char*, const char**, CMPIStatus* status) noexcept
+CMPIStatus delete_instance(const CMPIBroker* broker, const CMPIContext* context, const CMPIObjectPath* path) noexcept
 {
-    return not_supported<CMPIEnumeration*>(status, nullptr);
+    return answer(
+        [&] {
+            up_call(broker, context, [&](Operations& operations) { operations.delete_instance(object<Path_Object>(path).path); });
+        });
 }
 
-CMPIEnumeration* associator_names(const CMPIBroker*, const CMPIContext*, const CMPIObjectPath*, const char*, const char*,
-                                  const char*, const char*, CMPIStatus* status) noexcept
+CMPIEnumeration* exec_query(const CMPIBroker* broker, const CMPIContext* context, const CMPIObjectPath* path, const char* query,
+                            const char* language, CMPIStatus* status) noexcept
 {
-    return not_supported<CMPIEnumeration*>(status, nullptr);
+    const auto body = [&](Operations& operations)
+    { return operations.exec_query(object<Path_Object>(path).path.name_space, required(query), required(language)); };
+    return enumerate(broker, context, CMPI_instance, status, body);
 }
 
-CMPIEnumeration* references(const CMPIBroker*, const CMPIContext*, const CMPIObjectPath*, const char*, const char*, const char**,
-                            CMPIStatus* status) noexcept
+std::string optional(const char* text) { return text ? text : ""; }
+
+CMPIEnumeration* associators(const CMPIBroker* broker, const CMPIContext* context, const CMPIObjectPath* path,
+                             const char* association_class, const char* result_class, const char* role, const char* result_role,
+                             const char** properties, CMPIStatus* status) noexcept
 {
-    return not_supported<CMPIEnumeration*>(status, nullptr);
+    const auto body = [&](Operations& operations)
+    {
+        return operations.associators(
+            object<Path_Object>(path).path,
+            {optional(association_class), optional(result_class), optional(role), optional(result_role)},
+            property_list(properties));
+    };
+    return enumerate(broker, context, CMPI_instance, status, body);
 }
 
-CMPIEnumeration* reference_names(const CMPIBroker*, const CMPIContext*, const CMPIObjectPath*, const char*, const char*,
-                                 CMPIStatus* status) noexcept
+CMPIEnumeration* associator_names(const CMPIBroker* broker, const CMPIContext* context, const CMPIObjectPath* path,
+                                  const char* association_class, const char* result_class, const char* role,
+                                  const char* result_role, CMPIStatus* status) noexcept
 {
-    return not_supported<CMPIEnumeration*>(status, nullptr);
+    const auto body = [&](Operations& operations)
+    {
+        return operations.associator_names(object<Path_Object>(path).path, {optional(association_class), optional(result_class),
+                                                                            optional(role), optional(result_role)});
+    };
+    return enumerate(broker, context, CMPI_ref, status, body);
 }
 
-CMPIData invoke_method(const CMPIBroker*, const CMPIContext*, const CMPIObjectPath*, const char*, const CMPIArgs*, CMPIArgs*,
-                       CMPIStatus* status) noexcept
+CMPIEnumeration* references(const CMPIBroker* broker, const CMPIContext* context, const CMPIObjectPath* path,
+                            const char* result_class, const char* role, const char** properties, CMPIStatus* status) noexcept
 {
-    return not_supported(status, no_data());
+    const auto body = [&](Operations& operations)
+    {
+        return operations.references(object<Path_Object>(path).path, {optional(result_class), "", optional(role), ""},
+                                     property_list(properties));
+    };
+    return enumerate(broker, context, CMPI_instance, status, body);
 }
 
-CMPIStatus set_property(const CMPIBroker*, const CMPIContext*, const CMPIObjectPath*, const char*, const CMPIValue*,
-                        CMPIType) noexcept
+CMPIEnumeration* reference_names(const CMPIBroker* broker, const CMPIContext* context, const CMPIObjectPath* path,
+                                 const char* result_class, const char* role, CMPIStatus* status) noexcept
 {
-    return not_supported();
+    const auto body = [&](Operations& operations) {
+        return operations.reference_names(object<Path_Object>(path).path, {optional(result_class), "", optional(role), ""});
+    };
+    return enumerate(broker, context, CMPI_ref, status, body);
 }
 
-CMPIData get_property(const CMPIBroker*, const CMPIContext*, const CMPIObjectPath*, const char*, CMPIStatus* status) noexcept
+CMPIData invoke_method(const CMPIBroker* broker, const CMPIContext* context, const CMPIObjectPath* path, const char* method,
+                       const CMPIArgs* in, CMPIArgs* out, CMPIStatus* status) noexcept
 {
-    return not_supported(status, no_data());
+    const auto body = [&]
+    {
+        const auto call = [&](Operations& operations)
+        {
+            return operations.invoke_method(object<Path_Object>(path).path, required(method),
+                                            in ? object<Args_Object>(in).args : std::vector<Named_Value>());
+        };
+        Method_Result result = up_call(broker, context, call);
+        if (out)
+            for (Named_Value& output : result.out)
+                put(object<Args_Object>(out).args, output.name.c_str(), std::move(output.value));
+        return to_cmpi(result.return_value);
+    };
+    return answer(status, no_data(), body);
+}
+
+CMPIStatus set_property(const CMPIBroker* broker, const CMPIContext* context, const CMPIObjectPath* path, const char* name,
+                        const CMPIValue* value, CMPIType type) noexcept
+{
+    const auto call = [&](Operations& operations)
+    { operations.set_property(object<Path_Object>(path).path, required(name), from_cmpi(value, type)); };
+    return answer([&] { up_call(broker, context, call); });
+}
+
+CMPIData get_property(const CMPIBroker* broker, const CMPIContext* context, const CMPIObjectPath* path, const char* name,
+                      CMPIStatus* status) noexcept
+{
+    const auto call = [&](Operations& operations)
+    { return operations.get_property(object<Path_Object>(path).path, required(name)); };
+    return answer(status, no_data(), [&] { return to_cmpi(up_call(broker, context, call)); });
 }
 
 } // namespace

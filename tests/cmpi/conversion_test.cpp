@@ -1,5 +1,6 @@
 // What instances become on the wire, and what comes back from it.
 #include "cimserver/broker/objects.h"
+#include "cmpi/cmpi_containers.h"
 #include "cmpi/converter.h"
 #include "tests/cmpi/served_provider.h"
 
@@ -10,7 +11,6 @@
 
 using namespace test;
 using testing::ElementsAre;
-using testing::IsEmpty;
 using testing::SizeIs;
 
 namespace
@@ -203,65 +203,6 @@ TEST_F(Conversion, refuses_a_reference_to_a_class_that_does_not_fit)
     EXPECT_THAT(messages, testing::Contains("Container: conversion error: Test_Link.Dependent"));
 }
 
-TEST_F(Conversion, copes_with_data_that_hold_nothing)
-{
-    const auto convert = [&](CMPIType type, Value& made) {
-        return cmpi_to_cimple_value(&repository, broker.face(), name_space, {type, CMPI_goodValue, {}}, made);
-    };
-    const auto message = [&](CMPIType type)
-    {
-        return logged(
-            [&]
-            {
-                Value made;
-                convert(type, made);
-            });
-    };
-    Value made;
-    EXPECT_EQ(convert(CMPI_string, made), 0);
-    EXPECT_EQ(*made.get_if<String>(), "");
-    constexpr CMPIType unusable[] = {
-        CMPI_dateTime, CMPI_ref,  CMPI_instance, CMPI_uint8 | CMPI_ARRAY, CMPI_ref | CMPI_ARRAY, CMPI_null,
-        CMPI_chars,    CMPI_args, 0x7777};
-    for (const CMPIType type : unusable)
-        EXPECT_EQ(convert(type, made), -1) << type;
-    EXPECT_THAT(message(CMPI_dateTime), ElementsAre("Converter: CMGetStringFormat() failed", "Converter: conversion error"));
-    EXPECT_THAT(message(CMPI_ref), ElementsAre("Converter: null instance", "Converter: failed to create CIMPLE instance"));
-    EXPECT_THAT(message(CMPI_args), ElementsAre("Converter: unknown type"));
-    EXPECT_THAT(logged([&] { convert(CMPI_string, made); }, "INFO"), ElementsAre("Converter: ignored null CMPI string"));
-}
-
-TEST_F(Conversion, survives_a_server_that_throws_or_answers_nothing)
-{
-    CMPIInstanceFT instance_table = Instance_Object::table;
-    instance_table.getPropertyCount = [](const CMPIInstance*, CMPIStatus*) { return CMPICount{1}; };
-    instance_table.release = [](CMPIInstance*) -> CMPIStatus { throw std::runtime_error("release"); };
-    CMPIInstance face = {nullptr, &instance_table};
-    const auto take = [&] { from_cmpi<Test_Thing>(CMPI_Ptr<CMPIInstance>(&face).get()); };
-    instance_table.getPropertyAt = [](const CMPIInstance*, CMPICount, CMPIString**, CMPIStatus*) -> CMPIData { throw 1; };
-    EXPECT_THAT(logged(take), ElementsAre("CMPI_Containers: CMGetPropertyAt() threw exception: index=0 size=1",
-                                          "Container: get_name() failed: class=Test_Thing, index=0"));
-    instance_table.getPropertyAt = [](const CMPIInstance*, CMPICount, CMPIString**, CMPIStatus*) -> CMPIData { return {}; };
-    EXPECT_THAT(logged(take), ElementsAre("CMPI_Containers: CMGetPropertyAt() failed",
-                                          "Container: get_name() failed: class=Test_Thing, index=0"));
-
-    CMPIObjectPathFT path_table = Path_Object::table;
-    path_table.getClassName = [](const CMPIObjectPath*, CMPIStatus*) -> CMPIString* { return nullptr; };
-    CMPIObjectPath nameless = {nullptr, &path_table};
-    CMPIStringFT string_table = cimserver::String_Object::table;
-    string_table.getCharPtr = [](const CMPIString*, CMPIStatus*) -> const char* { return nullptr; };
-    CMPIString mute = {nullptr, &string_table};
-    Value made;
-    const auto convert = [&](CMPIType type, CMPIValue content) {
-        return cmpi_to_cimple_value(&repository, broker.face(), name_space, {type, CMPI_goodValue, content}, made);
-    };
-    EXPECT_THAT(logged([&] { EXPECT_EQ(convert(CMPI_ref, {.ref = &nameless}), -1); }),
-                ElementsAre("Converter: CMGetClassName() failed", "Converter: failed to create CIMPLE instance"));
-    EXPECT_THAT(logged([&] { EXPECT_EQ(convert(CMPI_string, {.string = &mute}), 0); }),
-                ElementsAre("Converter: CMGetCharsPtr() failed"));
-    EXPECT_EQ(*made.get_if<String>(), "");
-}
-
 TEST_F(Conversion, leaves_no_object_with_the_broker_in_a_long_request)
 {
     const Ref<Test_Link> original = make_link("a", "b");
@@ -282,47 +223,260 @@ TEST_F(Conversion, leaves_no_object_with_the_broker_in_a_long_request)
     EXPECT_LT(mallinfo2().uordblks, before + 100'000);
 }
 
-TEST_F(Conversion, says_what_cannot_be_sent)
+// A message, or several, and what brings them about.
+struct Complaint
 {
-    const auto send = [&](const Value& sent, const char* ns)
+    std::vector<std::string> messages;
+    std::function<void()> work;
+};
+
+class Complaints : public Conversion
+{
+protected:
+    void expect(const std::vector<Complaint>& complaints)
+    {
+        for (const Complaint& complaint : complaints)
+            EXPECT_EQ(logged(complaint.work), complaint.messages);
+    }
+
+    // From CMPI: data of a type with this content, taken by itself.
+    std::function<void()> taking(CMPIType type, CMPIValue content, int answer = -1)
+    {
+        return [=, this]
+        {
+            Value made;
+            EXPECT_EQ(cmpi_to_cimple_value(&repository, broker.face(), name_space, {type, CMPI_goodValue, content}, made),
+                      answer);
+        };
+    }
+    std::function<void()> taking_array(CMPIType type, std::vector<cimserver::Value> elements, CMPIType declared)
+    {
+        return [=, this]
+        {
+            auto& array = make<cimserver::Array_Object>(type, elements);
+            taking(static_cast<CMPIType>(declared | CMPI_ARRAY), {.array = array.face()})();
+        };
+    }
+
+    // To CMPI, with a broker that the test has impaired.
+    int send(const Value& value, uint32 flags = 0, const char* ns = name_space)
     {
         CMPI_Data data;
-        return _to_cmpi_data(&repository, broker.face(), ns, sent, 0, data);
-    };
-    EXPECT_THAT(logged([&] { send(Value(), name_space); }), ElementsAre("Converter: missing type"));
+        return _to_cmpi_data(&repository, &server, ns, value, flags, data);
+    }
+    static Value instance_value(Ref<Test_Thing> instance)
+    {
+        Value value;
+        value.set_value(static_cast<Instance*>(instance.steal()));
+        return value;
+    }
 
-    Value no_instance;
-    no_instance.set_value(static_cast<Instance*>(nullptr));
-    EXPECT_THAT(logged([&] { send(no_instance, name_space); }), ElementsAre("Converter: null instance argument"));
-    Value homeless;
-    homeless.set_value(static_cast<Instance*>(thing("a").steal()));
-    EXPECT_THAT(logged([&] { send(homeless, ""); }), ElementsAre("Converter: null namespace"));
-    EXPECT_EQ(send(homeless, name_space), 0);
+    Complaints() { server.eft = &objects; }
+
+    CMPIBrokerEncFT objects = *broker.face()->eft;
+    CMPIBroker server = *broker.face();
+};
+
+CMPIStatus failing() { return {CMPI_RC_ERR_FAILED, nullptr}; }
+
+TEST_F(Complaints, about_scalars_that_the_server_hands_over)
+{
+    CMPIStringFT string_table = cimserver::String_Object::table;
+    string_table.getCharPtr = [](const CMPIString*, CMPIStatus*) -> const char* { return nullptr; };
+    CMPIString mute = {nullptr, &string_table};
+    CMPIDateTimeFT datetime_table = cimserver::Datetime_Object::table;
+    datetime_table.getStringFormat = [](const CMPIDateTime*, CMPIStatus*)
+    { return make<cimserver::String_Object>("yesterday").face(); };
+    CMPIDateTime vague = {nullptr, &datetime_table};
+    expect({
+        {{"Converter: unknown type"}, taking(CMPI_args, {})},
+        {{"Converter: unknown type"}, taking(CMPI_chars, {})},
+        {{"Converter: unknown type"}, taking(CMPI_null, {})},
+        {{"Converter: unknown type"}, taking(0x7777, {})},
+        {{"Converter: CMGetCharsPtr() failed"}, taking(CMPI_string, {.string = &mute}, 0)},
+        {{"Converter: CMGetStringFormat() failed", "Converter: conversion error"}, taking(CMPI_dateTime, {})},
+        {{"Converter: conversion error"}, taking(CMPI_dateTime, {.dateTime = &vague})},
+    });
+    Value made;
+    const CMPIData no_string = {CMPI_string, CMPI_goodValue, {}};
+    EXPECT_THAT(logged([&] { cmpi_to_cimple_value(&repository, broker.face(), name_space, no_string, made); }, "INFO"),
+                ElementsAre("Converter: ignored null CMPI string"));
+    EXPECT_EQ(*made.get_if<String>(), "");
 }
 
-TEST_F(Conversion, fails_as_a_whole_when_the_broker_makes_nothing)
+TEST_F(Complaints, about_objects_that_the_server_hands_over)
 {
-    CMPIBrokerEncFT nothing = *broker.face()->eft;
-    nothing.newInstance = [](const CMPIBroker*, const CMPIObjectPath*, CMPIStatus*) -> CMPIInstance* { return nullptr; };
-    CMPIBroker poor = *broker.face();
-    poor.eft = &nothing;
-    const Ref<Test_Thing> sent = thing("a");
-    CMPI_Ptr<CMPIInstance> made;
-    EXPECT_EQ(make_cmpi_instance(&poor, sent.ptr(), name_space, thing_path("a"), nullptr, made), CMPI_RC_ERR_FAILED);
+    CMPIObjectPathFT path_table = Path_Object::table;
+    path_table.getClassName = [](const CMPIObjectPath*, CMPIStatus*) -> CMPIString* { return nullptr; };
+    CMPIObjectPath nameless = {nullptr, &path_table};
+    CMPIInstanceFT instance_table = Instance_Object::table;
+    instance_table.getObjectPath = [](const CMPIInstance*, CMPIStatus*) -> CMPIObjectPath* { return nullptr; };
+    CMPIInstance homeless = {nullptr, &instance_table};
+    auto& stranger = make<Instance_Object>(cimserver::Instance{{"", "", "Test_Nobody", {}}, {}});
+    const char* failed = "Converter: failed to create CIMPLE instance";
+    expect({
+        {{"Converter: null instance", failed}, taking(CMPI_ref, {})},
+        {{"Converter: null instance", failed}, taking(CMPI_instance, {})},
+        {{"Converter: CMGetClassName() failed", failed}, taking(CMPI_ref, {.ref = &nameless})},
+        {{"Converter: CMGetObjectPath() failed", failed}, taking(CMPI_instance, {.inst = &homeless})},
+        {{"Converter: failed to find meta class: Test_Nobody", failed}, taking(CMPI_instance, {.inst = stranger.face()})},
+    });
+}
 
-    nothing.newObjectPath = [](const CMPIBroker*, const char*, const char*, CMPIStatus*) -> CMPIObjectPath* { return nullptr; };
+TEST_F(Complaints, about_arrays_that_the_server_hands_over)
+{
+    CMPIArrayFT array_table = cimserver::Array_Object::table;
+    array_table.getSize = [](const CMPIArray*, CMPIStatus*) { return CMPICount{1}; };
+    array_table.getElementAt = [](const CMPIArray*, CMPICount, CMPIStatus*) -> CMPIData {
+        return {CMPI_dateTime, CMPI_goodValue, {}};
+    };
+    CMPIArray timeless = {nullptr, &array_table};
+    const cimserver::Value nobody = reference("Test_Nobody", {});
+    expect({
+        {{"Converter: type mismatch"}, taking_array(CMPI_uint8, {{CMPI_uint8, std::uint64_t{1}}}, CMPI_uint16)},
+        {{"Converter: encountered null array element"}, taking_array(CMPI_string, {string("a"), {CMPI_string, {}}}, CMPI_string)},
+        {{"Converter: CMGetStringFormat() failed", "Converter: conversion error"},
+         taking(CMPI_dateTime | CMPI_ARRAY, {.array = &timeless})},
+        {{"Converter: array element type mismatch"}, taking_array(CMPI_string, {string("a")}, CMPI_ref)},
+        {{"Converter: encountered null instance element"}, taking_array(CMPI_ref, {{CMPI_ref, {}}}, CMPI_ref)},
+        {{"Converter: failed to find meta class: Test_Nobody", "Converter: failed to create CIMPLE instance"},
+         taking_array(CMPI_ref, {nobody}, CMPI_ref)},
+    });
+    taking(CMPI_uint8 | CMPI_ARRAY, {})();
+    taking(CMPI_ref | CMPI_ARRAY, {})();
+}
+
+TEST_F(Complaints, about_values_that_cannot_be_sent)
+{
+    Value strings;
+    strings.set_value(Array<String>({"a", "b"}));
+    Value nothing;
+    nothing.set_value(static_cast<Instance*>(nullptr));
+    Meta_Class nameless = Test_Thing::static_meta_class;
+    nameless.name = "";
+    const auto no_path = [](const CMPIBroker*, const char*, const char*, CMPIStatus*) -> CMPIObjectPath* { return nullptr; };
+    const auto no_instance = [](const CMPIBroker*, const CMPIObjectPath*, CMPIStatus*) -> CMPIInstance* { return nullptr; };
+    const auto no_array = [](const CMPIBroker*, CMPICount, CMPIType, CMPIStatus*) -> CMPIArray* { return nullptr; };
+    const auto no_string = [](const CMPIBroker*, const char*, CMPIStatus*) -> CMPIString* { return nullptr; };
+    static CMPIArrayFT read_only = cimserver::Array_Object::table;
+    static CMPIArray array = {nullptr, &read_only};
+    read_only.release = [](CMPIArray*) { return CMPIStatus{CMPI_RC_OK, nullptr}; };
+    read_only.setElementAt = [](CMPIArray*, CMPICount, const CMPIValue*, CMPIType) { return failing(); };
+    expect({
+        {{"Converter: missing type"}, [&] { send({}); }},
+        {{"Converter: null instance argument"}, [&] { send(nothing); }},
+        {{"Converter: null namespace"}, [&] { send(instance_value(thing("a")), 0, ""); }},
+        {{"Converter: null classname"},
+         [&]
+         {
+             const auto value = instance_value(thing("a"));
+             (*value.get_if<Instance*>())->meta_class = &nameless;
+             send(value);
+             (*value.get_if<Instance*>())->meta_class = &Test_Thing::static_meta_class;
+         }},
+        {{"Converter: CMNewInstance() failed"},
+         [&] { objects.newInstance = no_instance, send(instance_value(thing("a")), Flag_EmbeddedInstance); }},
+        {{"Converter: CMNewObjectPath() failed"}, [&] { objects.newObjectPath = no_path, send(instance_value(thing("a"))); }},
+        {{"Converter: CMNewString() failed", "Converter: element conversion failed"},
+         [&] { objects.newString = no_string, send(strings); }},
+        {{"Converter: CMNewArray() failed"}, [&] { objects.newArray = no_array, send(strings); }},
+        {{"Converter: CMSetArrayElementAt() failed"},
+         [&]
+         {
+             objects = *broker.face()->eft;
+             objects.newArray = [](const CMPIBroker*, CMPICount, CMPIType, CMPIStatus*) { return &array; };
+             send(strings);
+         }},
+    });
+    EXPECT_EQ(send(instance_value(thing("a"))), 0);
+}
+
+TEST_F(Complaints, about_the_objects_around_the_values)
+{
+    const Ref<Test_Thing> a = thing("a");
+    Ref<Test_Odd> odd(create<Test_Odd>());
+    odd->Odd = a.ptr();
+    const auto in = [&](auto& container, const Instance* instance, uint32 mask)
+    { return [&, instance, mask] { container.convert(instance, mask); }; };
+
+    CMPIInstanceFT instance_table = Instance_Object::table;
+    instance_table.getPropertyCount = [](const CMPIInstance*, CMPIStatus*) { return CMPICount{1}; };
+    instance_table.setProperty = [](const CMPIInstance*, const char*, const CMPIValue*, CMPIType) { return failing(); };
+    CMPIInstance instance = {nullptr, &instance_table};
+    CMPIInstance_Container properties(&repository, &server, name_space, &instance);
+    const auto take = [&] { from_cmpi<Test_Thing>(&instance); };
+
+    CMPIObjectPathFT path_table = Path_Object::table;
+    path_table.getKeyCount = [](const CMPIObjectPath*, CMPIStatus*) { return CMPICount{0}; };
+    path_table.addKey = [](CMPIObjectPath*, const char*, const CMPIValue*, CMPIType) { return failing(); };
+    CMPIObjectPath object_path = {nullptr, &path_table};
+    CMPIObjectPath_Container keys(&repository, &server, name_space, &object_path);
+
+    CMPIArgsFT args_table = cimserver::Args_Object::table;
+    args_table.addArg = [](const CMPIArgs*, const char*, const CMPIValue*, CMPIType) { return failing(); };
+    CMPIArgs args = {nullptr, &args_table};
+    CMPIArgs_Container arguments(&repository, &server, name_space, &args);
+    CMPIArgs_Container none(&repository, &server, name_space, nullptr);
+    Value value;
+    expect({
+        {{"Container: ignored null instance arg"}, in(keys, nullptr, 0)},
+        {{"Container: unexpected failure: Test_Odd.Odd"}, in(keys, odd.ptr(), 0)},
+        {{"CMPI_Containers: CMSetProperty() failed: Name", "Container: conversion error: Test_Thing.Name"},
+         in(properties, a.ptr(), 0)},
+        {{"CMPI_Containers: CMAddKey() failed", "Container: conversion error: Test_Thing.Name"}, in(keys, a.ptr(), Flag_Key)},
+        {{"CMPI_Containers: CMAddArg() failed", "Container: conversion error: Test_Thing.Name"}, in(arguments, a.ptr(), 0)},
+        {{}, in(none, a.ptr(), 0)},
+        {{"CMPI_Containers: bounds error"}, [&] { properties.get_value(1, Value::STRING, value); }},
+        {{"CMPI_Containers: bounds error"}, [&] { keys.get_value(0, Value::STRING, value); }},
+        {{"CMPI_Containers: bounds error"}, [&] { none.get_value(0, Value::STRING, value); }},
+        {{"CMPI_Containers: CMGetPropertyAt() threw exception: index=0 size=1",
+          "Container: get_name() failed: class=Test_Thing, index=0"},
+         [&]
+         {
+             instance_table.getPropertyAt = [](const CMPIInstance*, CMPICount, CMPIString**, CMPIStatus*) -> CMPIData
+             { throw 1; };
+             take();
+         }},
+        {{"CMPI_Containers: CMGetPropertyAt() failed", "Container: get_name() failed: class=Test_Thing, index=0"},
+         [&]
+         {
+             instance_table.getPropertyAt = [](const CMPIInstance*, CMPICount, CMPIString**, CMPIStatus*) -> CMPIData
+             { return {}; };
+             take();
+         }},
+        {{"Container: unexpected error: Test_Odd.Odd"},
+         [&] {
+             from_cmpi<Test_Odd>(make<Instance_Object>(cimserver::Instance{{}, {{"Odd", string("x")}}}).face());
+         }},
+    });
+    odd->Odd = nullptr;
+}
+
+TEST_F(Complaints, end_a_conversion_when_there_is_no_object_to_fill)
+{
+    const Ref<Test_Thing> sent = thing("a");
+    const char* list[] = {"Uint8", nullptr};
+    CMPI_Ptr<CMPIInstance> made;
     CMPI_Ptr<CMPIObjectPath> no_path;
-    EXPECT_EQ(make_cmpi_object_path(&poor, sent.ptr(), name_space, no_path), CMPI_RC_ERR_FAILED);
-    EXPECT_THAT(logged([&] { make_cmpi_instance(broker.face(), sent.ptr(), name_space, nullptr, nullptr, made); }),
+    const auto convert = [&](const CMPIObjectPath* object_path)
+    { return make_cmpi_instance(&server, sent.ptr(), name_space, object_path, list, made); };
+    const CMPIObjectPath* object_path = thing_path("a");
+    EXPECT_THAT(logged([&] { EXPECT_EQ(convert(nullptr), CMPI_RC_OK); }),
                 ElementsAre("Converter: No ObjectPath built before call to make_CMPI_instance"));
 
-    // A string that cannot be made leaves its property out.
-    CMPIBrokerEncFT silent = *broker.face()->eft;
-    silent.newString = [](const CMPIBroker*, const char*, CMPIStatus*) -> CMPIString* { return nullptr; };
-    poor.eft = &silent;
-    EXPECT_THAT(logged([&] { make_cmpi_instance(&poor, sent.ptr(), name_space, thing_path("a"), nullptr, made); }),
-                ElementsAre("Converter: CMNewString() failed", "CMPI_Containers: _to_cmpi_data() failed: feature=Name",
-                            "Container: conversion error: Test_Thing.Name"));
+    static CMPIInstanceFT unfiltered = Instance_Object::table;
+    static CMPIInstance instance = {nullptr, &unfiltered};
+    unfiltered.release = [](CMPIInstance*) -> CMPIStatus { throw std::runtime_error("release"); };
+    unfiltered.setPropertyFilter = [](CMPIInstance*, const char**, const char**) {
+        return CMPIStatus{CMPI_RC_ERR_NOT_SUPPORTED, nullptr};
+    };
+    objects.newInstance = [](const CMPIBroker*, const CMPIObjectPath*, CMPIStatus*) { return &instance; };
+    EXPECT_EQ(convert(object_path), CMPI_RC_ERR_NOT_SUPPORTED) << "the filter's own code";
+
+    objects.newInstance = [](const CMPIBroker*, const CMPIObjectPath*, CMPIStatus*) -> CMPIInstance* { return nullptr; };
+    EXPECT_EQ(convert(object_path), CMPI_RC_ERR_FAILED);
+    objects.newObjectPath = [](const CMPIBroker*, const char*, const char*, CMPIStatus*) -> CMPIObjectPath* { return nullptr; };
+    EXPECT_EQ(make_cmpi_object_path(&server, sent.ptr(), name_space, no_path), CMPI_RC_ERR_FAILED);
 }
 
 } // namespace

@@ -4,6 +4,7 @@
 
 #include <gmock/gmock.h>
 
+#include <atomic>
 #include <stdexcept>
 #include <thread>
 
@@ -170,6 +171,37 @@ TEST_F(Life, factories_may_race)
         thread.join();
     EXPECT_EQ(thing_data.adapter->load_count, num_threads);
     EXPECT_EQ(script.loads, 1);
+}
+
+TEST_F(Life, a_cleanup_waits_for_the_requests_that_run_and_refuses_new_ones)
+{
+    auto* mi = things();
+    std::atomic<bool> entered = false, cleaning = false, answered = false;
+    script.on_enum = [&]
+    {
+        entered = true;
+        while (!cleaning || !thing_data.adapter->requests.is_shut())
+            std::this_thread::yield();
+        cimserver::Request own;
+        Recorded_Result refused;
+        EXPECT_EQ(CMPI_Adapter::enumInstances(mi, own.context(), refused.face(), path("Test_Thing"), nullptr).rc,
+                  CMPI_RC_ERR_FAILED);
+    };
+    std::thread client(
+        [&]
+        {
+            cimserver::Request own;
+            Recorded_Result result;
+            EXPECT_EQ(CMPI_Adapter::enumInstances(mi, own.context(), result.face(), path("Test_Thing"), nullptr).rc, CMPI_RC_OK);
+            answered = true;
+        });
+    while (!entered)
+        std::this_thread::yield();
+    cleaning = true;
+    EXPECT_EQ(clean_up(mi), CMPI_RC_OK);
+    client.join();
+    EXPECT_TRUE(answered);
+    EXPECT_EQ(script.providers, 0);
 }
 
 using Life_Death_Test = Life;

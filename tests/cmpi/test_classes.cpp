@@ -94,6 +94,9 @@ constexpr Meta_Property alert_properties[] = {
 };
 constexpr const Meta_Feature* alert_features[] = {&alert_properties[0], &alert_properties[1]};
 
+constexpr Meta_Reference odd = {{{0}, 0, "Odd", nullptr, 0}, 0, &Test_Thing::static_meta_class, offsetof(Test_Odd, Odd)};
+constexpr const Meta_Feature* odd_features[] = {&odd};
+
 // A thing's properties, and behind them a disk's methods.
 constexpr uint32 num_disk_features = num_thing_properties + 2;
 struct Disk_Features
@@ -158,6 +161,7 @@ constinit Meta_Class Test_Link::static_meta_class =
     make(Flag_Association, "Test_Link", link_features, std::size(link_features), sizeof(Test_Link), &relation, 2);
 constinit Meta_Class Test_Alert::static_meta_class =
     make(Flag_Indication, "Test_Alert", alert_features, std::size(alert_features), sizeof(Test_Alert), nullptr, 0);
+constinit Meta_Class Test_Odd::static_meta_class = make(0, "Test_Odd", odd_features, 1, sizeof(Test_Odd), nullptr, 0);
 
 constinit const Meta_Repository repository = {classes, std::size(classes)};
 

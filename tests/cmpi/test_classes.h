@@ -85,6 +85,14 @@ struct Test_Alert : Instance
     static Meta_Class static_meta_class;
 };
 
+// A class that no generator writes: its one feature is neither property nor reference nor method.
+struct Test_Odd : Instance
+{
+    Instance* Odd;
+
+    static Meta_Class static_meta_class;
+};
+
 extern const Meta_Repository repository;
 
 Ref<Test_Thing> thing(const char* name);

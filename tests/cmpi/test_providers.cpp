@@ -8,26 +8,38 @@ namespace test
 namespace
 {
 
+// A provider's use of the script.
+class Turn
+{
+public:
+    Script* operator->() const { return &Script::get(); }
+
+private:
+    std::lock_guard<std::recursive_mutex> _guard{Script::turn()};
+};
+
 // The life of a provider of any kind.
 template <class Base> class Counted_Provider : public Base
 {
 public:
-    Counted_Provider() { ++Script::get().providers; }
-    ~Counted_Provider() override { --Script::get().providers; }
+    Counted_Provider() { ++Turn()->providers; }
+    ~Counted_Provider() override { --Turn()->providers; }
 
     Load_Status load() override
     {
-        ++Script::get().loads;
-        if (Script::get().on_load)
-            Script::get().on_load();
+        const Turn script;
+        ++script->loads;
+        if (script->on_load)
+            script->on_load();
         return LOAD_FAILED; // nobody asks
     }
 
     Unload_Status unload() override
     {
-        ++Script::get().unloads;
-        if (Script::get().on_unload)
-            Script::get().on_unload();
+        const Turn script;
+        ++script->unloads;
+        if (script->on_unload)
+            script->on_unload();
         return UNLOAD_FAILED; // nobody asks
     }
 };
@@ -40,46 +52,49 @@ public:
 
     Get_Instance_Status get_instance(const T* model, T*& instance) override
     {
-        Script& script = Script::get();
-        script.model.reset(clone(static_cast<const Instance*>(model)));
-        if (script.get_instance == GET_INSTANCE_OK && !script.instances.empty())
-            instance = static_cast<T*>(clone(script.instances.front().ptr()));
-        return script.get_instance;
+        const Turn script;
+        script->model.reset(clone(static_cast<const Instance*>(model)));
+        if (script->get_instance == GET_INSTANCE_OK && !script->instances.empty())
+            instance = static_cast<T*>(clone(script->instances.front().ptr()));
+        return script->get_instance;
     }
 
     Enum_Instances_Status enum_instances(const T* model, Enum_Instances_Handler<T>& handler) override
     {
-        Script& script = Script::get();
-        ++script.enumerations;
-        script.model.reset(clone(static_cast<const Instance*>(model)));
-        if (script.on_enum)
-            script.on_enum();
-        for (const Ref<Instance>& instance : script.instances)
+        const Turn script;
+        ++script->enumerations;
+        script->model.reset(clone(static_cast<const Instance*>(model)));
+        if (script->on_enum)
+            script->on_enum();
+        for (const Ref<Instance>& instance : script->instances)
         {
-            ++script.delivered;
-            if (!handler.handle(static_cast<T*>(clone(instance.ptr()))) && !script.deaf)
+            ++script->delivered;
+            if (!handler.handle(static_cast<T*>(clone(instance.ptr()))) && !script->deaf)
                 break;
         }
-        return script.enum_instances;
+        return script->enum_instances;
     }
 
     Create_Instance_Status create_instance(T* instance) override
     {
-        Script::get().instance.reset(clone(static_cast<Instance*>(instance)));
-        return Script::get().create_instance;
+        const Turn script;
+        script->instance.reset(clone(static_cast<Instance*>(instance)));
+        return script->create_instance;
     }
 
     Modify_Instance_Status modify_instance(const T* model, const T* instance) override
     {
-        Script::get().model.reset(clone(static_cast<const Instance*>(model)));
-        Script::get().instance.reset(clone(static_cast<const Instance*>(instance)));
-        return Script::get().modify_instance;
+        const Turn script;
+        script->model.reset(clone(static_cast<const Instance*>(model)));
+        script->instance.reset(clone(static_cast<const Instance*>(instance)));
+        return script->modify_instance;
     }
 
     Delete_Instance_Status delete_instance(const T* instance) override
     {
-        Script::get().instance.reset(clone(static_cast<const Instance*>(instance)));
-        return Script::get().delete_instance;
+        const Turn script;
+        script->instance.reset(clone(static_cast<const Instance*>(instance)));
+        return script->delete_instance;
     }
 };
 
@@ -91,11 +106,11 @@ public:
     static Disk_Provider* create() { return new Disk_Provider; }
     static int invoke(Disk_Provider&, const Test_Disk* self, Instance* parameters)
     {
-        Script& script = Script::get();
-        script.instance.reset(clone(static_cast<const Instance*>(self)));
-        if (script.on_invoke)
-            script.on_invoke(parameters);
-        return script.invoke_method;
+        const Turn script;
+        script->instance.reset(clone(static_cast<const Instance*>(self)));
+        if (script->on_invoke)
+            script->on_invoke(parameters);
+        return script->invoke_method;
     }
 };
 
@@ -128,9 +143,12 @@ private:
     template <class Handler, class Status> static Status hand_out(Handler& handler, Status status)
     {
         if (status == 0)
-            for (const Ref<Instance>& instance : Script::get().associators)
-                if (!handler.handle(clone(instance.ptr())) && !Script::get().deaf)
+        {
+            const Turn script;
+            for (const Ref<Instance>& instance : script->associators)
+                if (!handler.handle(clone(instance.ptr())) && !script->deaf)
                     break;
+        }
         return status;
     }
 };
@@ -144,23 +162,23 @@ public:
     Enable_Indications_Status enable_indications(Indication_Handler<Test_Alert>* handler) override
     {
         std::unique_ptr<Indication_Handler<Test_Alert>> own(handler);
-        Script& script = Script::get();
-        ++script.enables;
-        if (script.enable_indications == ENABLE_INDICATIONS_OK)
-            script.handler = std::move(own);
-        if (script.on_enable)
-            script.on_enable();
-        return script.enable_indications;
+        const Turn script;
+        ++script->enables;
+        if (script->enable_indications == ENABLE_INDICATIONS_OK)
+            script->handler = std::move(own);
+        if (script->on_enable)
+            script->on_enable();
+        return script->enable_indications;
     }
 
     Disable_Indications_Status disable_indications() override
     {
-        Script& script = Script::get();
-        ++script.disables;
-        if (script.on_disable)
-            script.on_disable();
-        script.handler.reset();
-        return script.disable_indications;
+        const Turn script;
+        ++script->disables;
+        if (script->on_disable)
+            script->on_disable();
+        script->handler.reset();
+        return script->disable_indications;
     }
 };
 
@@ -174,12 +192,17 @@ int proc(const Registration*, int operation, void* arg0, void* arg1, void* arg2,
         operation, []() -> P* { return P::create(); }, args);
 }
 
-Script script;
+Script the_script;
 
 } // namespace
 
-Script& Script::get() { return script; }
-Script& Script::fresh() { return script = Script(); }
+Script& Script::get() { return the_script; }
+std::recursive_mutex& Script::turn()
+{
+    static std::recursive_mutex mutex;
+    return mutex;
+}
+Script& Script::fresh() { return the_script = Script(); }
 
 // clang-format off
 constinit const Registration thing_registration = {"Test_Module", "Test_Thing_Provider",

@@ -7,12 +7,13 @@
 
 #include <functional>
 #include <memory>
+#include <mutex>
 #include <vector>
 
 namespace test
 {
 
-// One for all providers of the tests.
+// One for all providers of the tests, which take turns with it.
 struct Script
 {
     // What to answer.
@@ -51,6 +52,7 @@ struct Script
 
     static Script& get();
     static Script& fresh(); // emptied
+    static std::recursive_mutex& turn();
 };
 
 // The records of the providers; Test_Alert's is the head of their list.

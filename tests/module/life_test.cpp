@@ -5,6 +5,7 @@
 #include <dirent.h>
 #include <dlfcn.h>
 #include <gmock/gmock.h>
+#include <malloc.h>
 
 #include <thread>
 
@@ -49,13 +50,15 @@ TEST_F(Life, UnloadingLeavesNothingBehind)
     round();
     const auto descriptors = open_descriptors();
     const auto running = threads();
-    for (int i = 0; i < 20; ++i)
+    const auto heap = mallinfo2().uordblks;
+    for (int i = 0; i < LOAD_ROUNDS; ++i)
     {
         round();
         EXPECT_EQ(dlopen(module_path, RTLD_NOW | RTLD_NOLOAD), nullptr) << "the module is still mapped";
     }
     EXPECT_EQ(open_descriptors(), descriptors);
     EXPECT_EQ(threads(), running);
+    EXPECT_LT(mallinfo2().uordblks, heap + 10'000);
 }
 
 // The very first requests are among them: they race to make the managers, the helpers and the providers.

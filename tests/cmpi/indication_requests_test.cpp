@@ -1,0 +1,409 @@
+// The indication interface as a server calls it, and the delivery of alerts by provider threads.
+#include "cmpi/cimom.h"
+#include "cmpi/thread_context.h"
+#include "runtime/thread.h"
+#include "runtime/time.h"
+#include "tests/cmpi/served_provider.h"
+
+#include <cmpimacs.h>
+#include <gmock/gmock.h>
+
+#include <atomic>
+#include <malloc.h>
+#include <mutex>
+#include <stdexcept>
+#include <thread>
+
+using namespace test;
+using testing::ElementsAre;
+
+namespace
+{
+
+// What the server was handed, as "name space: message".
+class Inbox : public cimserver::Indication_Sink
+{
+public:
+    void deliver(const std::string& name_space, const cimserver::Instance& indication) override
+    {
+        const std::lock_guard guard(_mutex);
+        EXPECT_EQ(indication.path.name_space, name_space) << "one server reads this one, one the other";
+        ++count;
+        if (keep)
+            alerts.push_back(name_space + ": " + std::get<std::string>(indication.properties.at(0).value.content));
+        if (refuse)
+            throw std::runtime_error("full");
+    }
+
+    std::vector<std::string> alerts;
+    std::atomic<int> count = 0;
+    bool keep = true;
+    bool refuse = false;
+
+private:
+    std::mutex _mutex;
+};
+
+Test_Alert* alert(const char* message)
+{
+    Test_Alert* result = create<Test_Alert>();
+    result->Message.set(message);
+    result->Texts.set({"one", "two"});
+    return result;
+}
+
+// Starts a provider thread when indications are enabled or the provider loads, and ends it on demand.
+struct Provider_Thread
+{
+    void start(std::function<void()> body)
+    {
+        work = std::move(body);
+        const auto run = [](void* self) -> void*
+        {
+            static_cast<Provider_Thread*>(self)->work();
+            return nullptr;
+        };
+        EXPECT_EQ(Thread::create_joinable(thread, run, this), 0);
+    }
+    void join()
+    {
+        void* result = nullptr;
+        running = false;
+        EXPECT_EQ(Thread::join(thread, result), 0);
+    }
+
+    Thread thread;
+    std::atomic<bool> running = true;
+    std::function<void()> work;
+};
+
+class Indications : public Served_Provider
+{
+protected:
+    Indications()
+    {
+        broker.set_indication_sink(&inbox);
+        mi = alerts();
+    }
+
+    CMPIObjectPath* filter_path(const char* ns) const { return CMNewObjectPath(broker.face(), ns, "Test_Alert", nullptr); }
+    void activate(const char* ns)
+    {
+        EXPECT_EQ(mi->ft->activateFilter(mi, nullptr, nullptr, "", filter_path(ns), 1).rc, CMPI_RC_OK);
+    }
+    void deactivate(const char* ns)
+    {
+        EXPECT_EQ(mi->ft->deActivateFilter(mi, nullptr, nullptr, "", filter_path(ns), 0).rc, CMPI_RC_OK);
+    }
+    CMPIrc enable() { return mi->ft->enableIndications(mi, request.context()).rc; }
+    CMPIrc disable() { return mi->ft->disableIndications(mi, request.context()).rc; }
+    CMPIrc clean_up() { return mi->ft->cleanup(mi, request.context(), 0).rc; }
+
+    // Raises an alert on a thread of the server's that works for the provider.
+    bool raise(const char* message)
+    {
+        const CMPI_Thread_Context_Pusher pusher(broker.face(), request.context(), alert_data.adapter);
+        return script.handler->handle(alert(message));
+    }
+
+    Inbox inbox;
+    CMPIIndicationMI* mi = nullptr;
+};
+
+TEST_F(Indications, reach_each_name_space_with_a_filter_once)
+{
+    struct Step
+    {
+        const char* activated;
+        const char* deactivated;
+        std::vector<std::string> alerts;
+    };
+    const Step steps[] = {
+        {nullptr, nullptr, {}},
+        {"root/b", nullptr, {"root/b: x"}},
+        {"root/a", nullptr, {"root/b: x", "root/a: x"}},
+        {"root/b", nullptr, {"root/b: x", "root/a: x"}}, // two filters: still one delivery
+        {nullptr, "root/b", {"root/b: x", "root/a: x"}},
+        {nullptr, "root/unknown", {"root/b: x", "root/a: x"}},
+        {nullptr, "root/b", {"root/a: x"}},
+        {nullptr, "root/a", {}},
+    };
+    ASSERT_EQ(enable(), CMPI_RC_OK);
+    for (const Step& step : steps)
+    {
+        if (step.activated)
+            activate(step.activated);
+        if (step.deactivated)
+            deactivate(step.deactivated);
+        inbox.alerts.clear();
+        EXPECT_TRUE(raise("x"));
+        EXPECT_EQ(inbox.alerts, step.alerts);
+    }
+    EXPECT_FALSE(script.handler->handle(nullptr)) << "the end of delivery";
+    EXPECT_EQ(live_instances(), 0U) << "the alerts were adopted";
+}
+
+TEST_F(Indications, are_enabled_once_and_disabled_once)
+{
+    struct Step
+    {
+        bool on;
+        int provider_status;
+        CMPIrc rc;
+        int enables, disables; // calls of the provider so far
+    };
+    const Step steps[] = {
+        {false, DISABLE_INDICATIONS_OK, CMPI_RC_OK, 0, 0}, // never enabled: the provider is not asked
+        {true, ENABLE_INDICATIONS_FAILED, CMPI_RC_ERR_FAILED, 1, 0},
+        {false, DISABLE_INDICATIONS_OK, CMPI_RC_OK, 1, 0},
+        {true, ENABLE_INDICATIONS_OK, CMPI_RC_OK, 2, 0}, // the failed attempt left nothing enabled
+        {true, ENABLE_INDICATIONS_FAILED, CMPI_RC_OK, 2, 0},
+        {false, DISABLE_INDICATIONS_FAILED, CMPI_RC_ERR_FAILED, 2, 1},
+        {false, DISABLE_INDICATIONS_FAILED, CMPI_RC_OK, 2, 1},
+        {true, -1, CMPI_RC_OK, 3, 1},
+        {false, -1, CMPI_RC_OK, 3, 2},
+    };
+    for (const Step& step : steps)
+    {
+        script.enable_indications = static_cast<Enable_Indications_Status>(step.provider_status);
+        script.disable_indications = static_cast<Disable_Indications_Status>(step.provider_status);
+        EXPECT_EQ(step.on ? enable() : disable(), step.rc) << &step - steps;
+        EXPECT_EQ(script.enables, step.enables) << &step - steps;
+        EXPECT_EQ(script.disables, step.disables) << &step - steps;
+    }
+    script.on_enable = [] { throw std::runtime_error("enable"); };
+    EXPECT_EQ(enable(), CMPI_RC_ERR_FAILED);
+    script.on_enable = nullptr;
+    EXPECT_EQ(enable(), CMPI_RC_OK);
+}
+
+TEST_F(Indications, are_authorized_and_never_polled)
+{
+    EXPECT_THAT(
+        logged([&] { EXPECT_EQ(mi->ft->authorizeFilter(mi, nullptr, nullptr, "", nullptr, "me").rc, CMPI_RC_OK); }, "DBG"),
+        ElementsAre("CMPI_Adapter: enter: authorizeFilter()", "CMPI_Adapter: return: authorizeFilter(): CMPI_RC_OK"));
+    EXPECT_THAT(logged([&] { EXPECT_EQ(mi->ft->mustPoll(mi, nullptr, nullptr, "", nullptr).rc, CMPI_RC_OK); }, "DBG"),
+                ElementsAre("CMPI_Adapter: enter: mustPoll()", "CMPI_Adapter: return: mustPoll(): CMPI_RC_OK"));
+}
+
+TEST_F(Indications, go_on_when_the_server_refuses_one)
+{
+    ASSERT_EQ(enable(), CMPI_RC_OK);
+    activate("root/a");
+    inbox.refuse = true;
+    EXPECT_THAT(logged([&] { EXPECT_TRUE(raise("x")); }),
+                ElementsAre("Converter: No ObjectPath built before call to make_CMPI_instance",
+                            "CMPI_Adapter: CBDeliverIndication() failed: CMPI_RC_ERR_FAILED"));
+}
+
+TEST_F(Indications, of_a_thread_that_waits_for_a_request_do_not_hold_up_the_disabling)
+{
+    Provider_Thread delivery;
+    std::atomic<int> raised = 0;
+    const auto deliver = [&]
+    {
+        while (delivery.running)
+        {
+            EXPECT_TRUE(script.handler->handle(alert("x")));
+            ++raised;
+        }
+    };
+    script.on_enable = [&] { delivery.start(deliver); };
+    script.on_disable = [&]
+    {
+        // The thread is certain to wait for the adapter: this request holds it, or lets go of it.
+        const int before = raised;
+        while (raised < before + 3)
+            std::this_thread::yield();
+        delivery.join();
+    };
+    activate("root/a");
+    ASSERT_EQ(enable(), CMPI_RC_OK);
+    EXPECT_EQ(disable(), CMPI_RC_OK);
+    EXPECT_EQ(inbox.count, raised);
+}
+
+TEST_F(Indications, end_with_a_cleanup_while_they_are_enabled)
+{
+    Provider_Thread delivery;
+    script.on_enable = [&]
+    {
+        delivery.start(
+            [&]
+            {
+                while (delivery.running)
+                    script.handler->handle(alert("x"));
+            });
+    };
+    script.on_unload = [&]
+    {
+        delivery.join();
+        script.handler.reset();
+    };
+    activate("root/a");
+    ASSERT_EQ(enable(), CMPI_RC_OK);
+    EXPECT_EQ(clean_up(), CMPI_RC_OK);
+    EXPECT_EQ(script.providers, 0);
+}
+
+TEST_F(Indications, of_a_long_lived_thread_pile_up_nowhere)
+{
+    ASSERT_EQ(enable(), CMPI_RC_OK);
+    activate("root/a");
+    inbox.keep = false;
+    Provider_Thread delivery;
+    std::size_t grown = 1;
+    const CMPI_Thread_Context_Pusher pusher(broker.face(), request.context(), alert_data.adapter);
+    delivery.start(
+        [&]
+        {
+            const auto deliver = [&](int n)
+            {
+                for (int i = 0; i < n; ++i)
+                    script.handler->handle(alert("x"));
+            };
+            deliver(100);
+            const std::size_t before = mallinfo2().uordblks;
+            deliver(2'000);
+            grown = mallinfo2().uordblks - before;
+        });
+    delivery.join();
+    EXPECT_EQ(inbox.count, 2'100);
+    EXPECT_LT(grown + 1'000, 11'000U); // the log's buffers may grow a little
+}
+
+// A server that counts what its threads do, and may be told that it is gone.
+struct Thread_Counts
+{
+    std::atomic<int> prepared, attached, detached;
+    CMPIContext* context; // of the last thread prepared
+};
+Thread_Counts counts;
+
+class Provider_Threads : public Indications
+{
+protected:
+    Provider_Threads()
+    {
+        counts.prepared = counts.attached = counts.detached = 0;
+        calls.prepareAttachThread = [](const CMPIBroker* b, const CMPIContext* context)
+        { return ++counts.prepared, counts.context = cimserver::broker_table.prepareAttachThread(b, context); };
+        calls.attachThread = [](const CMPIBroker* b, const CMPIContext* context)
+        { return ++counts.attached, cimserver::broker_table.attachThread(b, context); };
+        calls.detachThread = [](const CMPIBroker* b, const CMPIContext* context)
+        { return ++counts.detached, cimserver::broker_table.detachThread(b, context); };
+        server.bft = &calls;
+        alert_data.adapter->broker = &server;
+    }
+
+    CMPIBroker server = *broker.face();
+    CMPIBrokerFT calls = *broker.face()->bft;
+};
+
+TEST_F(Provider_Threads, attach_to_the_server_and_detach)
+{
+    Provider_Thread thread;
+    script.on_enable = [&]
+    {
+        thread.start(
+            []
+            {
+                EXPECT_EQ(counts.attached, 1);
+                EXPECT_EQ(counts.detached, 0);
+                String user;
+                EXPECT_TRUE(cimom::get_username(user));
+                EXPECT_EQ(user, "root");
+            });
+    };
+    EXPECT_EQ(enable(), CMPI_RC_OK);
+    thread.join();
+    EXPECT_EQ(counts.prepared, 1);
+    EXPECT_EQ(counts.detached, 1);
+}
+
+TEST_F(Provider_Threads, that_outlive_the_adapter_leave_the_broker_alone)
+{
+    Provider_Thread thread;
+    std::atomic<bool> gone = false;
+    const auto outlive = [&]
+    {
+        while (!gone)
+            std::this_thread::yield();
+        String user;
+        Instance_Enumerator e;
+        const auto model = thing("a");
+        Thread other;
+        EXPECT_FALSE(cimom::get_username(user));
+        EXPECT_EQ(cimom::enum_instances(name_space, model.ptr(), e), -1);
+        EXPECT_FALSE(cimom::get_instance(name_space, model.ptr()));
+        EXPECT_EQ(cimom::create_instance(name_space, model.ptr()), -1);
+        EXPECT_EQ(cimom::allow_unload(false), 0);
+        // A thread that it starts has no context.
+        EXPECT_EQ(Thread::create_joinable(
+                      other, [](void*) -> void* { return Thread_Context::top(); }, nullptr),
+                  0);
+        void* context = &other;
+        Thread::join(other, context);
+        EXPECT_EQ(context, nullptr);
+    };
+    script.on_enable = [&] { thread.start(outlive); };
+    EXPECT_EQ(enable(), CMPI_RC_OK);
+    while (counts.attached == 0)
+        std::this_thread::yield();
+    EXPECT_EQ(clean_up(), CMPI_RC_OK);
+    server = {};
+    gone = true;
+    thread.join();
+    EXPECT_EQ(counts.detached, 0);
+    CMRelease(counts.context); // as a server does that goes
+}
+
+TEST_F(Provider_Threads, are_waited_for_while_they_use_the_broker)
+{
+    static std::atomic<bool> entered, left;
+    entered = left = false;
+    calls.enumerateInstances = [](const CMPIBroker*, const CMPIContext*, const CMPIObjectPath*, const char**,
+                                  CMPIStatus*) -> CMPIEnumeration*
+    {
+        entered = true;
+        Time::sleep(20 * Time::MSEC);
+        left = true;
+        return nullptr;
+    };
+    Provider_Thread thread;
+    script.on_enable = [&]
+    {
+        thread.start(
+            []
+            {
+                Instance_Enumerator e;
+                cimom::enum_instances(name_space, thing("a").ptr(), e);
+            });
+    };
+    EXPECT_EQ(enable(), CMPI_RC_OK);
+    while (!entered)
+        std::this_thread::yield();
+    EXPECT_EQ(clean_up(), CMPI_RC_OK);
+    EXPECT_TRUE(left);
+    thread.join();
+}
+
+TEST_F(Provider_Threads, that_cannot_attach_do_not_detach)
+{
+    calls.attachThread = [](const CMPIBroker*, const CMPIContext*) { return CMPIStatus{CMPI_RC_ERR_FAILED, nullptr}; };
+    Provider_Thread thread;
+    script.on_enable = [&] { thread.start([] {}); };
+    EXPECT_THAT(logged([&] { enable(), thread.join(); }, "ERR"),
+                ElementsAre("CMPI_Thread_Context: CBAttachThread() failed: CMPI_RC_ERR_FAILED"));
+    EXPECT_EQ(counts.detached, 0);
+}
+
+using Indications_Death_Test = Indications;
+
+TEST_F(Indications_Death_Test, raised_outside_a_thread_context_are_an_internal_error)
+{
+    ASSERT_EQ(enable(), CMPI_RC_OK);
+    EXPECT_DEATH(script.handler->handle(alert("x")), "assert: thread_context != 0\n\n");
+}
+
+} // namespace
