@@ -19,7 +19,7 @@ void init(pthread_mutex_t* mutex, bool recursive)
 {
     pthread_mutexattr_t attributes;
     pthread_mutexattr_init(&attributes);
-    pthread_mutexattr_settype(&attributes, recursive ? PTHREAD_MUTEX_RECURSIVE : PTHREAD_MUTEX_NORMAL);
+    pthread_mutexattr_settype(&attributes, recursive ? PTHREAD_MUTEX_RECURSIVE : PTHREAD_MUTEX_ERRORCHECK);
     check(pthread_mutex_init(mutex, &attributes) == 0, "pthread_mutex_init(&((MutexRep*)_rep)->mutex, &attr) == 0");
     pthread_mutexattr_destroy(&attributes);
 }

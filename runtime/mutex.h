@@ -14,7 +14,8 @@ struct MutexRep
     Magic<0x482A8C83> magic;
 };
 
-// A lock or unlock that fails, or a mutex used after its end, is an internal-consistency failure.
+// A lock or unlock that fails is an internal-consistency failure: one by a thread that does not hold it, a second lock of a
+// mutex that is not recursive by the thread that does. So is the use of a mutex after its end.
 class Mutex
 {
 public:

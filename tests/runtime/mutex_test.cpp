@@ -4,6 +4,7 @@
 
 #include <gtest/gtest.h>
 
+#include <string>
 #include <thread>
 #include <vector>
 
@@ -44,6 +45,31 @@ TEST(Mutex, is_held_by_one_thread_at_a_time)
             mutex.unlock();
         in_threads(1, [&] { EXPECT_EQ(mutex.try_lock(), -1); });
     }
+}
+
+// What a thread holds is taken in the process that dies: a lock remembers its thread's number, which differs after a fork.
+TEST(MutexDeathTest, is_neither_given_back_by_strangers_nor_taken_twice)
+{
+    const auto report = [](const std::string& verb)
+    { return verb + "\\(\\): assert: pthread_mutex_" + verb + "\\(&\\(\\(MutexRep\\*\\)_rep\\)->mutex\\) == 0"; };
+    const auto release_from_another_thread = [](Mutex& mutex)
+    {
+        const Auto_Mutex held(mutex);
+        in_threads(1, [&] { mutex.unlock(); });
+    };
+    for (bool recursive : {true, false})
+    {
+        Mutex mutex(recursive);
+        EXPECT_DEATH(mutex.unlock(), report("unlock"));
+        EXPECT_DEATH(release_from_another_thread(mutex), report("unlock"));
+    }
+    const auto lock_twice = []
+    {
+        Mutex mutex(false);
+        mutex.lock();
+        mutex.lock();
+    };
+    EXPECT_DEATH(lock_twice(), report("lock"));
 }
 
 TEST(Counts, threads_share_values_and_instances)
