@@ -1,10 +1,8 @@
 #include "runtime/features.h"
 #include "runtime/model_path.h"
+#include "runtime/number.h"
 
-#include <charconv>
-#include <iterator>
 #include <string_view>
-#include <type_traits>
 
 namespace zmlr
 {
@@ -12,16 +10,14 @@ namespace zmlr
 namespace
 {
 
-// Reals as %f writes them, with a point in every locale.
-template <class T> void append_number(String& out, T x)
+// Appends what one of the functions of number.h writes.
+template <std::size_t N, class Wide>
+void append_number(String& out, const char* (*write)(char (&buffer)[N], Wide x, uint32& size), Wide x)
 {
-    char text[320]; // the largest real has 309 digits before its point
-    std::to_chars_result end{};
-    if constexpr (std::is_floating_point_v<T>)
-        end = std::to_chars(text, std::end(text), x, std::chars_format::fixed, 6);
-    else
-        end = std::to_chars(text, std::end(text), x);
-    out.append(text, static_cast<std::size_t>(end.ptr - text));
+    char buffer[N];
+    uint32 size = 0;
+    const char* text = write(buffer, x, size);
+    out.append(text, size);
 }
 
 void append_character(String& out, char16 x)
@@ -44,16 +40,16 @@ void append_value(String& out, const Instance* instance, const Meta_Property* pr
     {
         // clang-format off
     case BOOLEAN:  return out.append(value_at<boolean>(instance, at) ? "true" : "false");
-    case UINT8:    return append_number(out, value_at<uint8>(instance, at));
-    case SINT8:    return append_number(out, value_at<sint8>(instance, at));
-    case UINT16:   return append_number(out, value_at<uint16>(instance, at));
-    case SINT16:   return append_number(out, value_at<sint16>(instance, at));
-    case UINT32:   return append_number(out, value_at<uint32>(instance, at));
-    case SINT32:   return append_number(out, value_at<sint32>(instance, at));
-    case UINT64:   return append_number(out, value_at<uint64>(instance, at));
-    case SINT64:   return append_number(out, value_at<sint64>(instance, at));
-    case REAL32:   return append_number(out, value_at<real32>(instance, at));
-    case REAL64:   return append_number(out, value_at<real64>(instance, at));
+    case UINT8:    return append_number(out, uint8_to_str, value_at<uint8>(instance, at));
+    case SINT8:    return append_number(out, sint8_to_str, value_at<sint8>(instance, at));
+    case UINT16:   return append_number(out, uint16_to_str, value_at<uint16>(instance, at));
+    case SINT16:   return append_number(out, sint16_to_str, value_at<sint16>(instance, at));
+    case UINT32:   return append_number(out, uint32_to_str, value_at<uint32>(instance, at));
+    case SINT32:   return append_number(out, sint32_to_str, value_at<sint32>(instance, at));
+    case UINT64:   return append_number(out, uint64_to_str, value_at<uint64>(instance, at));
+    case SINT64:   return append_number(out, sint64_to_str, value_at<sint64>(instance, at));
+    case REAL32:   return append_number(out, real64_to_str, real64{value_at<real32>(instance, at)});
+    case REAL64:   return append_number(out, real64_to_str, value_at<real64>(instance, at));
     case CHAR16:   return append_character(out, value_at<char16>(instance, at));
     case STRING:   return append_quoted(out, value_at<String>(instance, at));
     case DATETIME: return out.append(value_at<Datetime>(instance, at).ascii());

@@ -25,8 +25,8 @@ int str_to_sint64(const char* text, sint64& x);
 int str_to_real32(const char* text, real32& x);
 int str_to_real64(const char* text, real64& x);
 
-// Number to text: decimal digits, after a "-" if negative, and a terminating zero. The result lies in the buffer or in static
-// memory (never only at the buffer's begin); `size` receives its length.
+// Number to text: decimal digits, after a "-" if negative, and a terminating zero. The result is the first character, which
+// lies somewhere in the buffer or in static memory; `size` receives the length.
 inline constexpr std::size_t number_text_size = 22;
 const char* uint64_to_str(char (&buffer)[number_text_size], uint64 x, uint32& size);
 const char* sint64_to_str(char (&buffer)[number_text_size], sint64 x, uint32& size);
@@ -36,5 +36,9 @@ const char* uint16_to_str(char (&buffer)[number_text_size], uint16 x, uint32& si
 const char* sint16_to_str(char (&buffer)[number_text_size], sint16 x, uint32& size);
 const char* uint32_to_str(char (&buffer)[number_text_size], uint32 x, uint32& size);
 const char* sint32_to_str(char (&buffer)[number_text_size], sint32 x, uint32& size);
+
+// A real as printf's "%f" writes it where the decimal point is a point: all digits before it, six after it; "inf" or "nan".
+inline constexpr std::size_t real_text_size = 320; // the largest real has 309 digits before its point
+const char* real64_to_str(char (&buffer)[real_text_size], real64 x, uint32& size);
 
 } // namespace zmlr

@@ -1,6 +1,7 @@
 #include "runtime/number.h"
 
 #include <array>
+#include <charconv>
 
 namespace zmlr
 {
@@ -79,5 +80,13 @@ const char* uint32_to_str(char (&buffer)[number_text_size], uint32 x, uint32& si
 const char* sint8_to_str(char (&buffer)[number_text_size], sint8 x, uint32& size) { return sint64_to_str(buffer, x, size); }
 const char* sint16_to_str(char (&buffer)[number_text_size], sint16 x, uint32& size) { return sint64_to_str(buffer, x, size); }
 const char* sint32_to_str(char (&buffer)[number_text_size], sint32 x, uint32& size) { return sint64_to_str(buffer, x, size); }
+
+const char* real64_to_str(char (&buffer)[real_text_size], real64 x, uint32& size)
+{
+    char* const end = std::to_chars(buffer, buffer + real_text_size - 1, x, std::chars_format::fixed, 6).ptr;
+    *end = '\0';
+    size = static_cast<uint32>(end - buffer);
+    return buffer;
+}
 
 } // namespace zmlr

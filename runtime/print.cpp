@@ -2,6 +2,7 @@
 
 #include "runtime/array.h"
 #include "runtime/datetime.h"
+#include "runtime/number.h"
 #include "runtime/string.h"
 
 #include <cinttypes>
@@ -24,7 +25,14 @@ void print(std::FILE* stream, uint8 x) { print(stream, uint32{x}); }
 void print(std::FILE* stream, sint8 x) { print(stream, sint32{x}); }
 void print(std::FILE* stream, uint16 x) { print(stream, uint32{x}); }
 void print(std::FILE* stream, sint16 x) { print(stream, sint32{x}); }
-void print(std::FILE* stream, real64 x) { std::fprintf(stream, "%f", x); }
+
+void print(std::FILE* stream, real64 x)
+{
+    char buffer[real_text_size];
+    uint32 size = 0;
+    std::fputs(real64_to_str(buffer, x, size), stream);
+}
+
 void print(std::FILE* stream, real32 x) { print(stream, real64{x}); }
 
 void print(std::FILE* stream, char16 x)
