@@ -50,7 +50,11 @@ public:
         return value;
     }
 
-    void literal(char c) { _good = _good && *_next++ == c; }
+    void literal(char c)
+    {
+        _good = _good && *_next == c;
+        ++_next;
+    }
     void skip() { ++_next; }
     bool good() const { return _good; }
 

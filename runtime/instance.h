@@ -90,7 +90,7 @@ void __create_refs(Instance* instance);
 
 // Associations. get_associators writes the far ends of an association that concerns `instance` to `out` (room for one
 // entry per reference of the association's class; the entries are borrowed) and returns their number, or -1 when the
-// association does not concern the instance.
+// association does not concern the instance in that role; entries written all the same are of no use then.
 int get_associators(const Instance* instance, const Instance* association, const char* result_class, const char* role,
                     const char* result_role, const Instance** out);
 bool is_reference_of(const Instance* instance, const Instance* association, const char* role);

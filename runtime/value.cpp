@@ -26,10 +26,11 @@ struct Value_Access
     // The index of a type's alternative; 0 for NONE and for what is no type.
     static std::size_t index_of(Value::Type type)
     {
-        for (std::size_t i = 1; i < std::variant_size_v<Content>; ++i)
-            if (type_at(i) == type)
-                return i;
-        return 0;
+        const auto code = static_cast<std::size_t>(type);
+        if (code < num_scalars)
+            return 1 + code;
+        const std::size_t element = code - Value::BOOLEAN_ARRAY;
+        return element < num_scalars ? 1 + num_scalars + element : 0;
     }
 
     template <class T> static Content load(const void* data)
