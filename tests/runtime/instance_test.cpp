@@ -52,31 +52,12 @@ TEST(Instance, created_with_defaults_has_them_and_nulls_elsewhere)
     EXPECT_TRUE(made->__name_space.empty());
 }
 
-TEST(Instance, created_without_defaults_is_zero_and_non_null)
+TEST(Instance, starts_with_its_references_unset)
 {
-    const Ref<Sample_Element> made(create<Sample_Element>(false));
-    EXPECT_EQ(set_properties(made.ptr()), "Name Online Slot Size Delta Load Letter Since Caption Labels Codes Intervals Samples");
-    EXPECT_EQ(made->Size.value, 0U);
-    EXPECT_TRUE(made->Since.value == Datetime());
-    EXPECT_TRUE(made->Caption.value.empty());
-    EXPECT_TRUE(made->Labels.value.empty());
-
-    const Ref<Sample_Link> link_made(create<Sample_Link>());
-    EXPECT_EQ(link_made->Antecedent, nullptr);
-    EXPECT_EQ(link_made->Others.null, 1);
-}
-
-TEST(Instance, a_parameter_record_is_an_instance)
-{
-    Ref<Sample_Element_Reset_method> record(
-        static_cast<Sample_Element_Reset_method*>(create(&Sample_Element_Reset_method::static_meta_class)));
-    EXPECT_STREQ(record_of(record.ptr())->name, "Reset");
-    record->Delay.set(7);
-    record->Peer = element("peer").steal();
-    const Ref<Sample_Element_Reset_method> copied(clone(record.ptr()));
-    EXPECT_EQ(copied->Delay.value, 7U);
-    EXPECT_EQ(copied->Peer->Name.value, "peer");
-    EXPECT_EQ(cast<Sample_Element>(static_cast<Instance*>(record.ptr())), nullptr);
+    const Ref<Sample_Link> made(create<Sample_Link>());
+    EXPECT_EQ(made->Antecedent, nullptr);
+    EXPECT_EQ(made->Others.null, 1);
+    EXPECT_EQ(cast<Sample_Element>(static_cast<Instance*>(made.ptr())), nullptr);
 }
 
 TEST(Instance, references_are_released_with_their_holder)

@@ -16,19 +16,13 @@ TEST(Meta, flag_names_stand_at_their_bits)
     {
         const char* name;
         uint32 flag;
-    } rows[] = {
-        {"property", Flag_Property},
-        {"CLASS", Flag_Class},
-        {"DN", Flag_DN},
-        {"EmbeddedObject", Flag_EmbeddedObject},
-        {"Experimental", Flag_Experimental},
-        {"Gauge", Flag_Gauge},
-        {"Key", Flag_Key},
-        {"Out", Flag_Out},
-        {"Read", Flag_Read},
-        {"Write", Flag_Write},
-        {"EmbeddedInstance", Flag_EmbeddedInstance},
-    };
+    } rows[] = {{"property", Flag_Property},
+                {"DN", Flag_DN},
+                {"Gauge", Flag_Gauge},
+                {"KEY", Flag_Key},
+                {"EmbeddedObject", Flag_EmbeddedObject},
+                {"Read", Flag_Read},
+                {"EmbeddedInstance", Flag_EmbeddedInstance}};
     for (const auto& row : rows)
         EXPECT_EQ(1U << flag_name_to_index(row.name), row.flag) << row.name;
     EXPECT_EQ(flag_name_to_index("Keys"), 0xFFFFFFFF);

@@ -1,19 +1,18 @@
 // The meta-data as generic code relies on it, for all classes at once, and by example.
 #include "runtime/instance.h"
 #include "runtime/name_index.h"
+#include "runtime/print.h"
 #include "schema/CIM_DiagnosticService.h"
 #include "schema/CIM_Service.h"
 #include "schema/ZEMLAR_AlarmDevice.h"
 #include "schema/repository.h"
+#include "tests/runtime/printed.h"
 
 #include <gtest/gtest.h>
 
 #include <algorithm>
-#include <cstring>
-#include <set>
 #include <span>
 #include <string>
-#include <strings.h>
 
 namespace zmlr
 {
@@ -68,18 +67,39 @@ void expect_fields_apart(const Meta_Record& record)
     EXPECT_LE(end, record.size) << record.name;
 }
 
-TEST(Meta_Data, fields_of_every_record_lie_apart_and_inside)
+template <class Law> void for_each_method(const Meta_Class& meta_class, Law law)
+{
+    for (const Meta_Feature* feature : features_of(meta_class))
+        if (is_method(feature))
+            law(*as_method(feature));
+}
+
+void expect_return_value_last(const Meta_Method& method)
+{
+    SCOPED_TRACE(method.name);
+    const Meta_Feature* last = features_of(method).back();
+    EXPECT_STREQ(last->name, "return_value");
+    EXPECT_EQ(last->flags, 0x01000001u);
+    EXPECT_EQ(as_property(last)->type, method.return_type);
+    for (const Meta_Feature* parameter : features_of(method))
+        EXPECT_NE(parameter->flags & (Flag_In | Flag_Out), 0u) << parameter->name;
+}
+
+TEST(Meta_Data, fields_lie_apart_keys_are_counted_and_methods_return)
 {
     for (const Meta_Class* meta_class : all_classes())
     {
+        SCOPED_TRACE(meta_class->name);
         expect_fields_apart(*meta_class);
-        for (const Meta_Feature* feature : features_of(*meta_class))
-            if (is_method(feature))
-                expect_fields_apart(*as_method(feature));
+        EXPECT_EQ(meta_class->num_keys, std::ranges::count_if(features_of(*meta_class), is_key));
+        EXPECT_EQ(meta_class->meta_repository, &meta_repository());
+        for_each_method(*meta_class, expect_fields_apart);
+        for_each_method(*meta_class, expect_return_value_last);
     }
 }
 
-TEST(Meta_Data, inherited_features_are_the_ancestors_objects_and_overrides_stand_in_their_place)
+// An inherited feature is the ancestor's object; an override stands in its place, remains a key, and may narrow a reference.
+TEST(Meta_Data, inherited_features_are_the_ancestors)
 {
     for (const Meta_Class* meta_class : all_classes())
     {
@@ -89,66 +109,48 @@ TEST(Meta_Data, inherited_features_are_the_ancestors_objects_and_overrides_stand
         for (uint32 i = 0; i < meta_class->num_meta_features; i++)
         {
             const Meta_Feature* feature = meta_class->meta_features[i];
+            const Meta_Feature* above = i < inherited ? superclass->meta_features[i] : nullptr;
             SCOPED_TRACE(std::string(meta_class->name) + "." + feature->name);
-            if (i >= inherited)
-            {
-                EXPECT_EQ(meta_class->locals[i].local, 1);
+            EXPECT_EQ(meta_class->locals[i].local == 0, feature == above);
+            if (!above)
                 continue;
-            }
-            EXPECT_EQ(meta_class->locals[i].local == 0, feature == superclass->meta_features[i]);
-            EXPECT_STRCASEEQ(feature->name, superclass->meta_features[i]->name);
-            EXPECT_EQ(is_key(superclass->meta_features[i]) && !is_key(feature), false);
+            EXPECT_STRCASEEQ(feature->name, above->name);
+            EXPECT_TRUE(is_key(feature) || !is_key(above));
+            EXPECT_TRUE(!is_reference(feature) ||
+                        is_subclass(as_reference(above)->meta_class, as_reference(feature)->meta_class));
         }
     }
 }
 
-TEST(Meta_Data, feature_names_are_unique_and_keys_are_counted)
+// An override stands for itself: without a default of its own the property has none.
+TEST(Meta_Data, defaults)
 {
-    for (const Meta_Class* meta_class : all_classes())
+    const struct
     {
-        const auto less = [](const char* a, const char* b) { return strcasecmp(a, b) < 0; };
-        std::set<const char*, decltype(less)> names;
-        uint32 keys = 0;
-        for (const Meta_Feature* feature : features_of(*meta_class))
-        {
-            EXPECT_TRUE(names.insert(feature->name).second) << meta_class->name << "." << feature->name;
-            keys += is_key(feature) ? 1 : 0;
-        }
-        EXPECT_EQ(meta_class->num_keys, keys) << meta_class->name;
-        EXPECT_EQ(meta_class->meta_repository, &meta_repository());
+        const char *class_name, *property, *value; // null: none
+    } rows[] = {
+        {"ZEMLAR_FCPort", "EnabledState", "5"},
+        {"ZEMLAR_FCPort", "RequestedState", "12"},
+        {"ZEMLAR_FCPort", "EnabledDefault", "2"},
+        {"ZEMLAR_FCPort", "HealthState", nullptr},
+        {"ZEMLAR_SCSIProtocolEndpoint", "EnabledState", nullptr},
+        {"ZEMLAR_ConcreteJob", "JobRunTimes", "1"},
+        {"ZEMLAR_ConcreteJob", "TimeBeforeRemoval", "\"00000000000500.000000:000\""},
+        {"ZEMLAR_FCPortStatistics", "SampleInterval", "\"00000000000000.000000:000\""},
+        {"ZEMLAR_LogicalDisk", "Primordial", "false"},
+        {"ZEMLAR_LogicalDisk", "NameFormat", "12"},
+        {"ZEMLAR_ObjectManager", "GatherStatisticalData", "true"},
+        {"ZEMLAR_PhysicalPackage", "RemovalConditions", "2"},
+    };
+    for (const auto& row : rows)
+    {
+        const Ref<Instance> made(create(&class_named(row.class_name), true));
+        const Meta_Property* property = as_property(&feature_named(row.class_name, row.property));
+        const void* value = address_of(made.ptr(), property->offset);
+        const auto print = [&](std::FILE* stream) { print_scalar(stream, static_cast<Type>(property->type), value); };
+        EXPECT_EQ(null_of(made.ptr(), property) ? "none" : printed(print), row.value ? row.value : "none")
+            << row.class_name << "." << row.property;
     }
-}
-
-TEST(Meta_Data, an_overriding_reference_narrows_the_class)
-{
-    for (const Meta_Class* meta_class : all_classes())
-        for (uint32 i = 0; meta_class->super_meta_class && i < meta_class->super_meta_class->num_meta_features; i++)
-        {
-            const Meta_Feature* feature = meta_class->meta_features[i];
-            const Meta_Feature* overridden = meta_class->super_meta_class->meta_features[i];
-            if (!is_reference(feature))
-                continue;
-            EXPECT_TRUE(is_subclass(as_reference(overridden)->meta_class, as_reference(feature)->meta_class))
-                << meta_class->name << "." << feature->name;
-        }
-}
-
-TEST(Meta_Data, every_method_ends_with_its_return_value)
-{
-    for (const Meta_Class* meta_class : all_classes())
-        for (const Meta_Feature* feature : features_of(*meta_class))
-        {
-            if (!is_method(feature))
-                continue;
-            const Meta_Method& method = *as_method(feature);
-            SCOPED_TRACE(std::string(meta_class->name) + "." + method.name);
-            const Meta_Feature* last = features_of(method).back();
-            EXPECT_STREQ(last->name, "return_value");
-            EXPECT_EQ(last->flags, 0x01000001u);
-            EXPECT_EQ(as_property(last)->type, method.return_type);
-            for (const Meta_Feature* parameter : features_of(method))
-                EXPECT_NE(parameter->flags & (Flag_In | Flag_Out), 0u) << parameter->name;
-        }
 }
 
 TEST(Meta_Data, flag_words)
@@ -255,9 +257,7 @@ TEST(Meta_Data, the_index_knows_every_class_feature_and_parameter)
         for (const Meta_Class* c = meta_class; c; c = c->super_meta_class)
             EXPECT_EQ(find_meta_class(meta_class, c->name), c);
         expect_features_found(*meta_class);
-        for (const Meta_Feature* feature : features_of(*meta_class))
-            if (is_method(feature))
-                expect_features_found(*as_method(feature));
+        for_each_method(*meta_class, expect_features_found);
     }
     EXPECT_EQ(find_meta_class(&ZEMLAR_AlarmDevice::static_meta_class, "zemlar_product"), &class_named("ZEMLAR_Product"));
     EXPECT_EQ(find_meta_class(&ZEMLAR_AlarmDevice::static_meta_class, "Instance"), nullptr);
