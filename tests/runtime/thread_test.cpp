@@ -1,4 +1,3 @@
-#include "runtime/mutex.h"
 #include "runtime/thread.h"
 #include "runtime/thread_context.h"
 #include "runtime/time.h"
