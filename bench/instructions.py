@@ -33,24 +33,54 @@ def nanoseconds(program, benchmark):
     return row["real_time"] * NANOSECONDS[row["time_unit"]]
 
 
+# Where the instructions of one enumeration go: benchmark, units, and the functions whose whole cost is counted. What the
+# callback does belongs to the conversion and the rest, not to the provider that calls it.
+SHARES = {"enumerate_fc_ports": ("enumerate_fc_ports/16", 32, "port")}
+CONVERSION = ["zmlr::make_cmpi_object_path(", "zmlr::make_cmpi_instance("]
+PROVIDER = "ZEMLAR_FCPort_Provider::enum_instances("
+CALLBACK = "zmlr::answer_with<"
+
+
+def callgrind(program, benchmark, output):
+    """Counts what happens inside the benchmark's loop, which runs once."""
+    subprocess.run(
+        [
+            "valgrind",
+            "--tool=callgrind",
+            "--collect-atstart=no",
+            f"--callgrind-out-file={output}",
+            program,
+            f"--benchmark_filter=^{benchmark}$",
+            "--benchmark_min_time=0.000001",
+        ],
+        check=True,
+        capture_output=True,
+    )
+    return int(re.search(r"^(?:totals|summary): (\d+)", output.read_text(), re.MULTILINE)[1])
+
+
 def instructions(program, benchmark):
-    """Instructions inside the benchmark's loop, which runs once."""
+    with tempfile.TemporaryDirectory() as folder:
+        return callgrind(program, benchmark, Path(folder) / "callgrind.out")
+
+
+def shares(program, benchmark):
+    """Instructions of one iteration in the conversion, in the provider and in the rest."""
     with tempfile.TemporaryDirectory() as folder:
         output = Path(folder) / "callgrind.out"
-        subprocess.run(
-            [
-                "valgrind",
-                "--tool=callgrind",
-                "--collect-atstart=no",
-                f"--callgrind-out-file={output}",
-                program,
-                f"--benchmark_filter=^{benchmark}$",
-                "--benchmark_min_time=0.000001",
-            ],
-            check=True,
-            capture_output=True,
-        )
-        return int(re.search(r"^(?:totals|summary): (\d+)", output.read_text(), re.MULTILINE)[1])
+        total = callgrind(program, benchmark, output)
+        command = ["callgrind_annotate", "--inclusive=yes", "--threshold=100", output]
+        table = subprocess.run(command, check=True, capture_output=True, text=True).stdout
+
+    def cost(function):
+        counts = re.findall(rf"^ *([\d,]+) .*{re.escape(function)}", table, re.MULTILINE)
+        if not counts:
+            sys.exit(f"{benchmark}: no call of {function}")
+        return max(int(count.replace(",", "")) for count in counts)
+
+    conversion = sum(cost(function) for function in CONVERSION)
+    provider = cost(PROVIDER) - cost(CALLBACK)
+    return {"conversion": conversion, "provider": provider, "rest": total - conversion - provider}
 
 
 def main():
@@ -60,6 +90,11 @@ def main():
             time = nanoseconds(program, benchmark)
             total = instructions(program, benchmark)
             print(f"{benchmark:<24} {total:>14,} {total / units:>12,.1f} {time / units:>10,.1f}  {unit}")
+    for program in sys.argv[1:]:
+        if Path(program).name in SHARES:
+            benchmark, units, unit = SHARES[Path(program).name]
+            for share, count in shares(program, benchmark).items():
+                print(f"{benchmark + ': ' + share:<36} {count / units:>12,.1f} instructions/{unit}")
 
 
 if __name__ == "__main__":

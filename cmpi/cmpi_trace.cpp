@@ -2,6 +2,8 @@
 
 #include "runtime/log.h"
 
+#include <cstdarg>
+
 namespace zmlr
 {
 
@@ -62,6 +64,16 @@ void ret(const char* name, CMPIrc rc, int line)
 {
     if (log_wanted(LL_DBG))
         log(LL_DBG, log_source, line, "return: %s(): %s", name, _rc_to_str(rc));
+}
+
+void trc(int line, const char* format, ...)
+{
+    if (!log_wanted(LL_DBG))
+        return;
+    va_list arguments;
+    va_start(arguments, format);
+    vlog(LL_DBG, log_source, line, format, arguments);
+    va_end(arguments);
 }
 
 const char* _rc_to_str(CMPIrc rc)

@@ -11,6 +11,9 @@ void ent(const char* name, int line = __builtin_LINE());
 void ret(const char* name, int line = __builtin_LINE());
 void ret(const char* name, CMPIrc rc, int line = __builtin_LINE());
 
+// A free text.
+[[gnu::format(printf, 2, 3)]] void trc(int line, const char* format, ...);
+
 // The name of a CMPI return code; "CMPI_RC_ERR_FAILED" for one that has none.
 const char* _rc_to_str(CMPIrc rc);
 

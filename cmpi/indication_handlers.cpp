@@ -54,6 +54,7 @@ void remove_filter(std::vector<Name_Space_Entry>& entries, const String& name)
 
 void deliver(const CMPI_Thread_Context& thread_context, const Instance* indication, const char* name_space)
 {
+    trc(__LINE__, "delivering an indication to %s", name_space);
     CMPI_Ptr<CMPIInstance> cmpi_instance;
     const CMPIBroker* broker = thread_context.cmpi_broker();
     if (make_cmpi_instance(broker, indication, name_space, nullptr, nullptr, cmpi_instance) != CMPI_RC_OK)

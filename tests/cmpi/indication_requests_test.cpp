@@ -190,6 +190,7 @@ TEST_F(Indications, go_on_when_the_server_refuses_one)
 {
     ASSERT_EQ(enable(), CMPI_RC_OK);
     activate("root/a");
+    EXPECT_THAT(logged([&] { raise("x"); }, "DBG"), ElementsAre("CMPI_Adapter: delivering an indication to root/a"));
     inbox.refuse = true;
     EXPECT_THAT(logged([&] { EXPECT_TRUE(raise("x")); }),
                 ElementsAre("Converter: No ObjectPath built before call to make_CMPI_instance",
