@@ -73,7 +73,7 @@ void parse_instance(hxal_config_t& model, std::string_view prefix, std::string_v
         return;
     const auto [key, value] = assignment('-', line);
     if (const Setting* setting = setting_with(prefix, key))
-        store(model, setting->code, idx, value);
+        store(model, *setting, idx, value);
     else if (prefix == "hxa" && contains(key, "vport"))
         store_vport(model.iocs[idx], value, has_number(key) ? std::optional(number(key)) : std::nullopt);
 }
@@ -97,7 +97,7 @@ void parse_for_all(hxal_config_t& model, std::string_view line)
     Ioc_Entry scratch{};
     set(model.config_all, setting->code, setting->form.store(scratch, value));
     for (int idx = 0, count = ioc_get_num(model); idx < count; ++idx)
-        store(model, setting->code, idx, value);
+        store(model, *setting, idx, value);
 }
 
 } // namespace

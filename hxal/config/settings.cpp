@@ -188,21 +188,24 @@ const Setting* setting_for_all(std::string_view key)
     return first_setting([=](const Setting& setting) { return setting.for_all != For_All::unknown && setting.key == key; });
 }
 
-bool store(hxal_config_t& model, int code, int idx, std::string_view value)
+bool store(hxal_config_t& model, const Setting& setting, int idx, std::string_view value)
 {
     if (!is_entry(idx))
         return false;
-    if (code >= HXAL_CONFIG_AD_SERIAL && code <= HXAL_CONFIG_AD_POWER)
-        return store_adapter(model.adapters[idx], code, value);
-    const Setting* setting = setting_of(code);
-    if (!setting)
-        return false;
     Ioc_Entry& entry = model.iocs[idx];
-    const bool understood = setting->form.store(entry, value);
-    set(entry.flags, code, understood);
-    if (code == HXAL_CONFIG_PORT_WWN)
+    const bool understood = setting.form.store(entry, value);
+    set(entry.flags, setting.code, understood);
+    if (setting.code == HXAL_CONFIG_PORT_WWN)
         pwwn_changed(model, idx);
     return understood;
+}
+
+bool store(hxal_config_t& model, int code, int idx, std::string_view value)
+{
+    if (code >= HXAL_CONFIG_AD_SERIAL && code <= HXAL_CONFIG_AD_POWER)
+        return is_entry(idx) && store_adapter(model.adapters[idx], code, value);
+    const Setting* setting = setting_of(code);
+    return setting && store(model, *setting, idx, value);
 }
 
 void write_text(std::FILE* file, const char* text, std::size_t size)

@@ -1,6 +1,8 @@
 // Replacing the file, so that at every moment either the old or the new one is there, whole.
 #include "hxal/config/writer.h"
 
+#include "hxal/internal/size_limit.h"
+
 #include <cerrno>
 #include <climits>
 #include <cstdio>
@@ -128,6 +130,7 @@ hxa_status_t hxal_config_sync(const char* path)
     if (!old.can_be_replaced)
         return HXA_STATUS_EFOPEN;
 
+    const hxal::Size_Limit_Without_Signal no_signal;
     Temporary_File temporary(target);
     if (!temporary.stream())
         return is_full(errno) ? HXA_STATUS_FAILED : HXA_STATUS_EFOPEN;

@@ -14,10 +14,11 @@ namespace
 {
 
 // Two spellings of one WWN are one port; texts that are no WWN are the same only letter by letter.
-bool same_pwwn(const hxal_vf_config_t& one, const hxal_vf_config_t& other)
+hxal_vf_config_t* listed(const Ioc_Entry& entry, std::string_view text)
 {
-    const wwn_t pwwn = wwn_of(one.pwwn);
-    return std::string_view(one.pwwn) == other.pwwn || (pwwn != 0 && pwwn == wwn_of(other.pwwn));
+    const wwn_t pwwn = wwn_of(text);
+    return first_that(entry.vport, [=](const hxal_vf_config_t& port)
+                      { return text == port.pwwn || (pwwn != 0 && pwwn == wwn_of(port.pwwn)); });
 }
 
 int free_number(hxal_vf_config_t* list)
@@ -52,7 +53,7 @@ std::string_view stripped(std::string_view text)
 
 void put_vport(Ioc_Entry& entry, const hxal_vf_config_t& port, std::optional<int> vidx)
 {
-    hxal_vf_config_t* to = first_that(entry.vport, [&](const hxal_vf_config_t& listed) { return same_pwwn(listed, port); });
+    hxal_vf_config_t* to = listed(entry, port.pwwn);
     if (!to)
         to = append(entry);
     if (!to)

@@ -19,7 +19,8 @@ extern "C"
     // the owner and the mode of the old file (0600 when there is none) and renames it over the old one, so that a crash or a full
     // disk never loses the old file. A link to the file is followed and stays.
     //     HXA_STATUS_EFOPEN  the file cannot be opened for writing: no such directory, no permission, no regular file
-    //     HXA_STATUS_FAILED  it cannot be written: no space left, or the owner cannot be kept
+    //     HXA_STATUS_FAILED  it cannot be written: no space left, the process may not write as much (RLIMIT_FSIZE; no SIGXFSZ
+    //                        follows), or the owner cannot be kept
     // In both cases the old file is as it was and no temporary file stays behind. Two writers at once each write a whole file;
     // the last one stays.
     hxa_status_t hxal_config_sync(const char* path);

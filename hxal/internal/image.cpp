@@ -1,6 +1,7 @@
 #include "hxal/internal/image.h"
 
 #include "hxal/internal/descriptor.h"
+#include "hxal/internal/size_limit.h"
 
 #include <cerrno>
 #include <sys/stat.h>
@@ -30,7 +31,12 @@ template <typename Call, typename Bytes> bool move_all(Call call, int fd, Bytes*
 } // namespace
 
 bool read_all(int fd, void* to, size_t size) { return move_all(::read, fd, static_cast<uint8_t*>(to), size); }
-bool write_all(int fd, const void* from, size_t size) { return move_all(::write, fd, static_cast<const uint8_t*>(from), size); }
+
+bool write_all(int fd, const void* from, size_t size)
+{
+    const Size_Limit_Without_Signal no_signal;
+    return move_all(::write, fd, static_cast<const uint8_t*>(from), size);
+}
 
 hxa_status_t read_image_file(const char* path, Image& image)
 {

@@ -138,7 +138,7 @@ TEST_F(Boot_Update, asks_nothing_of_the_card_unless_the_whole_archive_was_read)
         EXPECT_EQ(update(cut_wrapper, 0x13), HXA_STATUS_BAD_FILE) << size;
     }
     for (const char* size : {"77777777777", "00000020000", "0000000000x", "-0000000001", "           ", "\x80"})
-        for (const size_t member : {0, 1})
+        for (const size_t member : {0u, 1u})
         {
             Archive lying;
             lying.add("boot.txt", bytes_of(description), member == 0 ? size : "").add("optrom.bin", {1}, member == 1 ? size : "");

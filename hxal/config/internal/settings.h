@@ -42,8 +42,9 @@ const Setting* setting_of(int code);
 const Setting* setting_with(std::string_view prefix, std::string_view key);
 const Setting* setting_for_all(std::string_view key);
 
-// Stores the value of an adapter or IOC setting into an entry and marks it present, or absent when the text is none of the
+// Stores the value of an IOC setting, or of any, into an entry and marks it present, or absent when the text is none of the
 // setting's words. False then, and when there is no such setting or entry.
+bool store(hxal_config_t& model, const Setting& setting, int idx, std::string_view text);
 bool store(hxal_config_t& model, int code, int idx, std::string_view text);
 
 // Writes a text of at most `size` characters. A control character would end the line or hide in it.
