@@ -3,31 +3,19 @@
 #include <gtest/gtest.h>
 
 #include <algorithm>
-#include <map>
 #include <set>
 
 namespace
 {
 
-TEST(Commands, have_the_group_byte_of_their_family_and_their_record_size_in_the_code)
+// The record of the event fetch is larger in memory than its number tells, and its group does not follow the IOC's type. Other
+// numbers are held to what operations send.
+TEST(Commands, fetch_events_under_one_number)
 {
-    struct Codes
-    {
-        std::uint32_t fc, ll;
-    };
-    const std::map<std::string_view, Codes> expected = {
-        {"IOCMD_IOC_GET_ATTR", {0xC6484306, 0xC6484406}},      {"IOCMD_IOC_ENABLE", {0xC0084303, 0xC0084403}},
-        {"IOCMD_AEN_GET", {0xC0584329, 0xC0584329}},           {"IOCMD_IOCFC_RESET_STATS", {0xC008B003, 0xC0084403}},
-        {"IOCMD_LPORT_GET_RPORTS", {0xC020B104, 0xC020B104}},  {"IOCMD_RPORT_GET_ATTR", {0xC158B205, 0xC158B205}},
-        {"IOCMD_FLASH_GET_ATTR", {0xC210B501, 0xC210B501}},    {"IOCMD_SCSI_CMND", {0xC050BA01, 0xC050BA01}},
-        {"IOCMD_ITNIM_RESET_STATS", {0xC018BB03, 0xC018BB03}}, {"IOCMD_FCOE_GET_STATS", {0xC170C101, 0xC1704401}},
-    };
-    for (const hxal::Command& command : hxal::catalogue)
-        if (const auto row = expected.find(command.name); row != expected.end())
-        {
-            EXPECT_EQ(command_code(command, command.family.fc), row->second.fc) << command.name;
-            EXPECT_EQ(command_code(command, command.family.ll), row->second.ll) << command.name;
-        }
+    const auto fetch = std::ranges::find(hxal::catalogue, std::string_view("IOCMD_AEN_GET"), &hxal::Command::name);
+    ASSERT_NE(fetch, hxal::catalogue.end());
+    EXPECT_EQ(command_code(*fetch, fetch->family.fc), 0xC0584329u);
+    EXPECT_EQ(command_code(*fetch, fetch->family.ll), 0xC0584329u);
 }
 
 // On the FC node every code stands for one command. On the Ethernet node two commands share one, which the library tells
