@@ -33,8 +33,9 @@ extern "C"
     hxa_status_t hxal_aen_init(void);
 
     // Ends the event thread and waits until it is gone: at once when it is idle, else as long as a callback or a request takes.
-    // Called from a callback it does not wait: the thread ends after the events that were fetched with that one, and
-    // is gone after the next init or exit.
+    // Whoever calls it holds no lock that a callback takes. Called from a callback it does not wait: the thread ends after the
+    // events that were fetched with that one, and is gone after the next init or exit. The end of the process, and the
+    // unloading of the library, call it too. A child of fork(2) has no event thread.
     void hxal_aen_exit(void);
 
     // One request: fetches the events that the driver holds for an application on an IOC. `*count` tells the room in `out`, 64
@@ -77,7 +78,7 @@ extern "C"
     //
     // Which events of its kind a registration gets, besides that they come from the IOC's instance:
     //     adapter   those with the adapter's serial number; without an adapter (null) that any adapter was added
-    //     port      those with `pwwn` of the data, or with `mac` of the data on an Ethernet IOC
+    //     port      those with `pwwn` of the data, and those without a MAC; on an Ethernet IOC those with `mac` of the data
     //     lport     those with `lpwwn` of the data; with 0 there that a logical port is new
     //     rport     those with `lpwwn` of the data
     //     itnim     those with `lpwwn` and `rpwwn` of the data; with 0 in `rpwwn` all of the logical port

@@ -34,9 +34,15 @@ enum class State
     stopped,
 };
 
+struct Thread
+{
+    pthread_t id;
+    pid_t process; // a child of fork() inherits the variables but not the thread
+};
+
 // The thread, if there is one. The mutex is for those who start and end it, never for the thread itself.
 constinit std::mutex life;
-constinit std::optional<pthread_t> thread;
+constinit std::optional<Thread> thread;
 constinit std::atomic<State> state{State::stopped};
 constinit int wake_up = -1; // eventfd
 
@@ -45,6 +51,9 @@ thread_local bool is_event_thread = false;
 bool is_running() { return state == State::running; }
 
 using Entries = std::unique_ptr<hxa_aen_entry_t[]>;
+
+// As select() has it: what is hung up or broken is readable too, and the request tells why.
+constexpr short readable = POLLIN | POLLHUP | POLLERR;
 
 // What poll() waits for. Sorted, each descriptor once; the first one wakes the thread up.
 std::vector<pollfd> descriptors_to_watch()
@@ -68,7 +77,7 @@ void rest(int milliseconds)
 bool is_readable(const std::vector<pollfd>& watched, int fd)
 {
     return std::any_of(watched.begin() + 1, watched.end(),
-                       [=](const pollfd& each) { return each.fd == fd && (each.revents & POLLIN) != 0; });
+                       [=](const pollfd& each) { return each.fd == fd && (each.revents & readable) != 0; });
 }
 
 // Fetches and hands out what one IOC has; a batch that was fetched is handed out to its end. Whether there was anything.
@@ -119,8 +128,11 @@ void* run(void*) noexcept
     const hxa_aen_app_t app = hxal::current_application();
     const Entries entries(new (std::nothrow) hxa_aen_entry_t[HXA_AEN_MAX_ENTRIES]);
     if (!entries)
+    {
         std::printf("%s:%d: malloc failed\n", __func__, __LINE__);
-    while (entries && is_running())
+        state = State::stopped;
+    }
+    while (is_running())
         try
         {
             watch_once(entries.get(), app);
@@ -144,14 +156,34 @@ int start_thread(pthread_t& started)
     return error;
 }
 
-// Waits for the end of the thread, whose state says that it has to.
-void reap()
+void forget_thread()
 {
-    ::pthread_join(*thread, nullptr);
     thread.reset();
     ::close(wake_up);
     wake_up = -1;
 }
+
+// Ends the thread, if there is one, and waits until it is gone. From the first line on no callback can take an end back.
+void end_thread()
+{
+    state = State::stopped;
+    if (!thread)
+        return;
+    if (thread->process == ::getpid())
+    {
+        ::eventfd_write(wake_up, 1);
+        ::pthread_join(thread->id, nullptr);
+    }
+    forget_thread();
+}
+
+bool is_alive() { return thread && thread->process == ::getpid() && is_running(); }
+
+// Ends the thread before what it walks is taken down: at the end of the process, or when the library is unloaded.
+struct Ending
+{
+    ~Ending() { hxal_aen_exit(); }
+};
 
 hxa_status_t resume_from_callback()
 {
@@ -174,21 +206,20 @@ hxa_status_t hxal_aen_init(void)
         return resume_from_callback();
     if (hxal::current_application() == hxa_aen_app_tessik)
         return HXA_STATUS_OK;
+    static const Ending ending; // younger, so gone earlier, than everything that exists before the program runs
     const std::lock_guard lock(life);
-    if (thread && is_running())
+    if (is_alive())
         return HXA_STATUS_OK;
-    if (thread)
-        reap();
+    end_thread();
     wake_up = ::eventfd(0, EFD_CLOEXEC);
     if (wake_up < 0)
         return hxal_get_status(errno);
     state = State::running;
-    pthread_t started;
-    if (const int error = start_thread(started); error != 0)
+    Thread started{.id = {}, .process = ::getpid()};
+    if (const int error = start_thread(started.id); error != 0)
     {
         state = State::stopped;
-        ::close(wake_up);
-        wake_up = -1;
+        forget_thread();
         return hxal_get_status(error);
     }
     thread = started;
@@ -200,9 +231,5 @@ void hxal_aen_exit(void)
     if (is_event_thread)
         return stop_from_callback();
     const std::lock_guard lock(life);
-    if (!thread)
-        return;
-    state = State::stopped;
-    ::eventfd_write(wake_up, 1);
-    reap();
+    end_thread();
 }
