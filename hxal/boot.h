@@ -8,7 +8,7 @@
 //     PORT = 0, 1                   instances of the partition, hexadecimal; optional, 0 when it is missing
 //     ID = 13, 17                   PCI device ids that the image is for, hexadecimal; with TYPE and ID it is complete
 //
-// A line is recognised by the word that it contains; other lines are remarks.
+// A line is recognised by the word that it contains; other lines are remarks. Blanks in a value do not count.
 #pragma once
 
 #include "hxal/ioc.h"
@@ -26,7 +26,7 @@ extern "C"
     //     HXA_STATUS_INVALID_DEVID  not one of these ids; the file is not opened
     //     HXA_STATUS_FAILED         the file cannot be opened, holds no description, or one with an error in it
     //     HXA_STATUS_BAD_FILE       no regular file, no tar archive, or one that ends too early
-    //     HXA_STATUS_ENOMEM         out of memory; a member larger than 64 MiB or a description larger than 1 MiB
+    //     HXA_STATUS_ENOMEM         out of memory; images of more than 64 MiB together, or a description of more than 1 MiB
     //     HXA_STATUS_CREATE_FILE    the inner archive cannot be unpacked to "./zmlrtmpfile", which is gone afterwards
     //     HXA_STATUS_DEVID_MISSING  no image is for the card (of the last card, when every card is updated)
     //     else                      the status of the request that failed, or of hxal_flash_update_part()

@@ -2,6 +2,7 @@
 
 #include <algorithm>
 #include <charconv>
+#include <string>
 
 namespace hxal
 {
@@ -9,14 +10,11 @@ namespace hxal
 namespace
 {
 
-constexpr std::string_view blanks = " \t\r";
-
-std::string_view without_blanks(std::string_view text)
+std::string without_blanks(std::string_view text)
 {
-    const size_t first = text.find_first_not_of(blanks);
-    if (first == text.npos)
-        return {};
-    return text.substr(first, text.find_last_not_of(blanks) - first + 1);
+    std::string kept(text);
+    std::erase_if(kept, [](char each) { return each == ' ' || each == '\t' || each == '\r'; });
+    return kept;
 }
 
 // Takes the text up to a separator, and the separator, off the front of another.
@@ -28,13 +26,16 @@ std::string_view take(std::string_view& text, char separator)
     return front;
 }
 
-// Hexadecimal numbers with commas between them; false when there is none, or one that is no number of that size.
+// Hexadecimal numbers, with or without "0x", with commas between them; false when there is none, or one that is no number of
+// that size.
 template <typename Number> bool read_numbers(std::string_view text, std::vector<Number>& numbers)
 {
     numbers.clear();
     do
     {
-        const std::string_view digits = without_blanks(take(text, ','));
+        std::string_view digits = take(text, ',');
+        if (digits.starts_with("0x") || digits.starts_with("0X"))
+            digits.remove_prefix(2);
         Number number;
         const auto [end, error] = std::from_chars(digits.begin(), digits.end(), number, 16);
         if (error != std::errc() || end != digits.end())
