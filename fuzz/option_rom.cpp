@@ -9,7 +9,7 @@ extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, size_t size)
     for (const uint16_t devid : std::initializer_list<uint16_t>{0x13, 0x17})
     {
         hxal::Image rom(data, data + size);
-        if (hxal::fit_option_rom(rom, devid) != HXA_STATUS_OK)
+        if (hxal::update_device_id_chksum(rom, devid) != HXA_STATUS_OK)
             continue;
         if (rom.size() != size)
             std::abort();

@@ -42,7 +42,7 @@ hxa_status_t write_host_code(const hxal_t& ioc, const HXAL_IMAGE_DATA_T& image, 
 {
     hxal::Image copy = image.ibuf;
     if (image.itype == hxal::image_option_rom)
-        if (const hxa_status_t fitted = hxal::fit_option_rom(copy, devid); fitted != HXA_STATUS_OK)
+        if (const hxa_status_t fitted = hxal::update_device_id_chksum(copy, devid); fitted != HXA_STATUS_OK)
             return fitted;
     hxal::reverse_words(copy);
     return write_part(ioc, image, copy, 0);
@@ -65,7 +65,7 @@ hxa_status_t write_image(const hxal_t& ioc, const HXAL_IMAGE_DATA_T& image, uint
     return write_part(ioc, image, image.ibuf, 0);
 }
 
-hxa_status_t update_card(const hxal_t& ioc, const Images& images, uint16_t devid)
+hxa_status_t flash_data(const hxal_t& ioc, const Images& images, uint16_t devid)
 {
     const auto is_for_card = [=](const HXAL_IMAGE_DATA_T& image) { return image.is_for(devid); };
     if (std::none_of(images.begin(), images.end(), is_for_card))
@@ -90,7 +90,7 @@ hxa_status_t read_device_id(const hxal_t& ioc, uint16_t& devid)
 hxa_status_t update_listed_card(int ad, const hxal_t& ioc, const Images& images, uint16_t devid)
 {
     std::printf("updating boot code for adapter id %d\n", ad);
-    const hxa_status_t updated = update_card(ioc, images, devid);
+    const hxa_status_t updated = flash_data(ioc, images, devid);
     if (updated == HXA_STATUS_OK)
         std::printf("updated boot code for adapter id %d\n", ad);
     else if (updated == HXA_STATUS_DEVID_MISSING)
@@ -137,6 +137,6 @@ hxa_status_t hxal_boot_fwupdate(const hxal_t* ioc, const char* file, uint16_t de
             Images images;
             if (const hxa_status_t read = hxal::read_boot_archive(file, images); read != HXA_STATUS_OK)
                 return read;
-            return ioc ? update_card(*ioc, images, devid) : update_every_card(images);
+            return ioc ? flash_data(*ioc, images, devid) : update_every_card(images);
         });
 }

@@ -59,10 +59,8 @@ private:
     Descriptor _file;
 };
 
-// Reads the archive that an open file is, from its start: the description, then one member for each image of it.
-hxa_status_t read_archive(int fd, std::vector<HXAL_IMAGE_DATA_T>& images)
+hxa_status_t read_config_file(Tar_Reader& reader, std::vector<HXAL_IMAGE_DATA_T>& images)
 {
-    Tar_Reader reader(fd);
     Tar_Member member;
     if (const hxa_status_t read = reader.next(member); read != HXA_STATUS_OK)
         return read;
@@ -70,16 +68,31 @@ hxa_status_t read_archive(int fd, std::vector<HXAL_IMAGE_DATA_T>& images)
         return HXA_STATUS_FAILED;
     if (member.data.size() > max_description_size)
         return HXA_STATUS_ENOMEM;
-    const std::string_view text(reinterpret_cast<const char*>(member.data.data()), member.data.size());
-    if (const hxa_status_t parsed = read_boot_description(text, images); parsed != HXA_STATUS_OK)
-        return parsed;
+    return read_boot_description({reinterpret_cast<const char*>(member.data.data()), member.data.size()}, images);
+}
+
+hxa_status_t read_image_files(Tar_Reader& reader, std::vector<HXAL_IMAGE_DATA_T>& images)
+{
+    Tar_Member member;
+    size_t total = 0;
     for (HXAL_IMAGE_DATA_T& image : images)
     {
         if (const hxa_status_t read = reader.next(member); read != HXA_STATUS_OK)
             return read;
+        total += member.data.size();
+        if (total > max_image_size)
+            return HXA_STATUS_ENOMEM;
         image.ibuf.swap(member.data);
     }
     return HXA_STATUS_OK;
+}
+
+// Reads the archive that an open file is, from its start: the description, then one member for each image of it.
+hxa_status_t read_archive(int fd, std::vector<HXAL_IMAGE_DATA_T>& images)
+{
+    Tar_Reader reader(fd);
+    const hxa_status_t read = read_config_file(reader, images);
+    return read == HXA_STATUS_OK ? read_image_files(reader, images) : read;
 }
 
 } // namespace

@@ -65,19 +65,22 @@ void put_checksum(Bytes bytes, size_t at)
 
 bool is_patched(uint16_t devid) { return devid == 0x14 || devid == 0x17 || devid == 0x21; }
 
-// The Plug and Play header of an image; empty when there is none, or not all of it.
+// What stands in an image from its Plug and Play header on; empty when there is none.
 Bytes pnp_header_of(Bytes image)
 {
     const size_t offset = word_at(image, rom_header::pnp_header);
-    const Bytes header = offset == 0 ? Bytes() : structure_at(image, offset, pnp_length_unit);
-    const size_t length = header.empty() ? 0 : header[pnp_header::length] * pnp_length_unit;
-    return length <= header.size() ? header.first(length) : Bytes();
+    return offset == 0 ? Bytes() : structure_at(image, offset, pnp_length_unit);
 }
 
-void patch_pnp_header(Bytes header, uint16_t devid)
+// False when the header is shorter than its fields or longer than the image.
+bool patch_pnp_header(Bytes rest, uint16_t devid)
 {
-    put_word(header, pnp_header::device_id, devid);
-    put_checksum(header, pnp_header::checksum);
+    const size_t length = rest[pnp_header::length] * pnp_length_unit;
+    if (length == 0 || length > rest.size())
+        return false;
+    put_word(rest, pnp_header::device_id, devid);
+    put_checksum(rest.first(length), pnp_header::checksum);
+    return true;
 }
 
 // What the walk needs to know of an image before it changes anything.
@@ -106,7 +109,7 @@ Rom_Image image_at(Bytes rom, size_t offset)
 
 } // namespace
 
-hxa_status_t fit_option_rom(Image& rom, uint16_t devid)
+hxa_status_t update_device_id_chksum(Image& rom, uint16_t devid)
 {
     const bool patched = is_patched(devid);
     for (size_t offset = 0;;)
@@ -123,7 +126,8 @@ hxa_status_t fit_option_rom(Image& rom, uint16_t devid)
                 return HXA_STATUS_FAILED;
             if (!patched)
                 return HXA_STATUS_OK;
-            patch_pnp_header(header, devid);
+            if (!patch_pnp_header(header, devid))
+                return HXA_STATUS_FAILED;
         }
         put_checksum(image.bytes, image.bytes.size() - 1);
         if (image.is_last)

@@ -10,7 +10,7 @@ namespace hxal
 // written into each image's PCI data structure and, for x86 code, into its Plug and Play header; for another id the walk ends
 // at the first image of x86 code. HXA_STATUS_FAILED when a structure lies outside the bytes, x86 code has no Plug and Play
 // header, or an image has no length; what was changed by then stays changed.
-hxa_status_t fit_option_rom(Image& rom, uint16_t devid);
+hxa_status_t update_device_id_chksum(Image& rom, uint16_t devid);
 
 // Reverses the byte order of every 32-bit word; bytes left over stay as they are.
 void reverse_words(Image& image);

@@ -4,11 +4,16 @@
 #include "hxal/internal/boot_description.h"
 #include "hxal/internal/option_rom.h"
 
+#include <fcntl.h>
+#include <sys/resource.h>
 #include <sys/stat.h>
 #include <unistd.h>
 
+#include <atomic>
+#include <csignal>
 #include <filesystem>
 #include <numeric>
+#include <thread>
 
 namespace
 {
@@ -41,6 +46,28 @@ Archive archive_of(const std::string& text, const Bytes& firmware_image = firmwa
         .add("overlay.bin", overlay)
         .add("else.bin", bytes_of("else"));
 }
+
+// While it lives no file can grow beyond this many bytes: a full disk.
+class File_Size_Limit
+{
+public:
+    explicit File_Size_Limit(rlim_t bytes) : _handler(::signal(SIGXFSZ, SIG_IGN))
+    {
+        ::getrlimit(RLIMIT_FSIZE, &_before);
+        const rlimit limit{bytes, _before.rlim_max};
+        ::setrlimit(RLIMIT_FSIZE, &limit);
+    }
+
+    ~File_Size_Limit()
+    {
+        ::setrlimit(RLIMIT_FSIZE, &_before);
+        ::signal(SIGXFSZ, _handler);
+    }
+
+private:
+    sighandler_t _handler;
+    rlimit _before;
+};
 
 // One HBA of two ports with device id 0x13, the library on it, and a folder of its own to be in.
 class Boot_Update : public Simulated_Host
@@ -117,7 +144,7 @@ TEST_F(Boot_Update, fits_the_option_rom_to_the_card)
 {
     ASSERT_EQ(update(archive_of(description), 0x17), HXA_STATUS_OK);
     Bytes rom = Rom{}.build();
-    ASSERT_EQ(hxal::fit_option_rom(rom, 0x17), HXA_STATUS_OK);
+    ASSERT_EQ(hxal::update_device_id_chksum(rom, 0x17), HXA_STATUS_OK);
     hxal::reverse_words(rom);
     EXPECT_EQ(part(HXA_FLASH_PART_OPTROM, rom.size()), rom);
     EXPECT_THAT(requests(), testing::Contains("IOCMD_FLASH_ENABLE_OPTROM"));
@@ -164,9 +191,61 @@ TEST_F(Boot_Update, unpacks_to_a_file_of_its_own_or_not_at_all)
     EXPECT_EQ(fs::file_size("victim"), 4u);
     EXPECT_FALSE(fs::exists(fs::symlink_status("zmlrtmpfile")));
 
+    {
+        const File_Size_Limit limit(1024);
+        EXPECT_EQ(hxal_boot_fwupdate(hxal_adapter_get_port(1), "archive", 0x13), HXA_STATUS_CREATE_FILE) << "no room";
+        EXPECT_FALSE(fs::exists("zmlrtmpfile"));
+    }
     fs::create_directory("zmlrtmpfile");
     EXPECT_EQ(update(wrapped(archive_of(description)), 0x13), HXA_STATUS_CREATE_FILE);
     EXPECT_TRUE(fs::is_directory("zmlrtmpfile"));
+
+    const std::string archive = fs::absolute("archive");
+    fs::current_path("/proc");
+    EXPECT_EQ(hxal_boot_fwupdate(hxal_adapter_get_port(1), archive.c_str(), 0x13), HXA_STATUS_CREATE_FILE) << "unwritable";
+}
+
+TEST_F(Boot_Update, keeps_to_the_file_that_it_opened)
+{
+    const auto save_uniform = [](const char* path, uint8_t byte)
+    {
+        const Bytes image(4096, byte);
+        Archive()
+            .add("boot.txt", bytes_of("IMAGE\nTYPE=F\nID=13\nIMAGE\nTYPE=L\nID=13\n"))
+            .add("firmware.bin", image)
+            .add("overlay.bin", image)
+            .save(path);
+    };
+    save_uniform("archive", 1);
+    save_uniform("other", 2);
+    std::atomic<bool> over = false;
+    std::thread swapper(
+        [&]
+        {
+            while (!over)
+                ::renameat2(AT_FDCWD, "archive", AT_FDCWD, "other", RENAME_EXCHANGE);
+        });
+    for (int round = 0; round < 100; ++round)
+    {
+        EXPECT_EQ(hxal_boot_fwupdate(hxal_adapter_get_port(1), "archive", 0x13), HXA_STATUS_OK);
+        EXPECT_EQ(part(HXA_FLASH_PART_FWIMG, 4096), part(HXA_FLASH_PART_BOOTOVL, 4096));
+    }
+    over = true;
+    swapper.join();
+}
+
+TEST_F(Boot_Update, takes_no_more_than_a_card_holds)
+{
+    const Archive head_of_48_mib = Archive().add("image.bin", {}, "00300000000");
+    const auto add_hole = [] { fs::resize_file("archive", fs::file_size("archive") + (48 << 20)); };
+    Archive().add("boot.txt", bytes_of(description)).save("archive");
+    for (int image = 0; image < 2; ++image)
+    {
+        std::ofstream("archive", std::ios::binary | std::ios::app) << head_of_48_mib.bytes;
+        add_hole();
+    }
+    EXPECT_EQ(hxal_boot_fwupdate(hxal_adapter_get_port(1), "archive", 0x13), HXA_STATUS_ENOMEM);
+    EXPECT_THAT(requests(), IsEmpty());
 }
 
 TEST_F(Boot_Update, ends_with_the_first_image_that_fails)
@@ -217,6 +296,8 @@ TEST(BootDescription, is_read_line_by_line_or_refused)
         "IMAGE\nID=13\nTYPE=O",
         "IMAGE\r\nTYPE = \tO\r\nID = 13 ,14\r\n",
         "remark\nIMAGE\nPORT=0,1\nTYPE=\nID=ffff\nremark",
+        "IMAGE\nTYPE=O\nID=0x13,0X17\n",
+        "IMAGE\nTYPE=O\nID=1 3\t,\n",
     };
     for (const char* text : good)
     {
@@ -236,7 +317,8 @@ TEST(BootDescription, is_read_line_by_line_or_refused)
         "IMAGE\nTYPE=O\nID=\n",                // no id
         "IMAGE\nTYPE=O\nID=10000\n",           // no device id
         "IMAGE\nPORT=100\nTYPE=O\nID=13\n",    // no instance
-        "IMAGE\nTYPE=O\nID=13 14\n",           // no list
+        "IMAGE\nTYPE=O\nID=13;14\n",           // no list
+        "IMAGE\nTYPE=O\nID=0x\n",              // no digits
     };
     for (const char* text : bad)
     {

@@ -26,7 +26,7 @@ TEST(OptionRom, writes_the_device_id_and_all_checksums_into_every_image_of_a_pat
     for (const uint16_t devid : std::initializer_list<uint16_t>{0x14, 0x17, 0x21})
     {
         Bytes rom = chain;
-        EXPECT_EQ(hxal::fit_option_rom(rom, devid), HXA_STATUS_OK);
+        EXPECT_EQ(hxal::update_device_id_chksum(rom, devid), HXA_STATUS_OK);
         EXPECT_EQ(word_at(rom, 64 + 6), devid);
         EXPECT_EQ(word_at(rom, 128 + 12), 0x13) << "no x86 code, no Plug and Play header";
         EXPECT_EQ(word_at(rom, 1024 + 64 + 6), devid);
@@ -40,10 +40,17 @@ TEST(OptionRom, writes_the_device_id_and_all_checksums_into_every_image_of_a_pat
 TEST(OptionRom, of_another_card_stays_as_it_is_from_the_first_x86_image_on)
 {
     Bytes rom = chain;
-    EXPECT_EQ(hxal::fit_option_rom(rom, 0x13), HXA_STATUS_OK);
+    EXPECT_EQ(hxal::update_device_id_chksum(rom, 0x13), HXA_STATUS_OK);
     Bytes expected = chain;
     expected[1023] = static_cast<uint8_t>(expected[1023] - sum(chain, 0, 1024));
     EXPECT_EQ(rom, expected);
+
+    const Bytes odd = Rom{.pnp_units = 0}.build();
+    rom = odd;
+    EXPECT_EQ(hxal::update_device_id_chksum(rom, 0x13), HXA_STATUS_OK) << "there is a Plug and Play header, read by nobody";
+    EXPECT_EQ(rom, odd);
+    rom = Rom{.pnp_header = 0}.build();
+    EXPECT_EQ(hxal::update_device_id_chksum(rom, 0x13), HXA_STATUS_FAILED);
 }
 
 TEST(OptionRom, with_a_structure_out_of_place_is_refused)
@@ -64,7 +71,7 @@ TEST(OptionRom, with_a_structure_out_of_place_is_refused)
     for (const Bytes& row : rows)
     {
         Bytes rom = row;
-        EXPECT_EQ(hxal::fit_option_rom(rom, 0x17), HXA_STATUS_FAILED) << testing::PrintToString(&row - rows);
+        EXPECT_EQ(hxal::update_device_id_chksum(rom, 0x17), HXA_STATUS_FAILED) << testing::PrintToString(&row - rows);
     }
 }
 
