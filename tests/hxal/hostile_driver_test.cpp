@@ -1,5 +1,6 @@
 // A driver that lies: whatever it answers, the library neither crashes nor hangs nor grows.
 #include "allocations.h"
+#include "boot_files.h"
 #include "hxal/records/commands.h"
 #include "operation_table.h"
 #include "simulated_host.h"
@@ -8,6 +9,7 @@
 #include <cstddef>
 #include <random>
 #include <stdexcept>
+#include <sys/mman.h>
 
 namespace
 {
@@ -68,6 +70,27 @@ protected:
         hxal_rport_get_attr(ioc, 0, 0, remote, &attr);
         hxa_rport_symname_t symname;
         hxal_get_rport_symname(ioc, 0, 1, ioc->pwwn, remote, &symname);
+        char bytes[16];
+        hxal_flash_read_part(ioc, HXA_FLASH_PART_VPD, 0, bytes, sizeof bytes, HXA_FALSE);
+        const unsigned char image[16] = {};
+        hxal_flash_update_part(ioc, HXA_FLASH_PART_FWIMG, 0, image, HXA_FALSE, sizeof image);
+        hxal_boot_fwupdate(ioc, boot_archive(), 0x13);
+    }
+
+    // The path of an archive that lies in no folder.
+    static const char* boot_archive()
+    {
+        static const std::string path = []
+        {
+            std::string memory = "/proc/self/fd/" + std::to_string(::memfd_create("archive", MFD_CLOEXEC));
+            Archive()
+                .add("boot.txt", bytes_of("IMAGE\nTYPE=O\nID=13\nIMAGE\nPORT=0,1\nTYPE=C\nID=13\n"))
+                .add("optrom.bin", Rom{}.build())
+                .add("config.bin", bytes_of("configuration"))
+                .save(memory);
+            return memory;
+        }();
+        return path.c_str();
     }
 
     static void use_operations(hxal_t* ioc)
