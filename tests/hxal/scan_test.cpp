@@ -254,6 +254,23 @@ TEST_F(Scan, keeps_one_descriptor_for_each_node_that_a_list_uses)
     EXPECT_EQ(hxasim::open_descriptors(), 0);
 }
 
+TEST_F(Scan, leaves_a_registration_its_descriptor_until_it_is_taken_back)
+{
+    host(one_cna);
+    ASSERT_EQ(hxal_adapter_scan(), 1);
+    const auto ignore = [](void*, uint32_t, const hxa_ioc_aen_data_t*, hxa_timeval_t) {};
+    hxal_ioc_aen_cbhandle_t* registration = nullptr;
+    ASSERT_EQ(hxal_ioc_aen_register(hxal_ioc_open_idx(0), ignore, nullptr, &registration), HXA_STATUS_OK);
+    for (int i = 0; i < 3; ++i)
+        ASSERT_EQ(hxal_adapter_scan(), 1);
+    EXPECT_EQ(hxasim::open_descriptors(), 3);
+    host("{}");
+    hxal_adapter_scan();
+    EXPECT_EQ(hxasim::open_descriptors(), 1);
+    EXPECT_EQ(hxal_ioc_aen_unregister(registration), HXA_STATUS_OK);
+    EXPECT_EQ(hxasim::open_descriptors(), 0);
+}
+
 TEST_F(Scan, of_iocs_alone_can_hand_its_descriptor_to_an_adapter)
 {
     host(R"({"adapters": [{"kind": "cna", "ports": [{}]}]})");
