@@ -125,9 +125,15 @@ std::vector<Instance> Module_Operations::exec_query(const std::string&, const st
 
     const Property_List all;
     Instance_Sink sink(_name_space, all, nullptr);
+    bool asked = false;
     for (const Class_Entry* provider : _classes.served(*named))
         if (CMPIInstanceMI* mi = _module.instance_mi(*provider))
+        {
             Provider_Call(*provider, path_to(*provider), sink).run(mi, mi->ft->execQuery, query.c_str(), language.c_str());
+            asked = true;
+        }
+    if (!asked)
+        throw Cim_Error(CIM_ERR_NOT_SUPPORTED, not_served(*named));
     return std::move(sink.found);
 }
 

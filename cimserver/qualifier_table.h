@@ -1,8 +1,8 @@
 // The qualifiers that clients ask for and the module does not carry: Description, ValueMap, Values, and the class that
 // EmbeddedInstance names.
 //
-// Generated from the MOF. Rows are sorted by class and feature name (ASCII, lower case); an inherited feature's row stands
-// at the class that declares it.
+// Generated from the MOF. Rows are sorted by class, feature and parameter name (ASCII, lower case); an inherited feature's row
+// stands at the class that declares it.
 #pragma once
 
 namespace cimserver
@@ -11,8 +11,9 @@ namespace cimserver
 struct Qualifier_Row
 {
     const char* class_name;
-    const char* feature_name; // "" for the class itself
-    const char* name;         // "Description", "EmbeddedInstance", "ValueMap", "Values"
+    const char* feature_name;   // "" for the class itself
+    const char* parameter_name; // of a method; "" for the feature itself
+    const char* name;           // "Description", "EmbeddedInstance", "ValueMap", "Values"
     bool array;
     const char* const* values; // string values; one unless array
     unsigned num_values;

@@ -168,7 +168,7 @@ def _feature(owner, declared, overridden=None):
     inherited = overridden.flags & INHERITED_FEATURE_FLAGS if overridden else 0
     documentation = {**(overridden.documentation if overridden else {}), **_documentation(declared)}
     if isinstance(declared, pywbem.CIMMethod):
-        feature = _method(owner, declared, documentation)
+        feature = _method(owner, declared, documentation, overridden)
     else:
         feature = _field(owner, declared, inherited, documentation)
     if overridden and _layout(feature) != _layout(overridden):
@@ -190,19 +190,21 @@ def _field(owner, declared, inherited, documentation):
                    documentation)
 
 
-def _method(owner, declared, documentation):
-    parameters = [_parameter(owner, parameter) for parameter in declared.parameters.values()]
+def _method(owner, declared, documentation, overridden):
+    known = {parameter.name.lower(): parameter for parameter in overridden.parameters} if overridden else {}
+    parameters = [_parameter(owner, parameter, known.get(name.lower())) for name, parameter in declared.parameters.items()]
     parameters.append(Feature("return_value", owner, FLAGS["Property"] | FLAGS["Out"], declared.return_type, 0))
     return Method(declared.name, owner, _flags(declared) | FLAGS["Method"], declared.return_type, parameters, documentation)
 
 
-def _parameter(owner, declared):
+def _parameter(owner, declared, overridden):
     flags = _flags(declared)
     if "In" not in declared.qualifiers:
         flags |= FLAGS["In"]
-    if declared.type == "reference":
-        return Feature(declared.name, owner, flags | FLAGS["Reference"], declared.reference_class, _array(declared))
-    return Feature(declared.name, owner, flags | FLAGS["Property"], declared.type, _array(declared))
+    documentation = {**(overridden.documentation if overridden else {}), **_documentation(declared)}
+    is_reference = declared.type == "reference"
+    kind, type_ = ("Reference", declared.reference_class) if is_reference else ("Property", declared.type)
+    return Feature(declared.name, owner, flags | FLAGS[kind], type_, _array(declared), documentation=documentation)
 
 
 def _flags(declared):

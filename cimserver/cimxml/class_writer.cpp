@@ -93,14 +93,6 @@ void write_property(Xml_Writer& writer, const zmlr::Meta_Class& meta_class, unsi
     writer.end();
 }
 
-void write_parameter(Xml_Writer& writer, const zmlr::Meta_Feature& parameter, const Class_Selection& selection)
-{
-    start_typed(writer, element_of(parameter, parameter_elements), parameter);
-    if (selection.qualifiers)
-        write_parameter_qualifiers(writer, parameter);
-    writer.end();
-}
-
 void write_method(Xml_Writer& writer, const zmlr::Meta_Class& meta_class, unsigned index, const Class_Selection& selection)
 {
     const zmlr::Meta_Method& method = *zmlr::as_method(meta_class.meta_features[index]);
@@ -110,8 +102,15 @@ void write_method(Xml_Writer& writer, const zmlr::Meta_Class& meta_class, unsign
     if (selection.qualifiers)
         write_feature_qualifiers(writer, meta_class, index);
     for (unsigned i = 0; i < method.num_meta_features; ++i)
-        if (!equal_names(method.meta_features[i]->name, "return_value"))
-            write_parameter(writer, *method.meta_features[i], selection);
+    {
+        const zmlr::Meta_Feature& parameter = *method.meta_features[i];
+        if (equal_names(parameter.name, "return_value"))
+            continue;
+        start_typed(writer, element_of(parameter, parameter_elements), parameter);
+        if (selection.qualifiers)
+            write_parameter_qualifiers(writer, meta_class, method, parameter);
+        writer.end();
+    }
     writer.end();
 }
 

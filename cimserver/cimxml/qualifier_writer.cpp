@@ -131,10 +131,10 @@ void write_row(Xml_Writer& writer, const Qualifier_Row& row)
     writer.end();
 }
 
-void write_rows(Xml_Writer& writer, const zmlr::Meta_Class& meta_class, std::string_view feature)
+void write_rows(Xml_Writer& writer, const zmlr::Meta_Class& meta_class, std::string_view feature, std::string_view parameter = "")
 {
     for (const Qualifier_Row& row : rows_of(meta_class.name))
-        if (equal_names(row.feature_name, feature))
+        if (equal_names(row.feature_name, feature) && equal_names(row.parameter_name, parameter))
             write_row(writer, row);
 }
 
@@ -165,10 +165,13 @@ void write_feature_qualifiers(Xml_Writer& writer, const zmlr::Meta_Class& meta_c
         write_rows(writer, *origin, feature.name);
 }
 
-void write_parameter_qualifiers(Xml_Writer& writer, const zmlr::Meta_Feature& parameter)
+void write_parameter_qualifiers(Xml_Writer& writer, const zmlr::Meta_Class& meta_class, const zmlr::Meta_Method& method,
+                                const zmlr::Meta_Feature& parameter)
 {
     write_boolean(writer, "In", (parameter.flags & zmlr::Flag_In) != 0, {false, true});
     write_flags(writer, parameter.flags);
+    if (const zmlr::Meta_Class* origin = describing_class_of(meta_class, method.name))
+        write_rows(writer, *origin, method.name, parameter.name);
 }
 
 } // namespace cimserver

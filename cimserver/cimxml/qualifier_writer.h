@@ -12,7 +12,8 @@ namespace cimserver
 void write_class_qualifiers(Xml_Writer& writer, const zmlr::Meta_Class& meta_class);
 void write_feature_qualifiers(Xml_Writer& writer, const zmlr::Meta_Class& meta_class, unsigned feature_index);
 
-// A parameter's direction and flags.
-void write_parameter_qualifiers(Xml_Writer& writer, const zmlr::Meta_Feature& parameter);
+// A parameter's direction and flags, and the table's rows of the class that declares the method or last overrides it.
+void write_parameter_qualifiers(Xml_Writer& writer, const zmlr::Meta_Class& meta_class, const zmlr::Meta_Method& method,
+                                const zmlr::Meta_Feature& parameter);
 
 } // namespace cimserver

@@ -41,6 +41,9 @@ def test_classes(mixed):
     assert change.return_type == "uint32"
     assert change.parameters["Job"].reference_class == "CIM_ConcreteJob"
 
+    run = mixed.pywbem.GetClass("CIM_DiagnosticService").methods["RunDiagnosticService"]
+    assert run.parameters["JobSettings"].qualifiers["EmbeddedInstance"].value == "CIM_JobSettingData"
+
     local = mixed.pywbem.GetClass("ZEMLAR_PhysicalPackage", LocalOnly=True)
     assert list(local.properties) == ["FRUNumber"]
     assert mixed.pywbem.GetClass("ZEMLAR_PhysicalPackage").properties.keys() == local.properties.keys(), "local by default"

@@ -17,10 +17,11 @@ using cimserver::Qualifier_Row;
 
 std::span<const Qualifier_Row> rows() { return {cimserver::qualifier_table, cimserver::qualifier_table_size}; }
 
-const Qualifier_Row* find(const char* class_name, const char* feature_name, const char* name)
+const Qualifier_Row* find(const char* class_name, const char* feature_name, const char* name, const char* parameter = "")
 {
     for (const Qualifier_Row& row : rows())
-        if (!strcasecmp(row.class_name, class_name) && !strcasecmp(row.feature_name, feature_name) && !strcasecmp(row.name, name))
+        if (!strcasecmp(row.class_name, class_name) && !strcasecmp(row.feature_name, feature_name) &&
+            !strcasecmp(row.parameter_name, parameter) && !strcasecmp(row.name, name))
             return &row;
     return nullptr;
 }
@@ -43,6 +44,8 @@ TEST(Qualifier_Table, is_sorted_without_duplicates)
             return order < 0;
         if (const int order = strcasecmp(a.feature_name, b.feature_name))
             return order < 0;
+        if (const int order = strcasecmp(a.parameter_name, b.parameter_name))
+            return order < 0;
         return strcasecmp(a.name, b.name) < 0;
     };
     for (std::size_t i = 1; i < rows().size(); i++)
@@ -58,7 +61,7 @@ TEST(Qualifier_Table, every_code_has_one_text)
             continue;
         SCOPED_TRACE(std::string(row.class_name) + "." + row.feature_name);
         maps++;
-        const Qualifier_Row* texts = find(row.class_name, row.feature_name, "Values");
+        const Qualifier_Row* texts = find(row.class_name, row.feature_name, "Values", row.parameter_name);
         ASSERT_NE(texts, nullptr);
         EXPECT_TRUE(row.array && texts->array);
         EXPECT_EQ(row.num_values, texts->num_values);
@@ -95,6 +98,9 @@ TEST(Qualifier_Table, every_embedded_instance_has_its_class)
             EXPECT_EQ(find(c->name, feature->name, "EmbeddedInstance") != nullptr, flagged) << c->name << "." << feature->name;
         }
 
+    const Qualifier_Row* jobs = find("CIM_DiagnosticService", "RunDiagnosticService", "EmbeddedInstance", "JobSettings");
+    ASSERT_NE(jobs, nullptr);
+    EXPECT_STREQ(jobs->values[0], "CIM_JobSettingData");
     const Qualifier_Row* setting = find("CIM_AllocatedLogicalElement", "AllocationState", "EmbeddedInstance");
     ASSERT_NE(setting, nullptr);
     EXPECT_FALSE(setting->array);

@@ -46,9 +46,10 @@ TEST(class_writer, writes_local_features_with_their_qualifiers)
             "<PROPERTY NAME=\"Setting\" TYPE=\"string\" EmbeddedObject=\"instance\"><QUALIFIER NAME=\"EmbeddedInstance\" "
             "TYPE=\"string\"><VALUE>TST_Element</VALUE></QUALIFIER></PROPERTY>"
             "<METHOD NAME=\"Reset\" TYPE=\"uint32\"><PARAMETER NAME=\"Force\" TYPE=\"boolean\">" +
-            in + "</PARAMETER><PARAMETER.REFERENCE NAME=\"Job\" REFERENCECLASS=\"TST_Element\">" + in_false + fixed("Out") +
-            "</PARAMETER.REFERENCE><PARAMETER.ARRAY NAME=\"Codes\" TYPE=\"uint8\">" + in + fixed("Out") +
-            "</PARAMETER.ARRAY></METHOD></CLASS>");
+            in + description +
+            "Even now.</VALUE></QUALIFIER></PARAMETER><PARAMETER.REFERENCE NAME=\"Job\" REFERENCECLASS=\"TST_Element\">" +
+            in_false + fixed("Out") + "</PARAMETER.REFERENCE><PARAMETER.ARRAY NAME=\"Codes\" TYPE=\"uint8\">" + in +
+            fixed("Out") + "</PARAMETER.ARRAY></METHOD></CLASS>");
 }
 
 TEST(class_writer, writes_what_was_selected)

@@ -85,20 +85,22 @@ const char* const port_text[] = {"A port."};
 const char* const setting_class[] = {"TST_Element"};
 const char* const status_text[] = {"How it is."};
 const char* const name_text[] = {"The port's WWN."};
+const char* const force_text[] = {"Even now."};
 const char* const modes_map[] = {"2", ".."};
 const char* const modes_values[] = {"Point & point", "Reserved"};
 
 } // namespace
 
 const Qualifier_Row qualifier_table[] = {
-    {"TST_Element", "", "Description", false, element_text, 1},
-    {"TST_Element", "Name", "Description", false, status_text, 1},
-    {"TST_Element", "Status", "Description", false, status_text, 1},
-    {"TST_Port", "", "Description", false, port_text, 1},
-    {"TST_Port", "Modes", "ValueMap", true, modes_map, 2},
-    {"TST_Port", "Modes", "Values", true, modes_values, 2},
-    {"TST_Port", "Name", "Description", false, name_text, 1},
-    {"TST_Port", "Setting", "EmbeddedInstance", false, setting_class, 1},
+    {"TST_Element", "", "", "Description", false, element_text, 1},
+    {"TST_Element", "Name", "", "Description", false, status_text, 1},
+    {"TST_Element", "Status", "", "Description", false, status_text, 1},
+    {"TST_Port", "", "", "Description", false, port_text, 1},
+    {"TST_Port", "Modes", "", "ValueMap", true, modes_map, 2},
+    {"TST_Port", "Modes", "", "Values", true, modes_values, 2},
+    {"TST_Port", "Name", "", "Description", false, name_text, 1},
+    {"TST_Port", "Reset", "Force", "Description", false, force_text, 1},
+    {"TST_Port", "Setting", "", "EmbeddedInstance", false, setting_class, 1},
 };
 const unsigned qualifier_table_size = std::size(qualifier_table);
 
