@@ -1,14 +1,26 @@
 #include "sim/journal.h"
 
+#include <cstdlib>
+
 namespace hxasim
 {
 
 namespace
 {
 
-constexpr std::size_t max_entries = 100'000;
 constexpr std::size_t max_bytes = 128 * 1024 * 1024;
 constexpr std::size_t max_violations = 1000;
+
+// Nobody takes the requests of a process that only preloads the simulator: it can be told to keep fewer.
+std::size_t max_entries()
+{
+    static const std::size_t number = []
+    {
+        const char* text = secure_getenv("HXASIM_JOURNAL");
+        return text ? std::strtoul(text, nullptr, 10) : 100'000UL;
+    }();
+    return number;
+}
 
 std::size_t size_of(const Journal_Entry& entry) { return entry.sent.size() + entry.answered.size(); }
 
@@ -31,7 +43,7 @@ void Journal::add(Journal_Entry entry)
     ++_count;
     _bytes += size_of(entry);
     _entries.push_back(std::move(entry));
-    while (_entries.size() > max_entries || _bytes > max_bytes)
+    while (_entries.size() > max_entries() || _bytes > max_bytes)
     {
         _bytes -= size_of(_entries.front());
         _entries.pop_front();

@@ -219,7 +219,7 @@ def main():
     parser.add_argument("--seed", type=int, default=1)
     options = parser.parse_args()
 
-    server = SimulatedServer(options.scenario)
+    server = SimulatedServer(options.scenario, environment={"HXASIM_JOURNAL": "0"})
     try:
         complaints = soak(server, options)
     finally:
