@@ -50,5 +50,7 @@
 #include "hxal/lport.h"
 #include "hxal/port.h"
 #include "hxal/rport.h"
+#include "hxal/scsi.h"
+#include "hxal/sfp.h"
 #include "hxal/statistics.h"
 #include "hxal/texts.h"

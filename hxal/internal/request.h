@@ -57,14 +57,16 @@ hxa_status_t exchange(const hxal_s& ioc, Command_Name<std::type_identity_t<Recor
     return sent == HXA_STATUS_OK ? record.status : sent;
 }
 
-// The same, and copies a field of the answer out, whatever the driver says; a call that fails leaves the caller's buffer alone.
+// The same, and copies a field of the answer out, whatever the driver says; a call that fails leaves the caller's buffer alone,
+// which may be missing.
 template <typename Record, typename Output>
 hxa_status_t exchange(const hxal_s& ioc, Command_Name<std::type_identity_t<Record>> command, Record& record,
                       Output Record::*field, Output* output)
 {
     if (const hxa_status_t sent = send(ioc, command, record); sent != HXA_STATUS_OK)
         return sent;
-    *output = record.*field;
+    if (output)
+        *output = record.*field;
     return record.status;
 }
 

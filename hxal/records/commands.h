@@ -18,6 +18,8 @@
 #include "hxal/records/port_config.h"
 #include "hxal/records/port_stats.h"
 #include "hxal/records/rport.h"
+#include "hxal/records/scsi.h"
+#include "hxal/records/sfp.h"
 
 #include <array>
 #include <cstdint>
@@ -52,7 +54,7 @@ struct Command
     Family family;
     std::uint8_t number;
     std::uint32_t size; // of the record, in bytes, as the command number tells it
-    const char* record; // tag of the record type; null while no operation has its record
+    const char* record; // tag of the record type
 };
 
 template <typename Record> consteval Command command(std::string_view name, Family family, std::uint8_t number)
@@ -67,14 +69,9 @@ consteval Command command(std::string_view name, Family family, std::uint8_t num
     return {.name = name, .family = family, .number = number, .size = size, .record = &record_tag<Record>};
 }
 
-consteval Command command(std::string_view name, Family family, std::uint8_t number, std::uint32_t size)
-{
-    return {.name = name, .family = family, .number = number, .size = size, .record = nullptr};
-}
-
 // clang-format off
 inline constexpr std::array catalogue{
-    //      record                            name                          family              no., size without record
+    //      record                            name                          family              no., size in the command number
     command<hxa_ioctl_ioc_get_version_t>(     "IOCMD_IOC_GET_VERSION",      common_family,      0x01),
     command<hxa_ioctl_ioc_get_inst_t>(        "IOCMD_IOC_GET_INST",         common_family,      0x02),
     command<hxa_ioctl_gen_t>(                 "IOCMD_IOC_ENABLE",           common_family,      0x03),
@@ -86,17 +83,17 @@ inline constexpr std::array catalogue{
     command<hxa_ioctl_ioc_power_t>(           "IOCMD_IOC_SET_POWER",        common_family,      0x0A),
     command<hxa_ioctl_ioc_set_adapter_name_t>("IOCMD_IOC_SET_ADAPTER_NAME", common_family,      0x0C),
     command<hxa_ioctl_ioc_set_adapter_name_t>("IOCMD_IOC_SET_PORT_NAME",    common_family,      0x0D),
-    command(                                  "IOCMD_DIAG_REGREAD",         common_family,      0x0E, 32),
-    command(                                  "IOCMD_DIAG_REGWRITE",        common_family,      0x10, 24),
-    command(                                  "IOCMD_DIAG_TEMP",            common_family,      0x11, 8),
-    command(                                  "IOCMD_DIAG_MEMTEST",         common_family,      0x13, 56),
-    command(                                  "IOCMD_DIAG_LOOPBACK",        common_family,      0x14, 48),
-    command(                                  "IOCMD_DIAG_FWPING",          common_family,      0x15, 56),
-    command(                                  "IOCMD_DIAG_QUEUETEST",       common_family,      0x16, 24),
-    command(                                  "IOCMD_DIAG_SFP",             common_family,      0x18, 224),
-    command(                                  "IOCMD_DIAG_LED",             common_family,      0x19, 24),
-    command(                                  "IOCMD_DIAG_BEACON",          common_family,      0x1A, 20),
-    command(                                  "IOCMD_DIAG_LL_LOOPBACK",     common_family,      0x1B, 44),
+    command<hxa_ioctl_diag_regread_t>(        "IOCMD_DIAG_REGREAD",         common_family,      0x0E),
+    command<hxa_ioctl_diag_regwrite_t>(       "IOCMD_DIAG_REGWRITE",        common_family,      0x10),
+    command<hxa_ioctl_diag_get_temp_t>(       "IOCMD_DIAG_TEMP",            common_family,      0x11),
+    command<hxa_ioctl_diag_memtest_t>(        "IOCMD_DIAG_MEMTEST",         common_family,      0x13),
+    command<hxa_ioctl_diag_loopback_t>(       "IOCMD_DIAG_LOOPBACK",        common_family,      0x14),
+    command<hxa_ioctl_diag_fwping_t>(         "IOCMD_DIAG_FWPING",          common_family,      0x15),
+    command<hxa_ioctl_diag_qtest_t>(          "IOCMD_DIAG_QUEUETEST",       common_family,      0x16),
+    command<hxa_ioctl_sfp_show_t>(            "IOCMD_DIAG_SFP",             common_family,      0x18),
+    command<hxa_ioctl_diag_led_t>(            "IOCMD_DIAG_LED",             common_family,      0x19),
+    command<hxa_ioctl_diag_beacon_t>(         "IOCMD_DIAG_BEACON",          common_family,      0x1A),
+    command<hxa_ioctl_diag_ll_loopback_t>(    "IOCMD_DIAG_LL_LOOPBACK",     common_family,      0x1B),
     command<hxa_ioctl_diag_lb_stat_t>(        "IOCMD_DIAG_LB_STAT",         common_family,      0x1C),
     command<hxal_ioctl_aen_t>(                "IOCMD_AEN_GET",              event_family,       0x29, 88),
     command<hxa_ioctl_aen_t>(                 "IOCMD_AEN_SYNC",             common_family,      0x2A),
@@ -114,8 +111,8 @@ inline constexpr std::array catalogue{
     command<hxa_ioctl_port_trunk_t>(          "IOCMD_PORT_TRUNK_DISABLE",   common_family,      0x38),
     command<hxa_ioctl_port_rnid_t>(           "IOCMD_PORT_CFG_RNID",        common_family,      0x39),
     command<hxa_ioctl_port_rnid_t>(           "IOCMD_PORT_GET_RNID",        common_family,      0x3A),
-    command(                                  "IOCMD_SFP_MEDIA",            common_family,      0x3F, 12),
-    command(                                  "IOCMD_SFP_SPEED",            common_family,      0x40, 12),
+    command<hxa_ioctl_sfp_media_t>(           "IOCMD_SFP_MEDIA",            common_family,      0x3F),
+    command<hxa_ioctl_sfp_speed_t>(           "IOCMD_SFP_SPEED",            common_family,      0x40),
     command<hxa_ioctl_ethport_stats_t>(       "IOCMD_ETHPORT_GET_STATS",    common_family,      0x42),
     command<hxa_ioctl_ethport_attr_t>(        "IOCMD_ETHPORT_GET_ATTR",     common_family,      0x43),
     command<hxa_ioctl_iocfc_attr_t>(          "IOCMD_IOCFC_GET_ATTR",       iocfc_family,       0x01),
@@ -140,7 +137,7 @@ inline constexpr std::array catalogue{
     command<hxa_ioctl_flash_mfg_t>(           "IOCMD_FLASH_MFG_INFO",       flash_family,       0x05),
     command<hxa_ioctl_gen_t>(                 "IOCMD_FLASH_ENABLE_OPTROM",  flash_family,       0x06),
     command<hxa_ioctl_gen_t>(                 "IOCMD_FLASH_DISABLE_OPTROM", flash_family,       0x07),
-    command(                                  "IOCMD_SCSI_CMND",            passthrough_family, 0x01, 80),
+    command<hxa_ioctl_scsi_t>(                "IOCMD_SCSI_CMND",            passthrough_family, 0x01),
     command<hxa_ioctl_fcpt_t>(                "IOCMD_FCPT",                 passthrough_family, 0x02),
     command<hxa_ioctl_itnim_attr_t>(          "IOCMD_ITNIM_GET_ATTR",       itnim_family,       0x01),
     command<hxa_ioctl_itnim_stats_t>(         "IOCMD_ITNIM_GET_STATS",      itnim_family,       0x02),
