@@ -62,6 +62,19 @@ constexpr auto name = input(offsetof(hxa_ioctl_ioc_set_adapter_name_t, name), 64
 constexpr auto interrupts = input(offsetof(hxa_ioctl_iocfc_intr_t, attr), sizeof(hxa_iocfc_intr_attr_t));
 constexpr auto manufacturing = input(offsetof(hxa_ioctl_flash_mfg_t, mfg_block), sizeof(hxa_mfg_block_t));
 
+constexpr std::array<Field, 4> registers{Field{.offset = offsetof(hxa_ioctl_diag_regread_t, off), .size = 4 + 4},
+                                         Field{.offset = offsetof(hxa_ioctl_diag_regread_t, buf_ptr), .size = 8}};
+constexpr auto register_word = input(offsetof(hxa_ioctl_diag_regwrite_t, off), 4 + 4);
+constexpr std::array<Field, 4> memory_test{Field{.offset = offsetof(hxa_ioctl_diag_memtest_t, pat), .size = 4},
+                                           Field{.offset = offsetof(hxa_ioctl_diag_memtest_t, memtest.algo), .size = 1}};
+constexpr auto loopback = input(offsetof(hxa_ioctl_diag_loopback_t, opmode), 4 + 4 + 4 + 4);
+constexpr auto ethernet_loopback = input(offsetof(hxa_ioctl_diag_ll_loopback_t, opmode), 4 + 4 + 4);
+constexpr auto firmware_ping = input(offsetof(hxa_ioctl_diag_fwping_t, cnt), 4 + 4);
+constexpr auto queue_test = input(offsetof(hxa_ioctl_diag_qtest_t, queue), 4);
+constexpr auto led_test = input(offsetof(hxa_ioctl_diag_led_t, ledtest), sizeof(hxa_diag_ledtest_t));
+constexpr auto beacon = input(offsetof(hxa_ioctl_diag_beacon_t, beacon), 4 + 4 + 4);
+constexpr auto sfp_speed = input(offsetof(hxa_ioctl_sfp_speed_t, speed), 4);
+
 constexpr auto topology = input(offsetof(hxa_ioctl_port_cfg_topo_t, topo), 4);
 constexpr auto speed = input(offsetof(hxa_ioctl_port_cfg_speed_t, speed), 4);
 constexpr auto address = input(offsetof(hxa_ioctl_port_alpa_t, alpa), 1);
@@ -80,6 +93,8 @@ constexpr std::array<Field, 4> rport_speed{Field{.offset = offsetof(hxa_ioctl_rp
 constexpr std::array<Field, 4> frame{Field{.offset = offsetof(hxa_ioctl_fcpt_t, vf_id), .size = 2 + 8 + 8 + 4 + 4 + 4},
                                      Field{.offset = offsetof(hxa_ioctl_fcpt_t, fchs), .size = sizeof(fchs_t) + 4 + 4 + 4},
                                      Field{.offset = offsetof(hxa_ioctl_fcpt_t, reqbuf_ptr), .size = 8 + 8}};
+constexpr std::array<Field, 4> scsi{Field{.offset = offsetof(hxa_ioctl_scsi_t, vf_id), .size = 2 + 8 + 8 + 8 + 16 + 4 + 4},
+                                    Field{.offset = offsetof(hxa_ioctl_scsi_t, snssz), .size = 4 + 8 + 8}};
 
 // clang-format off
 constexpr std::array<Field, 4> partition{
@@ -105,6 +120,17 @@ constexpr std::array rows{
     row<answer_ioc_power>             ("IOCMD_IOC_SET_POWER",        Target::ioc,    power),
     row<answer_adapter_name>          ("IOCMD_IOC_SET_ADAPTER_NAME", Target::ioc,    name),
     row<answer_port_name>             ("IOCMD_IOC_SET_PORT_NAME",    Target::ioc,    name),
+    row<answer_register_read>         ("IOCMD_DIAG_REGREAD",         Target::ioc,    registers),
+    row<answer_register_write>        ("IOCMD_DIAG_REGWRITE",        Target::ioc,    register_word),
+    row<answer_temperature>           ("IOCMD_DIAG_TEMP",            Target::ioc),
+    row<answer_memory_test>           ("IOCMD_DIAG_MEMTEST",         Target::ioc,    memory_test),
+    row<answer_loopback>              ("IOCMD_DIAG_LOOPBACK",        Target::ioc,    loopback),
+    row<answer_firmware_ping>         ("IOCMD_DIAG_FWPING",          Target::ioc,    firmware_ping),
+    row<answer_queue_test>            ("IOCMD_DIAG_QUEUETEST",       Target::ioc,    queue_test),
+    row<answer_sfp_memory>            ("IOCMD_DIAG_SFP",             Target::ioc),
+    row<answer_led_test>              ("IOCMD_DIAG_LED",             Target::ioc,    led_test),
+    row<answer_beacon>                ("IOCMD_DIAG_BEACON",          Target::ioc,    beacon),
+    row<answer_ethernet_loopback>     ("IOCMD_DIAG_LL_LOOPBACK",     Target::ioc,    ethernet_loopback),
     row<answer_loopback_status>       ("IOCMD_DIAG_LB_STAT",         Target::ioc),
     row<answer_event_sync>            ("IOCMD_AEN_SYNC",             Target::driver, application),
     row<answer_port_enable>           ("IOCMD_PORT_ENABLE",          Target::ioc),
@@ -121,6 +147,8 @@ constexpr std::array rows{
     row<answer_port_untrunk>          ("IOCMD_PORT_TRUNK_DISABLE",   Target::ioc),
     row<answer_port_identify>         ("IOCMD_PORT_CFG_RNID",        Target::ioc,    identity),
     row<answer_port_identification>   ("IOCMD_PORT_GET_RNID",        Target::ioc),
+    row<answer_sfp_media>             ("IOCMD_SFP_MEDIA",            Target::ioc),
+    row<answer_sfp_speed>             ("IOCMD_SFP_SPEED",            Target::ioc,    sfp_speed),
     row<answer_ethport_statistics>    ("IOCMD_ETHPORT_GET_STATS",    Target::ioc),
     row<answer_ethport_attributes>    ("IOCMD_ETHPORT_GET_ATTR",     Target::ioc),
     row<answer_iocfc_attributes>      ("IOCMD_IOCFC_GET_ATTR",       Target::ioc),
@@ -145,6 +173,7 @@ constexpr std::array rows{
     row<answer_flash_manufacturing>   ("IOCMD_FLASH_MFG_INFO",       Target::ioc,    manufacturing),
     row<answer_optrom_enable>         ("IOCMD_FLASH_ENABLE_OPTROM",  Target::ioc),
     row<answer_optrom_disable>        ("IOCMD_FLASH_DISABLE_OPTROM", Target::ioc),
+    row<answer_scsi_command>          ("IOCMD_SCSI_CMND",            Target::ioc,    scsi),
     row<answer_fc_pass_through>       ("IOCMD_FCPT",                 Target::ioc,    frame),
     row<answer_nexus_attributes>      ("IOCMD_ITNIM_GET_ATTR",       Target::ioc,    rport),
     row<answer_nexus_statistics>      ("IOCMD_ITNIM_GET_STATS",      Target::ioc,    rport),

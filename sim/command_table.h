@@ -91,7 +91,21 @@ void answer_iocfc_reset_statistics(Call& call, hxa_ioctl_gen_t& record);
 void answer_port_attributes(Call& call, hxa_ioctl_port_attr_t& record); // port_commands.cpp
 void answer_port_enable(Call& call, hxa_ioctl_gen_t& record);
 void answer_port_disable(Call& call, hxa_ioctl_gen_t& record);
+void answer_register_read(Call& call, hxa_ioctl_diag_regread_t& record); // diag_commands.cpp
+void answer_register_write(Call& call, hxa_ioctl_diag_regwrite_t& record);
+void answer_temperature(Call& call, hxa_ioctl_diag_get_temp_t& record);
+void answer_memory_test(Call& call, hxa_ioctl_diag_memtest_t& record);
+void answer_loopback(Call& call, hxa_ioctl_diag_loopback_t& record);
+void answer_firmware_ping(Call& call, hxa_ioctl_diag_fwping_t& record);
+void answer_queue_test(Call& call, hxa_ioctl_diag_qtest_t& record);
+void answer_led_test(Call& call, hxa_ioctl_diag_led_t& record);
+void answer_beacon(Call& call, hxa_ioctl_diag_beacon_t& record);
+void answer_ethernet_loopback(Call& call, hxa_ioctl_diag_ll_loopback_t& record);
 void answer_loopback_status(Call& call, hxa_ioctl_diag_lb_stat_t& record);
+void answer_sfp_memory(Call& call, hxa_ioctl_sfp_show_t& record); // sfp_commands.cpp
+void answer_sfp_media(Call& call, hxa_ioctl_sfp_media_t& record);
+void answer_sfp_speed(Call& call, hxa_ioctl_sfp_speed_t& record);
+void answer_scsi_command(Call& call, hxa_ioctl_scsi_t& record);           // scsi_commands.cpp
 void answer_port_topology(Call& call, hxa_ioctl_port_cfg_topo_t& record); // port_config_commands.cpp
 void answer_port_speed(Call& call, hxa_ioctl_port_cfg_speed_t& record);
 void answer_port_hard_address(Call& call, hxa_ioctl_port_alpa_t& record);

@@ -2,6 +2,7 @@
 #pragma once
 
 #include "sim/counters.h"
+#include "sim/scsi_target.h"
 
 #include "hxal/records/itnim.h"
 #include "hxal/records/lport.h"
@@ -46,6 +47,7 @@ struct Remote_Port
     std::uint32_t target = 0;
     bool known = true; // to the driver
     Nexus nexus;
+    Scsi_Target scsi; // of a target
     Counters<hxa_rport_stats_t, std::uint32_t> counters;
 
     bool is_target() const { return (function & HXA_RPORT_TARGET) != 0; }

@@ -81,6 +81,11 @@ Ioc* Host::find(Node node, std::uint32_t instance)
 
 std::uint32_t& own_state(const Ioc& ioc) { return ioc.type == HXA_IOC_TYPE_LL ? ioc.port->eth_state : ioc.port->state; }
 
+bool is_out_of_service(std::uint32_t state)
+{
+    return state == HXA_PPORT_ST_DISABLED || state == HXA_PPORT_ST_DISABLING || state == HXA_PPORT_ST_STOPPED;
+}
+
 std::uint32_t port_state(const Ioc& ioc)
 {
     switch (*ioc.state)

@@ -6,6 +6,7 @@
 #include "hxal/records/iocfc.h"
 
 #include <array>
+#include <map>
 #include <string>
 #include <vector>
 
@@ -30,8 +31,9 @@ struct Ioc
     hxa_iocfc_intr_attr_t interrupts{};
     hxa_ioc_stats_t stats{};
     hxa_iocfc_stats_t fc_stats{};
-    std::uint32_t next_state = 0; // the state it is on the way to ...
-    std::uint32_t settle = 0;     // ... and how many attribute requests will see it there
+    std::map<std::uint32_t, std::uint32_t> registers = {}; // by offset; the others hold 0
+    std::uint32_t next_state = 0;                          // the state it is on the way to ...
+    std::uint32_t settle = 0;                              // ... and how many attribute requests will see it there
 };
 
 class Host
@@ -60,6 +62,9 @@ private:
 
 // The port's own state on the side of this IOC.
 std::uint32_t& own_state(const Ioc& ioc);
+
+// Whether a port in this state was put out of service.
+bool is_out_of_service(std::uint32_t state);
 
 // What the port reports through this IOC: its own state while the IOC runs, else that the IOC is down.
 std::uint32_t port_state(const Ioc& ioc);

@@ -8,11 +8,6 @@ namespace hxasim
 namespace
 {
 
-bool is_out_of_service(std::uint32_t state)
-{
-    return state == HXA_PPORT_ST_DISABLED || state == HXA_PPORT_ST_DISABLING || state == HXA_PPORT_ST_STOPPED;
-}
-
 void put_fibre_channel(hxa_pport_attr_t& field, const Port& port, bool link_up)
 {
     put_address(field.nwwn, port.nwwn);
@@ -55,7 +50,8 @@ void answer_port_attributes(Call& call, hxa_ioctl_port_attr_t& record)
     bool link_up = field.port_state == HXA_PPORT_ST_LINKUP;
     field.speed_supported = port.speed_supported;
     field.speed = link_up ? port.speed : std::uint32_t{HXA_PPORT_SPEED_UNKNOWN};
-    field.beacon = port.beacon;
+    field.beacon = port.beacon.port_is_on();
+    field.link_e2e_beacon = port.beacon.link_is_on();
     field.pport_cfg = port.configuration;
     if (ioc.type == HXA_IOC_TYPE_LL)
         field.port_type = HXA_PPORT_TYPE_UNKNOWN;
@@ -95,11 +91,6 @@ void answer_port_disable(Call& call, hxa_ioctl_gen_t& record)
             for_logical_ports(*call.ioc->port, [](Logical_Port& logical) { log_out(logical); });
         state = HXA_PPORT_ST_DISABLED;
     }
-}
-
-void answer_loopback_status(Call& call, hxa_ioctl_diag_lb_stat_t& record)
-{
-    record.status = call.ioc->port->loopback_test ? HXA_STATUS_DIAG_BUSY : HXA_STATUS_OK;
 }
 
 } // namespace hxasim

@@ -102,6 +102,7 @@ Remote_Port read_remote_port(Json_Object& object, Remote_Port remote)
     read_block(object, "counters", remote.counters);
     if (auto nexus = object.object("nexus"))
         remote.nexus = read_nexus(*nexus);
+    read_units(object, remote);
     object.done();
     return remote;
 }
@@ -153,7 +154,7 @@ void read_link(Json_Object& object, Port& port, bool converged)
     if (converged)
         port.mtu = object.number("mtu", max_u32, 1500);
     set_configuration(port, static_cast<std::uint16_t>(object.number("max_frame_size", 0xFFFF, 2112)));
-    port.beacon = object.boolean("beacon", port.beacon);
+    port.beacon.set(object.boolean("beacon", false), object.boolean("link_beacon", false), 0);
     port.loopback_test = object.boolean("loopback_test", port.loopback_test);
 }
 

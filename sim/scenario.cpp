@@ -150,6 +150,7 @@ void Scenario_Reader::read_adapter(Json_Object& object)
     read_texts(object, adapter);
     adapter.device_id = static_cast<std::uint16_t>(object.number("device_id", 0xFFFF, adapter.device_id));
     adapter.max_speed = static_cast<std::uint8_t>(object.number("max_speed", 255, adapter.max_speed));
+    adapter.temperature = static_cast<std::uint16_t>(object.number("temperature", 0xFFFF, adapter.temperature));
     adapter.cna_capable = object.boolean("cna_capable", adapter.cna_capable);
     adapter.is_mezz = object.boolean("is_mezz", adapter.is_mezz);
     read_vpd(object, adapter);
@@ -189,6 +190,7 @@ void Scenario_Reader::read_port(Json_Object& object, Adapter& adapter)
     read_link(object, port, adapter.converged());
     read_counters(object, port, adapter.converged());
     read_fabric(object, port);
+    read_sfp(object, port, adapter);
     port.ioc_state = object.choice("ioc_state", ioc_state_words, max_u32, port.ioc_state);
     port.ioc_settle = object.number("ioc_settle", 1000, port.ioc_settle);
     port.fc_instance = _fc_instances.take(object, "fc_instance");

@@ -4,10 +4,12 @@
 // bytes, enumerations as their numbers, speeds in Gbit/s.
 #pragma once
 
+#include "sim/beacon.h"
 #include "sim/counters.h"
 #include "sim/fabric.h"
 #include "sim/flash.h"
 #include "sim/hxasim.h"
+#include "sim/sfp.h"
 
 #include "hxal/records/ethport.h"
 #include "hxal/records/fcoe.h"
@@ -81,8 +83,10 @@ struct Port
     std::uint32_t mtu = 0;           // of the Ethernet function
     hxa_pport_cfg_t configuration{};
     hxa_pport_rnid_t identification{};
-    bool beacon = false;
+    Beacon beacon;
+    bool led_test = false;      // one has its lights
     bool loopback_test = false; // one holds the port
+    Sfp_Module sfp;
     Wwn fabric_name{};
     Logical_Port base_port;
     std::vector<Logical_Port> virtual_ports;
@@ -127,6 +131,7 @@ struct Adapter
     std::string os_type;
     std::uint16_t device_id = 0;
     std::uint8_t max_speed = 0;
+    std::uint16_t temperature = 45;
     bool cna_capable = false;
     bool is_mezz = false;
     Vpd vpd;

@@ -129,6 +129,45 @@ inline constexpr std::array nexus_state_words{
     Choice{"initiator",   HXA_ITNIM_INITIATIOR},
 };
 
+inline constexpr std::array sfp_identifier_words{
+    Choice{"gbic",     1},
+    Choice{"soldered", 2},
+    Choice{"sfp",      3},
+};
+
+inline constexpr std::array sfp_media_words{
+    Choice{"unknown",     HXA_SFP_MEDIA_UNKNOWN},
+    Choice{"cu",          HXA_SFP_MEDIA_CU},
+    Choice{"lw",          HXA_SFP_MEDIA_LW},
+    Choice{"sw",          HXA_SFP_MEDIA_SW},
+    Choice{"el",          HXA_SFP_MEDIA_EL},
+    Choice{"unsupported", HXA_SFP_MEDIA_UNSUPPORT},
+};
+
+inline constexpr std::array device_type_words{
+    Choice{"disk",             disk},
+    Choice{"tape",             tape},
+    Choice{"processor",        processor},
+    Choice{"cdrom",            cdrom},
+    Choice{"changer",          changer},
+    Choice{"array-controller", array_controller},
+    Choice{"enclosure",        enclosure},
+};
+
+inline constexpr std::array unit_state_words{
+    Choice{"ready",     static_cast<std::uint32_t>(Unit_State::ready)},
+    Choice{"not-ready", static_cast<std::uint32_t>(Unit_State::not_ready)},
+    Choice{"no-medium", static_cast<std::uint32_t>(Unit_State::no_medium)},
+};
+
+inline constexpr std::array identification_words{
+    Choice{"naa",   static_cast<std::uint32_t>(Identification::naa)},
+    Choice{"eui64", static_cast<std::uint32_t>(Identification::eui64)},
+    Choice{"t10",   static_cast<std::uint32_t>(Identification::t10)},
+    Choice{"name",  static_cast<std::uint32_t>(Identification::name)},
+    Choice{"none",  static_cast<std::uint32_t>(Identification::none)},
+};
+
 inline constexpr std::array errno_words{
     Choice{"EINTR",  EINTR},
     Choice{"EIO",    EIO},

@@ -80,6 +80,12 @@ TEST_F(Scenarios, name_the_place_of_every_error)
         {R"({"adapters": [{"kind": "fc-hba", "ports": [{"remote_ports": [{}, {"nexus": {"state": "up"}}]}]}]})",
          "adapters[0].ports[0].remote_ports[1].nexus.state: must be one of offline, prli-send, prli-sent, prli-retry, "
          "hcb-online, online, hcb-offline, initiator, or a whole number from 0 to 4294967295"},
+        {R"({"adapters": [{"kind": "fc-hba", "ports": [{"remote_ports": {"luns": [{"count": 3}, {"lun": 2}]}}]}]})",
+         "adapters[0].ports[0].remote_ports.luns[1]: LUN 2 is taken"},
+        {R"({"adapters": [{"kind": "fc-hba", "ports": [{"remote_ports": {"luns": {"lun": 9, "count": 65528}}}]}]})",
+         "adapters[0].ports[0].remote_ports.luns: LUNs beyond 65535"},
+        {R"({"adapters": [{"kind": "fc-hba", "ports": [{"sfp": {"media": 6, "fc_speed": 1}}]}]})",
+         "adapters[0].ports[0].sfp.fc_speed: unknown key"},
         {R"({"adaptors": []})", "adaptors: unknown key"},
         {R"({"adapters": 1})", "adapters: must be a list of at most 128 objects"},
         {R"({"adapters": [{"kind": "cna"}, 7]})", "adapters[1]: must be an object"},
