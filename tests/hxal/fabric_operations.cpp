@@ -20,6 +20,30 @@ wwn_t wwns[4];
 std::uint8_t request[3];
 std::uint8_t response[16];
 
+constexpr lun_t lun = 0x0000000000000540; // flat addressing, 5
+constexpr std::uint32_t length = 0x0102032C;
+
+// What a SCSI helper puts into a command that says 0xC0 in bytes 2, 9 and 15 so far.
+struct Scsi_Helper
+{
+    const char* name;
+    decltype(&hxal_scsi_inquiry) function;
+    std::vector<std::uint8_t> cdb;
+};
+
+// clang-format off
+const Scsi_Helper scsi_helpers[] = {
+    {"hxal_scsi_inquiry",        hxal_scsi_inquiry,        {0x12, 0, 0xC0, 0, 0x2C, 0, 0, 0, 0, 0xC0, 0, 0, 0, 0, 0, 0xC0}},
+    {"hxal_scsi_readcapacity",   hxal_scsi_readcapacity,   {0x25, 0, 0xC0, 0, 0, 0, 0, 0, 0, 0xC0, 0, 0, 0, 0, 0, 0xC0}},
+    {"hxal_scsi_readcapacity16", hxal_scsi_readcapacity16, {0x9E, 0x10, 0xC0, 0, 0, 0, 0, 0, 0, 0xC0, 1, 2, 3, 0x2C, 0, 0xC0}},
+    {"hxal_scsi_reportluns",     hxal_scsi_reportluns,     {0xA0, 0, 0xC0, 0, 0, 0, 1, 2, 3, 0x2C, 0, 0, 0, 0, 0, 0xC0}},
+    {"hxal_scsi_testunitready",  hxal_scsi_testunitready,  {0x00, 0, 0xC0, 0, 0, 0, 0, 0, 0, 0xC0, 0, 0, 0, 0, 0, 0xC0}},
+};
+// clang-format on
+
+uint8_t* status_in(void* output) { return output ? static_cast<uint8_t*>(output) + 4 : nullptr; }
+scsi_cdb_t command_so_far() { return {{0, 0, 0xC0, 0, 0, 0, 0, 0, 0, 0xC0, 0, 0, 0, 0, 0, 0xC0}}; }
+
 fchs_t frame_header()
 {
     fchs_t header{};
@@ -129,5 +153,47 @@ const std::vector<Operation>& fcpt_operations()
          .sent = {lport, {32, {8}}, {40, bytes_of(header)}, {72, room}, {88, address_of(response)}}, .copied = {{72, 4}}},
     };
     // clang-format on
+    return operations;
+}
+
+// The harness's buffer gives the room for the sense data and takes their length, then the SCSI status.
+const std::vector<Operation>& scsi_operations()
+{
+    static const auto operations = []
+    {
+        std::vector<Operation> rows;
+        const std::vector<Sent> common = {nexus, {24, bytes_of(lun)}, {52, bytes_of(length)}, {64, address_of(request)}};
+        const auto add = [&](const char* name, std::vector<std::uint8_t> cdb, std::vector<std::uint8_t> write, auto send)
+        {
+            auto sent = common;
+            sent.insert(sent.end(), {{32, std::move(cdb)}, {48, std::move(write)}});
+            sent.insert(sent.end(), {{60, room}, {72, address_of(response)}});
+            rows.push_back({.name = name,
+                            .fc_group = 0xBA,
+                            .ll_group = 0xBA,
+                            .number = 0x01,
+                            .size = 80,
+                            .call = send,
+                            .sent = std::move(sent),
+                            .copied = {{60, 4}, {59, 1, 4}},
+                            .optional_output = true});
+        };
+        static const scsi_cdb_t any_command = {{1, 2, 3, 4, 5, 6, 7, 8, 9, 10, 11, 12, 13, 14, 15, 16}};
+        add("hxal_scsi_cmnd", bytes_of(any_command), {1},
+            [](hxal_t* ioc, void* out)
+            {
+                return hxal_scsi_cmnd(ioc, vf, logical, remote, lun, &any_command, 1, request, length, status_in(out), response,
+                                      static_cast<uint32_t*>(out));
+            });
+        for (const auto& helper : scsi_helpers)
+            add(helper.name, helper.cdb, {},
+                [&helper](hxal_t* ioc, void* out)
+                {
+                    scsi_cdb_t cdb = command_so_far();
+                    return helper.function(ioc, vf, logical, remote, lun, &cdb, 1, request, length, status_in(out), response,
+                                           static_cast<uint32_t*>(out));
+                });
+        return rows;
+    }();
     return operations;
 }

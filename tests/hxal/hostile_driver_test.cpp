@@ -16,9 +16,9 @@ namespace
 
 constexpr std::size_t memory_limit = 64 << 20;
 
-constexpr const std::vector<Operation>& (*tables[])() = {flash_operations, ioc_operations,     port_operations,
-                                                         fcoe_operations,  ethport_operations, lport_operations,
-                                                         rport_operations, itnim_operations,   fcpt_operations};
+constexpr const std::vector<Operation>& (*tables[])() = {flash_operations,   ioc_operations,   port_operations,  fcoe_operations,
+                                                         ethport_operations, lport_operations, rport_operations, itnim_operations,
+                                                         fcpt_operations,    scsi_operations,  diag_operations};
 
 class Hostile_Driver : public Simulated_Host
 {
@@ -61,6 +61,7 @@ protected:
         const wwn_t remote = port_wwn(7, 7);
         hxal_port_enable(ioc);
         hxal_port_disable(ioc);
+        hxal_diag_beacon_lport(ioc, HXA_TRUE, 0);
         hxal_stats_long_t long_counters[45];
         hxal_port_get_stats(ioc, long_counters);
         hxal_fcoe_get_stats(ioc, long_counters);

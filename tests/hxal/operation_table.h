@@ -43,6 +43,7 @@ struct Operation
     const char* printed_on_error = "";         // on standard output when the call fails with ENXIO
     const char* printed_on_refusal = "";       // on standard output when an Ethernet IOC is refused
     bool in_place = false;                     // the record is the caller's buffer, also when the call fails
+    bool optional_output = false;              // the caller may give no buffer
 };
 
 // The tables.
@@ -55,6 +56,8 @@ const std::vector<Operation>& lport_operations(); // fabric_operations.cpp
 const std::vector<Operation>& rport_operations();
 const std::vector<Operation>& itnim_operations();
 const std::vector<Operation>& fcpt_operations();
+const std::vector<Operation>& scsi_operations();
+const std::vector<Operation>& diag_operations(); // diag_operations.cpp
 
 // Bytes as a record holds them.
 template <typename Value> std::vector<std::uint8_t> bytes_of(const Value& value)

@@ -127,7 +127,16 @@ protected:
         expect_answer_passed_on(operation, ioc, HXA_STATUS_OK);
         EXPECT_EQ(added(before), ioc->ioc_type == HXA_IOC_TYPE_LL ? operation.ll_recorded : operation.fc_recorded);
         if (!operation.copied.empty())
-            expect_nothing_sent(operation, ioc, nullptr, HXA_STATUS_EINVAL);
+            check_without_buffer(operation, ioc);
+    }
+
+    static void check_without_buffer(const Operation& operation, hxal_t* ioc)
+    {
+        if (!operation.optional_output)
+            return expect_nothing_sent(operation, ioc, nullptr, HXA_STATUS_EINVAL);
+        answer_with_status(HXA_STATUS_FAILED, operation);
+        EXPECT_EQ(operation.call(ioc, nullptr), HXA_STATUS_FAILED);
+        EXPECT_THAT(requests(), testing::SizeIs(1));
     }
 
     void check_all(const std::vector<Operation>& operations)
@@ -159,5 +168,7 @@ TEST_F(Operations, of_logical_ports) { check_all(lport_operations()); }
 TEST_F(Operations, of_remote_ports) { check_all(rport_operations()); }
 TEST_F(Operations, of_nexuses) { check_all(itnim_operations()); }
 TEST_F(Operations, of_the_pass_through) { check_all(fcpt_operations()); }
+TEST_F(Operations, of_scsi) { check_all(scsi_operations()); }
+TEST_F(Operations, of_diagnostics) { check_all(diag_operations()); }
 
 } // namespace

@@ -47,8 +47,6 @@ const std::vector<Operation>& port_operations()
         {.name = "hxal_port_get_rnid_info", .fc_group = 'C', .ll_group = 'D', .number = 0x3A, .size = 56,
          .call = [](hxal_t* ioc, void* out) { return hxal_port_get_rnid_info(ioc, static_cast<hxa_pport_rnid_t*>(out)); },
          .copied = {{8, 44}}},
-        {.name = "hxal_diag_get_lb_status", .fc_group = 'C', .ll_group = 'D', .number = 0x1C, .size = 8,
-         .call = [](hxal_t* ioc, void*) { return hxal_diag_get_lb_status(ioc); }},
     };
     // clang-format on
     return operations;
