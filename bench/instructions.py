@@ -18,6 +18,7 @@ MEASURED = {
         ("filter_ten_properties", 1_000, "call"),
     ],
     "conversion": [("convert_fc_port", 100, "port"), ("bare_broker_calls", 100, "port")],
+    "scsi": [(f"{name}/10000", 10_000, "LUN") for name in ["report_luns", "inquire_luns"]],
     "log_call": [("suppressed_log_call", 100_000, "call")],
 }
 
