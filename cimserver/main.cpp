@@ -6,6 +6,7 @@
 #include "cimserver/cimxml/http_server.h"
 #include "cimserver/cimxml/listener.h"
 #include "cimserver/cimxml/service.h"
+#include "cimserver/indications/subscription_classes.h"
 #include "cimserver/name_spaces.h"
 #include "cimserver/options.h"
 #include "cimserver/security/credentials.h"
@@ -30,6 +31,7 @@ using namespace cimserver;
 
 // How long a stop waits for the requests that run.
 constexpr std::chrono::seconds stop_grace{10};
+constexpr std::chrono::seconds delivery_grace{3}; // and for the listeners
 
 constexpr std::uint16_t http_port = 5988; // as registered for WBEM
 constexpr std::uint16_t https_port = 5989;
@@ -77,13 +79,27 @@ catch (const std::runtime_error& error)
     throw std::runtime_error(std::string(error.what()) + " (--add-user NAME adds a user to the file)");
 }
 
+// From now on clients can subscribe, and the module's indications go to their listeners.
+void offer(Subscriptions& subscriptions, Name_Spaces& operations, Module& module)
+{
+    using enum Subscription_Kind;
+    for (const Subscription_Kind kind : {filter, destination, subscription})
+        operations.interop().serve(make_subscription_class(kind, subscriptions));
+    module.broker().set_indication_sink(&subscriptions);
+}
+
 void serve(const Options& options)
 {
     handle_signals();
     const Http_Endpoint endpoint = endpoint_of(options);
     const auto credentials = credentials_of(options);
+    const auto store = options.state.empty() ? nullptr : std::make_unique<const Subscription_Store>(options.state);
     Module module(options.module);
+    Delivery delivery(options.delivery);
+    Subscriptions subscriptions(module, delivery, options.indication_order, store.get());
     Name_Spaces operations(module);
+    offer(subscriptions, operations, module);
+    subscriptions.restore();
     Service service(operations);
     Http_Server server(endpoint, options.limits, credentials.get(),
                        [&](const Http_Request& request)
@@ -100,6 +116,8 @@ void serve(const Options& options)
         std::fprintf(stderr, "zmlr-cimserver: a request did not finish in time\n");
         std::_Exit(EXIT_FAILURE); // it still uses the module
     }
+    subscriptions.stop();
+    delivery.stop(delivery_grace);
 }
 
 } // namespace

@@ -5,6 +5,8 @@
 
 #include <CLI/CLI.hpp>
 
+#include <map>
+
 namespace cimserver
 {
 namespace
@@ -41,6 +43,36 @@ void declare_limits(CLI::App& app, Http_Limits& limits)
     app.add_option("--workers", limits.workers, "requests answered at once")->check(CLI::Range(1, 256))->capture_default_str();
 }
 
+// Options hold milliseconds, people give seconds.
+void add_seconds(CLI::App& app, const std::string& name, std::chrono::milliseconds& value, double least, const std::string& text)
+{
+    const std::string preset = std::to_string(std::chrono::duration_cast<std::chrono::seconds>(value).count());
+    app.add_option_function<double>(
+           name, [&value](double seconds) { value = std::chrono::milliseconds(static_cast<long long>(seconds * 1000)); }, text)
+        ->check(CLI::Range(least, 3600.0))
+        ->default_str(preset);
+}
+
+void declare_indications(CLI::App& app, Options& options)
+{
+    const std::map<std::string, Indication_Order> orders{{"open-pegasus", Indication_Order::open_pegasus},
+                                                         {"sfcb", Indication_Order::sfcb}};
+    app.add_option("--state", options.state, "a folder that keeps subscriptions over a restart (made if missing)");
+    app.add_option("--indication-order", options.indication_order, "call indication providers in the order of this server")
+        ->transform(CLI::CheckedTransformer(orders))
+        ->default_str("open-pegasus");
+    app.add_option("--listener-ca", options.delivery.ca_file, "certificates that vouch for HTTPS listeners [the system's]")
+        ->check(CLI::ExistingFile);
+    app.add_option("--delivery-attempts", options.delivery.attempts, "how often an indication is tried")
+        ->check(CLI::Range(1, 100))
+        ->capture_default_str();
+    add_seconds(app, "--delivery-pause", options.delivery.pause, 0, "seconds between attempts");
+    add_seconds(app, "--delivery-timeout", options.delivery.timeout, 0.1, "seconds that one attempt may take");
+    app.add_option("--max-indications", options.delivery.waiting, "indications that may wait for a listener")
+        ->check(CLI::Range(1, 100000))
+        ->capture_default_str();
+}
+
 void check(const Options& options)
 {
     if (options.add_user)
@@ -67,6 +99,7 @@ std::variant<Options, int> read_options(int argc, char** argv)
     app.add_option("--module", options.module, "the provider module to serve (a shared library)");
     declare_access(app, options);
     declare_limits(app, options.limits);
+    declare_indications(app, options);
     try
     {
         app.parse(argc, argv);

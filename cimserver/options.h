@@ -2,6 +2,8 @@
 #pragma once
 
 #include "cimserver/cimxml/http_server.h"
+#include "cimserver/indications/delivery.h"
+#include "cimserver/indications/indication_providers.h"
 
 #include <cstdint>
 #include <optional>
@@ -23,6 +25,10 @@ struct Options
     std::string certificate;           // both or none: TLS
     std::string key;
     Http_Limits limits;
+
+    std::string state; // the folder that keeps subscriptions; empty: nothing is kept
+    Indication_Order indication_order = Indication_Order::open_pegasus;
+    Delivery_Limits delivery;
 };
 
 // The options, or the exit status of a program that has nothing to serve: 0 after help or the version (printed on standard

@@ -70,6 +70,16 @@ void Instance_Sink::take_instance(const Instance_Object& instance)
             path.keys.push_back({slots[slot].name, instance.value(slot)});
 }
 
+void check_status(const Class_Entry& provider, const CMPIStatus& status)
+{
+    if (status.rc == CMPI_RC_OK)
+        return;
+    std::string description = std::string(provider.registration->provider_name) + ": " + return_code_name(status.rc);
+    if (const auto text = message(status.msg); !text.empty())
+        description += ": " + text;
+    throw Cim_Error(cim_status(status.rc), description);
+}
+
 Provider_Call::Provider_Call(const Class_Entry& provider, Object_Path path, Result_Sink& sink, CMPIFlags flags)
     : _provider(provider)
     , _request(flags)
@@ -82,16 +92,6 @@ void Provider_Call::check_offered(bool offered) const
 {
     if (!offered)
         throw Cim_Error(CIM_ERR_NOT_SUPPORTED, std::string(_provider.registration->provider_name) + " does not offer this");
-}
-
-void Provider_Call::check(const CMPIStatus& status) const
-{
-    if (status.rc == CMPI_RC_OK)
-        return;
-    std::string description = std::string(_provider.registration->provider_name) + ": " + return_code_name(status.rc);
-    if (const auto text = message(status.msg); !text.empty())
-        description += ": " + text;
-    throw Cim_Error(cim_status(status.rc), description);
 }
 
 } // namespace cimserver

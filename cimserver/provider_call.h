@@ -91,6 +91,9 @@ public:
     Value value;
 };
 
+// Throws the Cim_Error that a provider's status other than OK means.
+void check_status(const Class_Entry& provider, const CMPIStatus& status);
+
 // The context, the result and the path of a call; what the provider makes lives as long as this.
 class Provider_Call
 {
@@ -102,12 +105,11 @@ public:
     template <class MI, class Function, class... Arguments> void run(MI* mi, Function function, Arguments... arguments)
     {
         check_offered(function != nullptr);
-        check(function(mi, _request.context(), _result, _path, arguments...));
+        check_status(_provider, function(mi, _request.context(), _result, _path, arguments...));
     }
 
 private:
     void check_offered(bool offered) const;
-    void check(const CMPIStatus& status) const;
 
     const Class_Entry& _provider;
     Request _request;

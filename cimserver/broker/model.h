@@ -79,8 +79,10 @@ inline constexpr int CIM_ERR_NOT_SUPPORTED = 7;
 inline constexpr int CIM_ERR_ALREADY_EXISTS = 11;
 inline constexpr int CIM_ERR_NO_SUCH_PROPERTY = 12;
 inline constexpr int CIM_ERR_TYPE_MISMATCH = 13;
+inline constexpr int CIM_ERR_QUERY_LANGUAGE_NOT_SUPPORTED = 14;
 inline constexpr int CIM_ERR_INVALID_QUERY = 15;
 inline constexpr int CIM_ERR_METHOD_NOT_AVAILABLE = 16;
 inline constexpr int CIM_ERR_METHOD_NOT_FOUND = 17;
+inline constexpr int CIM_ERR_SERVER_LIMITS_EXCEEDED = 27;
 
 } // namespace cimserver

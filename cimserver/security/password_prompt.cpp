@@ -57,10 +57,11 @@ std::string read_line()
     return line;
 }
 
+// Silent before it asks: what is typed earlier is dropped.
 std::string ask(const char* prompt)
 {
-    std::fputs(prompt, stderr);
     const Silent_Terminal silent;
+    std::fputs(prompt, stderr);
     return read_line();
 }
 

@@ -39,21 +39,26 @@ private:
     int _descriptor;
 };
 
-void check_owner(const std::string& name, const struct stat& status)
+struct Privacy_Row
+{
+    mode_t forbidden;
+    const char* rule;
+};
+
+// In the order of File_Privacy.
+constexpr Privacy_Row privacy_rows[] = {
+    {077, "may be read or written by others than its owner: its mode must be 0600, a folder's 0700"},
+    {027, "may be read by everybody or written by its group: its mode must be 0640 or 0600"},
+    {022, "may be written by others than its owner"},
+};
+
+void check_private(const std::string& name, const struct stat& status, File_Privacy privacy)
 {
     if (status.st_uid != geteuid() && status.st_uid != 0)
         throw std::runtime_error(name + " belongs to another user");
-}
-
-void check_private(const std::string& file, const struct stat& status, File_Privacy privacy)
-{
-    if (!S_ISREG(status.st_mode))
-        throw std::runtime_error(file + " is no regular file");
-    check_owner(file, status);
-    if (privacy == File_Privacy::owner_only && (status.st_mode & 077) != 0)
-        throw std::runtime_error(file + " may be read or written by others than its owner: its mode must be 0600");
-    if (privacy == File_Privacy::group_may_read && (status.st_mode & 027) != 0)
-        throw std::runtime_error(file + " may be read by everybody or written by its group: its mode must be 0640 or 0600");
+    const Privacy_Row& row = privacy_rows[static_cast<std::size_t>(privacy)];
+    if ((status.st_mode & row.forbidden) != 0)
+        throw std::runtime_error(name + " " + row.rule);
 }
 
 void write_all(int descriptor, const std::string& content, const std::string& file)
@@ -121,6 +126,8 @@ std::string read_private_file(const std::string& file, std::size_t max_bytes, Fi
     struct stat status = {};
     if (descriptor < 0 || fstat(descriptor, &status) != 0)
         fail("cannot read " + file);
+    if (!S_ISREG(status.st_mode))
+        throw std::runtime_error(file + " is no regular file");
     check_private(file, status, privacy);
 
     std::string content;
@@ -146,7 +153,7 @@ void write_private_file(const std::string& file, const std::string& content)
     sync_folder(folder_of(file));
 }
 
-void make_private_folder(const std::string& folder)
+void make_private_folder(const std::string& folder, File_Privacy privacy)
 {
     if (mkdir(folder.c_str(), 0700) != 0 && errno != EEXIST)
         fail("cannot make the folder " + folder);
@@ -155,19 +162,21 @@ void make_private_folder(const std::string& folder)
         fail("cannot read " + folder);
     if (!S_ISDIR(status.st_mode))
         throw std::runtime_error(folder + " is no folder");
-    check_owner(folder, status);
-    if ((status.st_mode & 022) != 0)
-        throw std::runtime_error(folder + " may be written by others than its owner");
+    check_private(folder, status, privacy);
 }
 
-Folder_Lock::Folder_Lock(const std::string& folder) : _folder(open(folder.c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC))
+Folder_Lock::Folder_Lock(const std::string& folder, Wait wait) : _folder(open(folder.c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC))
 {
-    if (_folder >= 0)
-        while (flock(_folder, LOCK_EX) != 0)
-            if (errno != EINTR)
-                break;
     if (_folder < 0)
         fail("cannot open the folder " + folder);
+    const int how = wait == Wait::yes ? LOCK_EX : LOCK_EX | LOCK_NB;
+    while (flock(_folder, how) != 0)
+        if (errno != EINTR)
+        {
+            const int error = errno;
+            close(_folder);
+            fail("cannot lock the folder " + folder + ", another process uses it", error);
+        }
 }
 
 Folder_Lock::~Folder_Lock() { close(_folder); }

@@ -7,10 +7,12 @@
 namespace cimserver
 {
 
+// What nobody but the owner may do.
 enum class File_Privacy
 {
-    owner_only,    // neither the group nor others may read or write it
-    group_may_read // others may not, the group may not write
+    owner_only,     // read or write
+    group_may_read, // write; and of others also read
+    all_may_read    // write
 };
 
 // The whole content of a regular file that belongs to the server's user or to root and is as private as asked. Throws
@@ -22,14 +24,21 @@ std::string read_private_file(const std::string& file, std::size_t max_bytes, Fi
 void write_private_file(const std::string& file, const std::string& content);
 
 // Makes the folder, mode 0700, unless it is there; its parent must exist. Throws std::runtime_error when it cannot be made, is
-// no folder, belongs to neither the server's user nor root, or may be written by anybody else.
-void make_private_folder(const std::string& folder);
+// no folder, belongs to neither the server's user nor root, or is less private than asked.
+void make_private_folder(const std::string& folder, File_Privacy privacy);
 
-// Keeps other processes that lock the same folder out, for a scope. Waits for them. Throws std::system_error.
+// Keeps other processes that lock the same folder out, for a scope.
 class Folder_Lock
 {
 public:
-    explicit Folder_Lock(const std::string& folder);
+    enum class Wait
+    {
+        yes,
+        no
+    };
+
+    // Throws std::system_error when the folder cannot be opened or, without waiting, is locked.
+    Folder_Lock(const std::string& folder, Wait wait);
     ~Folder_Lock();
     Folder_Lock(const Folder_Lock&) = delete;
     Folder_Lock& operator=(const Folder_Lock&) = delete;

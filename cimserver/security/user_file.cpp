@@ -74,8 +74,8 @@ void store_user(const std::string& file, const std::string& name, const std::str
     check_password(password);
     const std::string hash = hash_password(password);
 
-    make_private_folder(folder_of(file));
-    const Folder_Lock lock(folder_of(file)); // two at once must not lose one
+    make_private_folder(folder_of(file), File_Privacy::all_may_read);
+    const Folder_Lock lock(folder_of(file), Folder_Lock::Wait::yes); // two at once must not lose one
     Users users = access(file.c_str(), F_OK) == 0 ? read_users(file) : Users();
     users[name] = hash;
     const std::string text = format(users);

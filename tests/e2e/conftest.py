@@ -2,6 +2,7 @@
 
 import json
 import os
+import subprocess
 import sys
 from pathlib import Path
 
@@ -14,6 +15,7 @@ from tools.simulated_server import ROOT, SimulatedServer  # noqa: E402
 from tools.wbemcli import Wbemcli  # noqa: E402
 
 NAME_SPACE = "root/zemlar"
+TST_MODULE = Path(os.environ.get("ZMLR_BUILD_DIR", ROOT / "build/dev")) / "tests/e2e/module/libtst_module.so"
 
 
 class Host:
@@ -38,9 +40,22 @@ def mixed():
 @pytest.fixture(scope="session")
 def tst():
     """A server with the tests' own module. Tests clean up what they make."""
-    build = Path(os.environ.get("ZMLR_BUILD_DIR", ROOT / "build/dev"))
-    with SimulatedServer("fc-hba", module=build / "tests/e2e/module/libtst_module.so") as server:
+    with SimulatedServer("fc-hba", module=TST_MODULE) as server:
         yield Host(server)
+
+
+@pytest.fixture(scope="session")
+def identity(tmp_path_factory):
+    """A certificate of 127.0.0.1 and its key."""
+    folder = tmp_path_factory.mktemp("identity")
+    certificate, key = folder / "certificate.pem", folder / "key.pem"
+    subprocess.run(
+        ["openssl", "req", "-x509", "-newkey", "ec", "-pkeyopt", "ec_paramgen_curve:prime256v1", "-nodes", "-days", "2"]
+        + ["-subj", "/CN=test", "-addext", "subjectAltName=IP:127.0.0.1", "-out", certificate, "-keyout", key],
+        capture_output=True,
+        check=True,
+    )
+    return certificate, key
 
 
 @pytest.fixture
@@ -48,12 +63,12 @@ def start(tmp_path):
     """start(scenario): a server of the test's own; a dict is written to a scenario file first. Options replace --no-auth."""
     servers = []
 
-    def start_server(scenario, environment=None, options=None):
+    def start_server(scenario, environment=None, options=None, module=None):
         if isinstance(scenario, dict):
             path = tmp_path / f"scenario{len(servers)}.json"
             path.write_text(json.dumps(scenario), encoding="utf-8")
             scenario = str(path)
-        server = SimulatedServer(scenario, environment, options)
+        server = SimulatedServer(scenario, environment, options, module)
         servers.append(server)
         return Host(server)
 

@@ -34,20 +34,6 @@ def users(program, tmp_path):
     return file
 
 
-@pytest.fixture(scope="session")
-def identity(tmp_path_factory):
-    """A certificate of 127.0.0.1 and its key."""
-    folder = tmp_path_factory.mktemp("identity")
-    certificate, key = folder / "certificate.pem", folder / "key.pem"
-    subprocess.run(
-        ["openssl", "req", "-x509", "-newkey", "ec", "-pkeyopt", "ec_paramgen_curve:prime256v1", "-nodes", "-days", "2"]
-        + ["-subj", "/CN=test", "-addext", "subjectAltName=IP:127.0.0.1", "-out", certificate, "-keyout", key],
-        capture_output=True,
-        check=True,
-    )
-    return certificate, key
-
-
 def add_user(program, file, name, password):
     command = [program[0], "--add-user", name, "--users", file]
     return subprocess.run(command, input=password + "\n", capture_output=True, text=True, timeout=60, check=True)

@@ -1,0 +1,160 @@
+#include "cimserver/indications/subscription_store.h"
+
+#include "cimserver/interop/server_schema.h"
+
+#include <nlohmann/json.hpp>
+
+#include <unistd.h>
+
+#include <stdexcept>
+
+namespace cimserver
+{
+namespace
+{
+
+using Json = nlohmann::json;
+
+constexpr std::size_t max_file_bytes = std::size_t{64} << 20;
+constexpr int version = 1;
+
+struct List
+{
+    const char* name;
+    const zmlr::Meta_Class* meta_class;
+};
+
+constexpr List lists[] = {
+    {"filters", &CIM_IndicationFilter},
+    {"destinations", &CIM_ListenerDestinationCIMXML},
+    {"subscriptions", &CIM_IndicationSubscription},
+};
+
+Json json_of(const Value& value);
+
+Json json_of(const std::vector<Named_Value>& values)
+{
+    Json json = Json::object();
+    for (const auto& [name, value] : values)
+        if (!value.null())
+            json[name] = json_of(value);
+    return json;
+}
+
+Json json_of(const Value& value)
+{
+    return std::visit(
+        [](const auto& content) -> Json
+        {
+            using Content = std::decay_t<decltype(content)>;
+            if constexpr (std::is_same_v<Content, std::shared_ptr<const Object_Path>>)
+                return {{"class", content->class_name}, {"name space", content->name_space}, {"keys", json_of(content->keys)}};
+            else if constexpr (std::is_same_v<Content, std::vector<Value>>)
+            {
+                Json list = Json::array();
+                for (const Value& element : content)
+                    list.push_back(json_of(element));
+                return list;
+            }
+            else if constexpr (std::is_same_v<Content, std::shared_ptr<const Instance>> ||
+                               std::is_same_v<Content, std::monostate>)
+                return nullptr; // no property of these classes holds an instance
+            else
+                return content;
+        },
+        value.content);
+}
+
+// What a damaged file makes throw is read before an aggregate is begun: g++ 12 destroys the members of an unfinished one twice.
+Value value_of(const Json& json);
+
+std::vector<Named_Value> values_of(const Json& json)
+{
+    std::vector<Named_Value> values;
+    for (const auto& [name, value] : json.get_ref<const Json::object_t&>())
+    {
+        Value read = value_of(value);
+        values.push_back({name, std::move(read)});
+    }
+    return values;
+}
+
+Value value_of(const Json& json)
+{
+    if (json.is_string())
+        return {CMPI_string, json.get<std::string>()};
+    if (json.is_boolean())
+        return {CMPI_boolean, json.get<bool>()};
+    if (json.is_number())
+        return {CMPI_string, json.dump()};
+    if (json.is_array())
+    {
+        std::vector<Value> elements;
+        for (const Json& element : json)
+            elements.push_back(value_of(element));
+        return {static_cast<CMPIType>(CMPI_string | CMPI_ARRAY), std::move(elements)};
+    }
+    Object_Path path;
+    path.name_space = json.at("name space");
+    path.class_name = json.at("class");
+    path.keys = values_of(json.at("keys"));
+    return {CMPI_ref, std::make_shared<const Object_Path>(std::move(path))};
+}
+
+Stored_Instances instances_of(const Json& json)
+{
+    if (json.at("version") != version)
+        throw std::runtime_error("it is of another version");
+    Stored_Instances stored;
+    for (std::size_t kind = 0; kind < std::size(lists); ++kind)
+        for (const Json& instance : json.at(lists[kind].name).get_ref<const Json::array_t&>())
+        {
+            stored[kind].emplace_back().path.class_name = lists[kind].meta_class->name;
+            stored[kind].back().properties = values_of(instance);
+        }
+    return stored;
+}
+
+std::string made_folder(const std::string& folder)
+{
+    make_private_folder(folder, File_Privacy::owner_only);
+    return folder;
+}
+
+} // namespace
+
+Subscription_Store::Subscription_Store(const std::string& folder)
+    : _lock(made_folder(folder), Folder_Lock::Wait::no)
+    , _file(folder + "/subscriptions.json")
+{
+}
+
+Stored_Instances Subscription_Store::load() const
+{
+    if (access(_file.c_str(), F_OK) != 0)
+        return {};
+    const std::string text = read_private_file(_file, max_file_bytes);
+    try
+    {
+        return instances_of(Json::parse(text));
+    }
+    catch (const std::exception& error)
+    {
+        throw std::runtime_error(_file + " is damaged: " + error.what());
+    }
+}
+
+// Texts are what a client sent, valid UTF-8 or not.
+void Subscription_Store::save(const Stored_Instances& instances) const
+{
+    Json json = {{"version", version}};
+    for (std::size_t kind = 0; kind < std::size(lists); ++kind)
+    {
+        Json& list = json[lists[kind].name] = Json::array();
+        for (const Instance& instance : instances[kind])
+            list.push_back(json_of(instance.properties));
+    }
+    write_private_file(_file, json.dump(2, ' ', false, Json::error_handler_t::replace) + "\n");
+}
+
+} // namespace cimserver

@@ -1,0 +1,268 @@
+#include "cimserver/indications/subscriptions.h"
+
+#include "cimserver/broker/names.h"
+#include "cimserver/indications/export_message.h"
+#include "cimserver/interop/interop_operations.h"
+#include "cimserver/interop/server_schema.h"
+#include "cimserver/object_conversion.h"
+#include "cimserver/path_identity.h"
+
+#include <algorithm>
+#include <stdexcept>
+
+namespace cimserver
+{
+namespace
+{
+
+using Kind = Subscription_Kind;
+
+const Object_Path& reference(const Instance& subscription, const char* end)
+{
+    const Named_Value* key = find_named(subscription.path.keys, end);
+    return *std::get<std::shared_ptr<const Object_Path>>(key->value.content);
+}
+
+void set_reference(Instance& subscription, const char* end, const Object_Path& path)
+{
+    const Value value{CMPI_ref, std::make_shared<const Object_Path>(path)};
+    find_named(subscription.path.keys, end)->value = value;
+    find_named(subscription.properties, end)->value = value;
+}
+
+} // namespace
+
+Subscriptions::Subscriptions(Module& module, Delivery& delivery, Indication_Order order, const Subscription_Store* store)
+    : _module(module)
+    , _delivery(delivery)
+    , _store(store)
+    , _providers(module, order)
+    , _routes(std::make_shared<const std::vector<Route>>())
+{
+}
+
+std::vector<Instance> Subscriptions::list(Kind kind) const
+{
+    const std::lock_guard lock(_data);
+    std::vector<Instance> instances;
+    for (const auto& [id, entry] : table(kind))
+        instances.push_back(entry.instance);
+    return instances;
+}
+
+Subscriptions::Entry Subscriptions::checked(Kind kind, Instance instance) const
+{
+    Entry entry;
+    instance.path.host.clear();
+    instance.path.name_space = Interop_Operations::name_space;
+    if (kind == Kind::filter)
+    {
+        entry.instance = complete_filter(std::move(instance));
+        entry.filter = std::make_shared<const Event_Filter>(event_filter(entry.instance, _module.repository()));
+    }
+    else if (kind == Kind::destination)
+        entry.instance = complete_destination(std::move(instance));
+    else
+    {
+        entry.instance = complete_subscription(std::move(instance));
+        tie(entry);
+    }
+    return entry;
+}
+
+// The subscription's references become the stored objects' own paths. The handler may be named by its superclass.
+void Subscriptions::tie(Entry& subscription) const
+{
+    const auto find = [&](Kind kind, const char* end, const zmlr::Meta_Class& meta_class)
+    {
+        Object_Path path = reference(subscription.instance, end);
+        if (equal_names(path.class_name, CIM_ListenerDestination.name))
+            path.class_name = meta_class.name;
+        const std::string id = path_identity(path);
+        const auto found = table(kind).find(id);
+        if (found == table(kind).end())
+            throw Cim_Error(CIM_ERR_INVALID_PARAMETER, std::string("the subscription's ") + end + " does not exist");
+        set_reference(subscription.instance, end, found->second.instance.path);
+        return id;
+    };
+    subscription.filter_id = find(Kind::filter, "Filter", CIM_IndicationFilter);
+    subscription.destination_id = find(Kind::destination, "Handler", CIM_ListenerDestinationCIMXML);
+}
+
+std::size_t Subscriptions::uses(const std::string& filter_id) const
+{
+    const auto uses_it = [&](const auto& entry) { return entry.second.filter_id == filter_id; };
+    return static_cast<std::size_t>(std::ranges::count_if(table(Kind::subscription), uses_it));
+}
+
+bool Subscriptions::in_use(Kind kind, const std::string& id) const
+{
+    return std::ranges::any_of(table(Kind::subscription), [&](const auto& entry)
+                               { return (kind == Kind::filter ? entry.second.filter_id : entry.second.destination_id) == id; });
+}
+
+Provider_Filter Subscriptions::provider_filter(const std::string& filter_id) const
+{
+    const Entry& filter = table(Kind::filter).at(filter_id);
+    const Named_Value* query = find_named(filter.instance.properties, "Query");
+    return {std::get<std::string>(query->value.content), filter.filter->query.class_name(), filter.filter->name_spaces};
+}
+
+void Subscriptions::insert(Kind kind, const std::string& id, Entry entry)
+{
+    const std::lock_guard lock(_data);
+    table(kind).emplace(id, std::move(entry));
+    update_routes();
+}
+
+Subscriptions::Entry Subscriptions::take(Kind kind, const std::string& id)
+{
+    const std::lock_guard lock(_data);
+    Entry entry = std::move(table(kind).extract(id).mapped());
+    update_routes();
+    return entry;
+}
+
+void Subscriptions::update_routes()
+{
+    auto routes = std::make_shared<std::vector<Route>>();
+    std::set<std::string> urls;
+    for (const auto& [id, subscription] : table(Kind::subscription))
+    {
+        const Instance& destination = table(Kind::destination).at(subscription.destination_id).instance;
+        const auto& url = std::get<std::string>(find_named(destination.properties, "Destination")->value.content);
+        routes->push_back({table(Kind::filter).at(subscription.filter_id).filter, url});
+        urls.insert(url);
+    }
+    _routes = std::move(routes);
+    _delivery.keep(urls);
+}
+
+void Subscriptions::save() const
+{
+    if (!_store)
+        return;
+    try
+    {
+        _store->save({list(Kind::filter), list(Kind::destination), list(Kind::subscription)});
+    }
+    catch (const std::system_error& error)
+    {
+        throw Cim_Error(CIM_ERR_FAILED, error.what());
+    }
+}
+
+Object_Path Subscriptions::create(Kind kind, Instance instance)
+{
+    const std::lock_guard change(_changes);
+    Entry entry = checked(kind, std::move(instance));
+    const Object_Path path = entry.instance.path;
+    const std::string id = path_identity(path);
+    if (table(kind).contains(id))
+        throw Cim_Error(CIM_ERR_ALREADY_EXISTS, "there is such an instance of " + path.class_name + " already");
+    if (table(kind).size() >= max_of_a_kind)
+        throw Cim_Error(CIM_ERR_SERVER_LIMITS_EXCEEDED, "there are too many instances of " + path.class_name);
+
+    const std::string filter_id = entry.filter_id;
+    const bool starts = kind == Kind::subscription && uses(filter_id) == 0;
+    insert(kind, id, std::move(entry));
+    bool started = false;
+    try
+    {
+        if (starts)
+            _providers.start(filter_id, provider_filter(filter_id));
+        started = starts;
+        save();
+    }
+    catch (...)
+    {
+        if (started)
+            _providers.stop(filter_id);
+        take(kind, id);
+        throw;
+    }
+    return path;
+}
+
+void Subscriptions::remove(Kind kind, const Object_Path& path)
+{
+    const std::lock_guard change(_changes);
+    const std::string id = path_identity(path);
+    if (!table(kind).contains(id))
+        throw Cim_Error(CIM_ERR_NOT_FOUND, "there is no such instance of " + path.class_name);
+    if (in_use(kind, id))
+        throw Cim_Error(CIM_ERR_FAILED, "a subscription uses this instance of " + path.class_name);
+
+    Entry entry = take(kind, id);
+    try
+    {
+        save();
+    }
+    catch (...)
+    {
+        insert(kind, id, std::move(entry));
+        throw;
+    }
+    if (kind == Kind::subscription && uses(entry.filter_id) == 0)
+        _providers.stop(entry.filter_id);
+}
+
+// Everything is stored before the first provider is called: a provider may raise indications at once.
+void Subscriptions::restore()
+{
+    if (!_store)
+        return;
+    const std::lock_guard change(_changes);
+    const Repository classes(server_registrations());
+    const Stored_Instances stored = _store->load();
+    try
+    {
+        for (const Kind kind : {Kind::filter, Kind::destination, Kind::subscription})
+            for (Instance instance : stored[static_cast<std::size_t>(kind)])
+            {
+                instance.path.name_space = Interop_Operations::name_space;
+                const Class_Entry& own = *classes.find(instance.path.class_name);
+                Entry entry = checked(kind, typed_instance(classes, own, instance, CIM_ERR_INVALID_PARAMETER));
+                const std::string id = path_identity(entry.instance.path);
+                insert(kind, id, std::move(entry));
+            }
+    }
+    catch (const Cim_Error& error)
+    {
+        throw std::runtime_error(_store->file() + " is damaged: " + error.what());
+    }
+
+    std::map<std::string, Provider_Filter> filters;
+    for (const auto& [id, subscription] : table(Kind::subscription))
+        filters.emplace(subscription.filter_id, provider_filter(subscription.filter_id));
+    _providers.start_all({filters.begin(), filters.end()});
+}
+
+void Subscriptions::stop()
+{
+    const std::lock_guard change(_changes);
+    _providers.stop_all();
+}
+
+// On a thread of the module's, which holds locks of its own: nothing here waits.
+void Subscriptions::deliver(const std::string& name_space, const Instance& indication)
+{
+    std::shared_ptr<const std::vector<Route>> routes;
+    {
+        const std::lock_guard lock(_data);
+        routes = _routes;
+    }
+    const Class_Entry* entry = _module.repository().find(indication.path.class_name);
+    if (!entry)
+        return;
+    for (const Route& route : *routes)
+    {
+        const Event_Filter& filter = *route.filter;
+        const bool from_here =
+            std::ranges::any_of(filter.name_spaces, [&](const std::string& name) { return equal_names(name, name_space); });
+        if (from_here && Repository::is_a(entry->meta_class, filter.entry->meta_class) && filter.query.wants(indication))
+            _delivery.send(route.url, export_message(filter.query.selected(indication)));
+    }
+}
+
+} // namespace cimserver

@@ -1,0 +1,287 @@
+"""Subscriptions and what listeners get: one that is well, and those that are dead, slow, or refuse."""
+
+import json
+import re
+import ssl
+import subprocess
+import threading
+import time
+from http.server import BaseHTTPRequestHandler, ThreadingHTTPServer
+
+import pytest
+import pywbem
+from conftest import TST_MODULE
+
+RED = pywbem.CIMInstanceName("TST_Box", {"Name": "red"})
+ALL = "SELECT * FROM TST_Alert"
+TIMEOUT = 60  # seconds until something that must happen has failed to
+TAKEN = (
+    '<?xml version="1.0" encoding="utf-8" ?><CIM CIMVERSION="2.0" DTDVERSION="2.0"><MESSAGE ID="1" PROTOCOLVERSION="1.0">'
+    '<SIMPLEEXPRSP><EXPMETHODRESPONSE NAME="ExportIndication">{}</EXPMETHODRESPONSE></SIMPLEEXPRSP></MESSAGE></CIM>'
+)
+ERROR = '<ERROR CODE="1" DESCRIPTION="no"/>'
+
+
+def wait_until(condition):
+    deadline = time.monotonic() + TIMEOUT
+    while not condition():
+        assert time.monotonic() < deadline
+        time.sleep(0.02)
+
+
+class Listener:
+    """Keeps what it gets. `answers` are given in turn: an HTTP status, "hang" until release(), "error"; then it takes all."""
+
+    def __init__(self, answers=(), identity=None):
+        self.bodies, self.headers = [], []
+        self._answers = list(answers)
+        self._released = threading.Event()
+        listener = self
+
+        class Handler(BaseHTTPRequestHandler):
+            protocol_version = "HTTP/1.1"
+
+            def do_POST(self):
+                listener._take(self)
+
+            def log_message(self, *_):
+                pass
+
+        self._server = ThreadingHTTPServer(("127.0.0.1", 0), Handler)
+        self.url = f"http://127.0.0.1:{self._server.server_port}"
+        if identity:
+            context = ssl.SSLContext(ssl.PROTOCOL_TLS_SERVER)
+            context.load_cert_chain(*identity)
+            self._server.socket = context.wrap_socket(self._server.socket, server_side=True)
+            self.url = self.url.replace("http:", "https:")
+        threading.Thread(target=self._server.serve_forever, daemon=True).start()
+
+    def _take(self, request):
+        self.headers.append(dict(request.headers))
+        self.bodies.append(request.rfile.read(int(request.headers["Content-Length"])).decode())
+        answer = self._answers.pop(0) if self._answers else 200
+        if answer == "hang":
+            self._released.wait(TIMEOUT)
+        body = TAKEN.format(ERROR if answer == "error" else "").encode()
+        try:
+            request.send_response(answer if isinstance(answer, int) else 200)
+            request.send_header("Content-Length", str(len(body)))
+            request.end_headers()
+            request.wfile.write(body)
+        except OSError:
+            pass  # the server did not wait
+
+    @property
+    def numbers(self):
+        return [int(re.search(r'NAME="Number"[^>]*><VALUE>(\d+)<', body)[1]) for body in self.bodies]
+
+    def release(self):
+        self._released.set()
+
+    def close(self):
+        self.release()
+        self._server.shutdown()
+        self._server.server_close()
+
+
+@pytest.fixture
+def listen():
+    listeners = []
+
+    def make(*arguments, **keywords):
+        listeners.append(Listener(*arguments, **keywords))
+        return listeners[-1]
+
+    yield make
+    for listener in listeners:
+        listener.close()
+
+
+@pytest.fixture
+def serve(start):
+    """serve(options...): a server of the tests' module; retries come soon."""
+    return lambda *options: start(
+        "fc-hba", options=["--no-auth", "--delivery-pause", "0.2", *map(str, options)], module=TST_MODULE
+    )
+
+
+class Manager:
+    """pywbem's subscription manager on one server."""
+
+    def __init__(self, host, name="test"):
+        self.pywbem = pywbem.WBEMSubscriptionManager(name)
+        self.server = self.pywbem.add_server(pywbem.WBEMServer(host.pywbem))
+        self._count = 0
+
+    def subscribe(self, url, query=ALL, language="WQL", owned=True):
+        self._count += 1
+        names = (f"{self._count}", None) if owned else (None, f"permanent{self._count}")
+        destination = self.pywbem.add_destination(self.server, url, owned, *names)
+        event_filter = self.pywbem.add_filter(self.server, ["root/zemlar"], query, language, owned, *names)
+        return self.pywbem.add_subscriptions(self.server, event_filter.path, destination.path, owned)[0]
+
+    def counts(self):
+        lists = (self.pywbem.get_all_filters, self.pywbem.get_all_destinations, self.pywbem.get_all_subscriptions)
+        return [len(instances(self.server)) for instances in lists]
+
+
+def ring(host, times, text="now"):
+    raised, _ = host.pywbem.InvokeMethod("Ring", RED, Times=pywbem.Uint32(times), Text=text)
+    return raised
+
+
+def free_port():
+    with ThreadingHTTPServer(("127.0.0.1", 0), BaseHTTPRequestHandler) as server:
+        return server.server_port
+
+
+def test_subscription_manager_and_listener(serve):
+    host = serve()
+    received = []
+    listener = pywbem.WBEMListener("127.0.0.1", free_port())
+    listener.add_callback(lambda indication, _: received.append((indication["Number"], indication["Text"])))
+    listener.start()
+    try:
+        manager = Manager(host)
+        url = f"http://127.0.0.1:{listener.http_port}"
+        assert ring(host, 1) == 0, "nobody wants them yet"
+        subscription = manager.subscribe(url)
+        assert subscription["SubscriptionState"] == 2
+        assert manager.counts() == [1, 1, 1]
+        assert ring(host, 3, "<&> \u00e9") == 3
+        wait_until(lambda: len(received) == 3)
+        assert received == [(n, "<&> \u00e9") for n in (1, 2, 3)]
+
+        permanent = manager.subscribe(url, owned=False)
+        assert len(manager.pywbem.get_owned_subscriptions(manager.server)) == 1
+        with pytest.raises(pywbem.CIMError):
+            manager.pywbem.remove_filter(manager.server, permanent["Filter"])  # in use
+        manager.pywbem.remove_server(manager.server)  # takes what it owns along
+        manager = Manager(host)
+        assert manager.counts() == [1, 1, 1]
+        assert ring(host, 1) == 1
+        wait_until(lambda: len(received) == 4)
+
+        manager.pywbem.remove_subscriptions(manager.server, permanent.path)
+        manager.pywbem.remove_filter(manager.server, permanent["Filter"])
+        manager.pywbem.remove_destinations(manager.server, permanent["Handler"])
+        assert manager.counts() == [0, 0, 0]
+        assert ring(host, 1) == 0
+        for query, language, code in [("SELECT * FROM TST_Box", "WQL", 15), ("SELECT", "WQL", 15), (ALL, "SQL", 14)]:
+            with pytest.raises(pywbem.CIMError) as refusal:
+                manager.subscribe(url, query, language)
+            assert refusal.value.status_code == code
+    finally:
+        listener.stop()
+
+
+def test_the_message_is_what_listeners_read(serve, listen):
+    host, listener = serve(), listen()
+    Manager(host).subscribe(listener.url, "SELECT Number, Text FROM TST_Alert WHERE Number = 2", "DMTF:CQL")
+    ring(host, 3, "a < b")
+    wait_until(lambda: listener.bodies)
+    assert re.sub(r'MESSAGE ID="\d+"', 'MESSAGE ID=""', listener.bodies[0]) == (
+        '<?xml version="1.0" encoding="utf-8"?>\n<CIM CIMVERSION="2.0" DTDVERSION="2.0"><MESSAGE ID="" PROTOCOLVERSION="1.0">'
+        '<SIMPLEEXPREQ><EXPMETHODCALL NAME="ExportIndication"><EXPPARAMVALUE NAME="NewIndication">'
+        '<INSTANCE CLASSNAME="TST_Alert"><PROPERTY NAME="Number" TYPE="uint32"><VALUE>2</VALUE></PROPERTY>'
+        '<PROPERTY NAME="Text" TYPE="string"><VALUE>a &lt; b</VALUE></PROPERTY></INSTANCE>'
+        "</EXPPARAMVALUE></EXPMETHODCALL></SIMPLEEXPREQ></MESSAGE></CIM>"
+    )
+    headers = listener.headers[0]
+    assert headers["CIMExport"] == "MethodRequest"
+    assert headers["CIMExportMethod"] == "ExportIndication"
+    assert headers["Content-Type"] == 'application/xml; charset="utf-8"'
+    assert host.server.stop() == 0
+    assert listener.numbers == [2]
+
+
+@pytest.mark.parametrize(
+    "answers,numbers",
+    [
+        ([503, 429], [1, 1, 1, 2, 3]),  # it may take it later
+        ([500, 500, 500], [1, 1, 1, 2, 3]),  # given up
+        ([400], [1, 2, 3]),  # refused
+        (["error", 302], [1, 2, 3]),
+        ([200, "hang"], [1, 2, 2, 3]),
+    ],
+)
+def test_what_is_not_taken_is_tried_again_in_order(serve, listen, answers, numbers):
+    host, listener = serve("--delivery-timeout", 2), listen(answers)
+    Manager(host).subscribe(listener.url)
+    ring(host, 3)
+    wait_until(lambda: len(listener.numbers) == len(numbers))
+    assert listener.numbers == numbers
+
+
+def test_dead_and_slow_listeners_hold_up_nobody(serve, listen):
+    host, well, slow = serve("--delivery-timeout", 30), listen(), listen(["hang"])
+    manager = Manager(host)
+    for url in (f"http://127.0.0.1:{free_port()}", slow.url, well.url):
+        manager.subscribe(url)
+    begin = time.monotonic()
+    assert ring(host, 200) == 200
+    wait_until(lambda: len(well.bodies) == 200)
+    assert time.monotonic() - begin < 20
+    assert well.numbers == list(range(1, 201))
+    assert slow.numbers == [1]
+
+    begin = time.monotonic()
+    assert host.server.stop() == 0
+    assert time.monotonic() - begin < 15
+    assert any("the server stops" in line and slow.url in line for line in host.server.lines)
+
+
+def test_a_full_queue_loses_the_oldest(serve, listen):
+    host, listener = serve("--max-indications", 5, "--delivery-timeout", 60), listen(["hang"])
+    Manager(host).subscribe(listener.url)
+    ring(host, 1)
+    wait_until(lambda: listener.bodies)
+    ring(host, 20)
+    listener.release()
+    wait_until(lambda: len(listener.bodies) == 6)
+    assert listener.numbers == [1, 16, 17, 18, 19, 20]
+    wait_until(lambda: any("15 indications are lost" in line for line in host.server.lines))
+
+
+def test_https_listeners_must_prove_who_they_are(serve, listen, identity):
+    host, listener = serve("--listener-ca", identity[0]), listen(identity=identity)
+    Manager(host).subscribe(listener.url)
+    ring(host, 1)
+    wait_until(lambda: listener.numbers == [1])
+
+    distrusting = serve()
+    Manager(distrusting).subscribe(listener.url)
+    ring(distrusting, 1)
+    wait_until(lambda: any(listener.url in line and "1 indication is lost" in line for line in distrusting.server.lines))
+    assert listener.numbers == [1]
+
+
+@pytest.mark.parametrize("order", ["sfcb", "open-pegasus"])
+def test_subscriptions_survive_a_restart(serve, listen, tmp_path, order):
+    listener, state = listen(), tmp_path / "state"
+    host = serve("--state", state, "--indication-order", order)
+    before = Manager(host).subscribe(listener.url, owned=False)
+    assert state.stat().st_mode & 0o777 == 0o700
+    file = state / "subscriptions.json"
+    assert file.stat().st_mode & 0o777 == 0o600
+
+    command = [*host.server.arguments()[:3], "--no-auth", "--port", "0", "--state", state]
+    second = subprocess.run(command, capture_output=True, text=True, timeout=TIMEOUT, check=False)
+    assert (second.returncode, "another process uses it" in second.stderr) == (1, True)
+
+    host.server.stop()
+    host = serve("--state", state, "--indication-order", order)
+    again = host.pywbem.GetInstance(before.path)
+    assert again == before
+    ring(host, 2)
+    wait_until(lambda: listener.numbers == [1, 2])
+    host.pywbem.DeleteInstance(before.path)
+    assert ring(host, 1) == 0
+    host.server.stop()
+    assert json.loads(file.read_text(encoding="utf-8"))["subscriptions"] == []
+
+    spoilt = file.read_bytes()[:-10]
+    file.write_bytes(spoilt)
+    third = subprocess.run(command, capture_output=True, text=True, timeout=TIMEOUT, check=False)
+    assert (third.returncode, f"{file} is damaged" in third.stderr) == (1, True), third.stderr
+    assert file.read_bytes() == spoilt
