@@ -32,13 +32,26 @@ template <typename Record> consteval std::optional<std::size_t> status_offset()
         return std::nullopt;
 }
 
-template <auto function> void answer_with(Call& call, std::span<std::uint8_t> bytes)
+template <auto function> void answer_with(Call& call, std::vector<std::uint8_t>& bytes)
 {
-    typename Answer_Record<function>::type record;
+    typename Answer_Record<function>::type record{};
     static_assert(std::is_trivially_copyable_v<decltype(record)> && sizeof(record) <= max_record_size);
-    std::memcpy(&record, bytes.data(), sizeof(record));
+    std::memcpy(&record, bytes.data(), bytes.size());
     function(call, record);
-    std::memcpy(bytes.data(), &record, sizeof(record));
+    bytes.resize(call.answer_size.value_or(sizeof(record)));
+    std::memcpy(bytes.data(), &record, bytes.size());
+}
+
+// The record of an event fetch is as long as the sender has room, whatever the command's number tells: only its head is
+// sure to be there, and only as much comes back as there are events. What an IOC raised can be fetched after it has gone.
+constexpr bool is_event_fetch(const hxal::Command& command) { return command.name == "IOCMD_AEN_GET"; }
+
+template <typename Record> consteval Field instance_field()
+{
+    if constexpr (requires(Record record) { record.hxad_num; })
+        return {.offset = offsetof(Record, hxad_num), .size = sizeof(Record::hxad_num)};
+    else
+        return {};
 }
 
 template <auto function> consteval Row row(std::string_view name, Target target, std::array<Field, 4> inputs = {})
@@ -47,16 +60,23 @@ template <auto function> consteval Row row(std::string_view name, Target target,
     const auto* command = catalogued(name);
     if (command->record != &hxal::record_tag<Record>)
         throw "the catalogue has another record for this command";
+    if (target == Target::ioc && instance_field<Record>().size == 0)
+        throw "the record carries no instance";
     return {.command = command,
             .target = target,
+            .record_size = sizeof(Record),
+            .sent_size = is_event_fetch(*command) ? offsetof(hxal_ioctl_aen_t, aen_list) : sizeof(Record),
+            .instance = instance_field<Record>(),
             .status = status_offset<Record>(),
             .inputs = inputs,
-            .answer = answer_with<function>};
+            .answer = answer_with<function>,
+            .of_absent = is_event_fetch(*command)};
 }
 
 constexpr std::array<Field, 4> input(std::size_t offset, std::size_t size) { return {Field{.offset = offset, .size = size}}; }
 
 constexpr auto application = input(offsetof(hxa_ioctl_aen_t, app_id), 4);
+constexpr auto event_room = input(offsetof(hxal_ioctl_aen_t, aen_count), 4 + 4); // and the application
 constexpr auto power = input(offsetof(hxa_ioctl_ioc_power_t, power), 4);
 constexpr auto name = input(offsetof(hxa_ioctl_ioc_set_adapter_name_t, name), 64);
 constexpr auto interrupts = input(offsetof(hxa_ioctl_iocfc_intr_t, attr), sizeof(hxa_iocfc_intr_attr_t));
@@ -132,6 +152,7 @@ constexpr std::array rows{
     row<answer_beacon>                ("IOCMD_DIAG_BEACON",          Target::ioc,    beacon),
     row<answer_ethernet_loopback>     ("IOCMD_DIAG_LL_LOOPBACK",     Target::ioc,    ethernet_loopback),
     row<answer_loopback_status>       ("IOCMD_DIAG_LB_STAT",         Target::ioc),
+    row<answer_event_fetch>           ("IOCMD_AEN_GET",              Target::ioc,    event_room),
     row<answer_event_sync>            ("IOCMD_AEN_SYNC",             Target::driver, application),
     row<answer_port_enable>           ("IOCMD_PORT_ENABLE",          Target::ioc),
     row<answer_port_disable>          ("IOCMD_PORT_DISABLE",         Target::ioc),

@@ -8,6 +8,7 @@
 #include "hxal/records/commands.h"
 
 #include <array>
+#include <bitset>
 #include <optional>
 #include <span>
 #include <string>
@@ -15,11 +16,15 @@
 namespace hxasim
 {
 
-// An open node.
+// An open node. It is readable while the application has events to fetch from one of the IOCs that it knows.
 struct Descriptor
 {
     Node node;
-    std::uint64_t host_number; // of the host that it was opened on
+    std::uint64_t host_number;          // of the host that it was opened on
+    std::uint32_t application = 0;      // that synchronised on it; 0: none
+    std::bitset<max_instances> known{}; // IOCs that were there then
+    bool readable = false;              // now
+    bool inherited = false;             // from the process that this one was forked from, which makes it readable
 };
 
 // One request while it is answered. The answer sets `status` in its record, or refuses the whole call.
@@ -27,9 +32,10 @@ struct Call
 {
     Host& host;
     Descriptor& descriptor;
-    Ioc* ioc;             // null for a request to the driver as a whole
-    int error = 0;        // errno that the call fails with
-    std::string why = {}; // what was wrong with it
+    Ioc* ioc;                                    // null for a request to the driver as a whole
+    int error = 0;                               // errno that the call fails with
+    std::string why = {};                        // what was wrong with it
+    std::optional<std::size_t> answer_size = {}; // bytes of the record that go back, where not all do
 
     void refuse(int errno_value, std::string reason)
     {
@@ -51,21 +57,23 @@ enum class Target : std::uint8_t
     ioc
 };
 
-using Answer = void (*)(Call& call, std::span<std::uint8_t> record);
+// `record` comes in as it was sent and goes out as it is to be answered.
+using Answer = void (*)(Call& call, std::vector<std::uint8_t>& record);
 
 struct Row
 {
     const hxal::Command* command;
     Target target;
+    std::size_t record_size;           // largest one that is answered
+    std::size_t sent_size;             // what of it is read from the sender
+    Field instance;                    // where the record carries it, in a request to one IOC
     std::optional<std::size_t> status; // where the record keeps its status
     std::array<Field, 4> inputs;       // what the sender sets besides the instance; all other bytes come in as 0
     Answer answer;
+    bool of_absent = false; // answered also for an IOC whose card is gone
 };
 
-// Where requests to one IOC carry its instance.
-inline constexpr Field instance_field{.offset = offsetof(hxa_ioctl_gen_t, hxad_num), .size = sizeof(hxa_ioctl_gen_t::hxad_num)};
-
-constexpr std::size_t max_record_size = 4096;
+constexpr std::size_t max_record_size = sizeof(hxal_ioctl_aen_t);
 
 // Null when no row has it.
 const Row* row_of(const hxal::Command& command);
@@ -74,7 +82,8 @@ const Row* row_named(std::string_view name);
 // The answers, by the file that holds them.
 void answer_version(Call& call, hxa_ioctl_ioc_get_version_t& record); // driver_commands.cpp
 void answer_instances(Call& call, hxa_ioctl_ioc_get_inst_t& record);
-void answer_event_sync(Call& call, hxa_ioctl_aen_t& record);
+void answer_event_sync(Call& call, hxa_ioctl_aen_t& record); // event_commands.cpp
+void answer_event_fetch(Call& call, hxal_ioctl_aen_t& record);
 void answer_ioc_info(Call& call, hxa_ioctl_ioc_info_t& record); // ioc_commands.cpp
 void answer_ioc_attributes(Call& call, hxa_ioctl_ioc_attr_t& record);
 void answer_ioc_enable(Call& call, hxa_ioctl_gen_t& record);

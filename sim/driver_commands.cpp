@@ -2,7 +2,6 @@
 #include "sim/command_table.h"
 
 #include <algorithm>
-#include <cerrno>
 
 namespace hxasim
 {
@@ -19,18 +18,13 @@ void answer_instances(Call& call, hxa_ioctl_ioc_get_inst_t& record)
     std::uint32_t count = 0;
     for (const auto& ioc : call.host.iocs(call.descriptor.node))
     {
+        if (!ioc.adapter->plugged)
+            continue;
         auto& byte = record.bm[ioc.instance / 8];
         byte = static_cast<std::uint8_t>(byte | 1U << ioc.instance % 8);
         count = std::max(count, ioc.instance + 1);
     }
     record.cnt = call.host.driver(call.descriptor.node).instance_count.value_or(count);
-}
-
-void answer_event_sync(Call& call, hxa_ioctl_aen_t& record)
-{
-    if (record.app_id > hxa_aen_app_test)
-        return call.refuse(EINVAL, "no such application: " + std::to_string(record.app_id));
-    record.status = HXA_STATUS_OK;
 }
 
 } // namespace hxasim

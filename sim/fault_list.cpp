@@ -12,7 +12,7 @@ namespace
 
 bool fits(const Patch& patch, const Row& row)
 {
-    return patch.offset <= row.command->size && patch.bytes.size() <= row.command->size - patch.offset;
+    return patch.offset <= row.record_size && patch.bytes.size() <= row.record_size - patch.offset;
 }
 
 bool can_strike(const Fault& fault, const Row& row)
@@ -33,7 +33,7 @@ void check_against(const Row& row, const Fault& fault, const std::string& place)
         refuse(place + ".status", fault.command + " carries no status");
     for (const auto& patch : fault.answer)
         if (!fits(patch, row))
-            refuse(place + ".answer", "beyond the " + std::to_string(row.command->size) + " bytes of " + fault.command);
+            refuse(place + ".answer", "beyond the " + std::to_string(row.record_size) + " bytes of " + fault.command);
 }
 
 } // namespace
@@ -43,15 +43,15 @@ void check_fault(const Fault& fault, const std::string& place)
     const Row* row = row_named(fault.command);
     if (!fault.command.empty() && !row)
         refuse(place + ".command", "no such command: " + fault.command);
-    if (!fault.node.empty() && std::none_of(node_paths.begin(), node_paths.end(), [&](auto path) { return fault.node == path; }))
+    if (!fault.node.empty() && !node_at(fault.node))
         refuse(place + ".node", "no such node: " + fault.node);
-    if (fault.error == 0 && fault.status == 0 && fault.answer.empty())
-        refuse(place, "needs an error, a status or an answer");
+    if (fault.error == 0 && fault.status == 0 && fault.answer.empty() && fault.delay == 0)
+        refuse(place, "needs an error, a status, an answer or a delay");
     if (row)
         check_against(*row, fault, place);
 }
 
-const Fault* Fault_List::strike(const Row& row, Node node, int instance)
+std::optional<Fault> Fault_List::strike(const Row& row, Node node, int instance)
 {
     for (auto& fault : _faults)
     {
@@ -60,20 +60,23 @@ const Fault* Fault_List::strike(const Row& row, Node node, int instance)
         if (fault.skip > 0)
             --fault.skip;
         else if (fault.times < 0)
-            return &fault;
+            return fault;
         else if (fault.times > 0)
         {
             --fault.times;
-            return &fault;
+            return fault;
         }
     }
-    return nullptr;
+    return std::nullopt;
 }
 
 void overwrite(const std::vector<Patch>& patches, std::span<std::uint8_t> record)
 {
     for (const auto& patch : patches)
-        std::copy(patch.bytes.begin(), patch.bytes.end(), record.begin() + static_cast<std::ptrdiff_t>(patch.offset));
+    {
+        auto place = record.subspan(std::min(patch.offset, record.size()));
+        std::copy_n(patch.bytes.begin(), std::min(patch.bytes.size(), place.size()), place.begin());
+    }
 }
 
 } // namespace hxasim

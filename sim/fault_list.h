@@ -3,6 +3,7 @@
 
 #include "sim/command_table.h"
 
+#include <optional>
 #include <string>
 #include <vector>
 
@@ -18,16 +19,16 @@ public:
     void add(const Fault& fault) { _faults.push_back(fault); }
     void assign(const std::vector<Fault>& faults) { _faults = faults; }
     void clear() { _faults.clear(); }
+    std::size_t size() const { return _faults.size(); }
 
-    // The fault that strikes this request, or null. Every fault asked counts the request against its `skip` or `times`.
-    // The pointer is good until the list changes.
-    const Fault* strike(const Row& row, Node node, int instance);
+    // The fault that strikes this request, if any. Every fault asked counts the request against its `skip` or `times`.
+    std::optional<Fault> strike(const Row& row, Node node, int instance);
 
 private:
     std::vector<Fault> _faults;
 };
 
-// Overwrites the patched bytes of an answered record.
+// Overwrites the patched bytes of an answered record, as far as it reaches.
 void overwrite(const std::vector<Patch>& patches, std::span<std::uint8_t> record);
 
 } // namespace hxasim

@@ -79,7 +79,16 @@ Ioc* Host::find(Node node, std::uint32_t instance)
     return found == iocs.end() ? nullptr : &*found;
 }
 
-std::uint32_t& own_state(const Ioc& ioc) { return ioc.type == HXA_IOC_TYPE_LL ? ioc.port->eth_state : ioc.port->state; }
+void Host::raise(Ioc& ioc, hxa_aen_entry_t event)
+{
+    if (!driver(ioc.node).present)
+        return;
+    event.hxad_num = static_cast<std::int32_t>(ioc.instance);
+    ioc.events.add(event);
+    _event_news = true;
+}
+
+std::uint32_t& own_state(const Ioc& ioc) { return is_fibre_channel(ioc) ? ioc.port->state : ioc.port->eth_state; }
 
 bool is_out_of_service(std::uint32_t state)
 {

@@ -1,6 +1,7 @@
 // The simulated host at work: its IOCs by driver instance, and the state that requests read and change.
 #pragma once
 
+#include "sim/event_log.h"
 #include "sim/scenario.h"
 
 #include "hxal/records/iocfc.h"
@@ -8,6 +9,7 @@
 #include <array>
 #include <map>
 #include <string>
+#include <utility>
 #include <vector>
 
 namespace hxasim
@@ -34,6 +36,7 @@ struct Ioc
     std::map<std::uint32_t, std::uint32_t> registers = {}; // by offset; the others hold 0
     std::uint32_t next_state = 0;                          // the state it is on the way to ...
     std::uint32_t settle = 0;                              // ... and how many attribute requests will see it there
+    Event_Log events{};
 };
 
 class Host
@@ -45,9 +48,19 @@ public:
 
     const Driver& driver(Node node) const { return _scenario.drivers[static_cast<std::size_t>(node)]; }
     const std::vector<Ioc>& iocs(Node node) const { return _iocs[static_cast<std::size_t>(node)]; }
+    std::vector<Ioc>& iocs(Node node) { return _iocs[static_cast<std::size_t>(node)]; }
+    const std::vector<Adapter>& adapters() const { return _scenario.adapters; }
+    std::vector<Adapter>& adapters() { return _scenario.adapters; }
     const std::vector<Fault>& faults() const { return _scenario.faults; }
 
-    Ioc* find(Node node, std::uint32_t instance); // null when there is none
+    Ioc* find(Node node, std::uint32_t instance); // null when there is none; also one whose card is not plugged
+
+    // Queues an event of this IOC for every application. A driver that is not there says nothing.
+    void raise(Ioc& ioc, hxa_aen_entry_t event);
+
+    // Whether there are other events to fetch than when this was asked the last time.
+    bool take_event_news() { return std::exchange(_event_news, false); }
+    void tell_event_news() { _event_news = true; }
 
     // A driver keeps one name for a card, whichever of its IOCs is told.
     void name_adapter(const Ioc& told, const std::string& name);
@@ -58,7 +71,11 @@ private:
 
     Scenario _scenario;
     std::array<std::vector<Ioc>, 2> _iocs; // in the order of the scenario
+    bool _event_news = false;
 };
+
+inline bool is_fibre_channel(const Ioc& ioc) { return ioc.type != HXA_IOC_TYPE_LL; }
+inline const Mac& mac_of(const Ioc& ioc) { return is_fibre_channel(ioc) ? ioc.port->fcoe_mac : ioc.port->mac; }
 
 // The port's own state on the side of this IOC.
 std::uint32_t& own_state(const Ioc& ioc);

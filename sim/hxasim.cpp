@@ -34,4 +34,18 @@ std::vector<std::string> violations() { return simulator().violations(); }
 
 int open_descriptors() { return simulator().open_descriptors(); }
 
+void raise_event(const Event& event) { simulator().raise_event(event); }
+
+std::uint64_t lost_events(std::uint32_t application) { return simulator().lost_events(application); }
+
+void unplug(std::size_t adapter) { simulator().plug(adapter, false); }
+
+void plug(std::size_t adapter) { simulator().plug(adapter, true); }
+
+void set_link(std::size_t adapter, std::size_t port, bool up) { simulator().link(adapter, port, up); }
+
+void set_sfp(std::size_t adapter, std::size_t port, bool inserted) { simulator().sfp(adapter, port, inserted); }
+
+void serve_control(const std::string& path) { simulator().serve_control(path); }
+
 } // namespace hxasim

@@ -39,7 +39,7 @@ struct Patch
     std::vector<std::uint8_t> bytes;
 };
 
-// Makes matching requests go wrong. Unset members match everything. The first fault in the order of injection that fires
+// Makes matching requests go wrong, or late. Unset members match everything. The first fault in the order of injection that fires
 // decides; later ones do not see the request. A record status leaves the rest of the record as it was sent.
 struct Fault
 {
@@ -50,7 +50,20 @@ struct Fault
     std::uint32_t status = 0;         // ... or answer with this record status
     int skip = 0;                     // let this many matching requests pass first
     int times = -1;                   // then fail this many, -1: always
+    int delay = 0;                    // answer after this many ms; other requests go on meanwhile
     std::vector<Patch> answer = {};   // without an error: overwrite these bytes of the answered record
+};
+
+// What a driver tells its applications: queued at one IOC for each of them, and a node that an application has synchronised
+// on is readable while there is something to fetch. Enumerations are those of hxal/records/aen.h.
+struct Event
+{
+    std::string node = "/dev/hxa";       // of the IOC that raises it ...
+    int instance = 0;                    // ... and its instance
+    std::uint32_t category = 0;          // hxa_aen_category_t
+    std::uint32_t type = 0;              // event of the category
+    std::int16_t level = 0;              // hxa_pom_health_t, of optical monitoring
+    std::vector<std::uint8_t> data = {}; // up to 40 bytes of event data; empty: about that IOC's own objects
 };
 
 // Replaces the simulated host by a scenario: a shipped one by name ("mixed") or a JSON file by path; or JSON text.
@@ -74,6 +87,27 @@ std::vector<std::string> violations();
 
 // Open descriptors on the simulated nodes.
 int open_descriptors();
+
+// Raises an event for every application. Nothing else happens on the host. Throws std::runtime_error when there is no such
+// IOC, or for more data than an event holds.
+void raise_event(const Event& event);
+
+// How many events the application has lost since load(): an IOC keeps the newest 65,536.
+std::uint64_t lost_events(std::uint32_t application);
+
+// Pulls a card out of the host and puts it back as it was, raising the event of that; meanwhile its IOCs answer ENODEV to
+// everything but event fetches. Adapters are counted from 0, as in the scenario. Throw std::runtime_error when there is no
+// such adapter or port, or nothing to do.
+void unplug(std::size_t adapter);
+void plug(std::size_t adapter);
+
+// Takes the link of a port down, or up again, and the module out of its cage, or back; a port out of service keeps silent.
+void set_link(std::size_t adapter, std::size_t port, bool up);
+void set_sfp(std::size_t adapter, std::size_t port, bool inserted);
+
+// Serves the control socket (README.md) at this path instead of where it was; an empty path ends it. Throws
+// std::runtime_error when the socket cannot be made, as when another process serves it.
+void serve_control(const std::string& path);
 
 // Shortens the sleeps of the whole process - nanosleep(), usleep(), select() without descriptors - to this part of their time:
 // 1 leaves them, 0 skips them. It begins with HXASIM_TIME_SCALE, or 1. Throws std::runtime_error beyond 0 to 1.

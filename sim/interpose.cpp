@@ -11,7 +11,6 @@
 #include <atomic>
 #include <cerrno>
 #include <cstdarg>
-#include <cstring>
 #include <new>
 
 namespace
@@ -70,14 +69,6 @@ template <typename Work> int guarded(Work work) noexcept
     }
 }
 
-std::optional<hxasim::Node> node_at(const char* path) noexcept
-{
-    for (auto node : {hxasim::Node::hxa, hxasim::Node::hxn})
-        if (path && std::strcmp(path, path_of(node)) == 0)
-            return node;
-    return std::nullopt;
-}
-
 int mark(int descriptor)
 {
     if (static_cast<std::size_t>(descriptor) >= simulated.size())
@@ -93,7 +84,7 @@ int mark(int descriptor)
 // Opens a simulated node; none when the call is for the system.
 std::optional<int> open_node(const char* path, int flags) noexcept
 {
-    auto node = node_at(path);
+    auto node = path ? hxasim::node_at(path) : std::nullopt;
     if (!node)
         return std::nullopt;
     bool ours = true;

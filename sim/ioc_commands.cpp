@@ -11,10 +11,6 @@ namespace
 // PCI vendor identifier of the simulated cards, one that no vendor was given.
 constexpr std::uint16_t vendor_id = 0x7A6C;
 
-bool is_fibre_channel(const Ioc& ioc) { return ioc.type != HXA_IOC_TYPE_LL; }
-
-const Mac& mac_of(const Ioc& ioc) { return is_fibre_channel(ioc) ? ioc.port->fcoe_mac : ioc.port->mac; }
-
 void put_addresses(hxa_ioctl_ioc_info_t& record, const Ioc& ioc)
 {
     const auto& port = *ioc.port;

@@ -24,21 +24,6 @@ void put_fibre_channel(hxa_pport_attr_t& field, const Port& port, bool link_up)
     field.pid = port.base_port.address;
 }
 
-template <typename Change> void for_logical_ports(Port& port, Change change)
-{
-    change(port.base_port);
-    for (auto& logical : port.virtual_ports)
-        change(logical);
-}
-
-// A link that comes up runs with what was configured meanwhile.
-void start_link(Port& port)
-{
-    const auto& configuration = port.configuration;
-    port.speed = configuration.speed == HXA_PPORT_SPEED_AUTO ? port.auto_speed : configuration.speed;
-    port.topology = configuration.topology == HXA_PPORT_TOPOLOGY_AUTO ? port.auto_topology : configuration.topology;
-}
-
 } // namespace
 
 void answer_port_attributes(Call& call, hxa_ioctl_port_attr_t& record)
@@ -61,7 +46,7 @@ void answer_port_attributes(Call& call, hxa_ioctl_port_attr_t& record)
 
 void answer_port_enable(Call& call, hxa_ioctl_gen_t& record)
 {
-    auto& port = *call.ioc->port;
+    const auto& port = *call.ioc->port;
     auto& state = own_state(*call.ioc);
     if (*call.ioc->state != HXA_IOC_OPERATIONAL)
         record.status = HXA_STATUS_IOC_NON_OP;
@@ -70,12 +55,7 @@ void answer_port_enable(Call& call, hxa_ioctl_gen_t& record)
     else if (port.loopback_test)
         record.status = HXA_STATUS_DIAG_BUSY;
     else if (is_out_of_service(state))
-    {
         state = port.link_state;
-        start_link(port);
-        if (call.ioc->node == Node::hxa && state == HXA_PPORT_ST_LINKUP)
-            for_logical_ports(port, [](Logical_Port& logical) { log_in(logical); });
-    }
 }
 
 void answer_port_disable(Call& call, hxa_ioctl_gen_t& record)
@@ -86,11 +66,7 @@ void answer_port_disable(Call& call, hxa_ioctl_gen_t& record)
     else if (state == HXA_PPORT_ST_PREBOOT_DISABLED)
         record.status = HXA_STATUS_PBC;
     else
-    {
-        if (call.ioc->node == Node::hxa && state == HXA_PPORT_ST_LINKUP)
-            for_logical_ports(*call.ioc->port, [](Logical_Port& logical) { log_out(logical); });
         state = HXA_PPORT_ST_DISABLED;
-    }
 }
 
 } // namespace hxasim

@@ -27,7 +27,7 @@ bool covers(const Field& field, std::size_t at) { return at >= field.offset && a
 
 bool may_be_set(const Row& row, std::size_t at)
 {
-    return (row.target == Target::ioc && covers(instance_field, at)) ||
+    return (row.target == Target::ioc && covers(row.instance, at)) ||
            std::any_of(row.inputs.begin(), row.inputs.end(), [&](const Field& field) { return covers(field, at); });
 }
 
@@ -61,9 +61,9 @@ int instance_of(const Row& row, std::span<const std::uint8_t> record)
 {
     if (row.target == Target::driver)
         return -1;
-    std::uint16_t instance = 0;
-    std::memcpy(&instance, &record[instance_field.offset], sizeof(instance));
-    return instance;
+    std::uint32_t instance = 0; // of 2 or 4 bytes, the lowest first
+    std::memcpy(&instance, &record[row.instance.offset], row.instance.size);
+    return static_cast<int>(instance);
 }
 
 } // namespace hxasim

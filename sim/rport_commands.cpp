@@ -1,6 +1,7 @@
 // Requests to a remote port.
 #include "sim/lport_requests.h"
 #include "sim/record_fields.h"
+#include "sim/state_changes.h"
 
 namespace hxasim
 {
@@ -26,6 +27,14 @@ Remote_Port absent_port(wwn_t wwn)
     return remote;
 }
 
+// A port that the fabric has comes on line as soon as the driver knows it, and off line when it is to forget it.
+void make_known(Call& call, const Logical_Port& logical, Remote_Port& remote, bool known)
+{
+    if (remote.known != known && state_of(*call.ioc, remote) == HXA_RPORT_ONLINE)
+        tell_remote_port(call.host, *call.ioc, logical, remote, known);
+    remote.known = known;
+}
+
 } // namespace
 
 void answer_rport_add(Call& call, hxa_ioctl_rport_t& record)
@@ -34,7 +43,7 @@ void answer_rport_add(Call& call, hxa_ioctl_rport_t& record)
     if (!logical)
         return;
     if (auto* remote = port_with_wwn(logical->remote_ports, record.rpwwn))
-        remote->known = true;
+        make_known(call, *logical, *remote, true);
     else if (record.rpwwn == 0)
         record.status = HXA_STATUS_INVALID_WWN;
     else if (logical->remote_ports.size() >= max_remote_ports)
@@ -46,7 +55,7 @@ void answer_rport_add(Call& call, hxa_ioctl_rport_t& record)
 void answer_rport_remove(Call& call, hxa_ioctl_rport_t& record)
 {
     if (auto* remote = remote_port_of(call, record, record.pwwn, record.rpwwn))
-        remote->known = false;
+        make_known(call, *logical_port_of(call, record, record.pwwn), *remote, false);
 }
 
 void answer_rport_attributes(Call& call, hxa_ioctl_rport_attr_t& record)

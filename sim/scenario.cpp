@@ -1,6 +1,6 @@
 #include "sim/scenario.h"
 
-#include "sim/fault_list.h"
+#include "sim/fault_scenario.h"
 #include "sim/json_object.h"
 #include "sim/port_scenario.h"
 #include "sim/product_line.h"
@@ -57,7 +57,6 @@ private:
     void read_port(Json_Object& object, Adapter& adapter);
     void read_addresses(Json_Object& object, Port& port, bool converged);
     void generate(Json_Object& object);
-    void read_fault(Json_Object& object);
 
     Scenario _scenario;
     Instance_Numbers _fc_instances{Node::hxa};
@@ -153,6 +152,7 @@ void Scenario_Reader::read_adapter(Json_Object& object)
     adapter.temperature = static_cast<std::uint16_t>(object.number("temperature", 0xFFFF, adapter.temperature));
     adapter.cna_capable = object.boolean("cna_capable", adapter.cna_capable);
     adapter.is_mezz = object.boolean("is_mezz", adapter.is_mezz);
+    adapter.plugged = object.boolean("plugged", adapter.plugged);
     read_vpd(object, adapter);
 
     static const json usual = json::parse(R"({"ports": [{}, {}]})");
@@ -224,32 +224,6 @@ void Scenario_Reader::generate(Json_Object& object)
     }
 }
 
-Patch read_patch(Json_Object object)
-{
-    Patch patch{.offset = object.number("offset", max_record_size, 0), .bytes = object.bytes("bytes", max_record_size)};
-    object.done();
-    return patch;
-}
-
-void Scenario_Reader::read_fault(Json_Object& object)
-{
-    Fault fault;
-    fault.command = object.text("command", 64, "");
-    fault.node = object.text("node", 64, "");
-    if (auto instance = object.number("instance", 0xFFFF))
-        fault.instance = static_cast<int>(*instance);
-    fault.error = static_cast<int>(object.choice("error", errno_words, 4095, 0));
-    fault.status = object.number("status", max_u32, 0);
-    fault.skip = static_cast<int>(object.number("skip", 1'000'000'000, 0));
-    if (auto times = object.number("times", 1'000'000'000))
-        fault.times = static_cast<int>(*times);
-    for (auto& patch : object.objects("answer", 64))
-        fault.answer.push_back(read_patch(patch));
-    object.done();
-    check_fault(fault, object.place());
-    _scenario.faults.push_back(std::move(fault));
-}
-
 Scenario Scenario_Reader::read(const json& root)
 {
     Json_Object object(root, "");
@@ -261,7 +235,7 @@ Scenario Scenario_Reader::read(const json& root)
     if (auto generated = object.object("generate"))
         generate(*generated);
     for (auto& fault : object.objects("faults", 1000))
-        read_fault(fault);
+        _scenario.faults.push_back(read_fault(fault));
     object.done();
     return std::move(_scenario);
 }

@@ -21,6 +21,7 @@
 #include <cstdint>
 #include <optional>
 #include <string>
+#include <string_view>
 #include <vector>
 
 namespace hxasim
@@ -35,6 +36,13 @@ enum class Node : std::uint8_t
 };
 constexpr std::array<const char*, 2> node_paths = {"/dev/hxa", "/dev/hxn"};
 constexpr const char* path_of(Node node) { return node_paths[static_cast<std::size_t>(node)]; }
+constexpr std::optional<Node> node_at(std::string_view path)
+{
+    for (auto node : {Node::hxa, Node::hxn})
+        if (path == path_of(node))
+            return node;
+    return std::nullopt;
+}
 
 // A driver tells its application about this many IOCs at most.
 constexpr int max_instances = 128;
@@ -134,6 +142,7 @@ struct Adapter
     std::uint16_t temperature = 45;
     bool cna_capable = false;
     bool is_mezz = false;
+    bool plugged = true; // in the host, that is; its drivers know it only then
     Vpd vpd;
     Flash flash;
     std::vector<Port> ports;

@@ -1,14 +1,18 @@
 #include "sim/simulator.h"
 
 #include "sim/caller_memory.h"
+#include "sim/event_descriptor.h"
 #include "sim/request_check.h"
+#include "sim/state_changes.h"
 #include "sim/waits.h"
 
-#include <fcntl.h>
 #include <pthread.h>
-#include <sys/eventfd.h>
+#include <sys/syscall.h>
+#include <unistd.h>
 
+#include <algorithm>
 #include <cerrno>
+#include <chrono>
 #include <cstdio>
 #include <cstdlib>
 #include <cstring>
@@ -21,12 +25,14 @@ namespace
 {
 
 constexpr const char* scenario_variable = "HXASIM_SCENARIO";
+constexpr const char* control_variable = "HXASIM_CONTROL";
 
-int make_descriptor(int flags)
+// The system's own wait: the driver's time is not the product's, which a test may shorten.
+void wait(std::chrono::milliseconds time)
 {
-    int event_flags = ((flags & O_CLOEXEC) != 0 ? EFD_CLOEXEC : 0) | ((flags & O_NONBLOCK) != 0 ? EFD_NONBLOCK : 0);
-    int descriptor = eventfd(0, event_flags);
-    return descriptor < 0 ? -errno : descriptor;
+    timespec left{.tv_sec = time.count() / 1000, .tv_nsec = time.count() % 1000 * 1'000'000};
+    while (syscall(SYS_clock_nanosleep, CLOCK_MONOTONIC, 0, &left, &left) != 0 && errno == EINTR)
+        ;
 }
 
 } // namespace
@@ -37,11 +43,44 @@ Simulator& simulator()
     return the_one;
 }
 
-// A child of a process with threads must not inherit the lock in somebody else's hands.
+// The control socket is served from the first use of the simulator on, whatever host there will be.
 Simulator::Simulator()
 {
-    pthread_atfork([] { simulator().lock_for_fork(); }, [] { simulator().unlock_after_fork(); },
-                   [] { simulator().unlock_after_fork(); });
+    pthread_atfork([] { simulator().before_fork(); }, [] { simulator().after_fork_in_parent(); },
+                   [] { simulator().after_fork_in_child(); });
+    const char* path = secure_getenv(control_variable);
+    if (!path || *path == '\0')
+        return;
+    try
+    {
+        _control.serve(path);
+    }
+    catch (const std::exception& error)
+    {
+        std::fprintf(stderr, "hxasim: %s=%s: %s\n", control_variable, path, error.what());
+    }
+}
+
+// A child of a process with threads must not inherit a lock in somebody else's hands.
+void Simulator::before_fork()
+{
+    _control.before_fork();
+    _mutex.lock();
+}
+
+void Simulator::after_fork_in_parent()
+{
+    _mutex.unlock();
+    _control.after_fork_in_parent();
+}
+
+// Both processes have the same open file: what is read from it here is missed there.
+void Simulator::after_fork_in_child()
+{
+    for (auto& [number, descriptor] : _descriptors)
+        descriptor.inherited = true;
+    _mutex.unlock();
+    _control.after_fork_in_child();
 }
 
 std::unique_lock<std::mutex> Simulator::locked()
@@ -73,6 +112,7 @@ void Simulator::replace_host(std::unique_ptr<Host> host)
 {
     _host = std::move(host);
     ++_host_number;
+    show_events();
     _state = _host ? State::loaded : State::absent;
     _journal.clear();
     take_slept();
@@ -101,7 +141,7 @@ std::optional<int> Simulator::open(Node node, int flags)
         return -ENODEV;
     if (!_host->driver(node).present)
         return -ENOENT;
-    int descriptor = make_descriptor(flags);
+    int descriptor = make_event_descriptor(flags);
     if (descriptor >= 0)
         _descriptors.insert_or_assign(descriptor, Descriptor{.node = node, .host_number = _host_number});
     return descriptor;
@@ -113,16 +153,22 @@ void Simulator::forget(int descriptor)
     _descriptors.erase(descriptor);
 }
 
+Descriptor* Simulator::find(int descriptor)
+{
+    auto found = _descriptors.find(descriptor);
+    return found == _descriptors.end() || found->second.host_number != _host_number ? nullptr : &found->second;
+}
+
 int Simulator::request(int descriptor, std::uint32_t code, void* record)
 {
     auto lock = locked();
-    auto found = _descriptors.find(descriptor);
-    if (found == _descriptors.end())
+    if (!_descriptors.contains(descriptor))
         return EBADF;
-    if (found->second.host_number != _host_number)
+    const auto* open = find(descriptor);
+    if (!open)
         return ENODEV;
-    Journal_Entry entry{.node = found->second.node, .code = code, .slept = take_slept()};
-    entry.error = answer(found->second, entry, record);
+    Journal_Entry entry{.node = open->node, .code = code, .slept = take_slept()};
+    entry.error = answer(lock, descriptor, entry, record);
     int error = entry.error;
     _journal.add(std::move(entry));
     return error;
@@ -139,51 +185,75 @@ int Simulator::violate(const Journal_Entry& entry, int error, const std::string&
     return error;
 }
 
-int Simulator::answer(Descriptor& descriptor, Journal_Entry& entry, void* record)
+// The row that answers the request; null, with the entry's error set, when no driver would accept it.
+const Row* Simulator::accept(Journal_Entry& entry, const void* record)
 {
-    auto identified = identify(descriptor.node, entry.code);
+    auto refuse = [&](int error, const std::string& why)
+    {
+        entry.error = violate(entry, error, why);
+        return nullptr;
+    };
+    auto identified = identify(entry.node, entry.code);
+    const Row* row = identified.command ? row_of(*identified.command) : nullptr;
     if (identified.command)
         entry.name = identified.command->name;
-    entry.sent.resize(record_size(entry.code));
+    entry.sent.resize(identified.error == 0 && row ? row->sent_size : record_size(entry.code));
     if (!copy_from_caller(entry.sent, record))
     {
         entry.sent.clear();
         if (identified.error == 0)
-            return violate(entry, EFAULT, "bad address");
+            return refuse(EFAULT, "bad address");
     }
     if (identified.error != 0)
-        return violate(entry, identified.error, identified.why);
-    return answer_identified(descriptor, entry, *identified.command, record);
-}
-
-int Simulator::answer_identified(Descriptor& descriptor, Journal_Entry& entry, const hxal::Command& command, void* record)
-{
-    const Row* row = row_of(command);
+        return refuse(identified.error, identified.why);
     if (!row)
-        return violate(entry, ENOTTY, "not simulated");
+        return refuse(ENOTTY, "not simulated");
     entry.instance = instance_of(*row, entry.sent);
     if (auto dirt = find_dirt(*row, entry.sent); !dirt.empty())
-        return violate(entry, EINVAL, dirt);
-    Call call{.host = *_host, .descriptor = descriptor, .ioc = nullptr};
-    if (row->target == Target::ioc)
-    {
-        call.ioc = _host->find(descriptor.node, static_cast<std::uint32_t>(entry.instance));
-        if (!call.ioc)
-            return violate(entry, ENODEV, "no such instance");
-    }
-    return answer_row(call, *row, entry, record);
+        return refuse(EINVAL, dirt);
+    if (row->target == Target::ioc && !_host->find(entry.node, static_cast<std::uint32_t>(entry.instance)))
+        return refuse(ENODEV, "no such instance");
+    return row;
 }
 
-int Simulator::answer_row(Call& call, const Row& row, Journal_Entry& entry, void* record)
+int Simulator::answer(std::unique_lock<std::mutex>& lock, int descriptor, Journal_Entry& entry, void* record)
 {
-    const Fault* fault = _faults.strike(row, entry.node, entry.instance);
+    const Row* row = accept(entry, record);
+    if (!row)
+        return entry.error;
+    auto fault = _faults.strike(*row, entry.node, entry.instance);
+    const auto host_number = _host_number;
+    if (fault && fault->delay > 0)
+    {
+        lock.unlock();
+        wait(std::chrono::milliseconds(fault->delay));
+        lock.lock();
+    }
+    auto* open = find(descriptor);
+    if (!open || _host_number != host_number)
+        return ENODEV; // closed, or another host, meanwhile
+    Call call{.host = *_host, .descriptor = *open, .ioc = nullptr};
+    if (row->target == Target::ioc)
+        call.ioc = _host->find(open->node, static_cast<std::uint32_t>(entry.instance));
+    if (call.ioc && !call.ioc->adapter->plugged && !row->of_absent)
+        return ENODEV;
+    int error = answer_row(call, *row, fault, entry, record);
+    show_news();
+    return error;
+}
+
+int Simulator::answer_row(Call& call, const Row& row, const std::optional<Fault>& fault, Journal_Entry& entry, void* record)
+{
     if (fault && fault->error != 0)
         return fault->error;
     auto answered = entry.sent;
+    const auto before = call.ioc ? std::optional(function_state(*call.ioc)) : std::nullopt;
     if (fault && fault->status != 0)
         std::memcpy(&answered[*row.status], &fault->status, sizeof(fault->status));
     else
         row.answer(call, answered);
+    if (before)
+        follow(call.host, *call.ioc, *before);
     if (call.error != 0)
         return violate(entry, call.error, call.why);
     if (fault)
@@ -192,6 +262,34 @@ int Simulator::answer_row(Call& call, const Row& row, Journal_Entry& entry, void
         return violate(entry, EFAULT, "bad address");
     entry.answered = std::move(answered);
     return 0;
+}
+
+bool Simulator::has_events(const Descriptor& descriptor) const
+{
+    if (!_host || descriptor.host_number != _host_number)
+        return false;
+    const auto& iocs = _host->iocs(descriptor.node);
+    return std::any_of(iocs.begin(), iocs.end(),
+                       [&](const Ioc& ioc)
+                       { return descriptor.known[ioc.instance] && ioc.events.unread(descriptor.application) > 0; });
+}
+
+void Simulator::show_news()
+{
+    if (_host->take_event_news())
+        show_events();
+}
+
+void Simulator::show_events()
+{
+    for (auto& [number, descriptor] : _descriptors)
+    {
+        const bool readable = has_events(descriptor);
+        if (descriptor.inherited || readable == descriptor.readable)
+            continue;
+        readable ? make_readable(number) : make_unreadable(number);
+        descriptor.readable = readable;
+    }
 }
 
 std::uint64_t Simulator::request_count()

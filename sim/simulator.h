@@ -1,8 +1,11 @@
 // The one simulator of the process: the loaded host, the open descriptors, the faults and the journal, behind one lock.
 #pragma once
 
+#include "sim/control_requests.h"
+#include "sim/control_server.h"
 #include "sim/fault_list.h"
 #include "sim/host.h"
+#include "sim/host_summary.h"
 #include "sim/journal.h"
 
 #include <map>
@@ -34,9 +37,19 @@ public:
     void clear_faults();
     std::vector<std::string> violations();
     int open_descriptors();
+    void raise_event(const Event& event);
+    std::uint64_t lost_events(std::uint32_t application);
+    void plug(std::size_t adapter, bool plugged);
+    void link(std::size_t adapter, std::size_t port, bool up);
+    void sfp(std::size_t adapter, std::size_t port, bool inserted);
+    std::vector<Card_Summary> cards();
+    std::size_t fault_count();
 
-    void lock_for_fork() { _mutex.lock(); }
-    void unlock_after_fork() { _mutex.unlock(); }
+    void serve_control(const std::string& path) { _control.serve(path); }
+
+    void before_fork();
+    void after_fork_in_parent();
+    void after_fork_in_child();
 
 private:
     enum class State : std::uint8_t
@@ -50,10 +63,17 @@ private:
     std::unique_lock<std::mutex> locked(); // reads the environment at the first use
     void read_environment();
     void replace_host(std::unique_ptr<Host> host);
-    int answer(Descriptor& descriptor, Journal_Entry& entry, void* record);
-    int answer_identified(Descriptor& descriptor, Journal_Entry& entry, const hxal::Command& command, void* record);
-    int answer_row(Call& call, const Row& row, Journal_Entry& entry, void* record);
+    Descriptor* find(int descriptor); // null when it is not open on the present host
+    Host& loaded_host();              // throws without one
+    Adapter& adapter(std::size_t number);
+    Port& port(std::size_t adapter_number, std::size_t number);
+    const Row* accept(Journal_Entry& entry, const void* record);
+    int answer(std::unique_lock<std::mutex>& lock, int descriptor, Journal_Entry& entry, void* record);
+    int answer_row(Call& call, const Row& row, const std::optional<Fault>& fault, Journal_Entry& entry, void* record);
     int violate(const Journal_Entry& entry, int error, const std::string& why);
+    bool has_events(const Descriptor& descriptor) const;
+    void show_news(); // makes nodes readable or not, when that has changed
+    void show_events();
 
     std::mutex _mutex;
     State _state = State::untouched;
@@ -62,6 +82,7 @@ private:
     std::map<int, Descriptor> _descriptors;
     Fault_List _faults;
     Journal _journal;
+    Control_Server _control{answer_control};
 };
 
 Simulator& simulator();

@@ -1,7 +1,9 @@
 // Requests that are made to fail, by a test or by the scenario.
 #include "tests/sim/simulated_host.h"
 
+#include <chrono>
 #include <stdexcept>
+#include <thread>
 
 namespace
 {
@@ -99,12 +101,31 @@ TEST_F(Faults, overwrite_bytes_of_the_answer)
     EXPECT_EQ(hxasim::take_requests().back().answered[0x207], 0xFF);
 }
 
+TEST_F(Faults, delay_an_answer_without_holding_up_others)
+{
+    using std::chrono::milliseconds;
+    using std::chrono::steady_clock;
+    hxasim::inject({.command = "IOCMD_PORT_GET_ATTR", .instance = 1, .error = EIO, .delay = 400});
+    const auto before = steady_clock::now();
+    std::thread slow([] { EXPECT_EQ(outcome("/dev/hxa", 1), EIO); });
+    while (hxasim::open_descriptors() == 0)
+        std::this_thread::yield();
+    std::this_thread::sleep_for(milliseconds(20));
+    EXPECT_EQ(outcome("/dev/hxa", 0), 0);
+    slow.join();
+    EXPECT_GE(steady_clock::now() - before, milliseconds(400));
+    std::vector<int> order;
+    for (const auto& request : hxasim::take_requests())
+        order.push_back(request.instance);
+    EXPECT_THAT(order, ElementsAre(0, 1));
+}
+
 TEST_F(Faults, that_could_not_do_what_they_say_are_refused)
 {
     const std::pair<Fault, const char*> cases[] = {
         {{.command = "IOCMD_IOC_GET_ATTRS", .error = EIO}, "fault.command: no such command: IOCMD_IOC_GET_ATTRS"},
         {{.node = "/dev/hxx", .error = EIO}, "fault.node: no such node: /dev/hxx"},
-        {{.command = "IOCMD_IOC_GET_INFO"}, "fault: needs an error, a status or an answer"},
+        {{.command = "IOCMD_IOC_GET_INFO"}, "fault: needs an error, a status, an answer or a delay"},
         {{.command = "IOCMD_IOC_GET_INST", .status = 1}, "fault.status: IOCMD_IOC_GET_INST carries no status"},
         {{.command = "IOCMD_IOC_GET_INST", .answer = {{.offset = 37, .bytes = {1, 2, 3, 4}}}},
          "fault.answer: beyond the 40 bytes of IOCMD_IOC_GET_INST"},

@@ -121,7 +121,7 @@ TEST_F(Scenarios, name_the_place_of_every_error)
          "faults[0].error: must be one of EINTR, EIO, ENXIO, EBADF, EAGAIN, ENOMEM, EACCES, EFAULT, EBUSY, ENODEV, EINVAL, "
          "ENOTTY, or a whole number from 0 to 4095"},
         {R"({"faults": [{"error": 5, "answer": [{"offset": 0, "bytes": "0G"}]}]})",
-         "faults[0].answer[0].bytes: must be at most 4096 bytes as hexadecimal digits"},
+         "faults[0].answer[0].bytes: must be at most 4372 bytes as hexadecimal digits"},
     };
     hxasim::load("cna");
     for (const auto& [json, message] : cases)

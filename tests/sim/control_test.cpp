@@ -1,0 +1,273 @@
+// The control socket of a simulated process, and the tool that talks to it.
+#include "tests/sim/simulated_host.h"
+
+#include <sys/socket.h>
+#include <sys/stat.h>
+#include <sys/un.h>
+#include <sys/wait.h>
+
+#include <csignal>
+#include <cstdio>
+#include <fstream>
+#include <memory>
+#include <stdexcept>
+
+namespace
+{
+
+using testing::HasSubstr;
+
+class Control : public Simulated_Host
+{
+protected:
+    Control() : Simulated_Host("cna"), _path(testing::TempDir() + "sim_control_" + std::to_string(getpid()))
+    {
+        hxasim::serve_control(_path);
+    }
+    ~Control() override { hxasim::serve_control(""); }
+
+    Open_File connected() const
+    {
+        Open_File client(socket(AF_UNIX, SOCK_STREAM | SOCK_CLOEXEC, 0));
+        sockaddr_un address{};
+        address.sun_family = AF_UNIX;
+        _path.copy(address.sun_path, sizeof(address.sun_path) - 1);
+        if (connect(*client, reinterpret_cast<const sockaddr*>(&address), sizeof(address)) != 0)
+            client.close_now();
+        return client;
+    }
+
+    static void put(const Open_File& client, std::string_view bytes)
+    {
+        while (!bytes.empty())
+        {
+            const auto sent = ::send(*client, bytes.data(), bytes.size(), MSG_NOSIGNAL);
+            if (sent < 0)
+                return;
+            bytes.remove_prefix(static_cast<std::size_t>(sent));
+        }
+    }
+
+    // The next `lines` lines, or what came before the end.
+    static std::string get(const Open_File& client, int lines = 1)
+    {
+        std::string answer;
+        char byte = 0;
+        while (lines > 0 && recv(*client, &byte, 1, 0) == 1)
+        {
+            answer += byte;
+            lines -= byte == '\n';
+        }
+        return answer;
+    }
+
+    std::string ask(const std::string& line) const
+    {
+        const auto client = connected();
+        put(client, line + "\n");
+        return get(client);
+    }
+
+    // What the tool prints, and how it ends.
+    std::pair<int, std::string> tool(const std::string& words) const
+    {
+        const auto command = "HXASIM_CONTROL=" + _path + " " TOOL " " + words + " 2>&1";
+        std::unique_ptr<FILE, int (*)(FILE*)> pipe(popen(command.c_str(), "r"), pclose);
+        std::string output;
+        std::array<char, 256> line{};
+        while (fgets(line.data(), line.size(), pipe.get()))
+            output += line.data();
+        const int status = pclose(pipe.release());
+        return {WEXITSTATUS(status), output};
+    }
+
+    std::string _path;
+};
+
+constexpr const char* done = "{\"ok\":true}\n";
+
+std::string refusal(const std::string& why) { return "{\"error\":\"" + why + "\",\"ok\":false}\n"; }
+
+TEST_F(Control, answers_every_request_with_one_line)
+{
+    hxasim::load_text(R"({"adapters": [{"kind": "fc-hba", "ports": [{}]}]})");
+    const std::pair<const char*, std::string> cases[] = {
+        {R"({"request": "event", "category": "port", "event": "sfp-pom", "level": 2})", done},
+        {R"({"request": "event", "category": 9, "event": 77, "data": "0011"})", done},
+        {R"({"request": "port", "adapter": 0, "port": 0, "link": "down"})", done},
+        {R"({"request": "sfp", "adapter": 0, "port": 0, "module": "remove"})", done},
+        {R"({"request": "unplug", "adapter": 0})", done},
+        {R"({"request": "plug", "adapter": 0})", done},
+        {R"({"request": "fault", "command": "IOCMD_PORT_GET_ATTR", "error": "EIO", "delay": 5})", done},
+        {R"({"request": "requests"})", "{\"ok\":true,\"requests\":0}\n"},
+        {R"({"request": "status"})",
+         R"({"adapters":[{"model":"Zemlar-F86","plugged":true,"ports":[{"functions":[{"instance":0,"ioc":"operational",)"
+         R"("node":"/dev/hxa","port":"linkdown"}],"sfp":false}],"serial":"ZMF0000001"}],"faults":1,"lost_events":[0,0,0,0],)"
+         R"("ok":true,"open_descriptors":0,"requests":0,"violations":[]})"
+         "\n"},
+        {R"({"request": "clear-faults"})", done},
+        {R"({"request": "event", "category": "port", "event": "melted"})",
+         refusal("request.event: must be one of online, offline, rlir, sfp-insert, sfp-remove, sfp-pom, enable, disable, "
+                 "auth-on, auth-off, disconnect, qos-neg, fabric-name-change, sfp-access-error, sfp-unsupport, "
+                 "or a whole number from 0 to 4294967295")},
+        {R"({"request": "event", "category": 2, "event": 1, "instance": 3})", refusal("no instance 3 of /dev/hxa")},
+        {R"({"request": "port", "adapter": 0, "link": "down"})", refusal("request.port: is missing")},
+        {R"({"request": "port", "adapter": 0, "port": 0, "link": "up"})", refusal("no SFP in the port")},
+        {R"({"request": "unplug", "adapter": 1})", refusal("no adapter 1")},
+        {R"({"request": "unplug", "adapter": 0, "force": true})", refusal("request.force: unknown key")},
+        {R"({"request": "fault"})", refusal("request: needs an error, a status, an answer or a delay")},
+        {R"({"request": "reboot"})", refusal("request.request: no such request: reboot")},
+        {R"([])", refusal("request: must be an object")},
+    };
+    for (const auto& [request, answer] : cases)
+        EXPECT_EQ(ask(request), answer) << request;
+    EXPECT_THAT(ask("{"), HasSubstr("parse error"));
+    EXPECT_THAT(ask(std::string(60'000, '[')), HasSubstr("parse error"));
+}
+
+TEST_F(Control, does_what_it_is_asked_for)
+{
+    Open_File hxa("/dev/hxa");
+    ask(R"({"request": "fault", "command": "IOCMD_PORT_GET_ATTR", "instance": 1, "status": 13})");
+    ask(R"({"request": "port", "adapter": 0, "port": 0, "link": "down"})");
+    EXPECT_EQ(port(hxa, 'C', 0).port_state, std::uint32_t{HXA_PPORT_ST_LINKDOWN});
+    EXPECT_EQ(Simulated_Host::ask<hxa_ioctl_port_attr_t>(hxa, "IOCMD_PORT_GET_ATTR", 'C', 1).status, 13);
+    hxasim::unload();
+    EXPECT_EQ(ask(R"({"request": "unplug", "adapter": 0})"), refusal("no host is loaded"));
+}
+
+TEST_F(Control, serves_only_its_own_user_and_cleans_up)
+{
+    struct stat status = {};
+    ASSERT_EQ(stat(_path.c_str(), &status), 0);
+    EXPECT_EQ(status.st_mode, mode_t{S_IFSOCK | 0600});
+    hxasim::serve_control("");
+    EXPECT_NE(stat(_path.c_str(), &status), 0);
+    EXPECT_LT(*connected(), 0);
+}
+
+TEST_F(Control, takes_the_place_of_a_dead_socket_only)
+{
+    const auto refused = [&](const std::string& path) -> std::string
+    {
+        try
+        {
+            hxasim::serve_control(path);
+            return "served";
+        }
+        catch (const std::runtime_error& error)
+        {
+            return error.what();
+        }
+    };
+    const pid_t other = fork();
+    if (other == 0) // serves a second socket and dies without a chance to clean up
+    {
+        hxasim::serve_control(_path + "x");
+        raise(SIGKILL);
+    }
+    waitpid(other, nullptr, 0);
+    EXPECT_EQ(refused(_path + "x"), "served");
+    hxasim::serve_control(_path);
+
+    const std::string file = _path + ".txt";
+    std::ofstream(file) << "mine";
+    EXPECT_EQ(refused(file), "bind: Address already in use");
+    EXPECT_EQ(unlink(file.c_str()), 0);
+    EXPECT_EQ(refused("/no/such/folder/socket"), "bind: No such file or directory");
+    EXPECT_EQ(refused(std::string(200, 'x')), "socket: File name too long");
+}
+
+TEST_F(Control, keeps_answering_whatever_clients_do)
+{
+    std::vector<Open_File> silent;
+    for (int i = 0; i < 20; ++i)
+        silent.push_back(connected());
+    put(silent.back(), R"({"request": "requests"}   )");
+    EXPECT_EQ(ask(R"({"request": "clear-faults"})"), done);
+    const auto two = connected();
+    put(two, "{\"request\": \"clear-faults\"}\n{\"request\": \"clear-faults\"}\n{\"request\":");
+    EXPECT_EQ(get(two, 2), std::string(done) + done);
+    put(two, " \"clear-faults\"}\n");
+    EXPECT_EQ(get(two), done);
+    const auto long_line = connected();
+    put(long_line, std::string(70'000, ' '));
+    EXPECT_EQ(get(long_line, 2), refusal("line longer than 65536 bytes"));
+    const auto deaf = connected();
+    for (int i = 0; i < 2000; ++i)
+        if (::send(*deaf, "{\"request\": \"status\"}\n", 22, MSG_NOSIGNAL | MSG_DONTWAIT) < 0)
+            break;
+    EXPECT_EQ(ask(R"({"request": "clear-faults"})"), done);
+}
+
+TEST_F(Control, keeps_out_of_the_way_of_the_process)
+{
+    sigset_t user;
+    sigset_t pending;
+    sigemptyset(&user);
+    sigaddset(&user, SIGUSR1);
+    ASSERT_EQ(sigprocmask(SIG_BLOCK, &user, nullptr), 0);
+    kill(getpid(), SIGUSR1); // would end the process through a thread that takes it
+    ASSERT_EQ(ask(R"({"request": "requests"})"), "{\"ok\":true,\"requests\":0}\n");
+    ASSERT_EQ(sigpending(&pending), 0);
+    EXPECT_EQ(sigismember(&pending, SIGUSR1), 1);
+    signal(SIGUSR1, SIG_IGN);
+    signal(SIGUSR1, SIG_DFL);
+    sigprocmask(SIG_UNBLOCK, &user, nullptr);
+
+    const auto client = connected();
+    int keep_alive[2];
+    ASSERT_EQ(pipe(keep_alive), 0);
+    const pid_t child = fork();
+    if (child == 0)
+    {
+        close(keep_alive[1]);
+        char byte = 0;
+        _exit(read(keep_alive[0], &byte, 1) == 0 ? 0 : 1);
+    }
+    hxasim::serve_control("");
+    EXPECT_EQ(get(client), "") << "the child holds no connection open";
+    close(keep_alive[0]);
+    close(keep_alive[1]);
+    int status = -1;
+    waitpid(child, &status, 0);
+    EXPECT_EQ(status, 0);
+}
+
+TEST_F(Control, has_a_tool)
+{
+    const struct
+    {
+        const char* words;
+        int status;
+        const char* output;
+    } cases[] = {
+        {"event ioc hbfail --instance 1", 0, "\"ok\": true"},
+        {"event 2 6 --level 2", 0, "\"ok\": true"},
+        {"event port online --data 1000000533000001", 0, "\"ok\": true"},
+        {"port 0 1 down", 0, "\"ok\": true"},
+        {"sfp 0 1 remove", 0, "\"ok\": true"},
+        {"sfp 0 1 remove", 1, "no SFP in the port"},
+        {"unplug 0", 0, "\"ok\": true"},
+        {"plug 0", 0, "\"ok\": true"},
+        {"plug 7", 1, "no adapter 7"},
+        {"fault --command IOCMD_IOC_GET_INST --node /dev/hxn --answer 0:81000000 --answer 4:00 --times 3", 0, "\"ok\": true"},
+        {"fault --error EIO --instance 1 --delay 10", 0, "\"ok\": true"},
+        {"fault --status 5 --skip 1", 0, "\"ok\": true"},
+        {"status", 0, "\"faults\": 3"},
+        {"clear-faults", 0, "\"ok\": true"},
+        {"requests", 0, "\"requests\": 0"},
+        {"port 0 1 sideways", 105, "sideways"},
+        {"", 106, "subcommand"},
+        {"--socket /no/such/socket status", 2, "hxasim: /no/such/socket: No such file or directory"},
+    };
+    for (const auto& [words, status, output] : cases)
+    {
+        const auto [ended, said] = tool(words);
+        EXPECT_EQ(ended, status) << words << ": " << said;
+        EXPECT_THAT(said, HasSubstr(output)) << words;
+    }
+    EXPECT_THAT(tool("status").second, HasSubstr("\"port\": \"linkdown\""));
+}
+
+} // namespace
