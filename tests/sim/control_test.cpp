@@ -26,15 +26,21 @@ protected:
     }
     ~Control() override { hxasim::serve_control(""); }
 
-    Open_File connected() const
+    // A socket that bind() or connect() was called on; none when that failed.
+    static Open_File socket_at(const std::string& path, int (*call)(int, const sockaddr*, socklen_t) noexcept)
     {
-        Open_File client(socket(AF_UNIX, SOCK_STREAM | SOCK_CLOEXEC, 0));
+        Open_File made(socket(AF_UNIX, SOCK_STREAM | SOCK_CLOEXEC, 0));
         sockaddr_un address{};
         address.sun_family = AF_UNIX;
-        _path.copy(address.sun_path, sizeof(address.sun_path) - 1);
-        if (connect(*client, reinterpret_cast<const sockaddr*>(&address), sizeof(address)) != 0)
-            client.close_now();
-        return client;
+        path.copy(address.sun_path, sizeof(address.sun_path) - 1);
+        if (call(*made, reinterpret_cast<const sockaddr*>(&address), sizeof(address)) != 0)
+            made.close_now();
+        return made;
+    }
+
+    Open_File connected() const
+    {
+        return socket_at(_path, [](int made, const sockaddr* to, socklen_t size) noexcept { return connect(made, to, size); });
     }
 
     static void put(const Open_File& client, std::string_view bytes)
@@ -160,13 +166,7 @@ TEST_F(Control, takes_the_place_of_a_dead_socket_only)
             return error.what();
         }
     };
-    const pid_t other = fork();
-    if (other == 0) // serves a second socket and dies without a chance to clean up
-    {
-        hxasim::serve_control(_path + "x");
-        raise(SIGKILL);
-    }
-    waitpid(other, nullptr, 0);
+    ASSERT_GE(*socket_at(_path + "x", bind), 0); // and nobody listens, or cleans up
     EXPECT_EQ(refused(_path + "x"), "served");
     hxasim::serve_control(_path);
 
