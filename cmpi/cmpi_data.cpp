@@ -22,7 +22,7 @@ void CMPI_Data::set(CMPIType type, const CMPIValue& value)
 void CMPI_Data::set_null(CMPIType type)
 {
     release();
-    _data = {type, CMPI_nullValue, {}};
+    _data = {type, CMPI_nullValue, {.uint64 = 0}};
 }
 
 void CMPI_Data::own(CMPIType type, const CMPIValue& value)

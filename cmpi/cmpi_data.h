@@ -39,7 +39,7 @@ private:
     void own(CMPIType type, const CMPIValue& value);
     void release();
 
-    CMPIData _data = {CMPI_null, CMPI_nullValue, {}};
+    CMPIData _data = {CMPI_null, CMPI_nullValue, {.uint64 = 0}};
     bool _owner = false;
     std::vector<CMPI_Data> _elements; // of the array
 };

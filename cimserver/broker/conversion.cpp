@@ -87,7 +87,7 @@ Value from_array(const CMPIArray* face, CMPIType type)
 
 CMPIValue to_scalar(const Value& value)
 {
-    CMPIValue result{};
+    CMPIValue result{.uint64 = 0};
     switch (value.type)
     {
     case CMPI_boolean:
@@ -200,7 +200,7 @@ Value from_cmpi(const CMPIValue* value, CMPIType type)
 
 CMPIData to_cmpi(const Value& value)
 {
-    CMPIData data{value.type, CMPI_goodValue, {}};
+    CMPIData data{value.type, CMPI_goodValue, {.uint64 = 0}};
     if (value.null())
         data.state = CMPI_nullValue;
     else if ((value.type & CMPI_ARRAY) != 0)

@@ -147,7 +147,7 @@ template <class Result> Result not_supported(CMPIStatus* status, Result result)
 }
 
 // Data that is not there, which goes with a status other than OK.
-inline CMPIData no_data() { return {CMPI_null, CMPI_notFound, {}}; }
+inline CMPIData no_data() { return {CMPI_null, CMPI_notFound, {.uint64 = 0}}; }
 
 // The first two functions of every table.
 template <class T> CMPIStatus release(typename T::Face* face) noexcept

@@ -140,17 +140,17 @@ void Indication_Providers::start(const std::string& name, const Provider_Filter&
 void Indication_Providers::start_all(const std::vector<std::pair<std::string, Provider_Filter>>& filters)
 {
     const Module::Use use(_module);
-    for (const auto& [name, filter] : filters)
+    for (const auto& filter : filters)
         attempt(
             [&]
             {
-                Active_Filter& active = activate(name, filter);
+                Active_Filter& active = activate(filter.first, filter.second);
                 if (_order == Indication_Order::sfcb)
                     enable(active);
             });
     if (_order == Indication_Order::open_pegasus)
-        for (auto& [name, active] : _active)
-            attempt([&] { enable(active); });
+        for (auto& active : _active)
+            attempt([&] { enable(active.second); });
 }
 
 void Indication_Providers::disable(Provider& provider)

@@ -76,6 +76,9 @@ protected:
         const unsigned char image[16] = {};
         hxal_flash_update_part(ioc, HXA_FLASH_PART_FWIMG, 0, image, HXA_FALSE, sizeof image);
         hxal_boot_fwupdate(ioc, boot_archive(), 0x13);
+        hxa_aen_entry_t events[HXA_AEN_MAX_ENTRIES];
+        int count = HXA_AEN_MAX_ENTRIES;
+        hxal_aen_get_events(ioc, events, &count, hxa_aen_app_cim);
     }
 
     // The path of an archive that lies in no folder.
