@@ -2,6 +2,8 @@
 
 #include "cmpi/provider_proc.h"
 
+#include <atomic>
+
 namespace test
 {
 
@@ -18,28 +20,27 @@ private:
     std::lock_guard<std::recursive_mutex> _guard{Script::turn()};
 };
 
-// The life of a provider of any kind.
+// The life of a provider of any kind. It is told without a turn: a provider loads under the lock that a request within a turn
+// may want.
 template <class Base> class Counted_Provider : public Base
 {
 public:
-    Counted_Provider() { ++Turn()->providers; }
-    ~Counted_Provider() override { --Turn()->providers; }
+    Counted_Provider() { ++std::atomic_ref(Script::get().providers); }
+    ~Counted_Provider() override { --std::atomic_ref(Script::get().providers); }
 
     Load_Status load() override
     {
-        const Turn script;
-        ++script->loads;
-        if (script->on_load)
-            script->on_load();
+        ++std::atomic_ref(Script::get().loads);
+        if (Script::get().on_load)
+            Script::get().on_load();
         return LOAD_FAILED; // nobody asks
     }
 
     Unload_Status unload() override
     {
-        const Turn script;
-        ++script->unloads;
-        if (script->on_unload)
-            script->on_unload();
+        ++std::atomic_ref(Script::get().unloads);
+        if (Script::get().on_unload)
+            Script::get().on_unload();
         return UNLOAD_FAILED; // nobody asks
     }
 };
