@@ -387,6 +387,8 @@ TEST_F(Provider_Threads, are_waited_for_while_they_use_the_broker)
     EXPECT_EQ(clean_up(), CMPI_RC_OK);
     EXPECT_TRUE(left);
     thread.join();
+    if (counts.detached == 0)
+        CMRelease(counts.context); // as a server does that goes
 }
 
 TEST_F(Provider_Threads, that_cannot_attach_do_not_detach)

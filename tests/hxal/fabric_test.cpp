@@ -292,7 +292,7 @@ TEST_F(Fabric, passes_frames_for_logged_in_ports_only)
     fchs_t header{};
     const uint8_t from[] = {0x03, 0x02, 0x01};
     std::memcpy(header.s_id, from, sizeof from);
-    uint8_t response[16];
+    uint8_t response[16] = {};
     const auto pass = [&](wwn_t to, std::uint32_t requested)
     {
         uint32_t size = sizeof response;
