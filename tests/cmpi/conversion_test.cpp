@@ -240,7 +240,7 @@ protected:
     }
 
     // Of any type: all bits zero, which an empty initialiser does not promise for a union.
-    static constexpr CMPIValue nothing = {.uint64 = 0};
+    static constexpr CMPIValue zeros = {.uint64 = 0};
 
     // From CMPI: data of a type with this content, taken by itself.
     std::function<void()> taking(CMPIType type, CMPIValue content, int answer = -1)
@@ -292,16 +292,16 @@ TEST_F(Complaints, about_scalars_that_the_server_hands_over)
     { return make<cimserver::String_Object>("yesterday").face(); };
     CMPIDateTime vague = {nullptr, &datetime_table};
     expect({
-        {{"Converter: unknown type"}, taking(CMPI_args, nothing)},
-        {{"Converter: unknown type"}, taking(CMPI_chars, nothing)},
-        {{"Converter: unknown type"}, taking(CMPI_null, nothing)},
-        {{"Converter: unknown type"}, taking(0x7777, nothing)},
+        {{"Converter: unknown type"}, taking(CMPI_args, zeros)},
+        {{"Converter: unknown type"}, taking(CMPI_chars, zeros)},
+        {{"Converter: unknown type"}, taking(CMPI_null, zeros)},
+        {{"Converter: unknown type"}, taking(0x7777, zeros)},
         {{"Converter: CMGetCharsPtr() failed"}, taking(CMPI_string, {.string = &mute}, 0)},
-        {{"Converter: CMGetStringFormat() failed", "Converter: conversion error"}, taking(CMPI_dateTime, nothing)},
+        {{"Converter: CMGetStringFormat() failed", "Converter: conversion error"}, taking(CMPI_dateTime, zeros)},
         {{"Converter: conversion error"}, taking(CMPI_dateTime, {.dateTime = &vague})},
     });
     Value made;
-    const CMPIData no_string = {CMPI_string, CMPI_goodValue, nothing};
+    const CMPIData no_string = {CMPI_string, CMPI_goodValue, zeros};
     EXPECT_THAT(logged([&] { cmpi_to_cimple_value(&repository, broker.face(), name_space, no_string, made); }, "INFO"),
                 ElementsAre("Converter: ignored null CMPI string"));
     EXPECT_EQ(*made.get_if<String>(), "");
@@ -318,8 +318,8 @@ TEST_F(Complaints, about_objects_that_the_server_hands_over)
     auto& stranger = make<Instance_Object>(cimserver::Instance{{"", "", "Test_Nobody", {}}, {}});
     const char* failed = "Converter: failed to create CIMPLE instance";
     expect({
-        {{"Converter: null instance", failed}, taking(CMPI_ref, nothing)},
-        {{"Converter: null instance", failed}, taking(CMPI_instance, nothing)},
+        {{"Converter: null instance", failed}, taking(CMPI_ref, zeros)},
+        {{"Converter: null instance", failed}, taking(CMPI_instance, zeros)},
         {{"Converter: CMGetClassName() failed", failed}, taking(CMPI_ref, {.ref = &nameless})},
         {{"Converter: CMGetObjectPath() failed", failed}, taking(CMPI_instance, {.inst = &homeless})},
         {{"Converter: failed to find meta class: Test_Nobody", failed}, taking(CMPI_instance, {.inst = stranger.face()})},
@@ -345,8 +345,8 @@ TEST_F(Complaints, about_arrays_that_the_server_hands_over)
         {{"Converter: failed to find meta class: Test_Nobody", "Converter: failed to create CIMPLE instance"},
          taking_array(CMPI_ref, {nobody}, CMPI_ref)},
     });
-    taking(CMPI_uint8 | CMPI_ARRAY, nothing)();
-    taking(CMPI_ref | CMPI_ARRAY, nothing)();
+    taking(CMPI_uint8 | CMPI_ARRAY, zeros)();
+    taking(CMPI_ref | CMPI_ARRAY, zeros)();
 }
 
 TEST_F(Complaints, about_values_that_cannot_be_sent)
