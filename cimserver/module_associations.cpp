@@ -15,7 +15,20 @@ const char* word(const std::string& text) { return text.empty() ? nullptr : text
 
 } // namespace
 
-// A source named by a superclass is first looked up: only its own path means something to a provider.
+// A source named by a superclass is looked up: only its own path means something to a provider. Nothing when it does not exist.
+std::optional<Object_Path> Module_Operations::source_of(const Class_Entry& named, const Object_Path& path)
+try
+{
+    Object_Path source = path_to(named, typed_keys(_module.repository(), named, path));
+    return named.registration || _classes.served(named).empty() ? source : get_instance(path, std::vector<std::string>()).path;
+}
+catch (const Cim_Error& error)
+{
+    if (error.code() != CIM_ERR_NOT_FOUND)
+        throw;
+    return std::nullopt;
+}
+
 template <class Ask>
 void Module_Operations::ask_associations(const Object_Path& path, const Association_Filter& filter, Ends ends, Result_Sink& sink,
                                          Ask ask)
@@ -23,15 +36,15 @@ void Module_Operations::ask_associations(const Object_Path& path, const Associat
     const Class_Entry* named = _classes.find(path.class_name);
     if (!named)
         throw Cim_Error(CIM_ERR_INVALID_PARAMETER, "there is no class " + path.class_name);
-    Object_Path source = path_to(*named, typed_keys(_module.repository(), *named, path));
     const std::vector<const Class_Entry*> asked = concerned_associations(_classes, *named, filter, ends);
-    if (!named->registration && !_classes.served(*named).empty())
-        source = get_instance(path, std::vector<std::string>()).path;
+    const std::optional<Object_Path> source = source_of(*named, path);
+    if (!source)
+        return;
 
     for (const Class_Entry* provider : asked)
         if (CMPIAssociationMI* mi = _module.association_mi(*provider))
         {
-            Provider_Call call(*provider, source, sink);
+            Provider_Call call(*provider, *source, sink);
             ask(call, mi, provider->meta_class->name);
         }
 }

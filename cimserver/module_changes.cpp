@@ -32,7 +32,15 @@ const zmlr::Meta_Method* find_method(const zmlr::Meta_Class& meta_class, const s
     return nullptr;
 }
 
-// The class that a query selects from. All query languages of CIM write it as "FROM class".
+std::vector<std::string> names_of(const std::vector<Named_Value>& properties)
+{
+    std::vector<std::string> names;
+    std::ranges::transform(properties, std::back_inserter(names), &Named_Value::name);
+    return names;
+}
+
+} // namespace
+
 std::string class_of_query(const std::string& query)
 {
     std::istringstream words(query);
@@ -42,15 +50,6 @@ std::string class_of_query(const std::string& query)
             return word.substr(0, word.find_first_of(",;"));
     throw Cim_Error(CIM_ERR_INVALID_QUERY, "the query names no class");
 }
-
-std::vector<std::string> names_of(const std::vector<Named_Value>& properties)
-{
-    std::vector<std::string> names;
-    std::ranges::transform(properties, std::back_inserter(names), &Named_Value::name);
-    return names;
-}
-
-} // namespace
 
 Module_Operations::Target Module_Operations::target_of(const Object_Path& path)
 {

@@ -27,6 +27,9 @@
 namespace cimserver
 {
 
+// The class that a query selects from: all query languages of CIM write it as "FROM class". Throws CIM_ERR_INVALID_QUERY.
+std::string class_of_query(const std::string& query);
+
 class Module_Operations : public Operations
 {
 public:
@@ -74,6 +77,7 @@ private:
     std::optional<Instance> find_instance(const Class_Entry& provider, std::vector<Named_Value> keys,
                                           const Property_List& properties);
     Target target_of(const Object_Path& path);
+    std::optional<Object_Path> source_of(const Class_Entry& named, const Object_Path& path);
     const Class_Entry* method_provider(const Class_Entry& named, const Object_Path& path);
 
     template <class Ask>

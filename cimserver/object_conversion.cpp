@@ -148,7 +148,7 @@ void add_keys(Instance& instance)
         if (!property)
             instance.properties.push_back(key);
         else if (path_identity({"", "", "", {*property}}) != path_identity({"", "", "", {key}}))
-            throw Type_Error("the key " + key.name + " cannot be changed");
+            throw Cim_Error(CIM_ERR_INVALID_PARAMETER, "the key " + key.name + " cannot be changed");
     }
 }
 

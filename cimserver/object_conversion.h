@@ -13,8 +13,9 @@ namespace cimserver
 // a path without keys gets those that the properties give. Values are converted as operations.h tells; any other property
 // that is not given stays away.
 //
-// Throws Type_Error for a value that is none of its type, a property given twice and a key that contradicts the path, Key_Error
-// for wrong keys in the path, and a Cim_Error with the code `unknown_property` for a property that the class has not.
+// Throws Type_Error for a value that is none of its type and a property given twice, Key_Error for wrong keys in the path, and a
+// Cim_Error with the code `unknown_property` for a property that the class has not and INVALID_PARAMETER for a key that
+// contradicts the path.
 Instance typed_instance(const Repository& repository, const Class_Entry& entry, const Instance& instance, int unknown_property);
 
 // The input arguments with the names and types of the method's parameters, in their order. References without a name space

@@ -12,14 +12,6 @@ namespace cimserver
 namespace
 {
 
-// Blanks around a number, a boolean or a datetime are the client's layout.
-std::string_view trimmed(std::string_view text)
-{
-    constexpr std::string_view blanks = " \t\r\n";
-    const std::size_t first = text.find_first_not_of(blanks);
-    return first == std::string_view::npos ? std::string_view() : text.substr(first, text.find_last_not_of(blanks) - first + 1);
-}
-
 unsigned bits(CMPIType type)
 {
     switch (type)

@@ -1,20 +1,16 @@
 #include "cimserver/cimxml/http_connection.h"
 
+#include <netdb.h>
+#include <sys/socket.h>
+
 #include <charconv>
 #include <cstdint>
-#include <memory>
 
 namespace cimserver
 {
 
 namespace
 {
-
-struct Free_Http_Text
-{
-    void operator()(char* text) const { MHD_free(text); }
-};
-using Http_Text = std::unique_ptr<char, Free_Http_Text>;
 
 void add_headers(MHD_Response* response, const Http_Answer& answer)
 {
@@ -41,14 +37,13 @@ std::string header_of(MHD_Connection* connection, const char* name)
     return value ? value : "";
 }
 
-std::optional<Login> login_of(MHD_Connection* connection)
+std::string client_address(MHD_Connection* connection)
 {
-    char* password = nullptr;
-    const Http_Text name(MHD_basic_auth_get_username_password(connection, &password));
-    const Http_Text owned_password(password);
-    if (!name || !password)
-        return std::nullopt;
-    return Login{name.get(), password};
+    const sockaddr* address = MHD_get_connection_info(connection, MHD_CONNECTION_INFO_CLIENT_ADDRESS)->client_addr;
+    const socklen_t size = address->sa_family == AF_INET ? sizeof(sockaddr_in) : sizeof(sockaddr_in6);
+    char text[NI_MAXHOST] = "?";
+    getnameinfo(address, size, text, sizeof text, nullptr, 0, NI_NUMERICHOST);
+    return text;
 }
 
 bool announces_more_than(MHD_Connection* connection, std::size_t limit)

@@ -2,12 +2,10 @@
 #pragma once
 
 #include "cimserver/cimxml/http_message.h"
-#include "cimserver/security/credentials.h"
 
 #include <microhttpd.h>
 
 #include <cstddef>
-#include <optional>
 #include <string>
 
 namespace cimserver
@@ -16,15 +14,14 @@ namespace cimserver
 // A header's value, empty when the client sent none.
 std::string header_of(MHD_Connection* connection, const char* name);
 
-// The name and password of HTTP Basic; none when the client sent none or nonsense.
-std::optional<Login> login_of(MHD_Connection* connection);
+// The client's numeric address.
+std::string client_address(MHD_Connection* connection);
 
 // Whether Content-Length tells of a body beyond the limit.
 bool announces_more_than(MHD_Connection* connection, std::size_t limit);
 
 // Queues the answer with the headers of its status. Its body is not copied: unless it is empty it must live until the request
-// is completed.
-// MHD_NO when the answer cannot be queued: the connection is then to be closed.
+// is completed. MHD_NO when the answer cannot be queued: the connection is then to be closed.
 MHD_Result reply(MHD_Connection* connection, const Http_Answer& answer);
 
 } // namespace cimserver

@@ -5,6 +5,7 @@
 #include "cimserver/cimxml/listener.h"
 #include "cimserver/cimxml/worker_pool.h"
 #include "cimserver/security/credentials.h"
+#include "cimserver/security/refusal_log.h"
 
 #include <microhttpd.h>
 
@@ -96,6 +97,7 @@ private:
     std::condition_variable _answered;
     std::size_t _unanswered = 0; // submitted, the answer not yet sent
 
+    Refusal_Log _refusals;
     Connection_Watch _watch;
     Worker_Pool _verifiers;
     Worker_Pool _pool;
@@ -240,7 +242,7 @@ MHD_Result Http_Server::Daemon::begin(MHD_Connection* connection, std::string_vi
 // A client that is refused is heard to its end all the same: one that still sends might not see the answer.
 void Http_Server::Daemon::log_in(MHD_Connection* connection, Exchange& exchange)
 {
-    const auto login = login_of(connection);
+    const auto login = read_basic_login(header_of(connection, MHD_HTTP_HEADER_AUTHORIZATION));
     if (!login)
     {
         exchange.answer = {MHD_HTTP_UNAUTHORIZED, "", ""};
@@ -267,7 +269,10 @@ void Http_Server::Daemon::verify(MHD_Connection* connection, Exchange& exchange,
         if (_stopping)
             exchange.answer = {MHD_HTTP_SERVICE_UNAVAILABLE, "", ""};
         else if (!_credentials->verify(login))
+        {
+            _refusals.tell(login.name, client_address(connection));
             exchange.answer = {MHD_HTTP_UNAUTHORIZED, "", ""};
+        }
     }
     catch (...)
     {

@@ -3,6 +3,7 @@
 #include "cimserver/broker/names.h"
 #include "cimserver/cimxml/http_message.h"
 #include "cimserver/cimxml/request_rules.h"
+#include "cimserver/cimxml/value_text.h"
 
 #include <charconv>
 
@@ -13,13 +14,6 @@ namespace
 {
 
 [[noreturn]] void fail(const std::string& description) { throw Cim_Error(CIM_ERR_INVALID_PARAMETER, description); }
-
-std::string_view trimmed(std::string_view text)
-{
-    constexpr std::string_view blanks = " \t\r\n";
-    const std::size_t first = text.find_first_not_of(blanks);
-    return first == std::string_view::npos ? std::string_view() : text.substr(first, text.find_last_not_of(blanks) - first + 1);
-}
 
 // Decimal or hexadecimal integers and decimal reals (DSP0201).
 bool is_number(std::string_view text)

@@ -227,7 +227,7 @@ struct Operation_Row
     std::array<std::string_view, 8> parameters;
 };
 
-// LocalOnly and IncludeQualifiers are deprecated for instances: accepted, checked by no one, without effect.
+// LocalOnly and IncludeQualifiers are deprecated for instances: they have no effect.
 // clang-format off
 constexpr Operation_Row operation_rows[] = {
     {"AssociatorNames",        associator_names,         Answer::value,   {"ObjectName", "AssocClass", "ResultClass", "Role",
@@ -272,6 +272,8 @@ std::string run_operation(Operations& operations, const Cimxml_Request& request)
 {
     const Operation_Row& row = row_of(request.method);
     const Parameters parameters(request, row.parameters);
+    for (std::string_view flag : {"LocalOnly", "DeepInheritance", "IncludeQualifiers", "IncludeClassOrigin"})
+        parameters.boolean(flag, false); // refused when it is none, also where it has no effect
     const auto run = [&](Xml_Writer& writer) { row.run(operations, parameters, writer); };
     return row.answer == Answer::value ? write_success(request, run) : write_empty_success(request, run);
 }

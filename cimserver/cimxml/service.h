@@ -1,8 +1,7 @@
 // The CIM-XML service: takes one HTTP request, asks the operations, gives the HTTP answer (DSP0200).
 //
-// Served: GetClass, EnumerateClasses, EnumerateClassNames, GetInstance, EnumerateInstances, EnumerateInstanceNames and
-// extrinsic method calls. Every other operation answers CIM_ERR_NOT_SUPPORTED. The body is trusted, not the headers: only a
-// CIMOperation other than MethodCall is refused.
+// Served is what operations.h offers; every other operation, pulled enumerations among them, answers CIM_ERR_NOT_SUPPORTED.
+// The body is trusted, not the headers: only a CIMOperation other than MethodCall is refused.
 #pragma once
 
 #include "cimserver/cimxml/http_message.h"

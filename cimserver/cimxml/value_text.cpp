@@ -130,6 +130,13 @@ bool is_calendar_day(int year, int month, int day)
 
 } // namespace
 
+std::string_view trimmed(std::string_view text)
+{
+    constexpr std::string_view blanks = " \t\r\n";
+    const std::size_t first = text.find_first_not_of(blanks);
+    return first == std::string_view::npos ? std::string_view() : text.substr(first, text.find_last_not_of(blanks) - first + 1);
+}
+
 const char* cim_type_name(CMPIType type)
 {
     const CMPIType element = type & static_cast<CMPIType>(~CMPI_ARRAY);

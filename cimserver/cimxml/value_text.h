@@ -5,6 +5,7 @@
 
 #include <optional>
 #include <string>
+#include <string_view>
 
 namespace cimserver
 {
@@ -20,6 +21,9 @@ CMPIType cmpi_type(unsigned type);
 // could refuse, and its whole answer with it: an integer beyond its type, a char16 that is no character, a datetime that is
 // none. It is then sent as a null.
 std::optional<std::string> value_text(const Value& value);
+
+// A text without the blanks around it: around a number, a boolean or a datetime they are a client's layout.
+std::string_view trimmed(std::string_view text);
 
 // Whether a text is a datetime that clients read: 25 characters, a calendar day of the years 1 to 9999 with a time of day and
 // an offset below one day, or an interval.

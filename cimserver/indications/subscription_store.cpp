@@ -6,6 +6,7 @@
 
 #include <unistd.h>
 
+#include <cerrno>
 #include <stdexcept>
 
 namespace cimserver
@@ -17,6 +18,7 @@ using Json = nlohmann::json;
 
 constexpr std::size_t max_file_bytes = std::size_t{64} << 20;
 constexpr int version = 1;
+constexpr int max_depth = 8; // a subscription's reference has its keys at 5
 
 struct List
 {
@@ -101,6 +103,14 @@ Value value_of(const Json& json)
     return {CMPI_ref, std::make_shared<const Object_Path>(std::move(path))};
 }
 
+// Readers of values call themselves.
+bool refuse_deep(int depth, Json::parse_event_t, const Json&)
+{
+    if (depth > max_depth)
+        throw std::runtime_error("it is nested too deeply");
+    return true;
+}
+
 Stored_Instances instances_of(const Json& json)
 {
     if (json.at("version") != version)
@@ -131,12 +141,12 @@ Subscription_Store::Subscription_Store(const std::string& folder)
 
 Stored_Instances Subscription_Store::load() const
 {
-    if (access(_file.c_str(), F_OK) != 0)
+    if (access(_file.c_str(), F_OK) != 0 && errno == ENOENT)
         return {};
     const std::string text = read_private_file(_file, max_file_bytes);
     try
     {
-        return instances_of(Json::parse(text));
+        return instances_of(Json::parse(text, refuse_deep));
     }
     catch (const std::exception& error)
     {

@@ -209,6 +209,8 @@ Instance Interop_Operations::typed(const Class_Entry& entry, Instance instance, 
 std::vector<Instance> Interop_Operations::exec_query(const std::string& asked, const std::string& query,
                                                      const std::string& language)
 {
+    if (const Class_Entry* own = _own.find(class_of_query(query)))
+        throw Cim_Error(CIM_ERR_NOT_SUPPORTED, std::string("the server answers no queries of class ") + own->meta_class->name);
     return _module_part.exec_query(asked, query, language);
 }
 

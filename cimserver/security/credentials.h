@@ -9,6 +9,7 @@
 // it cannot be read or is damaged nobody is let in, and standard error tells why.
 #pragma once
 
+#include "cimserver/security/basic_login.h"
 #include "cimserver/security/user_file.h"
 
 #include <sys/stat.h>
@@ -20,12 +21,6 @@
 
 namespace cimserver
 {
-
-struct Login
-{
-    std::string name;
-    std::string password;
-};
 
 // Safe to use from several threads at once.
 class Credentials

@@ -117,6 +117,13 @@ def test_errors(tst, call, code):
     assert caught.value.status_description
 
 
+def test_what_does_not_exist_has_no_associations(mixed):
+    for class_name in ("ZEMLAR_FCPort", "CIM_LogicalDevice"):
+        port = mixed.pywbem.EnumerateInstanceNames("ZEMLAR_FCPort")[0]
+        port.classname, port["DeviceID"] = class_name, "none"
+        assert mixed.pywbem.AssociatorNames(port) == []
+
+
 def test_wbemcli_walks_the_same_way(tst):
     red = "TST_Box.Name=red"
     assert len(tst.wbemcli.run("ain", red)) == 3

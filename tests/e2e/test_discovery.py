@@ -77,6 +77,7 @@ def test_superclasses_enumerate_both_parts(interop):
         (lambda c: c.GetInstance(CIMInstanceName("CIM_Namespace", {"Name": "root/zemlar"})), 4),
         (lambda c: c.ModifyInstance(CIMInstance("CIM_Namespace", path=c.EnumerateInstanceNames("CIM_Namespace")[0])), 7),
         (lambda c: c.InvokeMethod("Explode", "CIM_ObjectManager"), 17),
+        (lambda c: c.ExecQuery("WQL", "SELECT * FROM CIM_Namespace"), 7),
         (lambda c: c.AssociatorNames(c.EnumerateInstanceNames("CIM_Namespace")[0], AssocClass="CIM_Nothing"), 4),
     ],
 )

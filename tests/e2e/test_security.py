@@ -64,6 +64,7 @@ def test_only_users_are_served(start, users):
     assert refusal.startswith("HTTP/1.1 401 ")
     assert 'WWW-Authenticate: Basic realm="' in refusal
     for authorization, expected in [
+        (basic('a\n"b', "wrong"), 401),
         (basic("admin", "wrong"), 401),
         (basic("nobody", PASSWORD), 401),
         (basic("admin", PASSWORD[:-1]), 401),
@@ -74,7 +75,9 @@ def test_only_users_are_served(start, users):
         ("Basic", 401),
         ("Bearer " + basic("admin", PASSWORD)[6:], 401),
         (basic("admin", "x" * 20000), 401),
+        (basic("admin", PASSWORD + "\0"), 401),
         (basic("admin", PASSWORD), 200),
+        (basic("admin", PASSWORD).replace("Basic ", "bASIC  "), 200),
     ]:
         assert status(server.port, authorization) == expected, authorization
         assert status(server.port, authorization) == expected, "again, with what is remembered"
@@ -86,6 +89,10 @@ def test_only_users_are_served(start, users):
         pywbem.WBEMConnection(server.url, ("admin", "wrong"), default_namespace="root/zemlar").EnumerateClassNames()
     with pytest.raises(WbemcliError):
         Wbemcli(server.port).enumerate_instance_names("ZEMLAR_FCPort")
+    assert server.stop() == 0
+    told = [line for line in server.lines if "refused the login" in line]
+    assert told[0] == 'zmlr-cimserver: refused the login of "a\\x0A\\x22b" from 127.0.0.1'
+    assert len(told) == 10, "more are counted, not told"
 
 
 def test_a_name_that_does_not_exist_takes_as_long_as_a_wrong_password(start, users):
