@@ -169,7 +169,9 @@ Object_Path Interop_Operations::create_instance(const Instance& instance)
     const Class_Entry* own = _own.find(instance.path.class_name);
     if (!own)
         return _module_part.create_instance(instance);
-    Object_Path path = changing(*own).create(typed(*own, instance, CIM_ERR_INVALID_PARAMETER));
+    Instance asked = instance;
+    asked.path.name_space = name_space;
+    Object_Path path = changing(*own).create(typed_instance(_own, *own, asked, CIM_ERR_INVALID_PARAMETER));
     path.name_space = name_space;
     return path;
 }
@@ -178,18 +180,8 @@ void Interop_Operations::modify_instance(const Instance& instance, const Propert
 {
     if (!is_own(instance.path.class_name))
         return _module_part.modify_instance(instance, properties);
-    Found found = find_own(*_own.find(instance.path.class_name), instance.path);
-    const Instance changes = typed(found.entry, {found.path, instance.properties}, CIM_ERR_NO_SUCH_PROPERTY);
-    std::vector<std::string> names;
-    if (properties)
-        names = *properties;
-    else
-        std::ranges::transform(instance.properties, std::back_inserter(names), &Named_Value::name);
-    for (const std::string& name : names)
-        if (!found.entry.layout->find(name))
-            throw Cim_Error(CIM_ERR_NO_SUCH_PROPERTY,
-                            "class " + std::string(found.entry.meta_class->name) + " has no property " + name);
-    found.server_class.modify(changes, names);
+    const Found found = find_own(*_own.find(instance.path.class_name), instance.path);
+    throw Cim_Error(CIM_ERR_NOT_SUPPORTED, std::string("instances of ") + found.entry.meta_class->name + " cannot be modified");
 }
 
 void Interop_Operations::delete_instance(const Object_Path& path)
@@ -198,12 +190,6 @@ void Interop_Operations::delete_instance(const Object_Path& path)
         return _module_part.delete_instance(path);
     const Found found = find_own(*_own.find(path.class_name), path);
     found.server_class.remove(found.path);
-}
-
-Instance Interop_Operations::typed(const Class_Entry& entry, Instance instance, int unknown_property) const
-{
-    instance.path.name_space = name_space;
-    return typed_instance(_own, entry, instance, unknown_property);
 }
 
 std::vector<Instance> Interop_Operations::exec_query(const std::string& asked, const std::string& query,

@@ -68,7 +68,6 @@ private:
     Server_Class* answering(const Class_Entry& entry) const; // null when nobody does
     Server_Class& changing(const Class_Entry& entry) const;  // CIM_ERR_NOT_SUPPORTED when nobody does
     Found find_own(const Class_Entry& named, const Object_Path& path) const;
-    Instance typed(const Class_Entry& entry, Instance instance, int unknown_property) const;
 
     // The instance as every client sees it: all properties of its class in their order, less those that are not asked for.
     static Instance shown(Instance instance, const Class_Entry& entry, const Property_List& properties,

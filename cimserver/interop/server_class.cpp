@@ -32,7 +32,6 @@ std::optional<Instance> Server_Class::get(const Object_Path& path)
 }
 
 Object_Path Server_Class::create(const Instance&) { refuse(meta_class(), "created"); }
-void Server_Class::modify(const Instance&, const std::vector<std::string>&) { refuse(meta_class(), "modified"); }
 void Server_Class::remove(const Object_Path&) { refuse(meta_class(), "deleted"); }
 
 } // namespace cimserver

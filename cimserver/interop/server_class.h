@@ -28,10 +28,9 @@ public:
     // The instance that the path names; nothing when there is none. Found by enumeration unless a class knows better.
     virtual std::optional<Instance> get(const Object_Path& path);
 
-    // Each of these is CIM_ERR_NOT_SUPPORTED unless a class can do it.
-    virtual Object_Path create(const Instance& instance);                                      // its path may lack keys
-    virtual void modify(const Instance& instance, const std::vector<std::string>& properties); // the path has the keys
-    virtual void remove(const Object_Path& path);                                              // CIM_ERR_NOT_FOUND too
+    // CIM_ERR_NOT_SUPPORTED unless a class can do it. Nothing of the server's can be modified.
+    virtual Object_Path create(const Instance& instance); // its path may lack keys
+    virtual void remove(const Object_Path& path);         // CIM_ERR_NOT_FOUND too
 };
 
 } // namespace cimserver

@@ -2,6 +2,7 @@
 
 import json
 import os
+import socket
 import subprocess
 import sys
 from pathlib import Path
@@ -15,7 +16,18 @@ from tools.simulated_server import ROOT, SimulatedServer  # noqa: E402
 from tools.wbemcli import Wbemcli  # noqa: E402
 
 NAME_SPACE = "root/zemlar"
+REQUEST = (ROOT / "tests/e2e/enumerate_host.xml").read_bytes()
 TST_MODULE = Path(os.environ.get("ZMLR_BUILD_DIR", ROOT / "build/dev")) / "tests/e2e/module/libtst_module.so"
+
+
+def post(port, body=REQUEST, headers="", tls=None):
+    """All that the server says to one request before it closes."""
+    head = f"POST /cimom HTTP/1.1\r\nHost: x\r\n{headers}Connection: close\r\nContent-Length: {len(body)}\r\n\r\n"
+    with socket.create_connection(("127.0.0.1", port), timeout=60) as plain:
+        connection = tls.wrap_socket(plain, server_hostname="127.0.0.1") if tls else plain
+        with connection:
+            connection.sendall(head.encode() + body)
+            return b"".join(iter(lambda: connection.recv(65536), b""))
 
 
 class Host:
@@ -42,6 +54,13 @@ def tst():
     """A server with the tests' own module. Tests clean up what they make."""
     with SimulatedServer("fc-hba", module=TST_MODULE) as server:
         yield Host(server)
+
+
+@pytest.fixture(scope="session")
+def program(mixed):
+    """The server's command line: the program, its module and a free port."""
+    arguments = mixed.server.arguments()
+    return [arguments[0], "--module", arguments[arguments.index("--module") + 1], "--port", "0"]
 
 
 @pytest.fixture(scope="session")

@@ -40,6 +40,7 @@ class Listener:
 
         class Handler(BaseHTTPRequestHandler):
             protocol_version = "HTTP/1.1"
+            wbufsize = -1  # an answer leaves in one piece: no waiting for its acknowledgement
 
             def do_POST(self):
                 listener._take(self)
@@ -54,7 +55,7 @@ class Listener:
             context.load_cert_chain(*identity)
             self._server.socket = context.wrap_socket(self._server.socket, server_side=True)
             self.url = self.url.replace("http:", "https:")
-        threading.Thread(target=self._server.serve_forever, daemon=True).start()
+        threading.Thread(target=self._server.serve_forever, args=[0.02], daemon=True).start()
 
     def _take(self, request):
         self.headers.append(dict(request.headers))
@@ -175,6 +176,45 @@ def test_subscription_manager_and_listener(serve):
         listener.stop()
 
 
+def test_subscriptions_lead_from_filters_to_destinations_and_back(serve):
+    interop = pywbem.WBEMConnection(serve().server.url, default_namespace="root/PG_InterOp")
+
+    def make(class_name, **properties):
+        return interop.CreateInstance(pywbem.CIMInstance(class_name, properties))
+
+    f, g = (make("CIM_IndicationFilter", Name=name, Query=ALL, QueryLanguage="WQL") for name in "fg")
+    d, e = (make("cim_listenerdestinationCIMXML", NAME=name, Destination=f"http://[::1]:1/{name}") for name in "de")
+    subscriptions = [make("CIM_IndicationSubscription", Filter=f, Handler=handler) for handler in (d, e)]
+    make("CIM_IndicationSubscription", Filter=g, Handler=e)
+    for source, filters, found in [
+        (f, {}, [d, e]),
+        (e, {}, [f, g]),
+        (e, {"ResultClass": "CIM_ListenerDestination"}, []),
+        (e, {"ResultClass": "CIM_IndicationFilter", "Role": "handler"}, [f, g]),
+        (e, {"Role": "Filter"}, []),
+        (f, {"ResultRole": "Filter"}, []),
+        (f, {"AssocClass": "CIM_IndicationSubscription"}, [d, e]),
+        (f, {"AssocClass": "CIM_Namespace"}, []),
+    ]:
+        assert [path["Name"] for path in interop.AssociatorNames(source, **filters)] == [path["Name"] for path in found], filters
+        assert [instance["Name"] for instance in interop.Associators(source, **filters)] == [path["Name"] for path in found]
+    assert [len(interop.ReferenceNames(path)) for path in (f, d)] == [2, 1]
+    assert [len(instance) for instance in interop.References(f, PropertyList=["SubscriptionState"])] == [1, 1]
+    d.classname = "CIM_ListenerDestination"
+    assert len(interop.GetInstance(d)) == 13, "found by its superclass, with every property of its own class"
+    assert interop.GetInstance(subscriptions[0])["SubscriptionState"] == 2
+    for code, call in [
+        (4, lambda: make("CIM_ListenerDestinationCIMXML", Name="x", PersistenceType="-1")),
+        (4, lambda: interop.AssociatorNames(f, AssocClass="CIM_Nothing")),
+        (6, lambda: interop.DeleteInstance(pywbem.CIMInstanceName(f.classname, {**f.keybindings, "Name": "x"}, namespace=f.namespace))),
+        (7, lambda: make("CIM_ListenerDestination", Name="x")),
+        (7, lambda: interop.ModifyInstance(pywbem.CIMInstance(f.classname, {"Query": ""}, path=f))),
+    ]:
+        with pytest.raises(pywbem.CIMError) as caught:
+            call()
+        assert caught.value.status_code == code, caught.value
+
+
 def test_the_message_is_what_listeners_read(serve, listen):
     host, listener = serve(), listen()
     Manager(host).subscribe(listener.url, "SELECT Number, Text FROM TST_Alert WHERE Number = 2", "DMTF:CQL")
@@ -206,7 +246,7 @@ def test_the_message_is_what_listeners_read(serve, listen):
     ],
 )
 def test_what_is_not_taken_is_tried_again_in_order(serve, listen, answers, numbers):
-    host, listener = serve("--delivery-timeout", 2), listen(answers)
+    host, listener = serve("--delivery-timeout", 1), listen(answers)
     Manager(host).subscribe(listener.url)
     ring(host, 3)
     wait_until(lambda: len(listener.numbers) == len(numbers))

@@ -36,12 +36,14 @@ def operation(name, *parameters):
 
 CLASS = parameter("ClassName", '<CLASSNAME NAME="TST_Box"/>')
 FLAGS = parameter("DeepInheritance", "<VALUE>TRUE</VALUE>")
+UNNAMED = '<INSTANCENAME CLASSNAME="TST_Box"><KEYVALUE>red</KEYVALUE></INSTANCENAME>'
 LIST = parameter("PropertyList", "<VALUE.ARRAY><VALUE>Name</VALUE></VALUE.ARRAY>")
 
 GOOD = {
     "GetClass": operation("GetClass", CLASS, LIST),
     "EnumerateInstances": operation("EnumerateInstances", CLASS, FLAGS, LIST),
     "GetInstance": operation("GetInstance", parameter("InstanceName", RED), LIST),
+    "GetInstance by an unnamed key": operation("GetInstance", parameter("InstanceName", UNNAMED)),
     "GetInstance by references": operation("GetInstance", parameter("InstanceName", HOLDS)),
     "ModifyInstance": operation(
         "ModifyInstance",

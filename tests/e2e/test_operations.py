@@ -1,7 +1,9 @@
 """What wbemcli and pywbem see of the mixed host through every operation that is served."""
 
-import pywbem
+import re
+
 import pytest
+import pywbem
 
 FC_PORT_KEYS = ["SystemCreationClassName", "SystemName", "CreationClassName", "DeviceID"]
 
@@ -55,6 +57,31 @@ def test_classes(mixed):
     assert association.properties["PartComponent"].reference_class == "ZEMLAR_FCPort"
     printed = [line[1:].rstrip("=") for line in mixed.wbemcli.get_class("ZEMLAR_FCPort") if line.startswith("-")]
     assert printed == list(port.properties)
+
+
+def fixed(name):
+    return f'<QUALIFIER NAME="{name}" TYPE="boolean" OVERRIDABLE="false"><VALUE>true</VALUE></QUALIFIER>'
+
+
+def test_a_class_is_written_for_the_strictest_reader(tst):
+    tst.pywbem.GetClass("tst_labels", IncludeClassOrigin=True)
+    assert re.sub(r'MESSAGE ID="\d+"', 'MESSAGE ID=""', tst.pywbem.last_raw_reply.decode()) == (
+        '<?xml version="1.0" encoding="utf-8"?>\n<CIM CIMVERSION="2.0" DTDVERSION="2.0">'
+        '<MESSAGE ID="" PROTOCOLVERSION="1.0"><SIMPLERSP><IMETHODRESPONSE NAME="GetClass">'
+        f'<IRETURNVALUE><CLASS NAME="TST_Labels" SUPERCLASS="TST_Link">{fixed("Association")}'
+        f'<PROPERTY.REFERENCE NAME="Container" REFERENCECLASS="TST_Box" CLASSORIGIN="TST_Link">{fixed("Key")}'
+        '<QUALIFIER NAME="Override" TYPE="string" TOSUBCLASS="false"><VALUE>Container</VALUE></QUALIFIER></PROPERTY.REFERENCE>'
+        "</CLASS></IRETURNVALUE></IMETHODRESPONSE></SIMPLERSP></MESSAGE></CIM>"
+    )
+    item = tst.pywbem.GetClass("TST_Item", LocalOnly=False)
+    assert (item.properties["Weight"].value, item.properties["Name"].propagated) == (1, True)
+    box = tst.pywbem.GetClass("TST_Box")
+    elements = box.methods["EchoObjects"].parameters["Elements"]
+    assert (elements.type, elements.is_array, elements.reference_class) == ("reference", True, "TST_Element")
+    assert elements.qualifiers["Out"].value is True
+    join = box.methods["Join"]
+    assert join.qualifiers["Static"].value is True
+    assert (join.return_type, join.parameters["Parts"].is_array, list(join.parameters["Parts"].qualifiers)) == ("string", True, ["In"])
 
 
 def test_every_served_class_enumerates(mixed):

