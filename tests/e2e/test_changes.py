@@ -7,7 +7,7 @@ import pywbem
 from pywbem import CIMDateTime, CIMInstance, CIMInstanceName, CIMProperty
 
 # property, type, values that have to come back as they are; None: null
-VALUES = [
+SCALAR_VALUES = [
     ("BooleanValue", "boolean", [True, False, None]),
     ("Uint8Value", "uint8", [0, 255]),
     ("Sint8Value", "sint8", [-128, 127]),
@@ -26,6 +26,8 @@ VALUES = [
         "datetime",
         [CIMDateTime(datetime(2024, 2, 29, 23, 59, 59, 999999)), CIMDateTime(timedelta(days=99999999, seconds=86399)), None],
     ),
+]
+VALUES = SCALAR_VALUES + [
     ("StringValues", "string", [[], ["", " x "], ["<&>"] * 100, None]),
     ("Uint8Values", "uint8", [[], [0, 255], None]),
     ("DatetimeValues", "datetime", [[CIMDateTime(timedelta(0))]]),

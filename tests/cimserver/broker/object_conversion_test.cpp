@@ -1,22 +1,16 @@
 // Instances of a request become instances of their class, or are refused; embedded ones above all.
 #include "cimserver/object_conversion.h"
 
-#include "cimserver/operations.h"
-#include "test_schema.h"
-
-#include <gtest/gtest.h>
+#include "loaded_module.h"
 
 namespace cimserver
 {
 namespace
 {
 
-class Object_Conversion : public ::testing::Test
+class Object_Conversion : public Loaded_Module
 {
 protected:
-    Repository repository{test_registrations()};
-
-    static Value text(const std::string& value) { return {CMPI_string, value}; }
     static std::string element(const std::string& class_name, const std::string& inside)
     {
         return "<INSTANCE CLASSNAME=\"" + class_name + "\">" + inside + "</INSTANCE>";
@@ -29,26 +23,14 @@ protected:
     Instance typed(std::vector<Named_Value> keys, std::vector<Named_Value> properties)
     {
         const Instance given{{"", "root/zemlar", "tst_disk", std::move(keys)}, std::move(properties)};
-        return typed_instance(repository, *repository.find("TST_Disk"), given, CIM_ERR_NO_SUCH_PROPERTY);
+        const Repository& classes = module.repository();
+        return typed_instance(classes, *classes.find("TST_Disk"), given, CIM_ERR_NO_SUCH_PROPERTY);
     }
 
     Instance embedded(const std::string& xml)
     {
         const Instance disk = typed({}, {{"detail", text(xml)}});
         return *std::get<std::shared_ptr<const Instance>>(disk.properties.at(0).value.content);
-    }
-
-    template <class Body> int error_of(Body body)
-    {
-        try
-        {
-            body();
-        }
-        catch (const Cim_Error& error)
-        {
-            return error.code();
-        }
-        return 0;
     }
 };
 

@@ -18,67 +18,66 @@ using testing::ElementsAre;
 class Recorder : public Operations, public Indication_Sink
 {
 public:
-    const zmlr::Meta_Class* get_class(const std::string&, const std::string&) override { return nullptr; }
-    std::vector<const zmlr::Meta_Class*> enumerate_classes(const std::string&, const std::string&, bool) override { return {}; }
-    std::vector<Object_Path> enumerate_instance_names(const std::string& ns, const std::string& class_name) override
+    using Text = const std::string&;
+    using List = const Property_List&;
+    using Filter = const Association_Filter&;
+    using Names = std::vector<Object_Path>;
+    using Instances = std::vector<Instance>;
+
+    const zmlr::Meta_Class* get_class(Text, Text) override { return nullptr; }
+    std::vector<const zmlr::Meta_Class*> enumerate_classes(Text, Text, bool) override { return {}; }
+    Names enumerate_instance_names(Text ns, Text name) override { return answer<Names>("names " + ns + ":" + name); }
+    Instances enumerate_instances(Text ns, Text name, bool, List list) override
     {
-        return answer<Object_Path>("names " + ns + ":" + class_name);
+        return answer<Instances>("instances " + ns + ":" + name + text_of(list));
     }
-    std::vector<Instance> enumerate_instances(const std::string& ns, const std::string& class_name, bool,
-                                              const Property_List& properties) override
+    Instance get_instance(const Object_Path&, List) override { return {}; }
+    Instances exec_query(Text ns, Text query, Text language) override
     {
-        return answer<Instance>("instances " + ns + ":" + class_name + text_of(properties));
+        return answer<Instances>(language + " " + ns + " " + query);
     }
-    Instance get_instance(const Object_Path& path, const Property_List& properties) override
+    Instances associators(const Object_Path& path, Filter f, List list) override
     {
-        return answer<Instance>("get " + path.class_name + text_of(properties)).at(0);
+        return answer<Instances>("associators " + path.class_name + text_of(f) + text_of(list));
     }
-    std::vector<Instance> exec_query(const std::string& ns, const std::string& query, const std::string& language) override
+    Names associator_names(const Object_Path& path, Filter f) override
     {
-        return answer<Instance>(language + " " + ns + " " + query);
+        return answer<Names>("associator names " + path.class_name + text_of(f));
     }
-    std::vector<Instance> associators(const Object_Path& path, const Association_Filter& f, const Property_List& list) override
+    Instances references(const Object_Path& path, Filter f, List list) override
     {
-        return answer<Instance>("associators " + path.class_name + text_of(f) + text_of(list));
+        return answer<Instances>("references " + path.class_name + text_of(f) + text_of(list));
     }
-    std::vector<Object_Path> associator_names(const Object_Path& path, const Association_Filter& f) override
+    Names reference_names(const Object_Path& path, Filter f) override
     {
-        return answer<Object_Path>("associator names " + path.class_name + text_of(f));
+        return answer<Names>("reference names " + path.class_name + text_of(f));
     }
-    std::vector<Instance> references(const Object_Path& path, const Association_Filter& f, const Property_List& list) override
+    void deliver(Text ns, const Instance& indication) override
     {
-        return answer<Instance>("references " + path.class_name + text_of(f) + text_of(list));
-    }
-    std::vector<Object_Path> reference_names(const Object_Path& path, const Association_Filter& f) override
-    {
-        return answer<Object_Path>("reference names " + path.class_name + text_of(f));
-    }
-    void deliver(const std::string& ns, const Instance& indication) override
-    {
-        answer<Instance>("deliver " + ns + " " + indication.path.class_name);
+        answer<Instances>("deliver " + ns + " " + indication.path.class_name);
     }
 
     std::vector<std::string> calls;
     bool fails = false;
 
 private:
-    static std::string text_of(const Association_Filter& f)
+    static std::string text_of(Filter f)
     {
         return " " + f.association_class + "/" + f.result_class + "/" + f.role + "/" + f.result_role;
     }
-    static std::string text_of(const Property_List& list)
+    static std::string text_of(List list)
     {
         std::string text;
-        for (const std::string& name : list.value_or(std::vector<std::string>()))
+        for (Text name : list.value_or(std::vector<std::string>()))
             text += " " + name;
         return text;
     }
-    template <class T> std::vector<T> answer(const std::string& call)
+    template <class Answer> Answer answer(Text call)
     {
         calls.push_back(call);
         if (fails)
             throw Cim_Error(CIM_ERR_ACCESS_DENIED, "no");
-        return std::vector<T>(2);
+        return Answer(2);
     }
 };
 

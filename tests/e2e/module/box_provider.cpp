@@ -52,11 +52,11 @@ public:
                                      Property<sint8>& Sint8Value, Property<uint16>& Uint16Value, Property<sint16>& Sint16Value,
                                      Property<uint32>& Uint32Value, Property<sint32>& Sint32Value, Property<uint64>& Uint64Value,
                                      Property<sint64>& Sint64Value, Property<real32>& Real32Value, Property<real64>& Real64Value,
-                                     Property<char16>& Char16Value, Property<String>& StringValue,
-                                     Property<Datetime>& DatetimeValue, Property<uint32>& return_value) override
+                                     Property<char16>& Char16Value, Property<String>& Caption, Property<Datetime>& DatetimeValue,
+                                     Property<uint32>& return_value) override
     {
         return_value.set(non_nulls(BooleanValue, Uint8Value, Sint8Value, Uint16Value, Sint16Value, Uint32Value, Sint32Value,
-                                   Uint64Value, Sint64Value, Real32Value, Real64Value, Char16Value, StringValue, DatetimeValue));
+                                   Uint64Value, Sint64Value, Real32Value, Real64Value, Char16Value, Caption, DatetimeValue));
         return INVOKE_METHOD_OK;
     }
 

@@ -3,7 +3,7 @@
 #include "providers/TST_Labels_Provider_Skeleton.h"
 #include "schema/TST_Element.h"
 
-#include <cstring>
+#include <utility>
 
 namespace zmlr
 {
@@ -30,54 +30,20 @@ public:
     }
 };
 
-// The red box is labelled with its bolt and with the blue box. Answers associators itself.
+// The red box is labelled with its bolt and with the blue box.
 class TST_Labels_Provider final : public TST_Labels_Provider_Skeleton
 {
 public:
     Enum_Instances_Status enum_instances(const Class*, Enum_Instances_Handler<Class>& handler) override
     {
-        for (TST_Element* content : {element(make_item("bolt")), element(make_box("blue"))})
+        for (Instance* content : {static_cast<Instance*>(make_item("bolt")), static_cast<Instance*>(make_box("blue"))})
         {
             Class* labels = Class::create();
             labels->Container = make_box("red");
-            labels->Content = content;
+            labels->Content = static_cast<TST_Element*>(content);
             handler.handle(labels);
         }
         return ENUM_INSTANCES_OK;
-    }
-
-    Enum_Associators_Status enum_associators(const Instance* instance, const String& result_class, const String& role,
-                                             const String& result_role, Enum_Associators_Handler<Instance>& handler) override
-    {
-        struct Search
-        {
-            const Instance* instance;
-            const char* result_class;
-            const char* role;
-            const char* result_role;
-            Enum_Associators_Handler<Instance>& handler;
-        } search{instance, result_class.c_str(), role.c_str(), result_role.c_str(), handler};
-
-        Enum_Instances_Handler<Class> collect(
-            [](Instance* labels, Enum_Instances_Status, void* data)
-            {
-                const Ref<Instance> owned(labels);
-                const auto& s = *static_cast<Search*>(data);
-                const Instance* found[2];
-                const int count = get_associators(s.instance, labels, s.result_class, s.role, s.result_role, found);
-                for (int i = 0; i < count; ++i)
-                    s.handler.handle(clone(found[i]));
-                return true;
-            },
-            &search);
-        enum_instances(nullptr, collect);
-        return ENUM_ASSOCIATORS_OK;
-    }
-
-private:
-    template <class T> static TST_Element* element(T* instance)
-    {
-        return static_cast<TST_Element*>(static_cast<Instance*>(instance));
     }
 };
 
