@@ -30,6 +30,14 @@ def post(port, body=REQUEST, headers="", tls=None):
             return b"".join(iter(lambda: connection.recv(65536), b""))
 
 
+def code_of(call, *arguments):
+    """The CIM status that the call fails with; the description has to say something."""
+    with pytest.raises(pywbem.CIMError) as caught:
+        call(*arguments)
+    assert caught.value.status_description
+    return caught.value.status_code
+
+
 class Host:
     """A simulated host with its server and a client of each kind."""
 
