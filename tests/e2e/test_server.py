@@ -83,6 +83,7 @@ def test_says_what_is_wrong_at_the_start(mixed, program):
         (b"GET / HTTP/1.1\r\nHost: x\r\n\r\n", [b"405", b"Allow: POST"]),
         (b"M-POST / HTTP/1.1\r\nHost: x\r\n\r\n", [b"405"]),
         (b"BREW / HTTP/1.1\r\nHost: x\r\n\r\n", [b"405"]),
+        (HEAD + b"Content-Length: 0\r\n\r\n", [b"400", b"request-not-well-formed"]),
         (HEAD + b"Content-Length: many\r\n\r\n", [b"400"]),
         (HEAD + b"X: " + b"x" * 100_000 + b"\r\n\r\n", [b"431"]),
         (HEAD + b"Content-Length: 104857600\r\n\r\n", [b"413"]),  # answered before any of it is read
@@ -106,21 +107,16 @@ def test_every_request_gets_its_answer(mixed, request_bytes, answers):
 
 
 @pytest.mark.parametrize(
-    "body,expected",
+    "what,instead,code",
     [
-        (b"", b" 400 "),
-        (b"<CIM", b"request-not-well-formed"),
-        (b"\x00\xff\xfe", b" 400 "),
-        (b'<?xml version="1.0"?><HELLO/>', b" 400 "),
-        (b'<?xml version="1.0"?><!DOCTYPE x [<!ENTITY a "b">]><x>&a;</x>', b" 400 "),
-        (REQUEST.replace(b"EnumerateInstanceNames", b"FlyToTheMoon"), b'CODE="7"'),
-        (REQUEST.replace(b'NAME="zemlar"', b'NAME="elsewhere"'), b'CODE="3"'),
-        (REQUEST.replace(b"ZEMLAR_ComputerSystem", b"ZEMLAR_" + b"x" * 1_000_000), b'CODE="5"'),
+        (b"EnumerateInstanceNames", b"FlyToTheMoon", 7),
+        (b'NAME="zemlar"', b'NAME="elsewhere"', 3),
+        (b"ZEMLAR_ComputerSystem", b"ZEMLAR_" + b"x" * 1_000_000, 5),
     ],
-    ids=["empty", "cut", "bytes", "no CIM", "entity", "operation", "name space", "long class"],
+    ids=["operation", "name space", "long class"],
 )
-def test_every_body_gets_a_proper_answer(mixed, body, expected):
-    assert expected in post(mixed.server.port, body)
+def test_what_is_not_there_is_told(mixed, what, instead, code):
+    assert b'<ERROR CODE="%d" DESCRIPTION="' % code in post(mixed.server.port, REQUEST.replace(what, instead))
 
 
 def test_a_body_without_end_is_cut(mixed):
