@@ -2,9 +2,7 @@
 #include "hxal/internal/request.h"
 #include "hxal/internal/text.h"
 
-#include <cerrno>
 #include <cstdio>
-#include <cstring>
 
 namespace
 {
@@ -35,16 +33,7 @@ hxa_status_t hxal_ioc_get_info(const hxal_t* ioc, hxa_ioctl_ioc_info_t* info)
 
 hxa_status_t hxal_ioc_get_attr(const hxal_t* ioc, hxa_ioc_attr_t* attr)
 {
-    if (!ioc || !attr)
-        return HXA_STATUS_EINVAL;
-    auto record = hxal::request_for<hxa_ioctl_ioc_attr_t>(*ioc);
-    if (const hxa_status_t sent = hxal::send(*ioc, "IOCMD_IOC_GET_ATTR", record); sent != HXA_STATUS_OK)
-    {
-        std::printf("IOCTL ERR  IOCMD_IOC_GET_ATTR   %s\n", std::strerror(errno));
-        return sent;
-    }
-    *attr = record.attr;
-    return record.status;
+    return hxal::read_or_tell(ioc, "IOCMD_IOC_GET_ATTR", &hxa_ioctl_ioc_attr_t::attr, attr);
 }
 
 hxa_status_t hxal_ioc_get_stats(const hxal_t* ioc, hxa_ioc_stats_t* stats)

@@ -79,25 +79,20 @@ template <bool plugged> json plug(Json_Object& object)
     return json::object();
 }
 
-json change_port(Json_Object& object)
+// What a request does to a port; `key` has the word that says so.
+json change_port(Json_Object& object, std::string_view key, std::span<const Choice> words,
+                 void (Simulator::*change)(std::size_t adapter, std::size_t port, bool on))
 {
     const auto adapter = required(object, "adapter", max_instances);
     const auto port = required(object, "port", max_instances);
-    const bool up = object.word("link", link_words) != 0;
+    const bool on = object.word(key, words) != 0;
     object.done();
-    simulator().link(adapter, port, up);
+    (simulator().*change)(adapter, port, on);
     return json::object();
 }
 
-json change_sfp(Json_Object& object)
-{
-    const auto adapter = required(object, "adapter", max_instances);
-    const auto port = required(object, "port", max_instances);
-    const bool inserted = object.word("module", sfp_words) != 0;
-    object.done();
-    simulator().sfp(adapter, port, inserted);
-    return json::object();
-}
+json change_link(Json_Object& object) { return change_port(object, "link", link_words, &Simulator::link); }
+json change_sfp(Json_Object& object) { return change_port(object, "module", sfp_words, &Simulator::sfp); }
 
 json inject(Json_Object& object)
 {
@@ -146,7 +141,7 @@ constexpr std::array control_requests{
     Control_Request{"event", raise_event},
     Control_Request{"unplug", plug<false>},
     Control_Request{"plug", plug<true>},
-    Control_Request{"port", change_port},
+    Control_Request{"port", change_link},
     Control_Request{"sfp", change_sfp},
     Control_Request{"fault", inject},
     Control_Request{"clear-faults", clear_faults},

@@ -19,9 +19,14 @@ Flash_Partition* partition_of(const Call& call, hxa_ioctl_flash_t& record)
     return partition;
 }
 
-bool fits(const Flash_Partition& partition, std::int32_t size)
+// The same, which has to hold as many bytes as the sender's buffer.
+Flash_Partition* partition_for_buffer(const Call& call, hxa_ioctl_flash_t& record)
 {
-    return size > 0 && static_cast<std::uint32_t>(size) <= partition.size;
+    auto* partition = partition_of(call, record);
+    if (!partition || (record.bufsz > 0 && static_cast<std::uint32_t>(record.bufsz) <= partition->size))
+        return partition;
+    record.status = HXA_STATUS_FLASH_BAD_LEN;
+    return nullptr;
 }
 
 } // namespace
@@ -53,14 +58,9 @@ void answer_flash_erase(Call& call, hxa_ioctl_flash_t& record)
 
 void answer_flash_update(Call& call, hxa_ioctl_flash_t& record)
 {
-    auto* partition = partition_of(call, record);
+    auto* partition = partition_for_buffer(call, record);
     if (!partition)
         return;
-    if (!fits(*partition, record.bufsz))
-    {
-        record.status = HXA_STATUS_FLASH_BAD_LEN;
-        return;
-    }
     std::vector<std::uint8_t> bytes(static_cast<std::size_t>(record.bufsz));
     if (!copy_from_caller(bytes, address_of(record.buf_ptr)))
         return call.refuse(EFAULT, "bad buffer address");
@@ -69,14 +69,9 @@ void answer_flash_update(Call& call, hxa_ioctl_flash_t& record)
 
 void answer_flash_read(Call& call, hxa_ioctl_flash_t& record)
 {
-    const auto* partition = partition_of(call, record);
+    const auto* partition = partition_for_buffer(call, record);
     if (!partition)
         return;
-    if (!fits(*partition, record.bufsz))
-    {
-        record.status = HXA_STATUS_FLASH_BAD_LEN;
-        return;
-    }
     std::vector<std::uint8_t> bytes(static_cast<std::size_t>(record.bufsz));
     read(*partition, bytes);
     if (!copy_to_caller(address_of(record.buf_ptr), bytes))

@@ -88,6 +88,18 @@ void Host::raise(Ioc& ioc, hxa_aen_entry_t event)
     _event_news = true;
 }
 
+bool is_link_speed(std::uint32_t speed)
+{
+    constexpr std::uint32_t speeds[] = {HXA_PPORT_SPEED_1GBPS, HXA_PPORT_SPEED_2GBPS, HXA_PPORT_SPEED_4GBPS,
+                                        HXA_PPORT_SPEED_8GBPS, HXA_PPORT_SPEED_10GBPS};
+    return std::find(std::begin(speeds), std::end(speeds), speed) != std::end(speeds);
+}
+
+bool can_run_at(const Port& port, std::uint32_t speed)
+{
+    return speed == HXA_PPORT_SPEED_AUTO || (is_link_speed(speed) && speed <= port.speed_supported);
+}
+
 std::uint32_t& own_state(const Ioc& ioc) { return is_fibre_channel(ioc) ? ioc.port->state : ioc.port->eth_state; }
 
 bool is_out_of_service(std::uint32_t state)

@@ -77,6 +77,12 @@ private:
 inline bool is_fibre_channel(const Ioc& ioc) { return ioc.type != HXA_IOC_TYPE_LL; }
 inline const Mac& mac_of(const Ioc& ioc) { return is_fibre_channel(ioc) ? ioc.port->fcoe_mac : ioc.port->mac; }
 
+// Whether a number is the speed of a link (hxa_pport_speed_t), and none that is still to be found.
+bool is_link_speed(std::uint32_t speed);
+
+// Whether the port can be told to run at a speed: one that it has, or the best that there is.
+bool can_run_at(const Port& port, std::uint32_t speed);
+
 // The port's own state on the side of this IOC.
 std::uint32_t& own_state(const Ioc& ioc);
 

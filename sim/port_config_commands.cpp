@@ -1,8 +1,6 @@
 // Requests that configure the physical port. They are for its FC function; the Ethernet driver supports none of them.
 #include "sim/command_table.h"
 
-#include <algorithm>
-
 namespace hxasim
 {
 
@@ -16,14 +14,6 @@ template <typename Record> hxa_pport_cfg_t* configuration_of(Call& call, Record&
         return &call.ioc->port->configuration;
     record.status = HXA_STATUS_CMD_NOTSUPP;
     return nullptr;
-}
-
-bool is_speed(const Port& port, std::uint32_t speed)
-{
-    constexpr std::uint32_t speeds[] = {HXA_PPORT_SPEED_1GBPS, HXA_PPORT_SPEED_2GBPS, HXA_PPORT_SPEED_4GBPS,
-                                        HXA_PPORT_SPEED_8GBPS, HXA_PPORT_SPEED_10GBPS};
-    return speed == HXA_PPORT_SPEED_AUTO ||
-           (speed <= port.speed_supported && std::find(std::begin(speeds), std::end(speeds), speed) != std::end(speeds));
 }
 
 // FC-FS-2: the receive data field size of a port.
@@ -47,7 +37,7 @@ void answer_port_speed(Call& call, hxa_ioctl_port_cfg_speed_t& record)
     auto* configuration = configuration_of(call, record);
     if (!configuration)
         return;
-    if (!is_speed(*call.ioc->port, record.speed))
+    if (!can_run_at(*call.ioc->port, record.speed))
         record.status = HXA_STATUS_UNSUPP_SPEED;
     else
         configuration->speed = static_cast<std::uint8_t>(record.speed);

@@ -108,7 +108,7 @@ void answer_rport_speed(Call& call, hxa_ioctl_rport_set_speed_t& record)
         return;
     if (remote->speed != HXA_PPORT_SPEED_UNKNOWN)
         record.status = HXA_STATUS_RPSC_ENABLED;
-    else if (record.speed > HXA_PPORT_SPEED_10GBPS)
+    else if (record.speed != HXA_PPORT_SPEED_UNKNOWN && !is_link_speed(record.speed))
         record.status = HXA_STATUS_UNSUPP_SPEED;
     else
         remote->assigned_speed = record.speed;

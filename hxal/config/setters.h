@@ -55,7 +55,8 @@ extern "C"
     // 0 to 15; a larger one does nothing.
 
     // The shared secret as it left its encipherment: `n` numbers, stored as decimal text separated by ",", as many as fit
-    // whole into 511 characters. The library never sees the secret in clear. Kept when the text is not empty.
+    // whole into 511 characters. The library never sees the secret in clear. Kept when the text is not empty. Beyond 488
+    // characters its line in the file may be longer than the 511 that hxal_config_load() takes: it would be read back cut.
     void hxal_config_auth_secretstring(const hxal_t* ioc, const uint32_t* words, int n);
 
     // Interrupt moderation. `coalesce` is always stored, `delay` and `latency` (microseconds) only when coalescing is on. The

@@ -3,6 +3,8 @@
 #include "hxal/frame.h"
 
 #include <cerrno>
+#include <cstdio>
+#include <cstring>
 #include <sys/ioctl.h>
 
 hxa_status_t hxal::transfer(const hxal_s& ioc, const Command& command, void* record)
@@ -15,4 +17,9 @@ hxa_status_t hxal::transfer(const hxal_s& ioc, const Command& command, void* rec
     const int result = ::ioctl(ioc.fd, code, record);
     const bool failed = ethernet ? result != 0 : result == -1;
     return failed ? hxal_get_status(errno) : HXA_STATUS_OK;
+}
+
+void hxal::tell_failure(const Command& command)
+{
+    std::printf("IOCTL ERR  %.*s   %s\n", static_cast<int>(command.name.size()), command.name.data(), std::strerror(errno));
 }

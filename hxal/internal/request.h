@@ -43,6 +43,9 @@ inline uint64_t sender_address(const void* buffer) { return reinterpret_cast<uin
 // which is left as the call set it. Waits as long as the driver does.
 hxa_status_t transfer(const hxal_s& ioc, const Command& command, void* record);
 
+// Says on standard output which call failed, and why, as errno has it.
+void tell_failure(const Command& command);
+
 template <typename Record>
 hxa_status_t send(const hxal_s& ioc, Command_Name<std::type_identity_t<Record>> command, Record& record)
 {
@@ -67,6 +70,23 @@ hxa_status_t exchange(const hxal_s& ioc, Command_Name<std::type_identity_t<Recor
         return sent;
     if (output)
         *output = record.*field;
+    return record.status;
+}
+
+// A request that carries nothing but the instance and brings a field. A call that fails is told on standard output.
+template <typename Record, typename Output>
+hxa_status_t read_or_tell(const hxal_t* ioc, Command_Name<std::type_identity_t<Record>> command, Output Record::*field,
+                          Output* output)
+{
+    if (!ioc || !output)
+        return HXA_STATUS_EINVAL;
+    auto record = request_for<Record>(*ioc);
+    if (const hxa_status_t sent = send(*ioc, command, record); sent != HXA_STATUS_OK)
+    {
+        tell_failure(command.row);
+        return sent;
+    }
+    *output = record.*field;
     return record.status;
 }
 

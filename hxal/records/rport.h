@@ -128,7 +128,7 @@ typedef struct
 static_assert(sizeof(hxa_ioctl_rport_stats_t) == 288, "hxa_ioctl_rport_stats_t");
 static_assert(offsetof(hxa_ioctl_rport_stats_t, stats) == 24, "hxa_ioctl_rport_stats_t");
 
-// IOCMD_RPORT_ADD and IOCMD_RPORT_REMOVE.
+// IOCMD_RPORT_ADD, IOCMD_RPORT_REMOVE and, under a name of its own, IOCMD_RPORT_RESET_STATS.
 typedef struct
 {
     hxa_status_t status; //  0
@@ -139,18 +139,7 @@ typedef struct
 } hxa_ioctl_rport_t;
 static_assert(sizeof(hxa_ioctl_rport_t) == 24, "hxa_ioctl_rport_t");
 static_assert(offsetof(hxa_ioctl_rport_t, rpwwn) == 16, "hxa_ioctl_rport_t");
-
-// IOCMD_RPORT_RESET_STATS.
-typedef struct
-{
-    hxa_status_t status; //  0
-    uint16_t hxad_num;   //  4
-    uint16_t vf_id;      //  6  virtual fabric
-    wwn_t pwwn;          //  8  of the logical port
-    wwn_t rpwwn;         // 16  of the remote port
-} hxa_ioctl_rport_reset_stats_t;
-static_assert(sizeof(hxa_ioctl_rport_reset_stats_t) == 24, "hxa_ioctl_rport_reset_stats_t");
-static_assert(offsetof(hxa_ioctl_rport_reset_stats_t, rpwwn) == 16, "hxa_ioctl_rport_reset_stats_t");
+typedef hxa_ioctl_rport_t hxa_ioctl_rport_reset_stats_t;
 
 // IOCMD_RPORT_GET_SCSI_ADDR: where the operating system shows the remote target.
 typedef struct

@@ -4,12 +4,14 @@
 #include <fcntl.h>
 #include <sys/resource.h>
 #include <sys/select.h>
+#include <sys/wait.h>
 #include <unistd.h>
 
 #include <algorithm>
 #include <atomic>
 #include <cerrno>
 #include <chrono>
+#include <cstdlib>
 #include <filesystem>
 #include <thread>
 
@@ -180,6 +182,55 @@ TEST_F(Aen_Thread, can_be_stopped_and_kept_by_a_callback)
     EXPECT_THAT(heard.take(1), ElementsAre("it 2"));
     raise(0, 3);
     EXPECT_THAT(heard.take(1), ElementsAre("it 3"));
+}
+
+TEST_F(Aen_Thread, loses_no_event_when_callbacks_and_others_stop_and_start_it_at_once)
+{
+    Listener listener(heard, "it");
+    listen_ioc(listener, fc);
+    listener.then = []
+    {
+        hxal_aen_exit();
+        hxal_aen_init(); // fails while the other side waits for this thread's end
+    };
+    const auto before = threads();
+    std::vector<std::string> expected;
+    for (uint32_t round = 0; round < 500; ++round)
+    {
+        expected.push_back("it " + std::to_string(round));
+        raise(0, round);
+        EXPECT_EQ(hxal_aen_init(), HXA_STATUS_OK);
+    }
+    EXPECT_EQ(heard.take(expected.size()), expected);
+    hxal_aen_exit();
+    EXPECT_TRUE(settles_at(before));
+}
+
+TEST_F(Aen_Thread, does_not_hold_up_the_end_of_the_process)
+{
+    for (const bool in_callback : {false, true})
+    {
+        std::fflush(nullptr);
+        const pid_t child = fork();
+        if (child == 0)
+        {
+            alarm(60);
+            scan();
+            Listener listener(heard, "it");
+            listen_ioc(listener, fc);
+            hxasim::inject({.command = "IOCMD_AEN_GET", .answer = {{4, {64, 0, 0, 0}}}}); // never ends
+            raise(0, 1);
+            if (in_callback)
+                listener.then = [] { std::exit(0); };
+            hxal_aen_init();
+            while (in_callback || hxasim::request_count() < 100)
+                std::this_thread::yield();
+            std::exit(0);
+        }
+        int status = -1;
+        EXPECT_EQ(waitpid(child, &status, 0), child);
+        EXPECT_EQ(status, 0) << in_callback;
+    }
 }
 
 TEST_F(Aen_Thread, allows_registrations_to_change_while_it_dispatches)

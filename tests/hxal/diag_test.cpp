@@ -118,6 +118,7 @@ TEST_F(Diagnostics, send_frames_around_a_disabled_port)
         {R"("state": "disabled")",                           external, 10, HXA_STATUS_OK,                HXA_STATUS_OK},
         {R"("state": "disabled")",                           cable,    15, HXA_STATUS_OK,                HXA_STATUS_OK},
         {R"("state": "disabled", "speed_supported": 8)",     cable,    10, HXA_STATUS_UNSUPP_SPEED,      HXA_STATUS_OK},
+        {R"("state": "disabled")",                           cable,     9, HXA_STATUS_UNSUPP_SPEED,      HXA_STATUS_OK},
         {R"("state": "disabled", "sfp": {"present": false})", internal, 1, HXA_STATUS_OK,                HXA_STATUS_CMD_NOTSUPP},
         {R"("state": "disabled", "sfp": {"present": false})", cable,    1, HXA_STATUS_NO_SFP_DEV,        HXA_STATUS_NO_SFP_DEV},
         {R"("state": "disabled", "loopback_test": true)",    external,  1, HXA_STATUS_DIAG_BUSY,         HXA_STATUS_DIAG_BUSY},

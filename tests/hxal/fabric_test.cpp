@@ -166,6 +166,8 @@ TEST_F(Fabric, tells_where_a_target_is_and_takes_its_speed)
     EXPECT_EQ(hxal_rport_get_scsi_address(ioc, 0, base, initiator, &host, &bus, &target), HXA_STATUS_NO_FCPIM_NEXUS);
 
     EXPECT_EQ(hxal_rport_set_speed(ioc, 0, base, disks, HXA_PPORT_SPEED_2GBPS), HXA_STATUS_OK);
+    for (const int no_speed : {3, 9, 15})
+        EXPECT_EQ(hxal_rport_set_speed(ioc, 0, base, disks, static_cast<hxa_pport_speed_t>(no_speed)), HXA_STATUS_UNSUPP_SPEED);
     EXPECT_EQ(remote_port(disks).assigned_speed, 2u);
     EXPECT_EQ(hxal_rport_set_speed(ioc, 0, base, initiator, HXA_PPORT_SPEED_2GBPS), HXA_STATUS_RPSC_ENABLED);
 }
