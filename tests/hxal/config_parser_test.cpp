@@ -75,7 +75,8 @@ TEST_F(Config_Parser, stores_every_setting_of_an_instance)
 TEST_F(Config_Parser, stores_values_as_numbers)
 {
     parse({"hxa3-port-trunk = 0, 1", "hxa3-port-topology = auto", "hxa3-log-level = Info", "hxa3-auth-algo = ms",
-           "hxa3-auth-secretsource = RADIUS", "hxa3-port-hardalpa = 0x1f"});
+           "hxa3-auth-secretsource = RADIUS", "hxa3-port-hardalpa = 0x1f", "hxa3-qos = TRUE", "hxa3-qos = maybe"});
+    EXPECT_FALSE(has(ioc(3).flags, HXAL_CONFIG_QOS)) << "a later word that is none";
     EXPECT_EQ(ioc(3).trunking, 3u);
     EXPECT_EQ(ioc(3).topology, uint32_t{HXA_PPORT_TOPOLOGY_AUTO});
     EXPECT_EQ(ioc(3).log, HXA_LOG_INFO);
@@ -84,39 +85,14 @@ TEST_F(Config_Parser, stores_values_as_numbers)
     EXPECT_EQ(ioc(3).alpa, 31);
 }
 
-TEST_F(Config_Parser, forgets_a_setting_whose_later_word_is_none)
-{
-    parse({"hxa3-qos = TRUE", "hxa3-qos = maybe"});
-    EXPECT_FALSE(has(ioc(3).flags, HXAL_CONFIG_QOS));
-}
-
 TEST_F(Config_Parser, ignores_what_does_not_fit)
 {
-    for (const char* line : {"",
-                             " ",
-                             "=",
-                             "-",
-                             "hxa",
-                             "hxa-",
-                             "hxa3-port-speed",
-                             "hxa3-=8",
-                             "hxa3-port-speeds = 8",
-                             "hxa128-port-speed = 8",
-                             "hxa200-port-name = x;",
-                             "hxa2147483648-port-speed = 8",
-                             "hxa4294967296-port-speed = 8",
-                             "hxn3-port-speed = 8",
-                             "hxn3-vport-1 = a,b,c,d,1",
-                             "hxa3-port-mac = 00:05",
-                             "port-mac = 00:05",
-                             "port-name = x",
-                             "vport-1 = a,b,c,d,1",
-                             "adapter-SN1",
-                             "adapter = x",
-                             "name = x",
-                             "num-ioses = 5"})
-        hxal_config_parse(line);
-    hxal_config_parse(nullptr);
+    // clang-format off
+    parse({"", " ", "=", "-", "hxa", "hxa-", "hxa3-port-speed", "hxa3-=8", "hxa3-port-speeds = 8", "hxa128-port-speed = 8",
+           "hxa200-port-name = x;", "hxa2147483648-port-speed = 8", "hxa4294967296-port-speed = 8", "hxn3-port-speed = 8",
+           "hxn3-vport-1 = a,b,c,d,1", "hxa3-port-mac = 00:05", "port-mac = 00:05", "port-name = x", "vport-1 = a,b,c,d,1",
+           "adapter-SN1", "adapter = x", "name = x", "num-ioses = 5", nullptr});
+    // clang-format on
     EXPECT_THAT(settings(), IsEmpty());
     EXPECT_EQ(hxal_config_ad_get_num() + hxal_config_ioc_get_num(), 0);
 }
@@ -176,18 +152,6 @@ TEST_F(Config_Parser, reads_the_tuning_numbers)
 {
     const std::pair<const char*, int hxal_config_tuning_t::*> rows[] = {
         {"msix-disable", &hxal_config_tuning_t::msix_disable},
-        {"num-rports", &hxal_config_tuning_t::num_rports},
-        {"num-ios", &hxal_config_tuning_t::num_ios},
-        {"num-tms", &hxal_config_tuning_t::num_tms},
-        {"num-fcxps", &hxal_config_tuning_t::num_fcxps},
-        {"num-ufbufs", &hxal_config_tuning_t::num_ufbufs},
-        {"reqq-size", &hxal_config_tuning_t::reqq_size},
-        {"rspq-size", &hxal_config_tuning_t::rspq_size},
-        {"num-sgpgs", &hxal_config_tuning_t::num_sgpgs},
-        {"ioc-auto-recover", &hxal_config_tuning_t::ioc_auto_recover},
-        {"ipfc-disable", &hxal_config_tuning_t::ipfc_disable},
-        {"rport-del-timeout", &hxal_config_tuning_t::rport_del_timeout},
-        {"dma-relaxed-ordering", &hxal_config_tuning_t::dma_relaxed_ordering},
         {"pcie-max-read-reqsz", &hxal_config_tuning_t::pcie_max_read_reqsz},
     };
     int value = 10;

@@ -52,67 +52,64 @@ protected:
 
 using Set = std::function<void(const hxal_t*)>;
 
+template <typename... Values> Set with(void (*setter)(const hxal_t*, Values...), std::type_identity_t<Values>... values)
+{
+    return [=](const hxal_t* ioc) { setter(ioc, values...); };
+}
+
 TEST_F(Config_Setters, keep_a_value_that_is_no_default)
 {
     struct Row
     {
         Set set;
-        const char* line; // null: nothing is kept
+        const char* line;
+        std::vector<Set> defaults; // that keep nothing
     };
     const auto yes = HXA_TRUE, no = HXA_FALSE;
+    const auto dh768 = HXA_AUTH_GROUP_DH768;
+    const auto no_algorithm = hxa_auth_algo_t{};
+    // clang-format off
     const Row rows[] = {
-        {[](auto ioc) { hxal_config_ioc_name(ioc, "uplink"); }, "hxa1-port-name = \"uplink\";"},
-        {[](auto ioc) { hxal_config_ioc_name(ioc, ""); }, nullptr},
-        {[](auto ioc) { hxal_config_log_level(ioc, 4); }, "hxa1-log-level = \"Info\";"},
-        {[](auto ioc) { hxal_config_log_level(ioc, 0); }, nullptr},
-        {[](auto ioc) { hxal_config_log_level(ioc, 9); }, nullptr},
-        {[=](auto ioc) { hxal_config_pbind(ioc, yes); }, "hxa1-persistent-binding = \"TRUE\";"},
-        {[=](auto ioc) { hxal_config_pbind(ioc, no); }, nullptr},
-        {[=](auto ioc) { hxal_config_qos(ioc, yes); }, "hxa1-qos = \"TRUE\";"},
-        {[=](auto ioc) { hxal_config_qos(ioc, no); }, nullptr},
-        {[=](auto ioc) { hxal_config_ratelim(ioc, yes); }, "hxa1-ratelim = \"TRUE\";"},
-        {[=](auto ioc) { hxal_config_ratelim(ioc, no); }, nullptr},
-        {[](auto ioc) { hxal_config_defspeed(ioc, HXA_PPORT_SPEED_4GBPS); }, "hxa1-ratelim-defspeed = 4;"},
-        {[](auto ioc) { hxal_config_defspeed(ioc, HXA_PPORT_SPEED_AUTO); }, "hxa1-ratelim-defspeed = 0;"},
-        {[](auto ioc) { hxal_config_defspeed(ioc, HXA_PPORT_SPEED_1GBPS); }, nullptr},
-        {[=](auto ioc) { hxal_config_vf_mode(ioc, 1, yes); }, "hxa1-vf-enable = \"TRUE\""},
-        {[=](auto ioc) { hxal_config_vf_mode(ioc, 0, no); }, "hxa1-vf-default = 0;"},
-        {[=](auto ioc) { hxal_config_vf_mode(ioc, 1, no); }, nullptr},
-        {[=](auto ioc) { hxal_config_vf_list(ioc, 15, yes); }, "hxa1-vf-list = 15;"},
-        {[=](auto ioc) { hxal_config_vf_list(ioc, 16, yes); }, nullptr},
-        {[=](auto ioc) { hxal_config_vf_list(ioc, 0, no); }, nullptr},
-        {[](auto ioc) { hxal_config_topology(ioc, HXA_PPORT_TOPOLOGY_LOOP); }, "hxa1-port-topology = \"loop\";"},
-        {[](auto ioc) { hxal_config_topology(ioc, HXA_PPORT_TOPOLOGY_NONE); }, nullptr},
-        {[](auto ioc) { hxal_config_speed(ioc, HXA_PPORT_SPEED_8GBPS); }, "hxa1-port-speed = 8;"},
-        {[](auto ioc) { hxal_config_speed(ioc, HXA_PPORT_SPEED_AUTO); }, nullptr},
-        {[=](auto ioc) { hxal_config_alpa(ioc, 0xEF, yes); }, "hxa1-port-hardalpa = 0xef;"},
-        {[=](auto ioc) { hxal_config_alpa(ioc, 0xEF, no); }, nullptr},
-        {[](auto ioc) { hxal_config_maxfrsz(ioc, 2048); }, "hxa1-port-maxfrsize = 2048;"},
-        {[](auto ioc) { hxal_config_maxfrsz(ioc, 2112); }, nullptr},
-        {[=](auto ioc) { hxal_config_enable(ioc, no); }, "hxa1-port-enable = \"FALSE\";"},
-        {[=](auto ioc) { hxal_config_enable(ioc, yes); }, nullptr},
-        {[=](auto ioc) { hxal_config_ipfc_enable(ioc, no); }, "hxa1-ipfc-enable = \"FALSE\";"},
-        {[=](auto ioc) { hxal_config_ipfc_enable(ioc, yes); }, nullptr},
-        {[=](auto ioc) { hxal_config_trunk(ioc, 5, yes); }, "hxa1-port-trunk = 0, 2;"},
-        {[=](auto ioc) { hxal_config_trunk(ioc, 5, no); }, nullptr},
-        {[](auto ioc) { hxal_config_fcpim(ioc, 30); }, "hxa1-pathtov = 30;"},
-        {[](auto ioc) { hxal_config_fcpim(ioc, 0); }, nullptr},
-        {[](auto ioc) { hxal_config_qdepth(ioc, 32); }, "hxa1-qdepth = 32;"},
-        {[](auto ioc) { hxal_config_qdepth(ioc, 0); }, nullptr},
-        {[=](auto ioc) { hxal_config_auth_policy(ioc, yes); }, "hxa1-auth-policy = \"on\";"},
-        {[=](auto ioc) { hxal_config_auth_policy(ioc, no); }, nullptr},
-        {[](auto ioc) { hxal_config_auth_algo(ioc, HXA_AUTH_ALGO_SM); }, "hxa1-auth-algo = \"sm\";"},
-        {[](auto ioc) { hxal_config_auth_algo(ioc, hxa_auth_algo_t{}); }, nullptr},
-        {[](auto ioc) { hxal_config_auth_group(ioc, HXA_AUTH_GROUP_ALL); }, "hxa1-auth-group = 256;"},
-        {[](auto ioc) { hxal_config_auth_group(ioc, HXA_AUTH_GROUP_DH768); }, nullptr},
-        {[](auto ioc) { hxal_config_auth_secretsource(ioc, HXA_AUTH_SECSRC_TACACS); }, "hxa1-auth-secretsource = \"TACACS\";"},
-        {[](auto ioc) { hxal_config_auth_secretsource(ioc, HXA_AUTH_SECSRC_LOCAL); }, nullptr},
+        {with(hxal_config_ioc_name, "uplink"), "hxa1-port-name = \"uplink\";", {with(hxal_config_ioc_name, "")}},
+        {with(hxal_config_log_level, 4), "hxa1-log-level = \"Info\";",
+         {with(hxal_config_log_level, 0), with(hxal_config_log_level, 9)}},
+        {with(hxal_config_pbind, yes), "hxa1-persistent-binding = \"TRUE\";", {with(hxal_config_pbind, no)}},
+        {with(hxal_config_qos, yes), "hxa1-qos = \"TRUE\";", {with(hxal_config_qos, no)}},
+        {with(hxal_config_ratelim, yes), "hxa1-ratelim = \"TRUE\";", {with(hxal_config_ratelim, no)}},
+        {with(hxal_config_defspeed, HXA_PPORT_SPEED_4GBPS), "hxa1-ratelim-defspeed = 4;",
+         {with(hxal_config_defspeed, HXA_PPORT_SPEED_1GBPS)}},
+        {with(hxal_config_defspeed, HXA_PPORT_SPEED_AUTO), "hxa1-ratelim-defspeed = 0;", {}},
+        {with(hxal_config_vf_mode, 1, yes), "hxa1-vf-enable = \"TRUE\"", {with(hxal_config_vf_mode, 1, no)}},
+        {with(hxal_config_vf_mode, 0, no), "hxa1-vf-default = 0;", {}},
+        {with(hxal_config_vf_list, 15, yes), "hxa1-vf-list = 15;", {with(hxal_config_vf_list, 15, no)}},
+        {with(hxal_config_topology, HXA_PPORT_TOPOLOGY_LOOP), "hxa1-port-topology = \"loop\";",
+         {with(hxal_config_topology, HXA_PPORT_TOPOLOGY_NONE)}},
+        {with(hxal_config_speed, HXA_PPORT_SPEED_8GBPS), "hxa1-port-speed = 8;",
+         {with(hxal_config_speed, HXA_PPORT_SPEED_AUTO)}},
+        {with(hxal_config_alpa, 0xEF, yes), "hxa1-port-hardalpa = 0xef;", {with(hxal_config_alpa, 0xEF, no)}},
+        {with(hxal_config_maxfrsz, 2048), "hxa1-port-maxfrsize = 2048;", {with(hxal_config_maxfrsz, 2112)}},
+        {with(hxal_config_enable, no), "hxa1-port-enable = \"FALSE\";", {with(hxal_config_enable, yes)}},
+        {with(hxal_config_ipfc_enable, no), "hxa1-ipfc-enable = \"FALSE\";", {with(hxal_config_ipfc_enable, yes)}},
+        {with(hxal_config_trunk, 5, yes), "hxa1-port-trunk = 0, 2;", {with(hxal_config_trunk, 5, no)}},
+        {with(hxal_config_fcpim, 30), "hxa1-pathtov = 30;", {with(hxal_config_fcpim, 0)}},
+        {with(hxal_config_qdepth, 32), "hxa1-qdepth = 32;", {with(hxal_config_qdepth, 0)}},
+        {with(hxal_config_auth_policy, yes), "hxa1-auth-policy = \"on\";", {with(hxal_config_auth_policy, no)}},
+        {with(hxal_config_auth_algo, HXA_AUTH_ALGO_SM), "hxa1-auth-algo = \"sm\";", {with(hxal_config_auth_algo, no_algorithm)}},
+        {with(hxal_config_auth_group, HXA_AUTH_GROUP_ALL), "hxa1-auth-group = 256;", {with(hxal_config_auth_group, dh768)}},
+        {with(hxal_config_auth_secretsource, HXA_AUTH_SECSRC_TACACS), "hxa1-auth-secretsource = \"TACACS\";",
+         {with(hxal_config_auth_secretsource, HXA_AUTH_SECSRC_LOCAL)}},
     };
+    // clang-format on
     for (const Row& row : rows)
     {
         start_anew();
         row.set(&fc[1]);
-        EXPECT_EQ(lines(), row.line ? Lines{row.line} : Lines{}) << &row - rows;
+        EXPECT_EQ(lines(), Lines{row.line});
+        for (const Set& set_default : row.defaults)
+        {
+            set_default(&fc[1]);
+            EXPECT_THAT(lines(), IsEmpty()) << row.line;
+        }
     }
 }
 
@@ -151,33 +148,18 @@ TEST_F(Config_Setters, turn_a_setting_of_all_instances_into_one_of_each)
         Set set;
         Lines lines;
     };
+    const uint32_t same[] = {1, 2}, other[] = {1, 3};
     const Row rows[] = {
-        {"port-speed = 4;", [](auto ioc) { hxal_config_speed(ioc, HXA_PPORT_SPEED_4GBPS); }, {"port-speed = 4;"}},
-        {"port-speed = 4;",
-         [](auto ioc) { hxal_config_speed(ioc, HXA_PPORT_SPEED_8GBPS); },
-         {"hxa0-port-speed = 4;", "hxa1-port-speed = 8;"}},
-        {"port-speed = 4;", [](auto ioc) { hxal_config_speed(ioc, HXA_PPORT_SPEED_AUTO); }, {"hxa0-port-speed = 4;"}},
-        {"qos = \"TRUE\";", [](auto ioc) { hxal_config_qos(ioc, HXA_FALSE); }, {"hxa0-qos = \"TRUE\";"}},
-        {"vf-list = 1, 2;",
-         [](auto ioc) { hxal_config_vf_list(ioc, 2, HXA_FALSE); },
-         {"hxa0-vf-list = 1, 2;", "hxa1-vf-list = 1;"}},
+        {"port-speed = 4;", with(hxal_config_speed, HXA_PPORT_SPEED_4GBPS), {"port-speed = 4;"}},
+        {"port-speed = 4;", with(hxal_config_speed, HXA_PPORT_SPEED_8GBPS), {"hxa0-port-speed = 4;", "hxa1-port-speed = 8;"}},
+        {"port-speed = 4;", with(hxal_config_speed, HXA_PPORT_SPEED_AUTO), {"hxa0-port-speed = 4;"}},
+        {"qos = \"TRUE\";", with(hxal_config_qos, HXA_FALSE), {"hxa0-qos = \"TRUE\";"}},
+        {"vf-list = 1, 2;", with(hxal_config_vf_list, 2, HXA_FALSE), {"hxa0-vf-list = 1, 2;", "hxa1-vf-list = 1;"}},
+        {"auth-encrypt = \"1,2\";", with(hxal_config_auth_secretstring, same, 2), {"auth-encrypt = \"1,2\";"}},
         {"auth-encrypt = \"1,2\";",
-         [](auto ioc)
-         {
-             const uint32_t words[] = {1, 2};
-             hxal_config_auth_secretstring(ioc, words, 2);
-         },
-         {"auth-encrypt = \"1,2\";"}},
-        {"auth-encrypt = \"1,2\";",
-         [](auto ioc)
-         {
-             const uint32_t words[] = {1, 3};
-             hxal_config_auth_secretstring(ioc, words, 2);
-         },
+         with(hxal_config_auth_secretstring, other, 2),
          {"hxa0-auth-encrypt = \"1,2\";", "hxa1-auth-encrypt = \"1,3\";"}},
-        {"delay = 7;",
-         [](auto ioc) { hxal_config_iocfc_intr(ioc, HXA_FALSE, 9, 0); },
-         {"delay = 7;", "hxa1-coalesce = \"off\";"}},
+        {"delay = 7;", with(hxal_config_iocfc_intr, HXA_FALSE, 9, 0), {"delay = 7;", "hxa1-coalesce = \"off\";"}},
     };
     for (const Row& row : rows)
     {
@@ -269,6 +251,7 @@ TEST_F(Config_Setters, do_nothing_without_an_entry)
         if (ioc != &eth[0])
             hxal_config_ioc_name(ioc, "x");
     }
+    hxal_config_vf_list(&fc[0], 16, HXA_TRUE); // the list ends at 15
     hxal_config_vport_add(&fc[0], 1, nullptr);
     hxal_config_ioc_name(&fc[0], nullptr);
     hxal_config_ad_name(1, "x");

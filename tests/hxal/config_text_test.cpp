@@ -58,22 +58,13 @@ TEST(Config_Text, has_key_and_value)
 
 TEST(Config_Text, converts_to_numbers)
 {
+    // clang-format off
     const std::pair<const char*, int> decimals[] = {
-        {"hxa12", 12},
-        {"abc", 0},
-        {"", 0},
-        {nullptr, -1},
-        {"12\n", 12},
-        {"1\n2", 12},
-        {"-5", 5},
-        {"12 ", 0},
-        {"007", 7},
-        {"2147483647", INT_MAX},
-        {"2147483648", INT_MAX},
-        {"99999999999999999999999999", INT_MAX},
+        {"hxa12", 12}, {"abc", 0}, {"", 0}, {nullptr, -1}, {"12\n", 12}, {"1\n2", 12}, {"-5", 5}, {"12 ", 0}, {"007", 7},
+        {"2147483647", INT_MAX}, {"2147483648", INT_MAX}, {"10000000000000000000001", INT_MAX},
         {"00000000000000000000000008", 8},
-        {"10000000000000000000001", INT_MAX},
     };
+    // clang-format on
     for (const auto& [text, value] : decimals)
         EXPECT_EQ(hxal_config_get_num(text), value) << (text ? text : "null");
 

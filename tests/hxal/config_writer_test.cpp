@@ -98,55 +98,47 @@ private:
 
     int below(int end) { return std::uniform_int_distribution(0, end - 1)(random); }
 
+    template <typename Items> const auto& one_of(const Items& items)
+    {
+        return items[static_cast<std::size_t>(below(static_cast<int>(std::size(items))))];
+    }
+
     std::string text(int longest)
     {
         constexpr std::string_view letters = "bcefgijkmoqsuvwyzBCE0123456789_.:"; // no word that tells the kind of a line
         std::string made(static_cast<std::size_t>(1 + below(longest)), ' ');
         for (char& letter : made)
-            letter = letters[static_cast<std::size_t>(below(static_cast<int>(letters.size())))];
+            letter = one_of(letters);
         return made;
     }
 
     std::string wwn() { return "10:00:00:05:1e:10:" + std::to_string(below(10)) + ":" + std::to_string(below(10)); }
-    std::string decimal(int end) { return std::to_string(below(end)); }
-    std::string list(int end) { return below(5) ? decimal(end) + ", " + decimal(end) : ""; }
-    std::string one_of(std::initializer_list<const char*> words) { return words.begin()[below(static_cast<int>(words.size()))]; }
 
     std::string setting()
     {
-        switch (below(14))
+        struct Keys
         {
-        case 0:
-            return "port-speed = " + decimal(20);
-        case 1:
-            return "port-topology = " + one_of({"none", "p2p", "loop", "auto", "ring"});
-        case 2:
-            return "port-hardalpa = 0x" + decimal(100);
-        case 3:
-            return "port-trunk = " + list(32);
-        case 4:
-            return "vf-list = " + list(16);
-        case 5:
-            return one_of({"port-maxfrsize = ", "vf-default = ", "pathtov = ", "qdepth = ", "delay = ", "latency = "}) +
-                   decimal(70000);
-        case 6:
-            return one_of({"port-enable = ", "ipfc-enable = ", "vf-enable = ", "qos = ", "ratelim = ", "persistent-binding = "}) +
-                   one_of({"TRUE", "FALSE", "true"});
-        case 7:
-            return "log-level = " + one_of({"Critical", "Error", "Warning", "Info", "None"});
-        case 8:
-            return one_of({"auth-policy = ", "coalesce = "}) + one_of({"on", "off"});
-        case 9:
-            return "auth-algo = " + one_of({"md5", "sha1", "ms", "sm"});
-        case 10:
-            return one_of({"auth-group = ", "ratelim-defspeed = "}) + decimal(300);
-        case 11:
-            return "auth-secretsource = " + one_of({"LOCAL", "RADIUS", "TACACS"});
-        case 12:
-            return "auth-encrypt = " + decimal(1000) + "," + decimal(1000);
-        default:
-            return "qdepth = 0";
-        }
+            std::vector<const char*> keys;
+            std::vector<const char*> words; // none: a number
+        };
+        // clang-format off
+        static const Keys kinds[] = {
+            {{"port-speed", "port-maxfrsize", "vf-default", "pathtov", "qdepth", "delay", "latency", "auth-group",
+              "ratelim-defspeed"}, {}},
+            {{"port-trunk", "vf-list"}, {"", "0", "1, 15", "7,3"}},
+            {{"port-hardalpa"}, {"0x1f", "EF"}},
+            {{"port-enable", "ipfc-enable", "vf-enable", "qos", "ratelim", "persistent-binding"}, {"TRUE", "FALSE", "true"}},
+            {{"auth-policy", "coalesce"}, {"on", "off"}},
+            {{"port-topology"}, {"none", "p2p", "loop", "auto", "ring"}},
+            {{"log-level"}, {"Critical", "Error", "Warning", "Info", "None"}},
+            {{"auth-algo"}, {"md5", "sha1", "ms", "sm"}},
+            {{"auth-secretsource"}, {"LOCAL", "RADIUS", "TACACS"}},
+            {{"auth-encrypt"}, {"7", "1,22,333"}},
+        };
+        // clang-format on
+        const Keys& kind = one_of(kinds);
+        const std::string key = one_of(kind.keys);
+        return key + " = " + (kind.words.empty() ? std::to_string(below(70000)) : one_of(kind.words));
     }
 
     std::mt19937 random;

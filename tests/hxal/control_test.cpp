@@ -234,25 +234,11 @@ TEST_F(Control, leaves_the_drivers_as_told)
     hxal_adapter_set_name(1, "green");
     EXPECT_EQ(hxal_ioc_set_name(hxal_ioc_open_idx(0), "left"), HXA_STATUS_OK);
     EXPECT_STREQ(hxal_ioc_open_idx(0)->port_name, "left");
-    EXPECT_EQ(hxal_iocfc_intr_set(hxal_ioc_open_idx(0), HXA_FALSE, 7, 9), HXA_STATUS_OK);
     ASSERT_EQ(hxal_adapter_scan(), 1);
     for (int idx : {0, 1, 2, 3})
         EXPECT_STREQ(hxal_ioc_open_idx(idx)->name, "green");
     EXPECT_STREQ(hxal_ioc_open_idx(0)->port_name, "left");
     EXPECT_STREQ(hxal_ioc_open_idx(2)->port_name, "adapter-1-port-0") << "the Ethernet driver was not told";
-
-    hxa_iocfc_attr_t attr{};
-    EXPECT_EQ(hxal_iocfc_get_attr(hxal_ioc_open_idx(0), &attr), HXA_STATUS_OK);
-    EXPECT_EQ(attr.intr_attr.coalesce, 0u);
-    EXPECT_EQ(attr.intr_attr.delay, 7);
-    EXPECT_EQ(attr.intr_attr.latency, 9);
-    hxa_ioc_stats_t stats{};
-    EXPECT_EQ(hxal_ioc_get_stats(hxal_ioc_open_idx(0), &stats), HXA_STATUS_OK);
-    EXPECT_EQ(stats.drv_stats.ioc_boots, 1u);
-    hxal_ioc_reset_stats(hxal_ioc_open_idx(0));
-    hxal_ioc_get_stats(hxal_ioc_open_idx(0), &stats);
-    EXPECT_EQ(stats.drv_stats.ioc_boots, 0u);
-    EXPECT_EQ(stats.fw_stats.stats_reqs, 1u);
 }
 
 TEST_F(Control, begins_with_a_scan_that_lists_each_card_and_ioc_in_the_configuration_once)

@@ -100,17 +100,4 @@ TEST_F(Flash, read_that_fails_leaves_the_buffer_and_the_file_alone)
     EXPECT_EQ(read_to_file("/dev/full", 4), HXA_STATUS_FAILED);
 }
 
-TEST_F(Flash, tells_its_partitions)
-{
-    EXPECT_EQ(hxal_flash_erase_part(ioc, HXA_FLASH_PART_FWCFG, 1), HXA_STATUS_OK);
-    EXPECT_EQ(hxal_flash_erase_part(ioc, HXA_FLASH_PART_FWCFG, 2), HXA_STATUS_EINVAL) << "two ports, two configurations";
-    hxa_flash_attr_t attr;
-    ASSERT_EQ(hxal_flash_get_attr(ioc, &attr), HXA_STATUS_OK);
-    ASSERT_EQ(attr.npart, 8u);
-    EXPECT_EQ(attr.part[3].part_type, HXA_FLASH_PART_FWCFG);
-    EXPECT_EQ(attr.part[3].part_instance, 1u);
-    EXPECT_EQ(attr.part[3].part_status, HXA_FLASH_STATUS_EMPTY);
-    EXPECT_EQ(attr.part[3].part_off, attr.part[2].part_off + attr.part[2].part_size);
-}
-
 } // namespace

@@ -15,10 +15,6 @@ namespace
 
 constexpr std::size_t memory_limit = 64 << 20;
 
-constexpr const std::vector<Operation>& (*tables[])() = {flash_operations,   ioc_operations,   port_operations,  fcoe_operations,
-                                                         ethport_operations, lport_operations, rport_operations, itnim_operations,
-                                                         fcpt_operations,    scsi_operations,  diag_operations};
-
 class Hostile_Driver : public Simulated_Host
 {
 protected:
@@ -87,12 +83,11 @@ protected:
 
     static void use_operations(hxal_t* ioc)
     {
-        for (const auto table : tables)
-            for (const Operation& operation : table())
-            {
-                alignas(std::max_align_t) std::uint8_t output[4096] = {};
-                operation.call(ioc, output);
-            }
+        for (const Operation& operation : operations())
+        {
+            alignas(std::max_align_t) std::uint8_t output[4096] = {};
+            operation.call(ioc, output);
+        }
     }
 
     static void use_adapter(int ad)

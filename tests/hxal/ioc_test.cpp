@@ -45,26 +45,27 @@ TEST_F(Ioc, is_found_by_index_address_name_path_and_instance)
 
 TEST_F(Ioc, is_not_found_by_what_nobody_or_another_kind_has)
 {
-    for (int idx : {-1, 5, INT_MAX})
-        EXPECT_EQ(hxal_ioc_open_idx(idx), nullptr) << idx;
-    EXPECT_EQ(hxal_ioc_open_pwwn(0), nullptr); // the Ethernet IOCs' own
-    EXPECT_EQ(hxal_ioc_open_name("green"), nullptr);
-    EXPECT_EQ(hxal_ioc_open_name("Blue"), nullptr);
-    EXPECT_EQ(hxal_ioc_open_name(nullptr), nullptr);
-    EXPECT_EQ(hxal_ioc_open_hwpath(nullptr), nullptr);
-    EXPECT_EQ(hxal_ioc_get_by_eth_name(nullptr), nullptr);
-    EXPECT_EQ(hxal_ioc_get_by_inst(3), nullptr);
-
-    EXPECT_EQ(hxal_ioc_get_idx_by_pwwn(node_wwn(1, 1)), -1);
-    EXPECT_EQ(hxal_ioc_get_idx_by_mac(mac_t{{1}}), -1);
-    EXPECT_EQ(hxal_ioc_get_idx_by_mac(mac_t{}), -1); // the FC IOC's own
-    EXPECT_EQ(hxal_ioc_get_idx_by_name("r0", HXA_IOC_TYPE_FCoE), -1);
-    EXPECT_EQ(hxal_ioc_get_eth_idx_by_name("r0"), -1);
-    EXPECT_EQ(hxal_ioc_get_fc_idx_by_name(nullptr), -1);
-    EXPECT_EQ(hxal_ioc_get_fc_idx_by_hwpath("0000:02:00.2"), -1);
-    EXPECT_EQ(hxal_ioc_get_eth_idx_by_hwpath(nullptr), -1);
-    EXPECT_EQ(hxal_ioc_get_inst_num_by_pwwn(0), -1);
-    EXPECT_EQ(hxal_ioc_get_inst_num_by_mac(fcoe_mac(1, 0)), -1);
+    const hxal_t* const handles[] = {hxal_ioc_open_idx(-1),
+                                     hxal_ioc_open_idx(5),
+                                     hxal_ioc_open_idx(INT_MAX),
+                                     hxal_ioc_open_name("Blue"),
+                                     hxal_ioc_open_name(nullptr),
+                                     hxal_ioc_open_hwpath(nullptr),
+                                     hxal_ioc_get_by_inst(3),
+                                     hxal_ioc_open_pwwn(0), // the Ethernet IOCs' own
+                                     hxal_ioc_get_by_eth_name(nullptr)};
+    EXPECT_THAT(handles, testing::Each(nullptr));
+    const int numbers[] = {hxal_ioc_get_idx_by_pwwn(node_wwn(1, 1)),
+                           hxal_ioc_get_idx_by_mac(mac_t{{1}}),
+                           hxal_ioc_get_idx_by_mac(mac_t{}), // the FC IOC's own
+                           hxal_ioc_get_idx_by_name("r0", HXA_IOC_TYPE_FCoE),
+                           hxal_ioc_get_eth_idx_by_name("r0"),
+                           hxal_ioc_get_fc_idx_by_name(nullptr),
+                           hxal_ioc_get_fc_idx_by_hwpath("0000:02:00.2"),
+                           hxal_ioc_get_eth_idx_by_hwpath(nullptr),
+                           hxal_ioc_get_inst_num_by_pwwn(0),
+                           hxal_ioc_get_inst_num_by_mac(fcoe_mac(1, 0))};
+    EXPECT_THAT(numbers, testing::Each(-1));
 }
 
 TEST_F(Ioc, tells_its_fields)

@@ -1,5 +1,5 @@
-// Operations that are one request each, as tables: one table for an object family, one row for an operation. A row says what
-// goes out, what comes back to the caller and what is recorded; the checks are the same for all.
+// Operations that are one request each, as one table with a row for an operation. A row says what goes out, what comes back to
+// the caller and what is recorded; the checks are the same for all.
 #pragma once
 
 #include "hxal/hxal.h"
@@ -8,7 +8,15 @@
 #include <cstdint>
 #include <functional>
 #include <string>
+#include <tuple>
 #include <vector>
+
+// The group byte on an FC or FCoE IOC, and on an Ethernet IOC; 0: refused there with HXA_STATUS_FAILED, before any request.
+struct Groups
+{
+    std::uint8_t fc;
+    std::uint8_t ll;
+};
 
 // Bytes of a record that the operation sends besides the instance; all others go out as 0.
 struct Sent
@@ -25,39 +33,53 @@ struct Copied
     std::size_t at = 0; // in the buffer
 };
 
+using Lines = std::vector<std::string>;
+
 // The caller's side of an operation: a buffer that is big and aligned enough for every output.
 using Call = std::function<hxa_status_t(hxal_t* ioc, void* output)>;
 
+// The call of an operation with these arguments behind the handle.
+template <typename Handle, typename... Parameters>
+Call call(hxa_status_t (*operation)(Handle, Parameters...), std::type_identity_t<Parameters>... arguments)
+{
+    return [=](hxal_t* ioc, void*) { return operation(ioc, arguments...); };
+}
+
+// The same, and the buffer as the last argument.
+template <typename Handle, typename... Parameters, typename... Arguments>
+Call read(hxa_status_t (*operation)(Handle, Parameters...), Arguments... arguments)
+{
+    using Output = std::tuple_element_t<sizeof...(Parameters) - 1, std::tuple<Parameters...>>;
+    return [=](hxal_t* ioc, void* output) { return operation(ioc, arguments..., static_cast<Output>(output)); };
+}
+
 struct Operation
 {
-    const char* name;
-    std::uint8_t fc_group; // group byte on an FC or FCoE IOC
-    std::uint8_t ll_group; // group byte on an Ethernet IOC; 0: refused there with HXA_STATUS_FAILED, before any request
-    std::uint8_t number;   // in the group
-    std::size_t size;      // of the record
+    Groups groups;
+    std::uint8_t number; // in the group
+    std::size_t size;    // of the record
     Call call;
     std::vector<Sent> sent = {};
-    std::vector<Copied> copied = {};           // none: the operation takes no buffer
-    std::vector<std::string> fc_recorded = {}; // lines that status 0 adds to the configuration, for instance 1 of "/dev/hxa"
-    std::vector<std::string> ll_recorded = {}; // the same for instance 1 of "/dev/hxn"
-    const char* printed_on_error = "";         // on standard output when the call fails with ENXIO
-    const char* printed_on_refusal = "";       // on standard output when an Ethernet IOC is refused
-    bool in_place = false;                     // the record is the caller's buffer, also when the call fails
-    bool optional_output = false;              // the caller may give no buffer
+    std::vector<Copied> copied = {};     // none: the operation takes no buffer
+    Lines fc_recorded = {};              // what status 0 adds to the configuration, for instance 1 of "/dev/hxa"
+    Lines ll_recorded = {};              // the same for instance 1 of "/dev/hxn"
+    const char* printed_on_error = "";   // on standard output when the call fails with ENXIO
+    const char* printed_on_refusal = ""; // on standard output when an Ethernet IOC is refused
+    bool is_in_place = false;            // the record is the caller's buffer, also when the call fails
+    bool output_is_optional = false;     // the caller may give no buffer
+
+    // clang-format off
+    Operation sends(std::vector<Sent> parts)         { sent = std::move(parts); return *this; }
+    Operation copies(std::vector<Copied> parts)      { copied = std::move(parts); return *this; }
+    Operation may_copy(std::vector<Copied> parts)    { output_is_optional = true; return copies(std::move(parts)); }
+    Operation records(Lines on_fc, Lines on_ll = {}) { fc_recorded = std::move(on_fc); ll_recorded = std::move(on_ll); return *this; }
+    Operation prints_on_error(const char* text)      { printed_on_error = text; return *this; }
+    Operation prints_on_refusal(const char* text)    { printed_on_refusal = text; return *this; }
+    Operation in_place()                             { is_in_place = true; return *this; }
+    // clang-format on
 };
 
-// The tables.
-const std::vector<Operation>& flash_operations();
-const std::vector<Operation>& ioc_operations();
-const std::vector<Operation>& port_operations(); // port_operations.cpp
-const std::vector<Operation>& fcoe_operations();
-const std::vector<Operation>& ethport_operations();
-const std::vector<Operation>& lport_operations(); // fabric_operations.cpp
-const std::vector<Operation>& rport_operations();
-const std::vector<Operation>& itnim_operations();
-const std::vector<Operation>& fcpt_operations();
-const std::vector<Operation>& scsi_operations();
-const std::vector<Operation>& diag_operations(); // diag_operations.cpp
+const std::vector<Operation>& operations();
 
 // Bytes as a record holds them.
 template <typename Value> std::vector<std::uint8_t> bytes_of(const Value& value)

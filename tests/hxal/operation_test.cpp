@@ -64,7 +64,7 @@ protected:
             return std::vector<std::uint8_t>(operation.size);
         }
         const bool ethernet = ioc->ioc_type == HXA_IOC_TYPE_LL;
-        const std::uint32_t group = ethernet ? operation.ll_group : operation.fc_group;
+        const std::uint32_t group = ethernet ? operation.groups.ll : operation.groups.fc;
         EXPECT_EQ(requests[0].node, ethernet ? "/dev/hxn" : "/dev/hxa");
         EXPECT_EQ(requests[0].command, 0xC0000000 | operation.size << 16 | group << 8 | operation.number);
         EXPECT_EQ(requests[0].sent, expected_record(operation, instance));
@@ -88,7 +88,8 @@ protected:
         testing::internal::CaptureStdout();
         call(operation, ioc, HXA_STATUS_ENXIO, buffer);
         EXPECT_EQ(testing::internal::GetCapturedStdout(), operation.printed_on_error);
-        const Buffer expected = operation.in_place ? expected_buffer(operation, expected_record(operation, instance)) : Buffer();
+        const Buffer expected =
+            operation.is_in_place ? expected_buffer(operation, expected_record(operation, instance)) : Buffer();
         EXPECT_EQ(std::memcmp(buffer.bytes, expected.bytes, sizeof buffer.bytes), 0) << "after an error";
     }
 
@@ -108,16 +109,16 @@ protected:
     }
 
     // The settings that came since.
-    static std::vector<std::string> added(const std::vector<std::string>& before)
+    static Lines added(const std::vector<std::string>& before)
     {
-        std::vector<std::string> lines = settings();
+        Lines lines = settings();
         std::erase_if(lines, [&](const std::string& line) { return std::ranges::count(before, line) > 0; });
         return lines;
     }
 
     static void check(const Operation& operation, hxal_t* ioc)
     {
-        if (ioc->ioc_type == HXA_IOC_TYPE_LL && operation.ll_group == 0)
+        if (ioc->ioc_type == HXA_IOC_TYPE_LL && operation.groups.ll == 0)
             return expect_refused(operation, ioc);
         const auto before = settings();
         expect_error_passed_on(operation, ioc);
@@ -132,43 +133,31 @@ protected:
 
     static void check_without_buffer(const Operation& operation, hxal_t* ioc)
     {
-        if (!operation.optional_output)
+        if (!operation.output_is_optional)
             return expect_nothing_sent(operation, ioc, nullptr, HXA_STATUS_EINVAL);
         answer_with_status(HXA_STATUS_FAILED, operation);
         EXPECT_EQ(operation.call(ioc, nullptr), HXA_STATUS_FAILED);
         EXPECT_THAT(requests(), testing::SizeIs(1));
     }
-
-    void check_all(const std::vector<Operation>& operations)
-    {
-        for (const Operation& operation : operations)
-            for (int idx : {1, 3})
-            {
-                host(one_cna);
-                empty_model();
-                ASSERT_EQ(hxal_ioc_scan(), 4);
-                hxasim::take_requests();
-                hxal_t* ioc = hxal_ioc_open_idx(idx);
-                ASSERT_EQ(ioc->instance, instance);
-                SCOPED_TRACE(std::string(operation.name) + " on " + ioc->devpath);
-                check(operation, ioc);
-                Buffer buffer;
-                expect_nothing_sent(operation, nullptr, buffer.bytes, HXA_STATUS_EINVAL);
-            }
-        EXPECT_EQ(hxal_get_last_error(), HXA_STATUS_OK) << "requests leave it alone";
-    }
 };
 
-TEST_F(Operations, of_flash) { check_all(flash_operations()); }
-TEST_F(Operations, of_iocs) { check_all(ioc_operations()); }
-TEST_F(Operations, of_ports) { check_all(port_operations()); }
-TEST_F(Operations, of_fcoe_functions) { check_all(fcoe_operations()); }
-TEST_F(Operations, of_ethernet_ports) { check_all(ethport_operations()); }
-TEST_F(Operations, of_logical_ports) { check_all(lport_operations()); }
-TEST_F(Operations, of_remote_ports) { check_all(rport_operations()); }
-TEST_F(Operations, of_nexuses) { check_all(itnim_operations()); }
-TEST_F(Operations, of_the_pass_through) { check_all(fcpt_operations()); }
-TEST_F(Operations, of_scsi) { check_all(scsi_operations()); }
-TEST_F(Operations, of_diagnostics) { check_all(diag_operations()); }
+TEST_F(Operations, send_one_record_each_and_hand_on_its_answer)
+{
+    for (const Operation& operation : operations())
+        for (const int idx : {1, 3})
+        {
+            host(one_cna);
+            empty_model();
+            ASSERT_EQ(hxal_ioc_scan(), 4);
+            hxasim::take_requests();
+            hxal_t* ioc = hxal_ioc_open_idx(idx);
+            ASSERT_EQ(ioc->instance, instance);
+            SCOPED_TRACE("row " + std::to_string(&operation - operations().data()) + " on " + ioc->devpath);
+            check(operation, ioc);
+            Buffer buffer;
+            expect_nothing_sent(operation, nullptr, buffer.bytes, HXA_STATUS_EINVAL);
+        }
+    EXPECT_EQ(hxal_get_last_error(), HXA_STATUS_OK) << "requests leave it alone";
+}
 
 } // namespace

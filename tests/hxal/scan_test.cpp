@@ -56,24 +56,6 @@ TEST_F(Scan, of_a_converged_adapter_sends_these_requests_and_no_others)
     }
 }
 
-TEST_F(Scan, lists_fc_iocs_before_ethernet_iocs)
-{
-    host(one_cna);
-    ASSERT_EQ(hxal_ioc_scan(), 4);
-    EXPECT_EQ(hxal_ioc_get_num(), 4);
-    int index = 0;
-    for (const hxal_t* ioc = hxal_ioc_get_list(); ioc; ioc = ioc->next, ++index)
-    {
-        const bool ethernet = index >= 2;
-        EXPECT_EQ(ioc->id, index);
-        EXPECT_EQ(ioc->instance, index % 2);
-        EXPECT_EQ(ioc->ioc_type, ethernet ? HXA_IOC_TYPE_LL : HXA_IOC_TYPE_FCoE);
-        EXPECT_STREQ(ioc->devpath, ethernet ? "/dev/hxn" : "/dev/hxa");
-        EXPECT_EQ(ioc->pwwn, ethernet ? 0 : port_wwn(0, static_cast<uint8_t>(index)));
-    }
-    EXPECT_EQ(index, 4);
-}
-
 TEST_F(Scan, fills_a_handle_with_what_its_type_has)
 {
     host(R"({"adapters": [{"kind": "cna", "ports": [{
@@ -178,15 +160,6 @@ TEST_F(Scan, warns_of_another_driver_version_and_goes_on)
     EXPECT_EQ(hxal_adapter_scan(), 1);
     EXPECT_EQ(testing::internal::GetCapturedStdout(), "\nWARNING: Tessik and Driver versions dont match!!!\n\n");
     EXPECT_EQ(hxal_ioc_get_num(), 4);
-}
-
-TEST_F(Scan, takes_128_instances_of_one_node)
-{
-    host(R"({"generate": {"adapters": 16, "ports": 8, "kind": "fc-hba"}})");
-    EXPECT_EQ(hxal_adapter_scan(), 16);
-    EXPECT_EQ(hxal_ioc_get_num(), 128);
-    EXPECT_EQ(hxal_ioc_get_inst_num(), 128);
-    EXPECT_EQ(hxal_ioc_open_idx(127)->instance, 127);
 }
 
 TEST_F(Scan, that_finds_a_hole_lists_the_iocs_and_no_adapter)

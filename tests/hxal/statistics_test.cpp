@@ -148,21 +148,6 @@ TEST_F(Statistics, are_converted_on_status_0_only)
     EXPECT_THAT(requests(), testing::IsEmpty());
 }
 
-TEST_F(Statistics, start_again_at_0)
-{
-    hxal_stats_long_t pairs[HXAL_FCOE_STATS];
-    hxal_stats_t short_pairs[HXAL_LPORT_STATS];
-    EXPECT_EQ(hxal_port_reset_stats(fc), HXA_STATUS_OK);
-    EXPECT_EQ(hxal_port_get_stats(fc, pairs), HXA_STATUS_OK);
-    EXPECT_EQ(pairs[28].value, 0u);
-    EXPECT_EQ(hxal_fcoe_reset_stats(fcoe), HXA_STATUS_OK);
-    EXPECT_EQ(hxal_fcoe_get_stats(fcoe, pairs), HXA_STATUS_OK);
-    EXPECT_EQ(pairs[44].value, 0u);
-    EXPECT_EQ(hxal_lport_reset_stats(fc, 0, fc->pwwn), HXA_STATUS_OK);
-    EXPECT_EQ(hxal_lport_get_stats(fc, 0, fc->pwwn, short_pairs), HXA_STATUS_OK);
-    EXPECT_EQ(short_pairs[42].value, 0u);
-}
-
 TEST_F(Statistics, of_an_fc_port_under_fcoe_names_are_its_quality_of_service)
 {
     hxal_stats_long_t pairs[HXAL_FCOE_STATS];

@@ -217,22 +217,6 @@ TEST_F(Events, are_refused_to_requests_that_no_driver_accepts)
     }
 }
 
-TEST_F(Events, can_be_distorted)
-{
-    Open_File hxa("/dev/hxa");
-    hxasim::inject({.command = "IOCMD_AEN_GET", .times = 1, .answer = {{4, {0xFF, 0xFF, 0xFF, 0xFF}}, {88, {7}}, {4371, {1}}}});
-    raise(0, 2);
-    hxal_ioctl_aen_t record{};
-    EXPECT_EQ(Fetch().send_in(hxa, record), 0);
-    EXPECT_EQ(record.aen_count, -1);
-    EXPECT_EQ(record.aen_list[1].aen_category, 7U);
-    hxasim::inject({.command = "IOCMD_AEN_GET", .status = 1, .times = 1});
-    raise(0);
-    EXPECT_EQ(Fetch().send_in(hxa, record), 0);
-    EXPECT_EQ(record.status, HXA_STATUS_FAILED);
-    EXPECT_THAT(numbers(hxa, 0, 2), ElementsAre(3)) << "the failed fetch took none";
-}
-
 TEST_F(Events, tell_of_the_objects_of_their_IOC)
 {
     hxasim::load_text(host_with_targets);

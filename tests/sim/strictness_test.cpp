@@ -31,25 +31,20 @@ struct Bad_Request
 const Bad_Request bad_requests[] = {
     // commands that the node does not know
     {"/dev/hxa", 0xC0084399, 0, 0, ENOTTY, "/dev/hxa 0xC0084399: unknown command"},
-    {"/dev/hxa", 0x00005401, 0, 0, ENOTTY, "/dev/hxa 0x00005401: unknown command"},
     {"/dev/hxa", 0xC648B006, 0, 0, ENOTTY, "/dev/hxa 0xC648B006: unknown command"},
     {"/dev/hxa", 0x86484306, 0, 0, ENOTTY, "/dev/hxa 0x86484306: unknown command"},
     {"/dev/hxa", 0xC6484406, 0, 0, ENOTTY, "/dev/hxa IOCMD_IOC_GET_ATTR: belongs on /dev/hxn"},
-    {"/dev/hxn", 0xC6484306, 0, 0, ENOTTY, "/dev/hxn IOCMD_IOC_GET_ATTR: belongs on /dev/hxa"},
     {"/dev/hxn", 0xC058432A, 0, 0, ENOTTY, "/dev/hxn IOCMD_AEN_SYNC: belongs on /dev/hxa"},
     // records of another size
     {"/dev/hxa", 0xC6474306, 0, 0, EINVAL, "/dev/hxa IOCMD_IOC_GET_ATTR: record of 1607 bytes, must be 1608"},
-    {"/dev/hxa", 0xC0004301, 0, 0, EINVAL, "/dev/hxa IOCMD_IOC_GET_VERSION: record of 0 bytes, must be 8"},
     // bytes that must be 0: status, reserved, output, the last one
     {"/dev/hxa", 0xC6484306,    0,   1, EINVAL, "/dev/hxa IOCMD_IOC_GET_ATTR instance 0: byte 0 is 1, must be 0"},
     {"/dev/hxa", 0xC6484306,    6, 255, EINVAL, "/dev/hxa IOCMD_IOC_GET_ATTR instance 0: byte 6 is 255, must be 0"},
     {"/dev/hxn", 0xC2084407, 519, 7, EINVAL, "/dev/hxn IOCMD_IOC_GET_INFO instance 0: byte 519 is 7, must be 0"},
     {"/dev/hxa", 0xC0084301,    4,   2, EINVAL, "/dev/hxa IOCMD_IOC_GET_VERSION: byte 4 is 2, must be 0"},
-    {"/dev/hxa", 0xC0284302,    4,   2, EINVAL, "/dev/hxa IOCMD_IOC_GET_INST: byte 4 is 2, must be 0"},
     {"/dev/hxa", 0xC058432A,    0,   1, EINVAL, "/dev/hxa IOCMD_AEN_SYNC: byte 0 is 1, must be 0"},
     {"/dev/hxa", 0xC058432A,   16,   1, EINVAL, "/dev/hxa IOCMD_AEN_SYNC: byte 16 is 1, must be 0"},
     {"/dev/hxa", 0xC060BA02,   36,   1, EINVAL, "/dev/hxa IOCMD_FCPT instance 0: byte 36 is 1, must be 0"},
-    {"/dev/hxa", 0xC060BA02,   79,   1, EINVAL, "/dev/hxa IOCMD_FCPT instance 0: byte 79 is 1, must be 0"},
     {"/dev/hxa", 0xC020B207,   12,   1, EINVAL, "/dev/hxa IOCMD_RPORT_SET_SPEED instance 0: byte 12 is 1, must be 0"},
     // inputs that contradict each other
     {"/dev/hxa", 0xC018432E,    8,   1, EINVAL, "/dev/hxa IOCMD_PORT_GET_STATS instance 0: buffer of 1 bytes, must be 304"},
@@ -84,7 +79,7 @@ TEST_F(Strictness, refuses_bad_requests_and_leaves_the_record_alone)
         EXPECT_THAT(requests[i].answered, IsEmpty());
     }
     EXPECT_EQ(requests[0].name, "");
-    EXPECT_EQ(requests[4].name, "IOCMD_IOC_GET_ATTR");
+    EXPECT_EQ(requests[3].name, "IOCMD_IOC_GET_ATTR");
 }
 
 TEST_F(Strictness, answers_bad_addresses_without_touching_them)
@@ -101,38 +96,14 @@ TEST_F(Strictness, answers_bad_addresses_without_touching_them)
     munmap(page, 4096);
     EXPECT_EQ(ioctl(*hxa, code, nullptr), -1);
     EXPECT_EQ(errno, EFAULT);
-    expect_violation("/dev/hxa IOCMD_IOC_GET_ATTR: bad address");
-    expect_violation("/dev/hxa IOCMD_IOC_GET_ATTR instance 0: bad address");
-    expect_violation("/dev/hxa IOCMD_IOC_GET_ATTR: bad address");
-}
-
-TEST_F(Strictness, answers_bad_addresses_inside_a_record_the_same_way)
-{
-    hxa_ioctl_port_stats_t record{};
+    hxa_ioctl_port_stats_t record{}; // and inside a record
     record.buf_size = sizeof(hxa_pport_stats_t);
     record.buf_ptr = 16;
     EXPECT_EQ(send(*hxa, "IOCMD_PORT_GET_STATS", 'C', record), EFAULT);
+    expect_violation("/dev/hxa IOCMD_IOC_GET_ATTR: bad address");
+    expect_violation("/dev/hxa IOCMD_IOC_GET_ATTR instance 0: bad address");
+    expect_violation("/dev/hxa IOCMD_IOC_GET_ATTR: bad address");
     expect_violation("/dev/hxa IOCMD_PORT_GET_STATS instance 0: bad address of the counters");
-}
-
-TEST_F(Strictness, records_requests_with_their_bytes_until_taken)
-{
-    port(hxn, 'D', 1);
-    instances(hxa, 'C');
-    auto requests = hxasim::take_requests();
-    ASSERT_EQ(requests.size(), 2U);
-    EXPECT_EQ(requests[0].node, "/dev/hxn");
-    EXPECT_EQ(requests[0].command, 0xC178442DU);
-    EXPECT_EQ(requests[0].name, "IOCMD_PORT_GET_ATTR");
-    EXPECT_EQ(requests[0].instance, 1);
-    std::vector<std::uint8_t> sent(376);
-    sent[4] = 1;
-    EXPECT_EQ(requests[0].sent, sent);
-    EXPECT_EQ(requests[0].answered.size(), 376U);
-    EXPECT_EQ(requests[0].answered[8 + 324], HXA_PPORT_ST_LINKUP);
-    EXPECT_EQ(requests[1].name, "IOCMD_IOC_GET_INST");
-    EXPECT_EQ(requests[1].instance, -1);
-    EXPECT_THAT(hxasim::take_requests(), IsEmpty());
 }
 
 TEST_F(Strictness, keeps_the_newest_requests_only)
