@@ -22,7 +22,7 @@ protected:
 
 } // namespace
 
-TEST_F(Adapters, Are_Port_Controllers)
+TEST_F(Adapters, are_port_controllers)
 {
     const Instance_Array all = controllers();
     ASSERT_EQ(all.size(), 4U);
@@ -65,7 +65,7 @@ TEST_F(Adapters, Are_Port_Controllers)
                 ElementsAre(R"("00051E300000")", R"("200000051E100100")", R"("00051E300200")", R"("200000051E100300")"));
 }
 
-TEST_F(Adapters, Are_Disabled_When_Every_IOC_Is)
+TEST_F(Adapters, are_disabled_when_every_ioc_is)
 {
     plug_text(R"({"adapters": [
         {"kind": "cna", "ports": [{"ioc_state": "disabled"}, {"ioc_state": "disabled"}]},
@@ -75,14 +75,14 @@ TEST_F(Adapters, Are_Disabled_When_Every_IOC_Is)
     EXPECT_THAT(values("StatusDescriptions"), ElementsAre(R"({"The adapter is disabled"})", R"({"The adapter is in service"})"));
 }
 
-TEST_F(Adapters, Are_Looked_Up_By_Name_Once)
+TEST_F(Adapters, are_looked_up_by_name_once)
 {
     plug_text(R"({"generate": {"adapters": 5, "kind": "fc-hba"}})");
     EXPECT_EQ(controllers().size(), 5U);
     EXPECT_EQ(fake_host.lookups, 1);
 }
 
-TEST_F(Adapters, Cost_The_Requests_Of_Port_0_And_Of_The_State)
+TEST_F(Adapters, cost_the_requests_of_port_0_and_of_the_state)
 {
     plug_text(R"({"adapters": [{"kind": "cna", "ports": [{}]}, {"kind": "fc-hba"}]})");
     controllers();
@@ -92,7 +92,7 @@ TEST_F(Adapters, Cost_The_Requests_Of_Port_0_And_Of_The_State)
 }
 
 // One half of a CNA that answers is enough for the card; the MAC address then comes from the scan.
-TEST_F(Adapters, Are_Read_From_What_Answers)
+TEST_F(Adapters, are_read_from_what_answers)
 {
     plug_text(R"({"adapters": [{"kind": "cna", "serial": "SERIAL"}]})");
     const std::string whole = describe(controllers());
@@ -113,7 +113,7 @@ TEST_F(Adapters, Are_Read_From_What_Answers)
 }
 
 // Where the FC driver is missing or fails, the Ethernet side is all there is: its MAC address still tells the adapters apart.
-TEST_F(Adapters, Keep_A_Key_Of_Their_Own_Without_The_FC_Driver)
+TEST_F(Adapters, keep_a_key_of_their_own_without_the_fc_driver)
 {
     plug_text(R"({"adapters": [{"kind": "cna"}, {"kind": "cna"}],
         "faults": [{"command": "IOCMD_IOC_GET_INST", "node": "/dev/hxa", "error": "EIO"}]})");
@@ -123,7 +123,7 @@ TEST_F(Adapters, Keep_A_Key_Of_Their_Own_Without_The_FC_Driver)
     EXPECT_EQ(ProviderUtil::getAdapterId("00051E200100"), 2);
 }
 
-TEST_F(Adapters, Are_Skipped_One_By_One_When_They_Fail)
+TEST_F(Adapters, are_skipped_one_by_one_when_they_fail)
 {
     plug_text(R"({"generate": {"adapters": 3, "kind": "fc-hba", "ports": 1}})");
     fail("IOCMD_IOC_GET_ATTR", "/dev/hxa", 1, ENODEV);
@@ -137,7 +137,7 @@ TEST_F(Adapters, Are_Skipped_One_By_One_When_They_Fail)
     EXPECT_THAT(values("Name"), IsEmpty());
 }
 
-TEST_F(Adapters, Have_Texts_As_Long_As_Their_Fields)
+TEST_F(Adapters, have_texts_as_long_as_their_fields)
 {
     plug_text(R"({"adapters": [{"kind": "fc-hba", "serial": "123456789AB\u0007", "ports": [{}]}]})");
     EXPECT_THAT(values("Name"), ElementsAre(R"("123456789AB?")"));

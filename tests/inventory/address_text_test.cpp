@@ -10,7 +10,7 @@
 using namespace zmlr;
 using testing::ElementsAre;
 
-TEST(Class_Names, Table_And_Its_Ends)
+TEST(Class_Names, table_and_its_ends)
 {
     EXPECT_STREQ(ProviderUtil::getClassName(CLASSID_None).c_str(), "--");
     EXPECT_STREQ(ProviderUtil::getClassName(static_cast<classId_t>(3)).c_str(), "ZEMLAR_FCPort");
@@ -19,7 +19,7 @@ TEST(Class_Names, Table_And_Its_Ends)
     EXPECT_STREQ(ProviderUtil::getClassName(static_cast<classId_t>(0xFFFFFFFF)).c_str(), "INVALID CLASS");
 }
 
-TEST(Address_Text, Written_In_Memory_Order)
+TEST(Address_Text, written_in_memory_order)
 {
     const unsigned char bytes[] = {0x20, 0x00, 0x00, 0x05, 0x1e, 0xab, 0x0f, 0xf0};
     wwn_t wwn;
@@ -34,7 +34,7 @@ TEST(Address_Text, Written_In_Memory_Order)
     EXPECT_STREQ(mac_text, "00051EAB0FF0");
 }
 
-TEST(Address_Text, Read_Strictly)
+TEST(Address_Text, read_strictly)
 {
     unsigned char wwn[8];
     EXPECT_TRUE(ProviderUtil::getRawWWNFromStr("200000051eAB0fF0", wwn));
@@ -52,7 +52,7 @@ TEST(Address_Text, Read_Strictly)
     }
 }
 
-TEST(Address_Text, Trimmed_Of_Blanks_Only)
+TEST(Address_Text, trimmed_of_blanks_only)
 {
     constexpr const char* cases[][2] = {
         {"  2.1.3.0  ", "2.1.3.0"}, {"2.1 3", "2.1 3"}, {"   ", ""}, {"", ""}, {" \t x\n ", "\t x\n"},
@@ -68,7 +68,7 @@ TEST(Address_Text, Trimmed_Of_Blanks_Only)
     }
 }
 
-TEST(Address_Text, Taken_From_A_Package_Tag)
+TEST(Address_Text, taken_from_a_package_tag)
 {
     constexpr const char* cna = "10000000-0000-0000-0000-00051E200000";
     constexpr const char* hba = "10000000-0000-0000-2000-00051E123456";
@@ -91,7 +91,7 @@ TEST(Address_Text, Taken_From_A_Package_Tag)
         EXPECT_STREQ(ProviderUtil::getNodeMACOrWWNFromTag(tag, model).c_str(), expected) << tag << ' ' << model;
 }
 
-TEST(Property_Text, Holds_Only_What_XML_Can_Carry)
+TEST(Property_Text, holds_only_what_xml_can_carry)
 {
     using namespace std::string_literals;
     const std::pair<std::string, std::string> cases[] = {
@@ -116,7 +116,7 @@ TEST(Property_Text, Holds_Only_What_XML_Can_Carry)
     EXPECT_STREQ(property_text(unterminated).c_str(), "ab\xC3\xA9");
 }
 
-TEST(Property_Text, Copies_Are_Cut_And_Terminated)
+TEST(Property_Text, copies_are_cut_and_terminated)
 {
     const char unterminated[4] = {'a', 'b', 'c', 'd'};
     char same[4];

@@ -55,7 +55,7 @@ protected:
 
 } // namespace
 
-TEST_F(Driver_Gate, Is_What_The_Probe_Found)
+TEST_F(Driver_Gate, is_what_the_probe_found)
 {
     EXPECT_EQ(asked_early, probe().status);
     EXPECT_EQ(ProviderInit::getDriverStatus(), probe().status);
@@ -65,7 +65,7 @@ TEST_F(Driver_Gate, Is_What_The_Probe_Found)
     EXPECT_EQ(std::count(lines.begin(), lines.end(), "INFO ProviderInit: Inside ProviderInit Constructor."), 1);
 }
 
-TEST_F(Driver_Gate, Closes_Every_Class_That_Needs_The_Adapters)
+TEST_F(Driver_Gate, closes_every_class_that_needs_the_adapters)
 {
     constexpr const char* closed = "Driver is not installed or there is a hxal mismatch hence no instances returned";
     constexpr const char* unsupported = "Requested class is NOT supported.";

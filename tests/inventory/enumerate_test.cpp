@@ -65,15 +65,15 @@ private:
 
 } // namespace
 
-TEST_F(Enumerate, Hands_Over_The_Instances_Of_The_Class_In_Order)
+TEST_F(Enumerate, hands_over_the_instances_of_the_class_in_order)
 {
     EXPECT_THAT(run(mixed_bag), ElementsAre("\"1\"", "\"2\"", "\"3\""));
     EXPECT_THAT(log(), ElementsAre("DBG Test_Provider: Returning instances"));
 }
 
-TEST_F(Enumerate, Stops_When_The_Handler_Has_Enough) { EXPECT_THAT(run(mixed_bag, 2), ElementsAre("\"1\"", "\"2\"")); }
+TEST_F(Enumerate, stops_when_the_handler_has_enough) { EXPECT_THAT(run(mixed_bag, 2), ElementsAre("\"1\"", "\"2\"")); }
 
-TEST_F(Enumerate, Says_That_There_Is_Nothing)
+TEST_F(Enumerate, says_that_there_is_nothing)
 {
     EXPECT_THAT(run(nothing), IsEmpty());
     EXPECT_THAT(log(), ElementsAre("ERR Test_Provider: No FC Ports Found!"));

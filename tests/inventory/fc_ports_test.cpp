@@ -22,7 +22,7 @@ protected:
 
 } // namespace
 
-TEST_F(FC_Ports, Are_Described_Property_By_Property)
+TEST_F(FC_Ports, are_described_property_by_property)
 {
     const Instance_Array all = ports();
     ASSERT_EQ(all.size(), 8U);
@@ -60,7 +60,7 @@ TEST_F(FC_Ports, Are_Described_Property_By_Property)
                 ElementsAre("2112", "2112", "2112", "2112", "1024", "2112", "2112", "2112"));
 }
 
-TEST_F(FC_Ports, Cost_One_Request_Each)
+TEST_F(FC_Ports, cost_one_request_each)
 {
     plug_text(R"({"adapters": [{"kind": "fc-hba"}]})");
     EXPECT_EQ(ports().size(), 2U);
@@ -68,7 +68,7 @@ TEST_F(FC_Ports, Cost_One_Request_Each)
     EXPECT_EQ(fake_host.lookups, 1);
 }
 
-TEST_F(FC_Ports, Are_Skipped_One_By_One_When_They_Fail)
+TEST_F(FC_Ports, are_skipped_one_by_one_when_they_fail)
 {
     plug_text(R"({"generate": {"adapters": 2, "kind": "fc-hba"}})");
     fail("IOCMD_PORT_GET_ATTR", "/dev/hxa", 1, EIO);
@@ -79,7 +79,7 @@ TEST_F(FC_Ports, Are_Skipped_One_By_One_When_They_Fail)
     EXPECT_THAT(lines, Contains("INFO PortHelper: hxal_port_get_attr failed. Adapter=2, Port=0 "));
 }
 
-TEST_F(FC_Ports, Have_The_States_And_Types_Of_The_Driver)
+TEST_F(FC_Ports, have_the_states_and_types_of_the_driver)
 {
     std::string json;
     for (int state = 0; state <= 14; state++)
@@ -95,7 +95,7 @@ TEST_F(FC_Ports, Have_The_States_And_Types_Of_The_Driver)
         EXPECT_EQ(PortHelper::getPortType(static_cast<uint32>(driver)), cim) << driver;
 }
 
-TEST_F(FC_Ports, Have_What_A_Hostile_Driver_Says)
+TEST_F(FC_Ports, have_what_a_hostile_driver_says)
 {
     constexpr std::size_t attributes = 8; // where they begin in the record
     const std::vector<std::uint8_t> ones(4, 0xFF);
@@ -119,7 +119,7 @@ TEST_F(FC_Ports, Have_What_A_Hostile_Driver_Says)
     EXPECT_THAT(values("PortType"), ElementsAre("0"));
 }
 
-TEST_F(FC_Ports, Are_Found_By_Their_Adapter)
+TEST_F(FC_Ports, are_found_by_their_adapter)
 {
     plug_text(R"({"adapters": [{"kind": "cna"}, {"kind": "fc-hba"}]})");
     const FCHBAManager& manager = FCHBAManager::getFCHBAManager();
@@ -131,7 +131,7 @@ TEST_F(FC_Ports, Are_Found_By_Their_Adapter)
     EXPECT_THAT(log(), Contains("WARN PortHelper: Failed to get adapterId"));
 }
 
-TEST_F(FC_Ports, Of_A_Missing_Port_Are_Left_Out)
+TEST_F(FC_Ports, of_a_missing_port_are_left_out)
 {
     // Port 0 of the adapter has no IOC: the driver says that its only IOC drives port 1.
     hxasim::load_text(R"({"adapters": [{"kind": "fc-hba", "ports": [{}]}], "faults": [
@@ -141,7 +141,7 @@ TEST_F(FC_Ports, Of_A_Missing_Port_Are_Left_Out)
     EXPECT_THAT(log(), Contains("WARN PortHelper: Unable to get the handler. Adapter=1, Port=0. "));
 }
 
-TEST_F(FC_Ports, Are_None_Without_Adapters_Or_For_Other_Classes)
+TEST_F(FC_Ports, are_none_without_adapters_or_for_other_classes)
 {
     const PortHelper& helper = PortHelper::getPortHelperObject();
     EXPECT_TRUE(helper.getInstancesByClass(CLASSID_ComputerSystem).empty());

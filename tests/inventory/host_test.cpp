@@ -33,7 +33,7 @@ protected:
 
 } // namespace
 
-TEST_F(Host, Info_Tells_The_Best_Text_There_Is)
+TEST_F(Host, info_tells_the_best_text_there_is)
 {
     const std::string line = "INFO ProviderUtil: gethostbyname() FAILED. hostString will have hostname instead of ipAddress";
     const struct
@@ -74,7 +74,7 @@ TEST_F(Host, Info_Tells_The_Best_Text_There_Is)
     }
 }
 
-TEST_F(Host, Info_Is_Bounded)
+TEST_F(Host, info_is_bounded)
 {
     EXPECT_EQ(info(5), (Info{0, "192."}));
     EXPECT_EQ(info(1), (Info{0, ""}));
@@ -85,7 +85,7 @@ TEST_F(Host, Info_Is_Bounded)
     EXPECT_EQ(info(), (Info{4, std::string(254, 'n')}));
 }
 
-TEST_F(Host, Paths_Begin_With_The_Host)
+TEST_F(Host, paths_begin_with_the_host)
 {
     EXPECT_STREQ(ProviderUtil::updateNamespacePath("ZEMLAR_FCPort.DeviceID=\"1\"").c_str(),
                  "//192.0.2.10/root/zemlar:ZEMLAR_FCPort.DeviceID=\"1\"");
@@ -93,7 +93,7 @@ TEST_F(Host, Paths_Begin_With_The_Host)
     EXPECT_FALSE(ProviderUtil::IsFileExist("/no/such/file"));
 }
 
-TEST_F(Host, Name_Is_The_Node_s)
+TEST_F(Host, name_is_that_of_the_node)
 {
     const ProviderUtil& util = ProviderUtil::getProviderUtil();
     EXPECT_STREQ(util.getHostName().c_str(), "storage-host");
@@ -101,7 +101,7 @@ TEST_F(Host, Name_Is_The_Node_s)
     EXPECT_STREQ(util.getHostName().c_str(), "localhost");
 }
 
-TEST_F(Host, Is_One_Computer_System)
+TEST_F(Host, is_one_computer_system)
 {
     EXPECT_EQ(describe(FCHBAManager::getFCHBAManager().getInstances(CLASSID_ComputerSystem)), R"(ZEMLAR_ComputerSystem
     Caption = "The host with Zemlar's adapters installed."
@@ -123,7 +123,7 @@ TEST_F(Host, Is_One_Computer_System)
     EXPECT_THAT(requests(), IsEmpty());
 }
 
-TEST_F(Host, Computer_System_Is_Named_As_The_Info_Says)
+TEST_F(Host, computer_system_is_named_as_the_info_says)
 {
     const std::string remark =
         "WARN CommonHelper: No host IP / Name  retrived in the function, So function fills localhost for host info.";

@@ -25,7 +25,7 @@ protected:
 
 } // namespace
 
-TEST_F(Lookups, Find_Adapters_By_Address)
+TEST_F(Lookups, find_adapters_by_address)
 {
     constexpr struct
     {
@@ -43,7 +43,7 @@ TEST_F(Lookups, Find_Adapters_By_Address)
     EXPECT_THAT(requests(), IsEmpty());
 }
 
-TEST_F(Lookups, Say_Why_There_Is_No_Adapter)
+TEST_F(Lookups, say_why_there_is_no_adapter)
 {
     constexpr const char* unable_wwn = "WARN ProviderUtil: Unable to get Adapter Id for adpater NWWN =";
     constexpr const char* unable_mac = "WARN ProviderUtil: Unable to get Adapter Id for adpater MAC address=";
@@ -69,7 +69,7 @@ TEST_F(Lookups, Say_Why_There_Is_No_Adapter)
     EXPECT_THAT(requests(), IsEmpty());
 }
 
-TEST_F(Lookups, Tell_The_Key_Of_An_Adapter)
+TEST_F(Lookups, tell_the_key_of_an_adapter)
 {
     EXPECT_STREQ(ProviderUtil::getAddrByAdapterId(1).c_str(), "00051E300000");
     EXPECT_STREQ(ProviderUtil::getAddrByAdapterId(2).c_str(), "200000051E100100");
@@ -78,7 +78,7 @@ TEST_F(Lookups, Tell_The_Key_Of_An_Adapter)
     EXPECT_STREQ(ProviderUtil::getAddrByAdapterId(3).c_str(), "");
 }
 
-TEST_F(Lookups, Find_The_IOC_Of_An_Adapter)
+TEST_F(Lookups, find_the_ioc_of_an_adapter)
 {
     EXPECT_EQ(hxal_ioc_get_ioc_type(ProviderUtil::getHxalHandlerByAdapterId(1)), HXA_IOC_TYPE_LL);
     EXPECT_EQ(hxal_ioc_get_ioc_type(ProviderUtil::getHxalHandlerByAdapterId(2)), HXA_IOC_TYPE_FC);
@@ -90,7 +90,7 @@ TEST_F(Lookups, Find_The_IOC_Of_An_Adapter)
                                    "ERR ProviderUtil: Invalid adapter id.", "ERR ProviderUtil: Invalid adapter id."));
 }
 
-TEST_F(Lookups, Find_The_IOC_Of_A_Port)
+TEST_F(Lookups, find_the_ioc_of_a_port)
 {
     const hxal_t* fc = ProviderUtil::getHxalHandlerByPortWWN("100000051e100101");
     ASSERT_NE(fc, nullptr);
@@ -109,7 +109,7 @@ TEST_F(Lookups, Find_The_IOC_Of_A_Port)
     EXPECT_THAT(requests(), IsEmpty());
 }
 
-TEST_F(Lookups, Read_The_Driver_Version_Where_There_Is_One)
+TEST_F(Lookups, read_the_driver_version_where_there_is_one)
 {
     EXPECT_STREQ(ProviderUtil::getDriverVersion().c_str(), "2.2.0.9");
     EXPECT_THAT(requests(), ElementsAre("IOCMD_IOC_GET_ATTR /dev/hxn 0"));

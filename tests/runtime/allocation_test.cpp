@@ -77,42 +77,24 @@ TEST(Memory, runs_out_without_a_leak)
     const auto other = linked(element("x"), disk("y"));
     other->Others.value.append(element("z").steal());
 
-    fail_each_allocation_of([] { const Ref<Sample_Element> made(create<Sample_Element>()); });
-    fail_each_allocation_of([&] { const Ref<Sample_Link> made(clone(source.ptr())); });
-    fail_each_allocation_of([&] { const Ref<Instance> made(key_clone(source.ptr())); });
     fail_each_allocation_of(
         [&]
         {
-            const Ref<Sample_Link> dest(clone(other.ptr()));
+            const Ref<Sample_Link> made(clone(source.ptr())), dest(clone(other.ptr())), bare(create<Sample_Link>());
+            const Ref<Instance> keys(key_clone(source.ptr()));
             copy(dest.ptr(), source.ptr());
-        });
-    fail_each_allocation_of(
-        [&]
-        {
-            const Ref<Sample_Link> made(create<Sample_Link>());
-            __create_refs(made.ptr());
-            __set_name_space_recursive(made.ptr(), "root/zemlar", true);
-        });
-    fail_each_allocation_of(
-        [&]
-        {
+            __create_refs(bare.ptr());
+            __set_name_space_recursive(bare.ptr(), "root/zemlar", true);
+
             Value value;
             value.set(source.ptr(), find_reference(source->meta_class, "Others"));
             const Value copied = value;
-            const Ref<Sample_Link> made(create<Sample_Link>());
-            copied.get(made.ptr(), find_reference(source->meta_class, "Others"));
-        });
-    fail_each_allocation_of(
-        [&]
-        {
+            copied.get(bare.ptr(), find_reference(source->meta_class, "Others"));
+
             String path;
             EXPECT_EQ(instance_to_model_path(source.ptr(), path), 0);
-            const Ref<Instance> read(model_path_to_instance(source->meta_class, path.c_str()));
-            EXPECT_TRUE(read);
-        });
-    fail_each_allocation_of(
-        [&]
-        {
+            EXPECT_TRUE(Ref<Instance>(model_path_to_instance(source->meta_class, path.c_str())));
+
             Instance_Array instances;
             for (int i = 0; i < 20; ++i)
                 instances.adopt(Ref<Instance>(clone(static_cast<const Instance*>(source.ptr()))));

@@ -11,28 +11,26 @@ namespace
 
 TEST(Buffer, grows_around_its_first_capacity)
 {
-    for (std::size_t n : {0U, 1U, 4095U, 4096U, 4097U, 8192U, 8193U})
+    for (std::size_t n : {1U, 4095U, 4096U, 4097U, 8193U})
     {
         const std::string text(n, 'x');
-        Buffer appended;
+        Buffer appended, formatted, single;
         appended.append(text.data(), n);
-        Buffer formatted;
         formatted.format("%s", text.c_str());
-        Buffer single;
         for (char c : text)
             single.append(c);
-
-        EXPECT_EQ(appended.data(), text);
-        EXPECT_EQ(formatted.data(), text);
-        EXPECT_EQ(single.data(), text);
-        EXPECT_EQ(appended.capacity(), n == 0 ? 0 : n <= 4096 ? 4096U : n <= 8192 ? 8192U : 16384U);
-        EXPECT_EQ(single.capacity(), appended.capacity());
+        for (Buffer* buffer : {&appended, &formatted, &single})
+        {
+            EXPECT_EQ(buffer->data(), text);
+            EXPECT_EQ(buffer->capacity(), n <= 4096 ? 4096U : n <= 8192 ? 8192U : 16384U);
+        }
     }
 }
 
 TEST(Buffer, inserts_removes_and_writes_numbers)
 {
     Buffer buffer;
+    EXPECT_STREQ(buffer.data(), "");
     buffer.append_uint64(18446744073709551615U);
     buffer.insert(0, "[", 1);
     buffer.append(']');
@@ -41,7 +39,6 @@ TEST(Buffer, inserts_removes_and_writes_numbers)
     buffer.remove(3, 18);
     buffer.insert(3, "--", 2);
     EXPECT_STREQ(buffer.data(), "[18--]0");
-    EXPECT_EQ(buffer[6], '0');
 }
 
 } // namespace

@@ -28,22 +28,9 @@ TEST(AssertDeathTest, reports_place_function_and_condition)
     EXPECT_DEATH(copy(element("a").ptr(), disk("a").ptr()), "copy\\(\\): assert: dest->meta_class == src->meta_class");
     EXPECT_DEATH(copy(element("a").ptr(), element("b").ptr(), disk("a").ptr()), "model->meta_class == dest->meta_class");
     EXPECT_DEATH(is_reference_of(element("a").ptr(), nullptr, ""), "assert: assoc_inst != 0");
-}
-
-TEST(AssertDeathTest, destroy_takes_the_last_reference_only)
-{
-    Sample_Element* shared = element("a").steal();
-    ref(shared);
-    EXPECT_DEATH(destroy(shared), "destroy\\(\\): assert: Atomic_get\\(&inst->__refs\\) == 1");
-    unref(shared);
-    destroy(shared);
-}
-
-TEST(Trace, goes_to_standard_error)
-{
-    testing::internal::CaptureStderr();
-    __cimple_trace("port.cpp", 12, "here");
-    EXPECT_EQ(testing::internal::GetCapturedStderr(), "TRACE: port.cpp(12): here\n");
+    const auto held = element("a"), shared = held;
+    EXPECT_DEATH(destroy(shared.ptr()), "destroy\\(\\): assert: Atomic_get\\(&inst->__refs\\) == 1");
+    EXPECT_DEATH((__cimple_trace("port.cpp", 12, "here"), check(false, "x")), "TRACE: port.cpp\\(12\\): here\n.*assert: x\n\n");
 }
 
 TEST(AssertDeathTest, positions_past_the_end)

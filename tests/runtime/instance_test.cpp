@@ -2,6 +2,7 @@
 
 #include "tests/runtime/sample_classes.h"
 
+#include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
 #include <limits>
@@ -48,16 +49,10 @@ TEST(Instance, created_with_defaults_has_them_and_nulls_elsewhere)
     EXPECT_TRUE(made->Labels.value == (Array<String>{"a", "b"}));
     EXPECT_TRUE(made->Codes.value == (Array<uint16>{2, 3, 5}));
     EXPECT_TRUE(made->Intervals.value == Array<Datetime>{Datetime()});
-    EXPECT_EQ(Atomic_get(&made->__refs), 1U);
-    EXPECT_TRUE(made->__name_space.empty());
-}
 
-TEST(Instance, starts_with_its_references_unset)
-{
-    const Ref<Sample_Link> made(create<Sample_Link>());
-    EXPECT_EQ(made->Antecedent, nullptr);
-    EXPECT_EQ(made->Others.null, 1);
-    EXPECT_EQ(cast<Sample_Element>(static_cast<Instance*>(made.ptr())), nullptr);
+    const Ref<Sample_Link> unset(create<Sample_Link>());
+    EXPECT_EQ(unset->Antecedent, nullptr);
+    EXPECT_EQ(unset->Others.null, 1);
 }
 
 TEST(Instance, references_are_released_with_their_holder)
@@ -137,9 +132,9 @@ TEST(Instance, keys_of_another_kind_are_never_equal)
     // References to unrelated classes differ even while both are unset.
     Meta_Reference to_person = *find_reference(&Sample_Link::static_meta_class, "Dependent");
     to_person.meta_class = &Sample_Person::static_meta_class;
-    const Meta_Feature* const* own = Sample_Link::static_meta_class.meta_features;
-    const Meta_Feature* const features[] = {own[0], &to_person, own[2], own[3]};
     Meta_Class other = Sample_Link::static_meta_class;
+    const Meta_Feature* const* own = other.meta_features;
+    const Meta_Feature* const features[] = {own[0], &to_person, own[2], own[3]};
     other.meta_features = features;
     EXPECT_FALSE(key_eq(linked({}, {}).ptr(), Ref<Instance>(create(&other, false)).ptr()));
 }
@@ -189,6 +184,29 @@ TEST(Instance, a_filter_makes_the_references_that_were_asked_for)
     __create_refs(half.ptr());
     ASSERT_NE(half->Dependent, nullptr);
     EXPECT_EQ(half->Dependent->Size.value, 1U) << "with defaults";
+}
+
+TEST(Name_Space, is_set_depth_first_where_there_is_none)
+{
+    const auto near = element("near");
+    near->__name_space = "root/other";
+    const auto association = linked(near, disk("far"));
+    const auto third = element("third");
+    association->Others.value.append(nullptr);
+    association->Others.value.append(Ref<Sample_Element>(third).steal());
+
+    std::vector<const Instance*> visited;
+    __visit(
+        association.ptr(), [](Instance* i, void* data) { static_cast<std::vector<const Instance*>*>(data)->push_back(i); },
+        &visited);
+    EXPECT_THAT(visited, ::testing::ElementsAre(association.ptr(), near.ptr(), association->Dependent, third.ptr()));
+
+    __set_name_space_recursive(association.ptr(), "root/zemlar", false);
+    for (const Instance* instance : visited)
+        EXPECT_EQ(instance->__name_space, instance == near.ptr() ? "root/other" : "root/zemlar");
+    __set_name_space_recursive(association.ptr(), "root/new", true);
+    for (const Instance* instance : visited)
+        EXPECT_EQ(instance->__name_space, "root/new");
 }
 
 } // namespace

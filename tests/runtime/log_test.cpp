@@ -2,7 +2,9 @@
 
 #include "runtime/file_lock.h"
 #include "runtime/trace.h"
+#include "runtime/value.h"
 #include "tests/runtime/home.h"
+#include "tests/runtime/sample_classes.h"
 
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
@@ -20,7 +22,7 @@
 #include <vector>
 
 using namespace zmlr;
-using sample::Home;
+using namespace sample;
 using ::testing::ElementsAre;
 using ::testing::MatchesRegex;
 
@@ -33,6 +35,14 @@ void log_one_of_each()
 {
     for (Log_Level level : {LL_FATAL, LL_ERR, LL_WARN, LL_INFO, LL_DBG})
         ZMLR_LOG(level, "level %u", static_cast<unsigned>(level));
+}
+
+// The log is off: from the first call on, further ones must cost next to nothing.
+void log_to_no_avail()
+{
+    log_one_of_each();
+    if (log_wanted(LL_FATAL))
+        std::abort();
 }
 
 TEST(Log, option_file_decides_what_is_written)
@@ -70,11 +80,9 @@ TEST(Log, is_off_and_leaves_no_trace_without_a_valid_level)
         ASSERT_TRUE(home.run(
             [&]
             {
-                log_one_of_each();
-                if (log_wanted(LL_FATAL))
-                    std::abort(); // from now on a call must cost next to nothing
+                log_to_no_avail();
                 home.options("LOG_LEVEL=DBG\n");
-                log_one_of_each();
+                log_to_no_avail();
             }));
         EXPECT_FALSE(home.has(".cimple")) << options << " and tried once only";
     }
@@ -114,18 +122,7 @@ TEST(Log, traces_scopes_on_every_way_out)
 {
     const Home home;
     home.options("LOG_LEVEL=DBG\n");
-    ASSERT_TRUE(home.run(
-        [&]
-        {
-            try
-            {
-                const Scope_Trace trace(log_source, "getInstances");
-                throw 1;
-            }
-            catch (int)
-            {
-            }
-        }));
+    ASSERT_TRUE(home.run([] { EXPECT_THROW((Scope_Trace(log_source, "getInstances"), throw 1), int); }));
     EXPECT_THAT(home.lines(), ElementsAre(MatchesRegex(".* DBG: FCHBAManager\\([0-9]+\\): Entering: getInstances"),
                                           MatchesRegex(".* DBG: FCHBAManager\\([0-9]+\\): Returning: getInstances")));
 }
@@ -197,25 +194,23 @@ TEST(Log, waits_for_another_process_that_holds_the_lock)
 TEST(Log, stays_off_when_something_else_has_the_name_of_a_file)
 {
     namespace fs = std::filesystem;
+    using Make = void (*)(const std::string& path);
+    const Make pipe = [](const std::string& path) { mkfifo(path.c_str(), 0600); };
+    const Make file = [](const std::string& path) { std::fclose(std::fopen(path.c_str(), "w")); };
+    const Make directory = [](const std::string& path) { fs::create_directory(path); };
+    const Make endless_device = [](const std::string& path) { fs::create_symlink("/dev/zero", path); };
+    const Make terabyte_of_nothing = [](const std::string& path)
+    {
+        std::fclose(std::fopen(path.c_str(), "w"));
+        fs::resize_file(path, std::uintmax_t{1} << 40);
+    };
     const struct
     {
-        const char* name;
         const char* file;
-        void (*make)(const std::string& path);
+        Make make;
     } rows[] = {
-        {"options: a directory", ".cimplerc", [](const std::string& path) { fs::create_directory(path); }},
-        {"options: a pipe", ".cimplerc", [](const std::string& path) { mkfifo(path.c_str(), 0600); }},
-        {"options: an endless device", ".cimplerc", [](const std::string& path) { fs::create_symlink("/dev/zero", path); }},
-        {"options: a terabyte of nothing", ".cimplerc",
-         [](const std::string& path)
-         {
-             std::fclose(std::fopen(path.c_str(), "w"));
-             fs::resize_file(path, std::uintmax_t{1} << 40);
-         }},
-        {"directory: a file", ".cimple", [](const std::string& path) { std::fclose(std::fopen(path.c_str(), "w")); }},
-        {"log: a pipe", ".cimple/messages", [](const std::string& path) { mkfifo(path.c_str(), 0600); }},
-        {"log: a directory", ".cimple/messages", [](const std::string& path) { fs::create_directory(path); }},
-        {"lock: a pipe", ".cimple/messages.lock", [](const std::string& path) { mkfifo(path.c_str(), 0600); }},
+        {".cimplerc", directory}, {".cimplerc", pipe},        {".cimplerc", endless_device},   {".cimplerc", terabyte_of_nothing},
+        {".cimple", file},        {".cimple/messages", pipe}, {".cimple/messages", directory}, {".cimple/messages.lock", pipe},
     };
     for (const auto& row : rows)
     {
@@ -225,14 +220,7 @@ TEST(Log, stays_off_when_something_else_has_the_name_of_a_file)
             home.options("LOG_LEVEL=DBG\n");
         fs::create_directory(path.parent_path());
         row.make(path);
-        EXPECT_TRUE(home.run(
-            [&]
-            {
-                log_one_of_each();
-                if (log_wanted(LL_FATAL))
-                    std::abort(); // from now on a call must cost next to nothing
-            }))
-            << row.name;
+        EXPECT_TRUE(home.run(log_to_no_avail)) << &row - rows << row.file;
     }
 }
 
@@ -249,6 +237,36 @@ TEST(Log, level_and_directory_can_be_set_by_code)
             log_one_of_each();
         }));
     EXPECT_EQ(home.lines().size(), 4U);
+}
+
+void store_what_does_not_fit()
+{
+    const auto to = linked(element("a"), disk("d"));
+    Value wrong;
+    wrong.set_value(element("no disk").steal());
+    wrong.get(to.ptr(), find_reference(to->meta_class, "Dependent"));
+    wrong.get(to.ptr(), find_property(to->meta_class, "Note"));
+    wrong.get(nullptr, find_property(to->meta_class, "Note"));
+}
+
+TEST(Log, warnings_name_class_and_feature)
+{
+    const Home home;
+    home.options("LOG_LEVEL=WARN\n");
+    ASSERT_TRUE(home.run(
+        []
+        {
+            store_what_does_not_fit();
+            if (log_enable(true) != -1 || log_enable(false) != 0 || log_enable(false) != -1)
+                std::abort();
+            store_what_does_not_fit();
+            log(LL_WARN, "Other", 1, "still written");
+        }));
+    const std::string mark = ".* WARN: Value\\([0-9]+\\): ";
+    EXPECT_THAT(home.lines(),
+                ElementsAre(MatchesRegex(mark + "failed to assign instance of Sample_Element to Sample_Link.Dependent"),
+                            MatchesRegex(mark + "type mismatch: Sample_Link.Note"), MatchesRegex(mark + "null instance argument"),
+                            MatchesRegex(".*still written")));
 }
 
 } // namespace

@@ -13,11 +13,17 @@ using namespace zmlr;
 namespace
 {
 
-template <class Work> void in_threads(int count, Work work)
+// Does the work a thousand times in each of four threads.
+template <class Work> void in_threads(Work work)
 {
     std::vector<std::thread> threads;
-    for (int i = 0; i < count; ++i)
-        threads.emplace_back(work);
+    for (int i = 0; i < 4; ++i)
+        threads.emplace_back(
+            [=]
+            {
+                for (int k = 0; k < 1000; ++k)
+                    work();
+            });
     for (std::thread& thread : threads)
         thread.join();
 }
@@ -28,22 +34,19 @@ TEST(Mutex, is_held_by_one_thread_at_a_time)
     {
         Mutex mutex(recursive);
         int count = 0;
-        in_threads(4,
-                   [&]
-                   {
-                       for (int i = 0; i < 1000; ++i)
-                       {
-                           const Auto_Mutex held(mutex);
-                           ++count;
-                       }
-                   });
+        in_threads(
+            [&]
+            {
+                const Auto_Mutex held(mutex);
+                ++count;
+            });
         EXPECT_EQ(count, 4000);
 
         const Auto_Mutex held(mutex);
         EXPECT_EQ(mutex.try_lock(), recursive ? 0 : -1);
         if (recursive)
             mutex.unlock();
-        in_threads(1, [&] { EXPECT_EQ(mutex.try_lock(), -1); });
+        std::thread([&] { EXPECT_EQ(mutex.try_lock(), -1); }).join();
     }
 }
 
@@ -55,7 +58,7 @@ TEST(MutexDeathTest, is_neither_given_back_by_strangers_nor_taken_twice)
     const auto release_from_another_thread = [](Mutex& mutex)
     {
         const Auto_Mutex held(mutex);
-        in_threads(1, [&] { mutex.unlock(); });
+        std::thread([&] { mutex.unlock(); }).join();
     };
     for (bool recursive : {true, false})
     {
@@ -77,20 +80,17 @@ TEST(Counts, threads_share_values_and_instances)
     const auto shared = sample::element("shared");
     const String text("text");
     const Datetime time(5, 60);
-    in_threads(4,
-               [&]
-               {
-                   for (int i = 0; i < 1000; ++i)
-                   {
-                       const Ref<sample::Sample_Element> held = shared;
-                       const Ref<sample::Sample_Element> copied(clone(held.ptr()));
-                       String own = text;
-                       own.append('!');
-                       Datetime later = time;
-                       later.usec(6);
-                       EXPECT_EQ(copied->Name.value, "shared");
-                   }
-               });
+    in_threads(
+        [&]
+        {
+            const Ref<sample::Sample_Element> held = shared;
+            const Ref<sample::Sample_Element> copied(clone(held.ptr()));
+            String own = text;
+            own.append('!');
+            Datetime later = time;
+            later.usec(6);
+            EXPECT_EQ(copied->Name.value, "shared");
+        });
     EXPECT_EQ(Atomic_get(&shared->__refs), 1U);
     EXPECT_EQ(text, "text");
     EXPECT_TRUE(time == Datetime(5, 60));

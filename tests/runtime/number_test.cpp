@@ -41,16 +41,10 @@ TEST(Number, reads_unsigned)
 {
     constexpr uint64 largest = std::numeric_limits<uint64>::max();
     expect_reads<uint64>(str_to_uint64,
-                         {{"0", 0},
-                          {"07", 7}, // leading zeros do not count
-                          {"007", 7},
-                          {"9999", 9999},
-                          {"12345", 12345},
-                          {"00000000000000000001", 1},
-                          {"18446744073709551615", largest},
-                          {"0x1F", 31},
-                          {"0X0", 0},
-                          {"0xFFFFFFFFFFFFFFFF", largest}},
+                         // clang-format off
+                         {{"0", 0}, {"07", 7}, {"12345", 12345}, {"00000000000000000001", 1}, {"18446744073709551615", largest},
+                          {"0x1F", 31}, {"0X0", 0}, {"0xFFFFFFFFFFFFFFFF", largest}},
+                         // clang-format on
                          {"18446744073709551616", "99999999999999999999", "000000000000000000001", "0123456789012345678901",
                           "123x", "123x5", "12x", "1 ", " 1", "+1", "-1", "", nullptr, "0x1f", "0x", "00x1", "0x1G",
                           "0x00000000000000001", "\xB2"});
@@ -64,13 +58,10 @@ TEST(Number, reads_signed)
     constexpr sint64 smallest = std::numeric_limits<sint64>::min();
     constexpr sint64 largest = std::numeric_limits<sint64>::max();
     expect_reads<sint64>(str_to_sint64,
-                         {{"-9223372036854775808", smallest},
-                          {"-0x8000000000000000", smallest},
-                          {"9223372036854775807", largest},
-                          {"+9223372036854775807", largest},
-                          {"+0x7FFFFFFFFFFFFFFF", largest},
-                          {"-0x10", -16},
-                          {"-0", 0}},
+                         // clang-format off
+                         {{"-9223372036854775808", smallest}, {"-0x8000000000000000", smallest}, {"9223372036854775807", largest},
+                          {"+9223372036854775807", largest}, {"+0x7FFFFFFFFFFFFFFF", largest}, {"-0x10", -16}, {"-0", 0}},
+                         // clang-format on
                          {"-9223372036854775809", "-0x8000000000000001", "9223372036854775808", "+0x8000000000000000", "-", "+",
                           "--1", "+-1", "- 1", "", nullptr});
     expect_reads<sint8>(str_to_sint8, {{"127", 127}, {"-128", -128}}, {"128", "-129", "x"});
@@ -79,30 +70,19 @@ TEST(Number, reads_signed)
                          {"2147483648", "-2147483649"});
 }
 
-TEST(Number, reads_reals)
+TEST(Number, reads_reals_and_booleans)
 {
     constexpr real64 infinity = std::numeric_limits<real64>::infinity();
     const std::string long_fraction = "0." + std::string(1000000, '3');
     expect_reads<real64>(
         str_to_real64,
-        {{"1.0", 1},
-         {".5", 0.5},
-         {"-.5", -0.5},
-         {"+1.5e3", 1500},
-         {"1.5E-3", 0.0015},
-         {"0.1", 0.1},
-         {"1.0e+400", infinity},
-         {"-1.0e400", -infinity},
-         {"1.0e-400", 0},
-         {long_fraction.c_str(), 1 / 3.0}},
+        // clang-format off
+        {{"1.0", 1}, {".5", 0.5}, {"-.5", -0.5}, {"+1.5e3", 1500}, {"1.5E-3", 0.0015}, {"0.1", 0.1}, {"1.0e+400", infinity},
+         {"-1.0e400", -infinity}, {"1.0e-400", 0}, {long_fraction.c_str(), 1 / 3.0}},
+        // clang-format on
         {"1", "1.", ".", "-", "1.5e", "1.5e+", "1.5e3x", "1.5x", " 1.5", "1,5", "0x1.8p3", "inf", "nan", "", nullptr});
     expect_reads<real32>(str_to_real32, {{"0.1", 0.1F}, {"1.0e39", std::numeric_limits<real32>::infinity()}}, {"1"});
-}
-
-TEST(Number, reads_booleans)
-{
-    expect_reads<boolean>(str_to_boolean, {{"true", true}, {"TRUE", true}, {"True", true}, {"false", false}, {"FALSE", false}},
-                          {"", "t", "true ", "truely", "1", nullptr});
+    expect_reads<boolean>(str_to_boolean, {{"true", true}, {"FALSE", false}}, {"", "t", "true ", "truely", "1", nullptr});
 }
 
 template <class T> std::string written(const char* (*write)(char (&)[number_text_size], T, uint32&), T x)
@@ -134,18 +114,16 @@ TEST(Number, writes_what_it_reads)
 
 TEST(Type, is_found_by_name)
 {
+    Type type = UINT8;
     for (uint32 i = 0; i < num_types; ++i)
     {
-        Type type = DATETIME;
         EXPECT_EQ(type_name_to_type(type_name[i], type), 0);
         EXPECT_EQ(type, static_cast<Type>(i));
     }
-    Type type = UINT8;
-    EXPECT_EQ(type_name_to_type("DateTime", type), 0);
-    EXPECT_EQ(type, DATETIME);
     for (const char* name : {"", "uint", "uint128", "string ", "instance"})
         EXPECT_EQ(type_name_to_type(name, type), -1) << name;
     EXPECT_EQ(type, DATETIME);
+    EXPECT_EQ(type_name_to_type("Uint8", type), 0);
 }
 
 TEST(Text, is_cut_into_tokens)

@@ -1,6 +1,7 @@
-#include "runtime/array.h"
+#include "runtime/instance_print.h"
 #include "runtime/print.h"
 #include "tests/runtime/printed.h"
+#include "tests/runtime/sample_classes.h"
 
 #include <gtest/gtest.h>
 
@@ -8,50 +9,87 @@
 #include <string>
 
 using namespace zmlr;
+using namespace sample;
 
 namespace
 {
 
-template <class T> std::string scalar(const T& x)
+template <class T> void expect_printed(const T& x, const std::string& text)
 {
-    return printed([&](std::FILE* stream) { print_scalar(stream, type_code<T>::value, &x); });
+    EXPECT_EQ(printed([&](std::FILE* stream) { print_scalar(stream, type_code<T>::value, &x); }), text);
+    const Array<T> twice = {x, x};
+    EXPECT_EQ(printed([&](std::FILE* stream) { print_array(stream, type_code<T>::value, &twice); }),
+              "{ " + text + ", " + text + " }");
 }
 
-template <class T> std::string array(const Array<T>& x)
+TEST(Print, scalars_and_arrays)
 {
-    return printed([&](std::FILE* stream) { print_array(stream, type_code<T>::value, &x); });
+    expect_printed(true, "true");
+    expect_printed(uint8{255}, "255");
+    expect_printed(sint8{-128}, "-128");
+    expect_printed(uint16{65535}, "65535");
+    expect_printed(sint16{-32768}, "-32768");
+    expect_printed(std::numeric_limits<uint32>::max(), "4294967295");
+    expect_printed(std::numeric_limits<sint32>::min(), "-2147483648");
+    expect_printed(std::numeric_limits<uint64>::max(), "18446744073709551615");
+    expect_printed(std::numeric_limits<sint64>::min(), "-9223372036854775808");
+    expect_printed(0.25F, "0.250000");
+    expect_printed(-1.5e6, "-1500000.000000");
+    expect_printed(char16(31), "0x001F");
+    expect_printed(char16(32), "' '");
+    expect_printed(char16(126), "'~'");
+    expect_printed(char16(0xFEFF), "0xFEFF");
+    expect_printed(Datetime(uint64{5}), "\"00000000000000.000005:000\"");
+    const char text[] = "a \"b\" \\ \t\n\x01\xC3\xBC" // a digit behind an escape is no part of it
+                        "1";
+    expect_printed(String(text), R"("a \"b\" \\ \t\n\001\303\2741")");
 }
 
-TEST(Print, scalars)
+TEST(Print, an_instance_is_a_block_and_so_is_what_it_refers_to)
 {
-    EXPECT_EQ(scalar(true), "true");
-    EXPECT_EQ(scalar(false), "false");
-    EXPECT_EQ(scalar(uint8{255}), "255");
-    EXPECT_EQ(scalar(sint8{-128}), "-128");
-    EXPECT_EQ(scalar(uint16{65535}), "65535");
-    EXPECT_EQ(scalar(sint16{-32768}), "-32768");
-    EXPECT_EQ(scalar(std::numeric_limits<uint32>::max()), "4294967295");
-    EXPECT_EQ(scalar(std::numeric_limits<sint32>::min()), "-2147483648");
-    EXPECT_EQ(scalar(std::numeric_limits<uint64>::max()), "18446744073709551615");
-    EXPECT_EQ(scalar(std::numeric_limits<sint64>::min()), "-9223372036854775808");
-    EXPECT_EQ(scalar(0.25F), "0.250000");
-    EXPECT_EQ(scalar(-1.5e6), "-1500000.000000");
-    EXPECT_EQ(scalar(char16(31)), "0x001F");
-    EXPECT_EQ(scalar(char16(32)), "' '");
-    EXPECT_EQ(scalar(char16(126)), "'~'");
-    EXPECT_EQ(scalar(char16(0xFEFF)), "0xFEFF");
-    EXPECT_EQ(scalar(String("a \"b\" \\ \t\n\x01\xC3\xBC"
-                            "1")),
-              R"("a \"b\" \\ \t\n\001\303\2741")");
-    EXPECT_EQ(scalar(Datetime(uint64{5})), "\"00000000000000.000005:000\"");
+    const auto association = linked(element("a\"b"), {});
+    association->__name_space = "root/zemlar";
+    association->Antecedent->Labels.value.clear();
+    const Ref<Sample_Setting> setting(create<Sample_Setting>(false));
+    association->Others.value.append(Ref<Sample_Setting>(setting).steal());
+    association->Others.value.append(nullptr);
+    association->Others.null = 0;
+    EXPECT_EQ(printed([&](std::FILE* stream) { fprint(stream, association.ptr()); }),
+              R"(Sample_Link
+{
+    string __name_space = "root/zemlar";
+    Sample_Element Antecedent =
+    {
+        string Name = "a\"b";
+        boolean Online = NULL;
+        uint8 Slot = NULL;
+        uint32 Size = 1;
+        sint64 Delta = NULL;
+        real64 Load = NULL;
+        char16 Letter = 'x';
+        datetime Since = "00000001000000.000000:000";
+        string Caption = "new element";
+        string Labels[] = { };
+        uint16 Codes[] = { 2, 3, 5 };
+        datetime Intervals[] = { "00000000000000.000000:000" };
+        real64 Samples[] = NULL;
+    }
+    Sample_Disk Dependent = NULL;
+    Sample_Element Others[] =
+    {
+        Sample_Setting Others =
+        {
+            uint32 Level = 0;
+        }
+        NULL
+    };
+    string Note = NULL;
 }
+)");
 
-TEST(Print, arrays)
-{
-    EXPECT_EQ(array(Array<boolean>()), "{ }");
-    EXPECT_EQ(array(Array<uint32>{7}), "{ 7 }");
-    EXPECT_EQ(array(Array<String>{"a", ""}), R"({ "a", "" })");
-    EXPECT_EQ(array(Array<Datetime>{Datetime()}), "{ \"00000000000000.000000:000\" }");
+    testing::internal::CaptureStdout();
+    print(setting.ptr());
+    EXPECT_EQ(testing::internal::GetCapturedStdout(), "Sample_Setting\n{\n    uint32 Level = 0;\n}\n");
 }
 
 } // namespace

@@ -77,23 +77,13 @@ constexpr Meta_Reference reset_peer   = make(Flag_Reference | Flag_In, "Peer", f
 constexpr Meta_Property  reset_return = make(Flag_Property | Flag_Out, "return_value", UINT32, false, offsetof(Sample_Element_Reset_method, return_value));
 // clang-format on
 
+// clang-format off
 constexpr const Meta_Feature* reset_features[] = {&reset_delay, &reset_peer, &reset_return};
-
-constexpr const Meta_Feature* element_features[] = {&element_name,    &element_online,
-                                                    &element_slot,    &element_size,
-                                                    &element_delta,   &element_load,
-                                                    &element_letter,  &element_since,
-                                                    &element_caption, &element_labels,
-                                                    &element_codes,   &element_intervals,
-                                                    &element_samples, &Sample_Element_Reset_method::static_meta_class};
-constexpr const Meta_Feature* disk_features[] = {&element_name,    &element_online,
-                                                 &element_slot,    &element_size,
-                                                 &element_delta,   &element_load,
-                                                 &element_letter,  &element_since,
-                                                 &element_caption, &element_labels,
-                                                 &element_codes,   &element_intervals,
-                                                 &element_samples, &Sample_Element_Reset_method::static_meta_class,
-                                                 &disk_blocks};
+constexpr const Meta_Feature* disk_features[] = { // those of an element, then its own
+    &element_name, &element_online, &element_slot, &element_size, &element_delta, &element_load, &element_letter, &element_since,
+    &element_caption, &element_labels, &element_codes, &element_intervals, &element_samples,
+    &Sample_Element_Reset_method::static_meta_class, &disk_blocks};
+// clang-format on
 constexpr const Meta_Feature* link_features[] = {&link_antecedent, &link_dependent, &link_others, &link_note};
 constexpr const Meta_Feature* person_features[] = {&person_name};
 constexpr const Meta_Feature* setting_features[] = {&setting_level};
@@ -111,7 +101,7 @@ constinit const Meta_Method Sample_Element_Reset_method::static_meta_class = {
     {{{0}, Flag_Method, "Reset", nullptr, 0}, reset_features, 3, sizeof(Sample_Element_Reset_method)}, UINT32};
 
 constinit const Meta_Class Sample_Element::static_meta_class =
-    make(Flag_Class, "Sample_Element", element_features, 14, sizeof(Sample_Element), all_local, nullptr, 1);
+    make(Flag_Class, "Sample_Element", disk_features, 14, sizeof(Sample_Element), all_local, nullptr, 1);
 constinit const Meta_Class Sample_Disk::static_meta_class =
     make(Flag_Class, "Sample_Disk", disk_features, 15, sizeof(Sample_Disk), disk_locals, &Sample_Element::static_meta_class, 1);
 constinit const Meta_Class Sample_Link::static_meta_class =
@@ -123,19 +113,15 @@ constinit const Meta_Class Sample_Setting::static_meta_class =
 
 constinit const Meta_Repository repository = {classes, 5};
 
-Ref<Sample_Element> element(const char* name)
+template <class T> Ref<T> named(const char* name)
 {
-    Ref<Sample_Element> result(create<Sample_Element>());
+    Ref<T> result(create<T>());
     result->Name.set(name);
     return result;
 }
 
-Ref<Sample_Disk> disk(const char* name)
-{
-    Ref<Sample_Disk> result(create<Sample_Disk>());
-    result->Name.set(name);
-    return result;
-}
+Ref<Sample_Element> element(const char* name) { return named<Sample_Element>(name); }
+Ref<Sample_Disk> disk(const char* name) { return named<Sample_Disk>(name); }
 
 Ref<Sample_Link> linked(Ref<Sample_Element> antecedent, Ref<Sample_Disk> dependent)
 {

@@ -13,26 +13,18 @@ String of_size(std::size_t n) { return String(std::string(n, 'x').c_str()); }
 
 TEST(String, capacities_are_powers_of_two_from_thirty_two)
 {
-    const struct
+    // The size of a new one; its capacity; the capacity with one character more.
+    constexpr uint32 rows[][3] = {{0, 0, 32}, {1, 32, 32}, {31, 32, 32}, {32, 32, 64}, {33, 64, 64}, {64, 64, 128}};
+    for (const auto& [size, made, grown] : rows)
     {
-        std::size_t size;
-        uint32 made, character_more, text_more;
-    } rows[] = {
-        // a new one, then with one character more, or with a text of one character more
-        {0, 0, 32, 32}, {1, 32, 32, 32}, {31, 32, 32, 32}, {32, 32, 64, 64}, {33, 64, 64, 64}, {64, 64, 128, 128},
-    };
-    for (const auto& row : rows)
-    {
-        String made = of_size(row.size);
-        EXPECT_EQ(made.capacity(), row.made) << row.size;
-        String with_character = of_size(row.size);
+        String with_character = of_size(size), with_text = of_size(size);
+        EXPECT_EQ(with_text.capacity(), made) << size;
         with_character.append('y');
-        EXPECT_EQ(with_character.capacity(), row.character_more) << row.size;
-        String with_text = of_size(row.size);
         with_text.append("y");
-        EXPECT_EQ(with_text.capacity(), row.text_more) << row.size;
+        EXPECT_EQ(with_character.capacity(), grown) << size;
+        EXPECT_EQ(with_text.capacity(), grown) << size;
         EXPECT_TRUE(with_text == with_character);
-        EXPECT_EQ(with_text.size(), row.size + 1);
+        EXPECT_EQ(with_text.size(), size + 1);
     }
 }
 
@@ -64,7 +56,6 @@ TEST(String, all_empty_strings_are_one)
     {
         EXPECT_EQ(empty.c_str(), String().c_str());
         EXPECT_EQ(empty.capacity(), 0U);
-        EXPECT_STREQ(empty.c_str(), "");
     }
 
     String own("text");
@@ -82,11 +73,10 @@ TEST(String, takes_its_own_text_as_argument)
     EXPECT_EQ(s.size(), 15U * 16);
     EXPECT_TRUE(s.equal(15 * 15, 15, "012345678956789"));
     s.assign(s.c_str() + 230, 5);
-    EXPECT_STREQ(s.c_str(), "56789");
     s = s.c_str() + 3;
-    EXPECT_STREQ(s.c_str(), "89");
     s = *&s;
-    EXPECT_STREQ(s.c_str(), "89");
+    s = s.substr(1);
+    EXPECT_STREQ(s.c_str(), "9");
 }
 
 TEST(String, finds_removes_and_compares)
@@ -120,7 +110,6 @@ TEST(String, finds_removes_and_compares)
 
 TEST(Text, compares_names_without_regard_to_case)
 {
-    EXPECT_TRUE(eqi("", ""));
     EXPECT_TRUE(eqi("DeviceID", "deviceid"));
     for (const char* other : {"", "d", "DeviceI", "DeviceID2", "Device[D"})
     {
@@ -134,27 +123,23 @@ TEST(Text, bounded_copy_and_append)
     const struct
     {
         const char* before;
-        std::size_t size;
-        const char* source;
-        std::size_t result;
+        std::size_t size, result;
         const char* after;
-    } rows[] = {
-        {"ab", 8, "cd", 4, "abcd"}, {"ab", 5, "cd", 4, "abcd"}, {"ab", 4, "cd", 4, "abc"},
-        {"ab", 2, "cd", 2, "ab"},   {"", 1, "cd", 2, ""},       {"ab", 0, "cd", 0, "ab"},
-    };
+    } rows[] = {{"ab", 5, 4, "abcd"}, {"ab", 4, 4, "abc"}, {"ab", 2, 2, "ab"}, {"", 1, 2, ""}, {"ab", 0, 0, "ab"}};
     for (const auto& row : rows)
     {
         char buffer[8] = {};
         strlcpy(buffer, row.before, sizeof(buffer));
-        EXPECT_EQ(strlcat(buffer, row.source, row.size), row.result) << row.before << row.size;
+        EXPECT_EQ(strlcat(buffer, "cd", row.size), row.result) << row.before << row.size;
         EXPECT_STREQ(buffer, row.after);
     }
 
-    char untouched[2] = {'x', 'y'};
-    EXPECT_EQ(strlcpy(untouched, "long", 0), 4U);
-    EXPECT_EQ(strlcpy(untouched, "long", 1), 4U);
-    EXPECT_EQ(untouched[0], '\0');
-    EXPECT_EQ(untouched[1], 'y');
+    char small[2] = {'x', 'y'};
+    EXPECT_EQ(strlcpy(small, "long", 0), 4U);
+    EXPECT_EQ(small[0], 'x');
+    EXPECT_EQ(strlcpy(small, "long", 1), 4U);
+    EXPECT_EQ(small[0], '\0');
+    EXPECT_EQ(small[1], 'y');
 }
 
 } // namespace

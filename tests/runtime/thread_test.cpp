@@ -7,10 +7,10 @@
 #include <atomic>
 #include <cerrno>
 #include <csignal>
-#include <memory>
 #include <mutex>
 #include <stdexcept>
 #include <string>
+#include <thread>
 #include <utility>
 
 using namespace zmlr;
@@ -18,41 +18,23 @@ using namespace zmlr;
 namespace
 {
 
-// What happened to contexts, in its order, whichever thread it happened in.
-class Events
-{
-public:
-    void add(const std::string& event)
-    {
-        const std::lock_guard guard(_mutex);
-        _text += event + " ";
-    }
-
-    std::string text()
-    {
-        const std::lock_guard guard(_mutex);
-        return _text;
-    }
-
-private:
-    std::mutex _mutex;
-    std::string _text;
-};
+// What happened to contexts, in its order, whichever thread it happened in: at any time only one of them can touch a context.
+using Events = std::string;
 
 // Serves threads; there is no server behind it.
 class Recording_Context : public Thread_Context
 {
 public:
     explicit Recording_Context(Events& events, Thread_Context* child = nullptr) : _events(events), _child(child) {}
-    ~Recording_Context() override { _events.add("delete"); }
+    ~Recording_Context() override { _events += "delete "; }
 
     Thread_Context* thread_create_hook(void*) override
     {
-        _events.add("create");
+        _events += "create ";
         return std::exchange(_child, nullptr);
     }
-    void thread_start_hook() noexcept override { _events.add(top() == this ? "start" : "start-elsewhere"); }
-    void thread_exit_hook() noexcept override { _events.add(top() == this ? "exit" : "exit-elsewhere"); }
+    void thread_start_hook() noexcept override { _events += top() == this ? "start " : "start-elsewhere "; }
+    void thread_exit_hook() noexcept override { _events += top() == this ? "exit " : "exit-elsewhere "; }
 
     int instance_enumerator_create(const char*, const Instance*, Instance_Enumerator_Rep*&) override { return -1; }
     void instance_enumerator_destroy(Instance_Enumerator_Rep*) override {}
@@ -101,28 +83,21 @@ TEST(Thread_Context, each_thread_has_its_own_stack)
 
 TEST(Thread, runs_in_the_context_that_its_creator_supplies)
 {
-    struct Case
-    {
-        const char* name;
-        Thread::Proc proc;
-        void* result;
-    };
     static int value;
-    const Case cases[] = {
-        {"returns", [](void* arg) { return arg; }, &value},
-        {"exits", [](void* arg) -> void* { Thread::exit(arg); }, &value},
-        {"throws", [](void*) -> void* { throw std::runtime_error("no"); }, nullptr},
-        {"throws no exception", [](void*) -> void* { throw 1; }, nullptr},
+    const std::pair<Thread::Proc, void*> cases[] = {
+        {[](void* arg) { return arg; }, &value},
+        {[](void* arg) -> void* { Thread::exit(arg); }, &value},
+        {[](void*) -> void* { throw std::runtime_error("no"); }, nullptr},
+        {[](void*) -> void* { throw 1; }, nullptr},
     };
-    for (const Case& c : cases)
+    for (const auto& [proc, result] : cases)
     {
-        SCOPED_TRACE(c.name);
         Events events;
         Recording_Context creator(events, new Recording_Context(events));
         Thread_Context::push(&creator);
-        EXPECT_EQ(in_thread(c.proc, &value), c.result);
+        EXPECT_EQ(in_thread(proc, &value), result);
         Thread_Context::pop();
-        EXPECT_EQ(events.text(), "create start exit delete ");
+        EXPECT_EQ(events, "create start exit delete ") << "case " << &proc - &cases[0].first;
     }
 }
 
@@ -159,34 +134,24 @@ TEST(Thread, that_cannot_be_created_leaves_nothing_behind)
     EXPECT_EQ(Thread::create_joinable(thread, top_of_stack, nullptr), EAGAIN);
     Thread_Context::pop();
     pthread_setattr_default_np(&usual);
-    EXPECT_EQ(events.text(), "create delete ");
+    EXPECT_EQ(events, "create delete ");
     void* result = nullptr;
     EXPECT_EQ(Thread::join(thread, result), EINVAL);
 }
 
-TEST(Thread, knows_itself)
+TEST(Thread, knows_itself_and_is_joined_once)
 {
     static Thread creator = Thread::self();
     EXPECT_TRUE(Thread::equal(creator, Thread::self()));
     EXPECT_FALSE(Thread::equal(creator, Thread()));
-    in_thread(
-        [](void*) -> void*
-        {
-            EXPECT_FALSE(Thread::equal(creator, Thread::self()));
-            return nullptr;
-        });
-}
+    EXPECT_EQ(in_thread([](void*) -> void* { return Thread::equal(creator, Thread::self()) ? &creator : nullptr; }), nullptr);
 
-TEST(Thread, joins_joinable_threads_once)
-{
     Thread thread;
     void* result = nullptr;
     EXPECT_EQ(Thread::join(thread, result), EINVAL) << "unset";
-
     ASSERT_EQ(Thread::create_joinable(thread, top_of_stack, nullptr), 0);
     EXPECT_EQ(Thread::join(thread, result), 0);
     EXPECT_EQ(Thread::join(thread, result), EINVAL) << "joined";
-
     ASSERT_EQ(Thread::create_detached(thread, top_of_stack, nullptr), 0);
     EXPECT_EQ(Thread::join(thread, result), EINVAL) << "detached";
 }
@@ -195,26 +160,21 @@ TEST(Thread, joins_joinable_threads_once)
 // sanitizer reports it if it were leaked.
 TEST(Thread, used_again_lets_the_thread_before_go)
 {
-    struct Shared
+    static std::mutex mutex;
+    static std::atomic<int> ended = 0;
+    const Thread::Proc proc = [](void*) -> void*
     {
-        std::mutex mutex;
-        std::atomic<int> ended = 0;
-    };
-    static Shared shared;
-    constexpr Thread::Proc proc = [](void*) -> void*
-    {
-        const std::lock_guard guard(shared.mutex);
-        ++shared.ended;
+        const std::lock_guard guard(mutex);
+        ++ended;
         return nullptr;
     };
-
     {
         Thread thread;
-        const std::lock_guard held(shared.mutex);
+        const std::lock_guard held(mutex);
         for (int i = 0; i < 3; ++i)
             ASSERT_EQ(Thread::create_joinable(thread, proc, nullptr), 0);
     }
-    while (shared.ended < 3)
+    while (ended < 3)
         Time::sleep(Time::MSEC);
 }
 
@@ -226,22 +186,15 @@ TEST(Time, sleeps_its_time_through_signals)
     sigaction(SIGUSR1, &action, &old);
 
     const uint64 begin = Time::now();
-    Thread disturber;
-    ASSERT_EQ(Thread::create_joinable(
-                  disturber,
-                  [](void*) -> void*
-                  {
-                      for (int i = 0; i < 10; ++i, Time::sleep(2 * Time::MSEC))
-                          pthread_kill(sleeper, SIGUSR1);
-                      return nullptr;
-                  },
-                  nullptr),
-              0);
+    std::thread disturber(
+        []
+        {
+            for (int i = 0; i < 10; ++i, Time::sleep(2 * Time::MSEC))
+                pthread_kill(sleeper, SIGUSR1);
+        });
     Time::sleep(50 * Time::MSEC);
     EXPECT_GE(Time::now() - begin, 50 * Time::MSEC);
-
-    void* result = nullptr;
-    Thread::join(disturber, result);
+    disturber.join();
     sigaction(SIGUSR1, &old, nullptr);
 }
 
