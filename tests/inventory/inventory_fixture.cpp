@@ -1,13 +1,13 @@
 #include "tests/inventory/inventory_fixture.h"
 
 #include "hxal/hxal.h"
-#include "runtime/value.h"
+#include "runtime/print.h"
+#include "tests/runtime/printed.h"
 
 #include <cstdlib>
 #include <filesystem>
 #include <fstream>
 #include <regex>
-#include <sstream>
 
 namespace zmlr
 {
@@ -41,37 +41,13 @@ public:
 
 [[maybe_unused]] const testing::Environment* home_removal = testing::AddGlobalTestEnvironment(new Home_Removal);
 
-std::string text_of(boolean x) { return x ? "true" : "false"; }
-std::string text_of(const String& x) { return '"' + std::string(x.c_str(), x.size()) + '"'; }
-template <class T>
-requires std::is_integral_v<T> std::string text_of(T x) { return std::to_string(x); }
-
-template <class T> std::string text_of(const Array<T>& array)
+std::string text_of(const Instance* instance, const Meta_Property* property)
 {
-    std::string text;
-    for (const T& x : array)
-        text += (text.empty() ? "" : ", ") + text_of(x);
-    return '{' + text + '}';
-}
-
-template <class... T> std::string text_of_any(const Value& value)
-{
-    std::string text = "?";
-    const auto take = [&text](const auto* x)
-    {
-        if (x)
-            text = text_of(*x);
-    };
-    (take(value.get_if<T>()), ...);
-    return text;
-}
-
-std::string text_of(const Instance* instance, const Meta_Feature* feature)
-{
-    Value value;
-    if (value.set(instance, feature) != 0 || value.null())
+    if (null_of(instance, property))
         return {};
-    return text_of_any<boolean, uint8, uint16, uint32, uint64, String, Array<uint16>, Array<String>>(value);
+    const auto print = property->subscript ? print_array : print_scalar;
+    return printed([&](FILE* stream)
+                   { print(stream, static_cast<Type>(property->type), address_of(instance, property->offset)); });
 }
 
 } // namespace
@@ -105,22 +81,7 @@ void Inventory_Test::plug_text(const std::string& json)
 
 void Inventory_Test::fail(const char* command, const char* node, std::optional<int> instance, int error)
 {
-    hxasim::Fault fault;
-    fault.command = command;
-    fault.node = node;
-    fault.instance = instance;
-    fault.error = error;
-    hxasim::inject(fault);
-}
-
-void Inventory_Test::refuse(const char* command, const char* node, std::optional<int> instance, uint32 status)
-{
-    hxasim::Fault fault;
-    fault.command = command;
-    fault.node = node;
-    fault.instance = instance;
-    fault.status = status;
-    hxasim::inject(fault);
+    hxasim::inject({.command = command, .node = node, .instance = instance, .error = error});
 }
 
 std::vector<std::string> Inventory_Test::requests()
@@ -171,7 +132,7 @@ std::string describe(const Instance* instance)
     for (uint32 i = 0; i < meta_class->num_meta_features; i++)
     {
         const Meta_Feature* feature = meta_class->meta_features[i];
-        const std::string value = is_property(feature) ? text_of(instance, feature) : std::string();
+        const std::string value = is_property(feature) ? text_of(instance, as_property(feature)) : std::string();
         if (!value.empty())
             text += std::string("    ") + feature->name + " = " + value + '\n';
     }

@@ -24,8 +24,7 @@ protected:
     void plug(const std::string& scenario); // replaces the host by a shipped one and scans it
     void plug_text(const std::string& json);
     void rescan();
-    void fail(const char* command, const char* node, std::optional<int> instance, int error);       // with an errno
-    void refuse(const char* command, const char* node, std::optional<int> instance, uint32 status); // with a status
+    void fail(const char* command, const char* node, std::optional<int> instance, int error); // with an errno
 
     std::vector<std::string> requests(); // "COMMAND node instance", since the last call
     std::vector<std::string> log();      // "LEVEL Source: message", since the last call, without entries and exits

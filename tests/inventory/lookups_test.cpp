@@ -27,19 +27,15 @@ protected:
 
 TEST_F(Lookups, find_adapters_by_address)
 {
-    constexpr struct
-    {
-        const char* address;
-        int adapter;
-    } cases[] = {
+    constexpr std::pair<const char*, int> cases[] = {
         {"200000051E100000", 1}, // node WWN
         {"100000051E100001", 1}, // port WWN
         {"200000051e100101", 2}, // lower case
         {"00051E200001", 1},     // Ethernet MAC
         {"00051e300000", 1},     // FCoE MAC
     };
-    for (const auto& c : cases)
-        EXPECT_EQ(ProviderUtil::getAdapterId(c.address), c.adapter) << c.address;
+    for (const auto& [address, adapter] : cases)
+        EXPECT_EQ(ProviderUtil::getAdapterId(address), adapter) << address;
     EXPECT_THAT(requests(), IsEmpty());
 }
 
@@ -48,11 +44,7 @@ TEST_F(Lookups, say_why_there_is_no_adapter)
     constexpr const char* unable_wwn = "WARN ProviderUtil: Unable to get Adapter Id for adpater NWWN =";
     constexpr const char* unable_mac = "WARN ProviderUtil: Unable to get Adapter Id for adpater MAC address=";
     constexpr const char* neither = "WARN ProviderUtil: The address passed is not MAC or WWN";
-    const struct
-    {
-        std::string address;
-        std::string line;
-    } cases[] = {
+    const std::pair<const char*, std::string> cases[] = {
         {"200000051EFFFFFF", std::string(unable_wwn) + "200000051EFFFFFF "},
         {"200000051E10000G", std::string(unable_wwn) + "200000051E10000G "},
         {"00051EFFFFFF", std::string(unable_mac) + "00051EFFFFFF "},
@@ -60,11 +52,11 @@ TEST_F(Lookups, say_why_there_is_no_adapter)
         {"00051E2000001", neither}, // 13 characters
         {"", neither},
     };
-    for (const auto& c : cases)
+    for (const auto& [address, line] : cases)
     {
         log();
-        EXPECT_EQ(ProviderUtil::getAdapterId(c.address.c_str()), -1) << c.address;
-        EXPECT_THAT(log(), ElementsAre(c.line));
+        EXPECT_EQ(ProviderUtil::getAdapterId(address), -1) << address;
+        EXPECT_THAT(log(), ElementsAre(line));
     }
     EXPECT_THAT(requests(), IsEmpty());
 }

@@ -1,5 +1,6 @@
 // Every class of the repository, and every parameter record, through every generic operation: laws that hold whatever the
 // features are.
+#include "runtime/features.h"
 #include "runtime/instance_print.h"
 #include "runtime/model_path.h"
 #include "schema/repository.h"
@@ -12,23 +13,11 @@
 #include <span>
 #include <string>
 #include <type_traits>
-#include <vector>
 
 namespace zmlr
 {
 namespace
 {
-
-std::span<const Meta_Feature* const> features_of(const Meta_Record* record)
-{
-    return {record->meta_features, record->num_meta_features};
-}
-
-const Meta_Property* to_property(const Meta_Feature* feature) { return is_property(feature) ? as_property(feature) : nullptr; }
-const Meta_Reference* to_reference(const Meta_Feature* feature)
-{
-    return is_reference(feature) ? as_reference(feature) : nullptr;
-}
 
 // The value of number n: another one than n + 1 has.
 template <class T> T numbered(unsigned n)
@@ -49,11 +38,10 @@ template <class T> T numbered(unsigned n)
 
 template <class T> void set_as(Instance* instance, const Meta_Property* property, unsigned n)
 {
-    void* value = address_of(instance, property->offset);
-    if (property->subscript == 0)
-        *static_cast<T*>(value) = numbered<T>(n);
+    if (is_array(property))
+        value_at<Array<T>>(instance, property->offset) = {numbered<T>(n), numbered<T>(n + 1)};
     else
-        *static_cast<Array<T>*>(value) = {numbered<T>(n), numbered<T>(n + 1)};
+        value_at<T>(instance, property->offset) = numbered<T>(n);
     null_of(instance, property) = 0;
 }
 
@@ -77,15 +65,12 @@ Ref<Instance> filled(const Meta_Record* record, unsigned seed)
         ++seed;
         if (const Meta_Property* property = to_property(feature))
             set(result.ptr(), property, seed);
-        const Meta_Reference* reference = to_reference(feature);
-        if (reference && reference->subscript == 0)
-            reference_of(result.ptr(), reference) = filled(reference->meta_class, seed).steal();
-        if (reference && reference->subscript != 0)
+        else if (const Meta_Reference* single = to_single_reference(feature))
+            reference_of(result.ptr(), single) = filled(single->meta_class, seed).steal();
+        else if (const Meta_Reference* array = to_array_reference(feature))
         {
-            auto& elements = *static_cast<Array<Instance*>*>(address_of(result.ptr(), reference->offset));
-            elements.append(filled(reference->meta_class, seed).steal());
-            elements.append(nullptr);
-            null_of(result.ptr(), reference) = 0;
+            references_of(result.ptr(), array) = {filled(array->meta_class, seed).steal(), nullptr};
+            null_of(result.ptr(), array) = 0;
         }
     }
     return result;
@@ -93,31 +78,28 @@ Ref<Instance> filled(const Meta_Record* record, unsigned seed)
 
 Ref<Instance> cloned(const Ref<Instance>& instance) { return Ref<Instance>(clone(static_cast<const Instance*>(instance.ptr()))); }
 
-std::vector<const Meta_Class*> all_classes()
-{
-    return {meta_repository().meta_classes, meta_repository().meta_classes + meta_repository().num_meta_classes};
-}
+std::span<const Meta_Class* const> all_classes() { return {meta_repository().meta_classes, meta_repository().num_meta_classes}; }
 
-std::vector<const Meta_Record*> all_records()
+void for_each_class(void (*law)(const Meta_Class*))
 {
-    std::vector<const Meta_Record*> result;
+    ASSERT_EQ(all_classes().size(), 177U);
     for (const Meta_Class* meta_class : all_classes())
     {
-        result.push_back(meta_class);
-        for (const Meta_Feature* feature : features_of(meta_class))
-            if (is_method(feature) && std::ranges::find(result, as_method(feature)) == result.end())
-                result.push_back(as_method(feature));
+        SCOPED_TRACE(meta_class->name);
+        law(meta_class);
     }
-    return result;
 }
 
-template <class Record, class Law> void for_each(const std::vector<const Record*>& records, Law law)
+// A record of each class and of each method's parameters, where the method is declared.
+void for_each_record(void (*law)(const Meta_Record*))
 {
-    ASSERT_GE(records.size(), 177U);
-    for (const Record* record : records)
+    for (const Meta_Class* meta_class : all_classes())
     {
-        SCOPED_TRACE(record->name);
-        law(record);
+        SCOPED_TRACE(meta_class->name);
+        law(meta_class);
+        for (uint32 i = 0; i < meta_class->num_meta_features; ++i)
+            if (meta_class->locals[i].local && is_method(meta_class->meta_features[i]))
+                law(as_method(meta_class->meta_features[i]));
     }
 }
 
@@ -125,7 +107,7 @@ bool feature_eq(const Meta_Feature* feature, const Instance* a, const Instance* 
 {
     if (const Meta_Property* property = to_property(feature))
         return property_eq(property, a, b);
-    const Meta_Reference* reference = to_reference(feature);
+    const Meta_Reference* reference = to_single_reference(feature);
     if (!reference)
         return true;
     const Instance* at_a = reference_of(a, reference);
@@ -135,14 +117,14 @@ bool feature_eq(const Meta_Feature* feature, const Instance* a, const Instance* 
 
 bool has_default(const Instance* instance, const Meta_Property* property)
 {
-    const void* value = address_of(instance, property->offset);
-    if (property->subscript != 0)
-        return static_cast<const Array<uint8>*>(value)->size() == property->value->size;
+    const uint32 at = property->offset;
+    if (is_array(property))
+        return value_at<Array<uint8>>(instance, at).size() == property->value->size;
     if (property->type == STRING)
-        return *static_cast<const String*>(value) == static_cast<const char*>(property->value->data);
+        return value_at<String>(instance, at) == static_cast<const char*>(property->value->data);
     if (property->type == DATETIME)
-        return static_cast<const Datetime*>(value)->ascii() == static_cast<const char*>(property->value->data);
-    return std::memcmp(value, property->value->data, type_size[property->type]) == 0;
+        return value_at<Datetime>(instance, at).ascii() == static_cast<const char*>(property->value->data);
+    return std::memcmp(address_of(instance, at), property->value->data, type_size[property->type]) == 0;
 }
 
 void expect_defaults_or_zeros(const Meta_Class* meta_class)
@@ -165,10 +147,7 @@ void expect_defaults_or_zeros(const Meta_Class* meta_class)
     EXPECT_TRUE(identical(cleared.ptr(), zero.ptr()));
 }
 
-TEST(Every_Class, starts_with_its_defaults_or_with_zeros_and_is_cleared_to_zeros)
-{
-    for_each(all_classes(), expect_defaults_or_zeros);
-}
+TEST(Every_Class, starts_with_its_defaults_or_with_zeros_and_is_cleared_to_zeros) { for_each_class(expect_defaults_or_zeros); }
 
 // Changes one feature of b, sees that each way of being different counts (or not), and undoes it.
 void expect_change_seen(const Meta_Feature* feature, unsigned n, bool (*equal)(const Instance*, const Instance*), bool seen,
@@ -185,8 +164,7 @@ void expect_change_seen(const Meta_Feature* feature, unsigned n, bool (*equal)(c
         EXPECT_EQ(equal(a, b), !seen);
         null_of(b, property) = 0;
     }
-    const Meta_Reference* reference = to_reference(feature);
-    if (reference && reference->subscript == 0)
+    if (const Meta_Reference* reference = to_single_reference(feature))
     {
         Instance*& slot = reference_of(b, reference);
         EXPECT_NE(slot, reference_of(a, reference));
@@ -208,7 +186,7 @@ void expect_identical_clone(const Meta_Record* record)
         expect_change_seen(feature, ++n, identical, true, original.ptr(), copied.ptr());
 }
 
-TEST(Every_Class, a_clone_is_identical_until_anything_of_it_changes) { for_each(all_records(), expect_identical_clone); }
+TEST(Every_Class, a_clone_is_identical_until_anything_of_it_changes) { for_each_record(expect_identical_clone); }
 
 void expect_keys_decide(const Meta_Class* meta_class)
 {
@@ -223,7 +201,7 @@ void expect_keys_decide(const Meta_Class* meta_class)
     }
 }
 
-TEST(Every_Class, only_keys_decide_whether_two_objects_are_one) { for_each(all_classes(), expect_keys_decide); }
+TEST(Every_Class, only_keys_decide_whether_two_objects_are_one) { for_each_class(expect_keys_decide); }
 
 // A model in which every second feature is set.
 Ref<Instance> half_set_model(const Ref<Instance>& source)
@@ -234,7 +212,7 @@ Ref<Instance> half_set_model(const Ref<Instance>& source)
     for (const Meta_Feature* feature : features_of(model->meta_class))
     {
         wanted = !wanted;
-        const Meta_Reference* reference = to_reference(feature);
+        const Meta_Reference* reference = to_single_reference(feature);
         if (const Meta_Property* property = to_property(feature))
             null_of(model.ptr(), property) = wanted ? 0 : 1;
         else if (reference && !wanted)
@@ -266,7 +244,7 @@ void expect_copies(const Meta_Class* meta_class)
     }
 }
 
-TEST(Every_Class, copies_take_what_they_are_told_and_leave_the_rest) { for_each(all_classes(), expect_copies); }
+TEST(Every_Class, copies_take_what_they_are_told_and_leave_the_rest) { for_each_class(expect_copies); }
 
 void expect_null_flags(const Meta_Class* meta_class)
 {
@@ -301,7 +279,7 @@ void expect_null_flags(const Meta_Class* meta_class)
     EXPECT_TRUE(keys_non_null(bare.ptr()));
 }
 
-TEST(Every_Class, null_flags_hide_values_and_keep_them) { for_each(all_classes(), expect_null_flags); }
+TEST(Every_Class, null_flags_hide_values_and_keep_them) { for_each_class(expect_null_flags); }
 
 // Whether the class and those that its keys refer to have keys.
 bool has_path(const Meta_Class* meta_class)
@@ -347,7 +325,7 @@ void expect_path_and_back(const Meta_Class* meta_class)
     }
 }
 
-TEST(Every_Class, a_path_reads_back_to_the_keys) { for_each(all_classes(), expect_path_and_back); }
+TEST(Every_Class, a_path_reads_back_to_the_keys) { for_each_class(expect_path_and_back); }
 
 void expect_printed(const Meta_Record* record)
 {
@@ -358,14 +336,12 @@ void expect_printed(const Meta_Record* record)
     std::size_t at = 0;
     for (const Meta_Feature* feature : features_of(record))
     {
-        if (is_method(feature))
-            continue;
-        at = text.find(std::string(" ") + feature->name, at);
+        at = is_method(feature) ? at : text.find(std::string(" ") + feature->name, at);
         ASSERT_NE(at, std::string::npos) << feature->name;
     }
 }
 
-TEST(Every_Class, prints_every_feature) { for_each(all_records(), expect_printed); }
+TEST(Every_Class, prints_every_feature) { for_each_record(expect_printed); }
 
 } // namespace
 } // namespace zmlr
