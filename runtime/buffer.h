@@ -10,8 +10,8 @@ namespace zmlr
 {
 
 // One byte more than the capacity is always allocated, for the zero that data() writes. Capacities are powers of two, at
-// least 4096. A position past the end is an internal-consistency failure. When memory runs out (std::bad_alloc) the buffer
-// keeps what it had.
+// least 4096. Texts given are not the buffer's own. A position past the end is an internal-consistency failure. When memory runs
+// out (std::bad_alloc) the buffer keeps what it had.
 class Buffer
 {
 public:

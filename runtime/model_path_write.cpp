@@ -3,6 +3,7 @@
 #include "runtime/number.h"
 
 #include <string_view>
+#include <utility>
 
 namespace zmlr
 {
@@ -111,8 +112,10 @@ bool append_path(String& out, const Instance* instance)
 int instance_to_model_path(const Instance* instance, String& out)
 {
     check_inst(instance);
-    out.clear();
-    return append_path(out, instance) ? 0 : -1;
+    String path; // `out` may be a key of the instance
+    const bool whole = append_path(path, instance);
+    out = std::move(path);
+    return whole ? 0 : -1;
 }
 
 } // namespace zmlr

@@ -2,10 +2,10 @@
 
 #include "hxal/hxal.h"
 #include "runtime/print.h"
+#include "tests/runtime/home.h"
 #include "tests/runtime/printed.h"
 
 #include <cstdlib>
-#include <filesystem>
 #include <fstream>
 #include <regex>
 
@@ -15,31 +15,19 @@ namespace zmlr
 namespace
 {
 
+const sample::Home& home()
+{
+    static const sample::Home home;
+    return home;
+}
+
 // Before any static object: the first of them already probes the driver and logs.
 [[gnu::constructor(101)]] void prepare_home()
 {
-    static char home[] = "/tmp/zmlr-inventory-XXXXXX";
-    if (!mkdtemp(home))
-        std::abort();
-    setenv("HOME", home, 1);
+    home().options("LOG_LEVEL=DBG\n");
+    setenv("HOME", home().path("").c_str(), 1);
     setenv("HXASIM_SCENARIO", "mixed", 0);
-
-    FILE* options = std::fopen((std::string(home) + "/.cimplerc").c_str(), "w");
-    if (!options)
-        std::abort();
-    std::fputs("LOG_LEVEL=DBG\n", options);
-    std::fclose(options);
 }
-
-std::filesystem::path home() { return std::getenv("HOME"); }
-
-class Home_Removal : public testing::Environment
-{
-public:
-    void TearDown() override { std::filesystem::remove_all(home()); }
-};
-
-[[maybe_unused]] const testing::Environment* home_removal = testing::AddGlobalTestEnvironment(new Home_Removal);
 
 std::string text_of(const Instance* instance, const Meta_Property* property)
 {
@@ -96,7 +84,7 @@ std::vector<std::string> Inventory_Test::log()
 {
     static std::ifstream messages;
     if (!messages.is_open())
-        messages.open(home() / ".cimple/messages");
+        messages.open(home().path(".cimple/messages"));
     messages.clear();
 
     static const std::regex form(R"(\S+ \S+ (\w+): (\w+)\(\d+\): (.*))");

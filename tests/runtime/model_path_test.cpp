@@ -111,6 +111,10 @@ TEST(Model_Path, references_are_quoted_paths)
     const char* const half = R"(Sample_Link.Dependent="Sample_Disk.Name=\"d\"")";
     EXPECT_FALSE(keys_non_null(Ref<Instance>(model_path_to_instance(link->meta_class, half)).ptr()));
 
+    const auto own = element("a");
+    EXPECT_EQ(instance_to_model_path(own.ptr(), own->Name.value), 0);
+    EXPECT_EQ(own->Name.value, "Sample_Element.Name=\"a\"") << "into the key itself";
+
     EXPECT_EQ(instance_to_model_path(linked(element("a"), {}).ptr(), path), -1);
     const Ref<Sample_Element> nameless(create<Sample_Element>());
     EXPECT_EQ(instance_to_model_path(linked(nameless, disk("d")).ptr(), path), -1);
