@@ -165,14 +165,13 @@ std::optional<std::string> value_text(const Value& value)
 
 bool is_readable_datetime(const std::string& text)
 {
-    if (text.size() != 25 || text[14] != '.' || number_at(text, 15, 6) < 0)
+    if (text.size() != 25 || text[14] != '.' || number_at(text, 15, 6) < 0 || !in_range(number_at(text, 8, 2), 0, 23) ||
+        !in_range(number_at(text, 10, 2), 0, 59) || !in_range(number_at(text, 12, 2), 0, 59))
         return false;
     if (text[21] == ':')
-        return number_at(text, 0, 8) >= 0 && number_at(text, 8, 6) >= 0 && number_at(text, 22, 3) == 0;
+        return number_at(text, 0, 8) >= 0 && number_at(text, 22, 3) == 0;
     return (text[21] == '+' || text[21] == '-') && in_range(number_at(text, 22, 3), 0, 999) &&
-           is_calendar_day(number_at(text, 0, 4), number_at(text, 4, 2), number_at(text, 6, 2)) &&
-           in_range(number_at(text, 8, 2), 0, 23) && in_range(number_at(text, 10, 2), 0, 59) &&
-           in_range(number_at(text, 12, 2), 0, 59);
+           is_calendar_day(number_at(text, 0, 4), number_at(text, 4, 2), number_at(text, 6, 2));
 }
 
 } // namespace cimserver

@@ -26,7 +26,7 @@ std::optional<std::string> value_text(const Value& value);
 std::string_view trimmed(std::string_view text);
 
 // Whether a text is a datetime that clients read: 25 characters, a calendar day of the years 1 to 9999 with a time of day and
-// an offset below one day, or an interval.
+// an offset below one day, or an interval of days and a time of day.
 bool is_readable_datetime(const std::string& text);
 
 } // namespace cimserver
