@@ -2,6 +2,8 @@
 
 #include "cmpi/cmpi_trace.h"
 #include "cmpi/shell.h"
+#include "cmpi/thread_context.h"
+#include "runtime/log.h"
 
 #include <atomic>
 
@@ -12,6 +14,8 @@ constinit std::recursive_mutex life_lock;
 
 namespace
 {
+
+constexpr const char* log_source = "CMPI_Adapter";
 
 // Counts the adapters that have gone, for factories that wait for one to.
 constinit std::atomic<unsigned> departures = 0;
@@ -56,7 +60,7 @@ void* interface_of(CMPI_Static_Data* sd, char kind)
 
 } // namespace
 
-CMPIrc cleanup(CMPI_Adapter* adapter, bool terminating)
+CMPIrc cleanup(CMPI_Adapter* adapter, bool terminating, const Thread_Context* caller)
 {
     {
         const std::lock_guard guard(life_lock);
@@ -66,6 +70,11 @@ CMPIrc cleanup(CMPI_Adapter* adapter, bool terminating)
         {
             --adapter->load_count;
             return CMPI_RC_OK;
+        }
+        if (works_for(caller, adapter))
+        {
+            ZMLR_LOG(LL_ERR, "cleanup refused: it came from within the provider");
+            return CMPI_RC_DO_NOT_UNLOAD;
         }
         adapter->requests.shut();
     }

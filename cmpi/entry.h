@@ -11,14 +11,17 @@
 namespace zmlr
 {
 
+class Thread_Context;
+
 // Recursive: a provider that loads may call into the server, which may ask for another provider of this module.
 extern constinit std::recursive_mutex life_lock;
 
 // What a cleanup function of any interface does: keeps everything and answers CMPI_RC_DO_NOT_UNLOAD while unloading is not
 // allowed (a terminating server is not asked), else gives up one interface. With the last one the provider goes: requests
 // that still run are waited for and new ones refused, the provider is unloaded, its threads leave the broker for good, and
-// the adapter is destroyed. Not to be called from within a request of the same provider.
-CMPIrc cleanup(CMPI_Adapter* adapter, bool terminating);
+// the adapter is destroyed. A thread that works for the provider cannot wait for itself: its last cleanup keeps everything and
+// answers CMPI_RC_DO_NOT_UNLOAD too. `caller` is that thread's context before the cleanup's own (null: none).
+CMPIrc cleanup(CMPI_Adapter* adapter, bool terminating, const Thread_Context* caller);
 
 // A request's hold on the adapter of its interface, which stays for this long.
 class Adapter_Use

@@ -92,9 +92,15 @@ bool _indication_proc(Instance* instance, void* client_data) noexcept
 // ---- on and off ----
 
 // Runs work() while nobody else enables or disables indications. The adapter's lock, which the caller holds, is free
-// meanwhile: a provider that disables joins its delivery thread, which may be waiting for that lock.
+// meanwhile: a provider that disables joins its delivery thread, which may be waiting for that lock. A thread that works for the
+// provider already cannot let go of it, or is the one to be joined: it is refused.
 template <class Work> CMPIrc switch_indications(CMPI_Adapter& adapter, Work work)
 {
+    if (works_for(Thread_Context::top()->below(), &adapter))
+    {
+        ZMLR_LOG(LL_ERR, "indications not switched: the call came from within the provider");
+        return CMPI_RC_ERR_FAILED;
+    }
     const Auto_Unlock unlocked(adapter.lock);
     const Auto_Mutex turn(adapter.indication_switch);
     return work();

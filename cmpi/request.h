@@ -55,10 +55,10 @@ template <class MI> CMPI_Adapter* leaving(MI* mi)
 
 // The common cleanup, traced as the cleanup function `name`. The adapter's lock is not taken: the adapter may end here, and a
 // provider that unloads may wait for a thread that needs it.
-inline CMPIrc traced_cleanup(const char* name, CMPI_Adapter* adapter, CMPIBoolean terminating)
+inline CMPIrc traced_cleanup(const char* name, CMPI_Adapter* adapter, CMPIBoolean terminating, const Thread_Context* caller)
 {
     ent(name);
-    const CMPIrc answer = cleanup(adapter, terminating != 0);
+    const CMPIrc answer = cleanup(adapter, terminating != 0, caller);
     ret(name, answer);
     return answer;
 }
@@ -70,8 +70,9 @@ CMPIStatus serve_cleanup(const char* name, MI* mi, const CMPIContext* context, C
     const auto request = [&]
     {
         CMPI_Adapter* adapter = leaving(mi);
+        const Thread_Context* caller = Thread_Context::top();
         const CMPI_Thread_Context_Pusher pusher(adapter->broker, context, adapter);
-        return traced_cleanup(name, adapter, terminating);
+        return traced_cleanup(name, adapter, terminating, caller);
     };
     return {shielded(name, request), nullptr};
 }

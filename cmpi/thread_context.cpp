@@ -112,6 +112,13 @@ bool CMPI_Thread_Context::get_username(String& username)
     return true;
 }
 
+bool works_for(const Thread_Context* context, const CMPI_Adapter* adapter)
+{
+    while (context && static_cast<const CMPI_Thread_Context*>(context)->cmpi_adapter() != adapter)
+        context = context->below();
+    return context != nullptr;
+}
+
 CMPI_Thread_Context_Pusher::CMPI_Thread_Context_Pusher(const CMPIBroker* cmpi_broker, const CMPIContext* cmpi_context,
                                                        CMPI_Adapter* cmpi_adapter)
 {

@@ -63,6 +63,10 @@ private:
     bool _attached = false;
 };
 
+// Whether a context or one below it, on the calling thread's stack, works for the adapter: a request of its provider is under
+// way on this thread, or the thread is the provider's own.
+bool works_for(const Thread_Context* context, const CMPI_Adapter* adapter);
+
 // Puts a context on the calling thread's stack for a scope. None of the arguments may be null, and contexts pushed
 // meanwhile must be gone at its end: anything else is an internal-consistency failure.
 class CMPI_Thread_Context_Pusher

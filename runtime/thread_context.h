@@ -24,6 +24,7 @@ public:
     static void push(Thread_Context* context); // links it above the current top; the caller keeps owning it
     static void pop();
     static Thread_Context* top(); // null when the thread has none
+    const Thread_Context* below() const { return _next; }
 
     virtual ~Thread_Context() = default;
 

@@ -31,14 +31,14 @@ public:
         ++count;
         if (keep)
             alerts.push_back(name_space + ": " + std::get<std::string>(indication.properties.at(0).value.content));
-        if (refuse)
-            throw std::runtime_error("full");
+        if (on_delivery)
+            on_delivery();
     }
 
     std::vector<std::string> alerts;
     std::atomic<int> count = 0;
     bool keep = true;
-    bool refuse = false;
+    std::function<void()> on_delivery;
 
 private:
     std::mutex _mutex;
@@ -191,7 +191,7 @@ TEST_F(Indications, go_on_when_the_server_refuses_one)
     ASSERT_EQ(enable(), CMPI_RC_OK);
     activate("root/a");
     EXPECT_THAT(logged([&] { raise("x"); }, "DBG"), ElementsAre("CMPI_Adapter: delivering an indication to root/a"));
-    inbox.refuse = true;
+    inbox.on_delivery = [] { throw std::runtime_error("full"); };
     EXPECT_THAT(logged([&] { EXPECT_TRUE(raise("x")); }),
                 ElementsAre("Converter: No ObjectPath built before call to make_CMPI_instance",
                             "CMPI_Adapter: CBDeliverIndication() failed: CMPI_RC_ERR_FAILED"));
@@ -222,6 +222,19 @@ TEST_F(Indications, of_a_thread_that_waits_for_a_request_do_not_hold_up_the_disa
     ASSERT_EQ(enable(), CMPI_RC_OK);
     EXPECT_EQ(disable(), CMPI_RC_OK);
     EXPECT_EQ(inbox.count, raised);
+}
+
+TEST_F(Indications, are_not_switched_nor_cleaned_up_from_within_the_provider)
+{
+    std::vector<CMPIrc> answers;
+    inbox.on_delivery = [&] { answers = {enable(), disable(), clean_up()}; };
+    activate("root/a");
+    ASSERT_EQ(enable(), CMPI_RC_OK);
+    EXPECT_TRUE(raise("x"));
+    EXPECT_THAT(answers, ElementsAre(CMPI_RC_ERR_FAILED, CMPI_RC_ERR_FAILED, CMPI_RC_DO_NOT_UNLOAD));
+    EXPECT_EQ(disable(), CMPI_RC_OK);
+    EXPECT_EQ(script.disables, 1);
+    EXPECT_EQ(clean_up(), CMPI_RC_OK);
 }
 
 TEST_F(Indications, end_with_a_cleanup_while_they_are_enabled)
