@@ -80,13 +80,29 @@ CMPIrc send_named_instance(const Answer& answer, Instance* object)
     return CMPI_RC_OK;
 }
 
+// With a list, what it names stays and every key is left to the path. filter_properties makes what is wanted non-null: that
+// is for models; an association's null property must not get a value.
+void keep_listed(Instance* association, const char** properties)
+{
+    if (!properties)
+        return;
+    const Ref<Instance> wanted(create(association->meta_class, false));
+    filter_properties(wanted.ptr(), properties, false);
+    for (uint32 i = 0; i < association->meta_class->num_meta_features; ++i)
+    {
+        const Meta_Feature* feature = association->meta_class->meta_features[i];
+        if (is_property(feature) && null_of(static_cast<const Instance*>(wanted.ptr()), as_property(feature)))
+            null_of(association, as_property(feature)) = 1;
+    }
+}
+
 CMPIrc send_reference(const Answer& answer, Instance* association)
 {
     CMPI_Ptr<CMPIObjectPath> path;
     CMPIrc rc = make_cmpi_object_path(answer.broker, association, answer.name_space.c_str(), path);
     if (rc != CMPI_RC_OK)
         return rc;
-    filter_properties(association, answer.properties, false); // after the path, which needs the keys
+    keep_listed(association, answer.properties); // after the path, which needs the keys
 
     CMPI_Ptr<CMPIInstance> cmpi_instance;
     rc = make_cmpi_instance(answer.broker, association, answer.name_space.c_str(), path.get(), answer.properties, cmpi_instance);
@@ -195,7 +211,7 @@ CMPIrc answer_references(const Association_Request& request, void (*prepare_mode
 CMPIStatus CMPI_Adapter::associationCleanup(CMPIAssociationMI* mi, const CMPIContext*, CMPIBoolean terminating) noexcept
 {
     constexpr const char* name = "associationCleanup";
-    return {shielded(name, [&] { return traced_cleanup(name, leaving(mi), terminating); }), nullptr};
+    return {shielded(name, [&] { return traced_cleanup(name, leaving(mi), terminating, Thread_Context::top()); }), nullptr};
 }
 
 CMPIStatus CMPI_Adapter::associators(CMPIAssociationMI* mi, const CMPIContext* context, const CMPIResult* result,

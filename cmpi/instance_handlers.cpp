@@ -73,7 +73,10 @@ CMPIrc enumerate(CMPI_Adapter& adapter, const CMPIContext* context, const CMPIRe
     if (rc != CMPI_RC_OK)
         return rc;
     if (properties)
+    {
+        __set_null_flags(model.ptr(), true, false, 0); // keys are always wanted, also where the path has none
         filter_properties(model.ptr(), properties, true);
+    }
 
     Answer answer{adapter.broker, context, result, name_space_of(path), properties};
     rc = to_rc(adapter.enum_instances(model.ptr(), answer_with<send_instance>, &answer));
