@@ -59,6 +59,14 @@ CMPIResultFT result_table = {100, nullptr, nullptr, return_data, return_instance
 
 } // namespace
 
+cimserver::Value string(const char* text) { return {CMPI_string, std::string(text)}; }
+
+cimserver::Value reference(const char* class_name, const char* name)
+{
+    const cimserver::Object_Path path = {"host", "root/elsewhere", class_name, {{"Name", string(name)}}};
+    return {CMPI_ref, std::make_shared<const cimserver::Object_Path>(path)};
+}
+
 Recorded_Result::Recorded_Result() : _face{this, &result_table} {}
 
 void Recorded_Result::clear()
@@ -90,7 +98,7 @@ CMPIObjectPath* Served_Provider::thing_path(const char* name, const char* class_
     return result;
 }
 
-const cimserver::Value& Served_Provider::value(const std::vector<cimserver::Named_Value>& items, const char* name)
+const cimserver::Value& Served_Provider::value(const Items& items, const char* name)
 {
     for (const auto& item : items)
     {
@@ -102,10 +110,30 @@ const cimserver::Value& Served_Provider::value(const std::vector<cimserver::Name
     return none;
 }
 
-std::string Served_Provider::text(const std::vector<cimserver::Named_Value>& items, const char* name)
+std::string Served_Provider::text(const Items& items, const char* name)
 {
     const auto* content = std::get_if<std::string>(&value(items, name).content);
     return content ? *content : "(null)";
+}
+
+std::vector<std::string> Served_Provider::names_of(const Items& items)
+{
+    std::vector<std::string> names;
+    for (const auto& item : items)
+        names.push_back(item.name);
+    return names;
+}
+
+std::vector<std::string> Served_Provider::non_null_of(const Instance* instance)
+{
+    std::vector<std::string> names;
+    for (uint32 i = 0; i < instance->meta_class->num_meta_features; ++i)
+    {
+        const Meta_Feature* feature = instance->meta_class->meta_features[i];
+        if (is_property(feature) && !null_of(instance, as_property(feature)))
+            names.emplace_back(feature->name);
+    }
+    return names;
 }
 
 std::vector<std::string> Served_Provider::logged(const std::function<void()>& work, const std::string& level)

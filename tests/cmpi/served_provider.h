@@ -18,6 +18,9 @@ namespace test
 
 inline constexpr const char* name_space = "root/zemlar";
 
+cimserver::Value string(const char* text);
+cimserver::Value reference(const char* class_name, const char* name); // to a thing, in another name space
+
 // A result that keeps what it is given.
 class Recorded_Result
 {
@@ -62,9 +65,23 @@ protected:
     CMPIObjectPath* thing_path(const char* name, const char* class_name = "Test_Thing") const;
 
     // The value of an item of a recorded path or instance; a failure when there is none.
-    static const cimserver::Value& value(const std::vector<cimserver::Named_Value>& items, const char* name);
-    static std::string text(const std::vector<cimserver::Named_Value>& items, const char* name);
+    using Items = std::vector<cimserver::Named_Value>;
+    static const cimserver::Value& value(const Items& items, const char* name);
+    static std::string text(const Items& items, const char* name); // "(null)" for what is no text
+    template <class T> static const T& content(const Items& items, const char* name)
+    {
+        return std::get<T>(value(items, name).content);
+    }
+    static const cimserver::Object_Path& path_in(const Items& items, const char* name)
+    {
+        return *content<std::shared_ptr<const cimserver::Object_Path>>(items, name);
+    }
     static std::string name_in(const cimserver::Object_Path& path) { return text(path.keys, "Name"); }
+    static std::vector<std::string> names_of(const Items& items);
+
+    // The names of the properties that have a value, or are asked for in a model.
+    static std::vector<std::string> non_null_of(const Instance* instance);
+    std::vector<std::string> asked_for() const { return non_null_of(script.model.ptr()); }
 
     // What the work logs at a level ("WARN"), as "source: message".
     static std::vector<std::string> logged(const std::function<void()>& work, const std::string& level = "WARN");

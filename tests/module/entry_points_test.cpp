@@ -73,7 +73,7 @@ private:
 
 } // namespace
 
-TEST_F(Entry_Points, RegistrationListHoldsTheClassesInReverseOrder)
+TEST_F(Entry_Points, registration_list_holds_the_classes_in_reverse_order)
 {
     const auto module_list = symbol<decltype(&cimple_module)>("cimple_module");
     ASSERT_NE(module_list, nullptr);
@@ -89,7 +89,7 @@ TEST_F(Entry_Points, RegistrationListHoldsTheClassesInReverseOrder)
     EXPECT_EQ(registration, nullptr);
 }
 
-TEST_F(Entry_Points, EveryFactoryMakesItsInterface)
+TEST_F(Entry_Points, every_factory_makes_its_interface)
 {
     for (const auto& row : rows)
     {

@@ -1,69 +1,79 @@
 // Loading, many threads, unloading.
-
 #include "tests/module/loaded_module.h"
 
-#include <dirent.h>
 #include <dlfcn.h>
 #include <gmock/gmock.h>
 #include <malloc.h>
 
+#include <chrono>
+#include <filesystem>
 #include <thread>
 
 namespace
 {
 
-std::size_t open_descriptors()
+std::size_t entries_of(const char* folder)
 {
-    std::size_t count = 0;
-    DIR* folder = opendir("/proc/self/fd");
-    while (readdir(folder))
-        ++count;
-    closedir(folder);
-    return count;
+    const std::filesystem::directory_iterator entries(folder);
+    return static_cast<std::size_t>(std::distance(begin(entries), end(entries)));
 }
 
-std::size_t threads()
+// Threads, descriptors and heap of this process.
+struct Resources
 {
-    std::size_t count = 0;
-    DIR* folder = opendir("/proc/self/task");
-    while (readdir(folder))
-        ++count;
-    closedir(folder);
-    return count;
-}
+    std::size_t threads = entries_of("/proc/self/task");
+    std::size_t descriptors = entries_of("/proc/self/fd");
+    std::size_t heap = mallinfo2().uordblks;
 
-class Life : public Loaded_Module
-{
+    bool operator==(const Resources&) const = default;
 };
+
+void PrintTo(const Resources& r, std::ostream* out)
+{
+    *out << r.threads << " threads, " << r.descriptors << " descriptors, " << r.heap << " bytes";
+}
+
+using Life = Loaded_Module;
+
+// Rounds run in a thread of their own: what the allocator caches of freed blocks for a thread counts as used until the thread
+// ends. A thread that was joined may be listed a moment longer.
+template <class Round> void run(int rounds, Round round)
+{
+    const Resources before;
+    std::thread runner(
+        [&]
+        {
+            for (int i = 0; i < rounds; ++i)
+                round();
+        });
+    runner.join();
+    for (int i = 0; i < 1'000 && Resources().threads != before.threads; ++i)
+        std::this_thread::sleep_for(std::chrono::milliseconds(1));
+}
 
 } // namespace
 
-TEST_F(Life, UnloadingLeavesNothingBehind)
+TEST_F(Life, unloading_leaves_nothing_behind)
 {
     hxasim::load("mixed");
     const auto round = []
     {
-        cimserver::Module module(module_path);
-        cimserver::Name_Spaces operations(module);
-        EXPECT_GT(operations.enumerate_instances(name_space, "ZEMLAR_FCPort", true, std::nullopt).size(), 0U);
-        hxasim::take_requests(); // what the simulator remembers is no leak
-    };
-    round();
-    const auto descriptors = open_descriptors();
-    const auto running = threads();
-    const auto heap = mallinfo2().uordblks;
-    for (int i = 0; i < LOAD_ROUNDS; ++i)
-    {
-        round();
+        {
+            cimserver::Module module(module_path);
+            cimserver::Name_Spaces operations(module);
+            EXPECT_GT(operations.enumerate_instances(name_space, "ZEMLAR_FCPort", true, std::nullopt).size(), 0U);
+            hxasim::take_requests(); // what the simulator remembers is no leak
+        }
         EXPECT_EQ(dlopen(module_path, RTLD_NOW | RTLD_NOLOAD), nullptr) << "the module is still mapped";
-    }
-    EXPECT_EQ(open_descriptors(), descriptors);
-    EXPECT_EQ(threads(), running);
-    EXPECT_LT(mallinfo2().uordblks, heap + 32 * LOAD_ROUNDS) << "less than anything that a load makes";
+    };
+    run(LOAD_ROUNDS / 10, round);
+    const Resources before;
+    run(LOAD_ROUNDS, round);
+    EXPECT_EQ(Resources(), before);
 }
 
 // The very first requests are among them: they race to make the managers, the helpers and the providers.
-TEST_F(Life, ManyThreadsAskAtOnce)
+TEST_F(Life, many_threads_ask_at_once)
 {
     load("mixed");
     const char* const classes[] = {"ZEMLAR_FCPort", "ZEMLAR_PortController", "ZEMLAR_ComputerSystem", "CIM_LogicalDevice"};

@@ -30,7 +30,7 @@ protected:
 
 } // namespace
 
-TEST_F(Requests, APortArrivesWhole)
+TEST_F(Requests, a_port_arrives_whole)
 {
     load("fc-hba");
     const auto host = text_of(enumerate("ZEMLAR_ComputerSystem").at(0), "Name");
@@ -58,7 +58,7 @@ TEST_F(Requests, APortArrivesWhole)
 )");
 }
 
-TEST_F(Requests, PortsCostOneRequestEach)
+TEST_F(Requests, ports_cost_one_request_each)
 {
     load("fc-hba");
     requests();
@@ -73,7 +73,7 @@ TEST_F(Requests, PortsCostOneRequestEach)
     EXPECT_THAT(requests(), IsEmpty()) << "the host is described without asking a driver";
 }
 
-TEST_F(Requests, LargestHost)
+TEST_F(Requests, the_largest_host)
 {
     load("large");
     requests();
@@ -85,7 +85,7 @@ TEST_F(Requests, LargestHost)
     EXPECT_EQ(std::adjacent_find(sorted.begin(), sorted.end()), sorted.end());
 }
 
-TEST_F(Requests, GetInstanceFindsByKeysAndNothingElse)
+TEST_F(Requests, get_instance_finds_by_keys_and_nothing_else)
 {
     load("mixed");
     for (const char* class_name : {"ZEMLAR_ComputerSystem", "ZEMLAR_PortController", "ZEMLAR_FCPort"})
@@ -105,7 +105,7 @@ TEST_F(Requests, GetInstanceFindsByKeysAndNothingElse)
     }
 }
 
-TEST_F(Requests, HostileTextsArriveAsPlainText)
+TEST_F(Requests, hostile_texts_arrive_as_plain_text)
 {
     load_text(R"({"adapters": [{"kind": "fc-hba", "ports": [{}, {}]}],
         "faults": [{"command": "IOCMD_PORT_GET_ATTR", "answer": {"offset": 48, "bytes": "0141C0808022FF"}}]})");
@@ -114,7 +114,7 @@ TEST_F(Requests, HostileTextsArriveAsPlainText)
     EXPECT_EQ(text_of(ports[0], "Caption").substr(0, 7), "?A???\"?");
 }
 
-TEST_F(Requests, EveryClassAnswersOnEveryHost)
+TEST_F(Requests, every_class_answers_on_every_host)
 {
     const struct
     {
