@@ -1,10 +1,10 @@
-// Provider_Handle and the procedures behind it: answers passed on, and those found by enumeration.
-#include "tests/cmpi/test_providers.h"
+// Provider_Handle and the procedures behind it. What servers see of the answers found by enumeration, filters and statuses, is
+// shown where they ask; here, what reaches a callback.
+#include "tests/cmpi/served_provider.h"
 
 #include <gmock/gmock.h>
 
 #include <stdexcept>
-#include <string>
 
 using namespace test;
 using testing::ElementsAre;
@@ -13,7 +13,15 @@ using testing::IsEmpty;
 namespace
 {
 
-// What a callback received: the objects by name (a link as "antecedent-dependent"), "end" for each end mark.
+std::string name_of(const Instance* instance)
+{
+    if (const auto* named = cast<Test_Thing>(instance))
+        return named->Name.value.c_str();
+    const auto* association = cast<Test_Link>(instance);
+    return association ? name_of(association->Antecedent) + "-" + name_of(association->Dependent) : "end";
+}
+
+// What a callback received: things by name, links as "antecedent-dependent", end marks as "end".
 struct Received
 {
     std::vector<std::string> names;
@@ -21,38 +29,24 @@ struct Received
     bool throws = false;
 };
 
-std::string name_of(const Instance* instance)
-{
-    if (!instance)
-        return "end";
-    if (const auto* named = cast<Test_Thing>(instance))
-        return named->Name.value.c_str();
-    const auto* association = cast<Test_Link>(instance);
-    return name_of(association->Antecedent) + "-" + name_of(association->Dependent);
-}
-
-template <class Status> bool receive(Instance* instance, Status status, void* client_data)
+template <class Status> bool receive(Instance* instance, Status, void* client_data)
 {
     const Ref<Instance> object(instance);
     auto& received = *static_cast<Received*>(client_data);
-    if (instance)
-    {
-        EXPECT_EQ(status, 0U);
-    }
     received.names.push_back(name_of(instance));
     if (received.throws && instance)
         throw std::runtime_error("callback");
     return received.names.size() < received.wanted;
 }
 
-class Provider_Handle_Test : public testing::Test
+// A handle lives within its test: no provider may be left at its end.
+class Provider_Handles : public Served_Provider
 {
 protected:
     void TearDown() override
     {
         source.reset();
-        Script::fresh();
-        EXPECT_EQ(live_instances(), 0U);
+        Served_Provider::TearDown();
     }
 
     template <class... Names> void offer(Names... names) { (script.instances.emplace_back(thing(names).steal()), ...); }
@@ -61,33 +55,24 @@ protected:
         for (const auto& [a, b] : {std::pair("a", "b"), {"c", "b"}, {"a", "d"}})
             script.instances.emplace_back(make_link(a, b).steal());
     }
-
-    Enum_Associator_Names_Status names(Received& received)
+    Enum_Associator_Names_Status associators(Provider_Handle& handle, Received& received)
     {
-        return links.enum_associator_names(source.ptr(), "", "", "", receive, &received);
+        return handle.enum_associator_names(source.ptr(), "", "", "", receive, &received);
     }
-
-    Enum_References_Status references(Received& received)
+    Enum_References_Status references(Provider_Handle& handle, Received& received)
     {
         const Ref<Test_Link> model(create<Test_Link>(false));
-        return links.enum_references(source.ptr(), model.ptr(), "", receive, &received);
+        return handle.enum_references(source.ptr(), model.ptr(), "", receive, &received);
     }
 
-    Script& script = Script::fresh();
-    Provider_Handle things{&thing_registration};
-    Provider_Handle links{&link_registration};
     Ref<Test_Thing> source = thing("a");
 };
 
-using Get_Instance = Provider_Handle_Test;
-using Associations = Provider_Handle_Test;
-using Procedure = Provider_Handle_Test;
-
-TEST_F(Get_Instance, is_otherwise_the_first_enumerated_instance_with_equal_keys)
+TEST_F(Provider_Handles, find_the_first_enumerated_instance_with_equal_keys)
 {
+    Provider_Handle things(&thing_registration);
     offer("x", "a", "y", "a");
-    auto& first = *static_cast<Test_Thing*>(script.instances[1].ptr());
-    first.Uint8.set(1);
+    static_cast<Test_Thing*>(script.instances[1].ptr())->Uint8.set(1);
     for (const bool deaf : {false, true})
     {
         script.deaf = deaf;
@@ -97,105 +82,78 @@ TEST_F(Get_Instance, is_otherwise_the_first_enumerated_instance_with_equal_keys)
         EXPECT_EQ(cast<Test_Thing>(found.ptr())->Uint8.value, 1);
         EXPECT_EQ(script.delivered, deaf ? 4 : 2);
     }
-}
-
-TEST_F(Get_Instance, is_not_found_without_a_match_or_when_the_enumeration_fails)
-{
     Ref<Instance> found;
-    offer("x", "y");
-    EXPECT_EQ(things.get_instance(source.ptr(), found), GET_INSTANCE_NOT_FOUND);
-    offer("a");
     script.enum_instances = ENUM_INSTANCES_FAILED;
     EXPECT_EQ(things.get_instance(source.ptr(), found), GET_INSTANCE_NOT_FOUND);
     EXPECT_FALSE(found);
 }
 
-// What the filters do is shown where servers set them.
-TEST_F(Associations, come_from_the_enumeration_with_one_end_mark)
+TEST_F(Provider_Handles, mark_the_end_once)
 {
+    Provider_Handle links(&link_registration);
     offer_links();
-    Received received;
-    EXPECT_EQ(names(received), ENUM_ASSOCIATOR_NAMES_OK);
-    EXPECT_THAT(received.names, ElementsAre("b", "d", "end"));
-    EXPECT_EQ(null_of(script.model.ptr(), find_property(&Test_Link::static_meta_class, "Note")), 1);
-    received = {};
-    EXPECT_EQ(references(received), ENUM_REFERENCES_OK);
-    EXPECT_THAT(received.names, ElementsAre("a-b", "a-d", "end"));
-}
-
-TEST_F(Associations, stop_when_told_and_still_mark_the_end)
-{
-    offer_links();
-    for (const bool deaf : {false, true})
+    const struct
     {
-        script.deaf = deaf;
-        Received received{.names = {}, .wanted = 1};
-        EXPECT_EQ(names(received), ENUM_ASSOCIATOR_NAMES_OK);
-        EXPECT_THAT(received.names, ElementsAre("b", "end"));
+        std::size_t wanted;
+        std::vector<std::string> names, links;
+    } cases[] = {{100, {"b", "d", "end"}, {"a-b", "a-d", "end"}}, {1, {"b", "end"}, {"a-b", "end"}}};
+    for (const bool deaf : {false, true})
+        for (const auto& c : cases)
+        {
+            script.deaf = deaf;
+            Received names{.names = {}, .wanted = c.wanted}, references_found{.names = {}, .wanted = c.wanted};
+            EXPECT_EQ(associators(links, names), ENUM_ASSOCIATOR_NAMES_OK);
+            EXPECT_EQ(names.names, c.names);
+            EXPECT_THAT(asked_for(), IsEmpty()) << "the keys are references";
+            EXPECT_EQ(references(links, references_found), ENUM_REFERENCES_OK);
+            EXPECT_EQ(references_found.names, c.links);
+        }
 
-        received = {.names = {}, .wanted = 1};
-        EXPECT_EQ(references(received), ENUM_REFERENCES_OK);
-        EXPECT_THAT(received.names, ElementsAre("a-b", "end"));
-    }
-}
-
-TEST_F(Associations, that_the_provider_answers_are_not_enumerated_and_end_once_too)
-{
-    offer_links();
     Received received;
+    script.enum_instances = ENUM_INSTANCES_FAILED;
+    EXPECT_EQ(links.enum_instances(source.ptr(), receive, &received), ENUM_INSTANCES_FAILED);
+    EXPECT_THAT(received.names, ElementsAre("a-b", "c-b", "a-d", "end"));
+
+    received = {};
+    script.enumerations = 0;
     script.enum_associator_names = ENUM_ASSOCIATOR_NAMES_FAILED;
     script.enum_references = ENUM_REFERENCES_ACCESS_DENIED;
-    EXPECT_EQ(names(received), ENUM_ASSOCIATOR_NAMES_FAILED);
-    EXPECT_EQ(references(received), ENUM_REFERENCES_ACCESS_DENIED);
-    EXPECT_THAT(received.names, ElementsAre("end", "end"));
+    EXPECT_EQ(associators(links, received), ENUM_ASSOCIATOR_NAMES_FAILED);
+    EXPECT_EQ(references(links, received), ENUM_REFERENCES_ACCESS_DENIED);
+    EXPECT_THAT(received.names, ElementsAre("end", "end")) << "the provider answered itself";
     EXPECT_EQ(script.enumerations, 0);
 }
 
-TEST_F(Associations, of_an_ordinary_class_fail_without_a_word_to_the_provider)
+TEST_F(Provider_Handles, of_ordinary_classes_fail_without_a_word_to_the_provider)
 {
+    Provider_Handle things(&thing_registration);
     Received received;
-    EXPECT_EQ(things.enum_associator_names(source.ptr(), "", "", "", receive, &received), ENUM_ASSOCIATOR_NAMES_FAILED);
-    EXPECT_EQ(things.enum_references(source.ptr(), source.ptr(), "", receive, &received), ENUM_REFERENCES_FAILED);
+    EXPECT_EQ(associators(things, received), ENUM_ASSOCIATOR_NAMES_FAILED);
+    EXPECT_EQ(references(things, received), ENUM_REFERENCES_FAILED);
     EXPECT_THAT(received.names, IsEmpty());
     EXPECT_EQ(script.enumerations, 0);
 }
 
-TEST_F(Associations, lose_nothing_when_a_callback_throws)
+TEST_F(Provider_Handles, lose_nothing_when_a_callback_throws)
 {
+    Provider_Handle links(&link_registration);
     offer_links();
     Received received{.names = {}, .throws = true};
-    EXPECT_THROW(names(received), std::runtime_error);
-    EXPECT_THROW(references(received), std::runtime_error);
+    EXPECT_THROW(associators(links, received), std::runtime_error);
+    EXPECT_THROW(references(links, received), std::runtime_error);
     EXPECT_THROW(links.enum_instances(source.ptr(), receive, &received), std::runtime_error);
 }
 
-TEST_F(Procedure, answers_minus_one_for_what_the_class_does_not_have)
+TEST_F(Provider_Handles, answer_minus_one_for_what_the_class_does_not_have)
 {
-    const auto answer = [](const Registration& registration, int operation)
-    {
-        return registration.provider_proc(&registration, operation, nullptr, nullptr, nullptr, nullptr, nullptr, nullptr, nullptr,
-                                          nullptr);
-    };
-
-    for (const int operation : {OPERATION_ENABLE_INDICATIONS, OPERATION_DISABLE_INDICATIONS, OPERATION_ENUM_ASSOCIATOR_NAMES,
-                                OPERATION_ENUM_REFERENCES, OPERATION_ENUM_ASSOCIATORS})
-        EXPECT_EQ(answer(thing_registration, operation), -1) << operation;
-    for (const int operation : {static_cast<int>(OPERATION_ENABLE_INDICATIONS), 17, -1, 1000})
-        EXPECT_EQ(answer(link_registration, operation), -1) << operation;
-    EXPECT_EQ(static_cast<int>(things.invoke_method(source.ptr(), source.ptr())), -1);
-    EXPECT_EQ(static_cast<int>(things.disable_indications()), -1);
-}
-
-TEST_F(Procedure, marks_the_end_of_an_enumeration_once)
-{
-    offer("x", "y");
-    for (const auto status : {ENUM_INSTANCES_OK, ENUM_INSTANCES_FAILED})
-    {
-        Received received;
-        script.enum_instances = status;
-        EXPECT_EQ(things.enum_instances(source.ptr(), receive, &received), status);
-        EXPECT_THAT(received.names, ElementsAre("x", "y", "end"));
-    }
+    const std::pair<const Registration&, std::vector<int>> missing[] = {
+        {thing_registration, {11, 12, 14, 15, 16}}, {link_registration, {11, 12, 17, -1}}, {alert_registration, {5, 6, 9, 14}}};
+    for (const auto& [registration, operations] : missing)
+        for (const int operation : operations)
+            EXPECT_EQ(registration.provider_proc(&registration, operation, nullptr, nullptr, nullptr, nullptr, nullptr, nullptr,
+                                                 nullptr, nullptr),
+                      -1)
+                << operation;
 }
 
 } // namespace
