@@ -77,6 +77,7 @@ TEST_F(Conversion, gives_every_type_its_code_and_bits)
     EXPECT_EQ(std::get<std::string>(content<Values>(properties, "Strings").at(2).content), "zw\xC3\xB6lf");
 }
 
+// Both ways through the interface of a provider.
 TEST_F(Conversion, tells_references_from_embedded_objects)
 {
     const Ref<Test_Link> original = make_link("a", "b");
@@ -87,27 +88,35 @@ TEST_F(Conversion, tells_references_from_embedded_objects)
         array->null = 0;
         array->value.append(full_thing("element").steal());
     }
-    const auto sent = to_cmpi(original.ptr());
-    const auto properties = cimserver::object<Instance_Object>(sent.get()).model().properties;
+    script.instances.emplace_back(original.ptr());
+    ref(original.ptr());
+    script.create_instance = CREATE_INSTANCE_OK;
+    Recorded_Result result;
+    CMPIInstanceMI* mi = links();
+    const CMPIObjectPath* object_path = path("Test_Link");
+
+    EXPECT_EQ(CMPI_Adapter::enumInstances(mi, request.context(), result.face(), object_path, nullptr).rc, CMPI_RC_OK);
+    const auto& properties = result.instances.at(0).properties;
     EXPECT_EQ(value(properties, "Antecedent").type, CMPI_ref);
     EXPECT_EQ(value(properties, "Detail").type, CMPI_instance);
     EXPECT_EQ(value(properties, "Others").type, CMPI_ref | CMPI_ARRAY);
     EXPECT_EQ(value(properties, "Details").type, CMPI_instance | CMPI_ARRAY);
-    const auto& dependent = path_in(properties, "Dependent");
-    EXPECT_EQ(dependent.name_space, "root/other");
-    EXPECT_EQ(name_in(dependent), "b");
+    EXPECT_EQ(path_in(properties, "Dependent").name_space, "root/other");
+    EXPECT_EQ(name_in(path_in(properties, "Dependent")), "b");
     const auto& detail = *content<std::shared_ptr<const cimserver::Instance>>(properties, "Detail");
     EXPECT_EQ(text(detail.properties, "When"), "00000000013000.000007:000");
 
-    const Ref<Test_Link> back = from_cmpi<Test_Link>(sent.get());
-    ASSERT_TRUE(back->Detail);
-    EXPECT_TRUE(key_eq(back.ptr(), original.ptr()));
-    EXPECT_EQ(back->Detail->Uint8.value, 0xFF);
-    ASSERT_EQ(back->Others.value.size(), 1U);
-    EXPECT_TRUE(cast<Test_Thing>(back->Others.value[0])->Uint8.null) << "a reference holds keys only";
-    ASSERT_EQ(back->Details.value.size(), 1U);
-    EXPECT_FALSE(cast<Test_Thing>(back->Details.value[0])->Uint8.null);
-    EXPECT_EQ(back->Details.value[0]->__name_space, name_space);
+    const CMPIInstance* sent_back = make<Instance_Object>(result.instances[0]).face();
+    EXPECT_EQ(CMPI_Adapter::createInstance(mi, request.context(), result.face(), object_path, sent_back).rc, CMPI_RC_OK);
+    const auto& back = *cast<Test_Link>(script.instance.ptr());
+    ASSERT_TRUE(back.Detail);
+    EXPECT_TRUE(key_eq(&back, original.ptr()));
+    EXPECT_EQ(back.Detail->Uint8.value, 0xFF);
+    ASSERT_EQ(back.Others.value.size(), 1U);
+    EXPECT_TRUE(cast<Test_Thing>(back.Others.value[0])->Uint8.null) << "a reference holds keys only";
+    ASSERT_EQ(back.Details.value.size(), 1U);
+    EXPECT_FALSE(cast<Test_Thing>(back.Details.value[0])->Uint8.null);
+    EXPECT_EQ(back.Details.value[0]->__name_space, name_space);
 }
 
 TEST_F(Conversion, takes_references_out_of_a_path)

@@ -15,10 +15,24 @@ class Turn
 {
 public:
     Script* operator->() const { return &Script::get(); }
+    Script& operator*() const { return Script::get(); }
 
 private:
     std::lock_guard<std::recursive_mutex> _guard{Script::turn()};
 };
+
+Ref<Instance> copy_of(const Instance* instance) { return Ref<Instance>(clone(instance)); }
+
+// Hands out clones until told to stop; a deaf provider goes on.
+template <class T, class Handler> void hand_out(const std::vector<Ref<Instance>>& instances, Handler& handler, Script& script)
+{
+    for (const Ref<Instance>& instance : instances)
+    {
+        ++script.delivered;
+        if (!handler.handle(static_cast<T*>(clone(instance.ptr()))) && !script.deaf)
+            break;
+    }
+}
 
 // The life of a provider of any kind. It is told without a turn: a provider loads under the lock that a request within a turn
 // may want.
@@ -43,18 +57,20 @@ public:
             Script::get().on_unload();
         return UNLOAD_FAILED; // nobody asks
     }
+
+    // What a provider without methods answers.
+    static int invoke(Base&, const Instance*, Instance*) { return -1; }
 };
 
 template <class T, template <class> class Base> class Scripted_Provider : public Counted_Provider<Base<T>>
 {
 public:
     static Scripted_Provider* create() { return new Scripted_Provider; }
-    static int invoke(Scripted_Provider&, const T*, Instance*) { return -1; }
 
     Get_Instance_Status get_instance(const T* model, T*& instance) override
     {
         const Turn script;
-        script->model.reset(clone(static_cast<const Instance*>(model)));
+        script->model = copy_of(model);
         if (script->get_instance == GET_INSTANCE_OK && !script->instances.empty())
             instance = static_cast<T*>(clone(script->instances.front().ptr()));
         return script->get_instance;
@@ -64,37 +80,32 @@ public:
     {
         const Turn script;
         ++script->enumerations;
-        script->model.reset(clone(static_cast<const Instance*>(model)));
+        script->model = copy_of(model);
         if (script->on_enum)
             script->on_enum();
-        for (const Ref<Instance>& instance : script->instances)
-        {
-            ++script->delivered;
-            if (!handler.handle(static_cast<T*>(clone(instance.ptr()))) && !script->deaf)
-                break;
-        }
+        hand_out<T>(script->instances, handler, *script);
         return script->enum_instances;
     }
 
     Create_Instance_Status create_instance(T* instance) override
     {
         const Turn script;
-        script->instance.reset(clone(static_cast<Instance*>(instance)));
+        script->instance = copy_of(instance);
         return script->create_instance;
     }
 
     Modify_Instance_Status modify_instance(const T* model, const T* instance) override
     {
         const Turn script;
-        script->model.reset(clone(static_cast<const Instance*>(model)));
-        script->instance.reset(clone(static_cast<const Instance*>(instance)));
+        script->model = copy_of(model);
+        script->instance = copy_of(instance);
         return script->modify_instance;
     }
 
     Delete_Instance_Status delete_instance(const T* instance) override
     {
         const Turn script;
-        script->instance.reset(clone(static_cast<const Instance*>(instance)));
+        script->instance = copy_of(instance);
         return script->delete_instance;
     }
 };
@@ -108,29 +119,35 @@ public:
     static int invoke(Disk_Provider&, const Test_Disk* self, Instance* parameters)
     {
         const Turn script;
-        script->instance.reset(clone(static_cast<const Instance*>(self)));
+        script->instance = copy_of(self);
         if (script->on_invoke)
             script->on_invoke(parameters);
         return script->invoke_method;
     }
 };
 
+// Delivers associators only when it says that it does.
 class Link_Provider : public Scripted_Provider<Test_Link, Association_Provider>
 {
 public:
     static Link_Provider* create() { return new Link_Provider; }
-    static int invoke(Link_Provider&, const Test_Link*, Instance*) { return -1; }
 
     Enum_Associators_Status enum_associators(const Instance*, const String&, const String&, const String&,
                                              Enum_Associators_Handler<Instance>& handler) override
     {
-        return hand_out(handler, Script::get().enum_associators);
+        const Turn script;
+        if (script->enum_associators == ENUM_ASSOCIATORS_OK)
+            hand_out<Instance>(script->associators, handler, *script);
+        return script->enum_associators;
     }
 
     Enum_Associator_Names_Status enum_associator_names(const Instance*, const String&, const String&, const String&,
                                                        Enum_Associator_Names_Handler<Instance>& handler) override
     {
-        return hand_out(handler, Script::get().enum_associator_names);
+        const Turn script;
+        if (script->enum_associator_names == ENUM_ASSOCIATOR_NAMES_OK)
+            hand_out<Instance>(script->associators, handler, *script);
+        return script->enum_associator_names;
     }
 
     Enum_References_Status enum_references(const Instance*, const Test_Link*, const String&,
@@ -138,27 +155,12 @@ public:
     {
         return Script::get().enum_references;
     }
-
-private:
-    // A provider that leaves it to others delivers nothing.
-    template <class Handler, class Status> static Status hand_out(Handler& handler, Status status)
-    {
-        if (status == 0)
-        {
-            const Turn script;
-            for (const Ref<Instance>& instance : script->associators)
-                if (!handler.handle(clone(instance.ptr())) && !script->deaf)
-                    break;
-        }
-        return status;
-    }
 };
 
 class Alert_Provider : public Counted_Provider<Indication_Provider<Test_Alert>>
 {
 public:
     static Alert_Provider* create() { return new Alert_Provider; }
-    static int invoke(Alert_Provider&, const Test_Alert*, Instance*) { return -1; }
 
     Enable_Indications_Status enable_indications(Indication_Handler<Test_Alert>* handler) override
     {
