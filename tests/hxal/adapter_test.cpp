@@ -13,13 +13,11 @@ class Adapter : public Simulated_Host
 protected:
     Adapter()
     {
-        host(R"({"adapters": [
+        scan(R"({"adapters": [
             {"kind": "fc-hba", "name": "red", "serial": "R1", "hwpath": "0000:01:00",
              "ports": [{"fc_instance": 2}, {"fc_instance": 3}]},
             {"kind": "cna", "name": "blue", "serial": "B1", "hwpath": "0000:02:00",
              "ports": [{"fc_instance": 0}, {"fc_instance": 1}]}]})");
-        EXPECT_EQ(hxal_adapter_scan(), 2);
-        hxasim::take_requests();
         cna = hxal_adapter_open_idx(1);
         hba = hxal_adapter_open_idx(2);
     }
@@ -175,8 +173,7 @@ TEST_F(Adapter, is_enabled_or_disabled_when_every_ioc_says_so)
 
 TEST_F(Adapter, with_ethernet_iocs_only_comes_last_and_is_found_by_mac)
 {
-    host(R"({"adapters": [{"kind": "cna"}], "drivers": {"hxa": {"present": false}}})");
-    ASSERT_EQ(hxal_adapter_scan(), 1);
+    ASSERT_EQ(scan(R"({"adapters": [{"kind": "cna"}], "drivers": {"hxa": {"present": false}}})"), 1);
     const hxal_adapter_t* ad = hxal_adapter_open_idx(1);
     EXPECT_EQ(ad->fcioc_list, nullptr);
     EXPECT_EQ(hxal_adapter_get_first_ioc(ad), ad->ethioc_list);

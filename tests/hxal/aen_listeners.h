@@ -69,89 +69,81 @@ template <typename Data> void hear_event(void* listener, uint32_t event, const D
     static_cast<Listener*>(listener)->hear(std::to_string(event));
 }
 
-// What the register function returned; the listener unregisters what it made.
-template <auto delist, typename Handle> hxa_status_t keep(Listener& listener, Handle*& handle, hxa_status_t status)
+// What `enlist` returned, which stores the handle where it is told; the listener unregisters it.
+template <typename Handle> hxa_status_t keep(Listener& listener, hxa_status_t (*delist)(Handle*), auto enlist)
 {
+    Handle* handle = nullptr;
+    const hxa_status_t status = enlist(&handle);
     if (status == HXA_STATUS_OK)
-        listener.unregister = [handle] { return delist(handle); };
+        listener.unregister = [=] { return delist(handle); };
     return status;
 }
 
 // One for each kind, with the full form of the callback unless told otherwise.
 
-inline hxa_status_t listen_adapter(Listener& listener, const hxal_adapter_t* adapter,
-                                   hxal_adapter_aen_cbfn_t callback = hear_event, uint32_t flag = 0)
+inline hxa_status_t listen_adapter(Listener& to, const hxal_adapter_t* adapter, hxal_adapter_aen_cbfn_t callback = hear_event,
+                                   uint32_t flag = 0)
 {
-    hxal_adapter_aen_cbhandle_t* handle = nullptr;
-    return keep<hxal_adapter_aen_unregister>(listener, handle,
-                                             hxal_adapter_aen_register(adapter, callback, &listener, &handle, flag));
+    return keep(to, hxal_adapter_aen_unregister,
+                [&](auto handle) { return hxal_adapter_aen_register(adapter, callback, &to, handle, flag); });
 }
 
-inline hxa_status_t listen_port(Listener& listener, const hxal_t* ioc, hxa_port_aen_data_t data)
+inline hxa_status_t listen_port(Listener& to, const hxal_t* ioc, hxa_port_aen_data_t data)
 {
-    hxal_port_aen_cbhandle_t* handle = nullptr;
-    return keep<hxal_port_aen_unregister>(listener, handle, hxal_port_aen_register(ioc, hear_event, &listener, &data, &handle));
+    return keep(to, hxal_port_aen_unregister,
+                [&](auto handle) { return hxal_port_aen_register(ioc, hear_event, &to, &data, handle); });
 }
 
-inline hxa_status_t listen_lport(Listener& listener, const hxal_t* ioc, hxa_lport_aen_data_t data,
+inline hxa_status_t listen_lport(Listener& to, const hxal_t* ioc, hxa_lport_aen_data_t data,
                                  hxal_lport_aen_cbfn_t callback = hear_event, uint32_t flag = 0)
 {
-    hxal_lport_aen_cbhandle_t* handle = nullptr;
-    return keep<hxal_lport_aen_unregister>(listener, handle,
-                                           hxal_lport_aen_register(ioc, callback, &listener, &data, &handle, flag));
+    return keep(to, hxal_lport_aen_unregister,
+                [&](auto handle) { return hxal_lport_aen_register(ioc, callback, &to, &data, handle, flag); });
 }
 
-inline hxa_status_t listen_rport(Listener& listener, const hxal_t* ioc, hxa_rport_aen_data_t data)
+inline hxa_status_t listen_rport(Listener& to, const hxal_t* ioc, hxa_rport_aen_data_t data)
 {
-    hxal_rport_aen_cbhandle_t* handle = nullptr;
-    return keep<hxal_rport_aen_unregister>(listener, handle, hxal_rport_aen_register(ioc, hear_event, &listener, &data, &handle));
+    return keep(to, hxal_rport_aen_unregister,
+                [&](auto handle) { return hxal_rport_aen_register(ioc, hear_event, &to, &data, handle); });
 }
 
-inline hxa_status_t listen_itnim(Listener& listener, const hxal_t* ioc, hxa_itnim_aen_data_t data,
+inline hxa_status_t listen_itnim(Listener& to, const hxal_t* ioc, hxa_itnim_aen_data_t data,
                                  hxal_itnim_aen_cbfn_t callback = hear_event, uint32_t flag = 0)
 {
-    hxal_itnim_aen_cbhandle_t* handle = nullptr;
-    return keep<hxal_itnim_aen_unregister>(listener, handle,
-                                           hxal_itnim_aen_register(ioc, callback, &listener, &data, &handle, flag));
+    return keep(to, hxal_itnim_aen_unregister,
+                [&](auto handle) { return hxal_itnim_aen_register(ioc, callback, &to, &data, handle, flag); });
 }
 
-inline hxa_status_t listen_audit(Listener& listener, const hxal_t* ioc, hxa_audit_aen_data_t data)
+inline hxa_status_t listen_audit(Listener& to, const hxal_t* ioc, hxa_audit_aen_data_t data)
 {
-    hxal_audit_aen_cbhandle_t* handle = nullptr;
-    return keep<hxal_audit_aen_unregister>(listener, handle, hxal_audit_aen_register(ioc, hear_event, &listener, &data, &handle));
+    return keep(to, hxal_audit_aen_unregister,
+                [&](auto handle) { return hxal_audit_aen_register(ioc, hear_event, &to, &data, handle); });
 }
 
-inline hxa_status_t listen_ioc(Listener& listener, const hxal_t* ioc, hxal_ioc_aen_cbfn_t callback = hear_event)
+inline hxa_status_t listen_ioc(Listener& to, const hxal_t* ioc)
 {
-    hxal_ioc_aen_cbhandle_t* handle = nullptr;
-    return keep<hxal_ioc_aen_unregister>(listener, handle, hxal_ioc_aen_register(ioc, callback, &listener, &handle));
+    return keep(to, hxal_ioc_aen_unregister, [&](auto handle) { return hxal_ioc_aen_register(ioc, hear_event, &to, handle); });
 }
 
-inline hxa_status_t listen_ethport(Listener& listener, const hxal_t* ioc)
+inline hxa_status_t listen_ethport(Listener& to, const hxal_t* ioc)
 {
-    hxal_ethport_aen_cbhandle_t* handle = nullptr;
-    return keep<hxal_ethport_aen_unregister>(listener, handle,
-                                             hxal_ethport_aen_register(ioc, hear_event, &listener, nullptr, &handle));
+    return keep(to, hxal_ethport_aen_unregister,
+                [&](auto handle) { return hxal_ethport_aen_register(ioc, hear_event, &to, nullptr, handle); });
 }
 
 // A scanned host with one two-port CNA: instances 0 and 1 of both drivers.
 class Aen : public Simulated_Host
 {
 protected:
-    Aen()
-    {
-        host(one_cna);
-        scan();
-    }
+    Aen() { scan_anew(); }
 
-    void scan()
+    void scan_anew()
     {
-        ASSERT_GT(hxal_adapter_scan(), 0U);
+        scan(one_cna);
         adapter = hxal_adapter_open_idx(1);
         fc = hxal_adapter_get_fcioc(adapter, 0);
         fc1 = hxal_adapter_get_fcioc(adapter, 1);
         eth = hxal_adapter_get_ethioc(adapter, 0);
-        hxasim::take_requests();
     }
 
     Heard heard;

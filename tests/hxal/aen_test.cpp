@@ -269,12 +269,10 @@ TEST_F(Aen, loses_no_event_after_one_of_an_IOC_that_has_gone)
     listen_lport(behind, fc, lport_data(a_wwn));
     listen_lport(brief, fc, lport_data(a_wwn), form, HXAL_AEN_SNIA);
     listen_lport(full, fc, lport_data(a_wwn));
-    host("{}");
-    hxal_adapter_scan();
+    scan("{}");
     hxal::dispatch_event(lport_event(0, HXA_LPORT_AEN_ONLINE, a_wwn));
     EXPECT_THAT(heard.take(), ElementsAre("full 3")) << "the dispatch ends where no address can be had";
-    host(one_cna);
-    scan();
+    scan_anew();
     hxal::dispatch_event(lport_event(0, HXA_LPORT_AEN_ONLINE, a_wwn));
     EXPECT_EQ(heard.take().size(), 3U);
 }

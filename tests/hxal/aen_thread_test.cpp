@@ -215,7 +215,7 @@ TEST_F(Aen_Thread, does_not_hold_up_the_end_of_the_process)
         if (child == 0)
         {
             alarm(60);
-            scan();
+            scan_anew();
             Listener listener(heard, "it");
             listen_ioc(listener, fc);
             hxasim::inject({.command = "IOCMD_AEN_GET", .answer = {{4, {64, 0, 0, 0}}}}); // never ends
@@ -342,7 +342,7 @@ TEST_F(Aen_Thread, waits_on_any_descriptor)
     do
         fillers.push_back(open("/dev/null", O_RDONLY | O_CLOEXEC));
     while (fillers.back() >= 0 && fillers.back() < FD_SETSIZE);
-    scan();
+    scan_anew();
     EXPECT_GT(fc->fd, FD_SETSIZE);
     Listener listener(heard, "it");
     listen_ioc(listener, fc);

@@ -78,20 +78,13 @@ protected:
         std::string name = fs::temp_directory_path() / "boot_update_XXXXXX";
         _folder = mkdtemp(name.data());
         fs::current_path(_folder);
-        use(R"({"adapters": [{"kind": "fc-hba"}]})");
+        scan(R"({"adapters": [{"kind": "fc-hba"}]})");
     }
 
     ~Boot_Update() override
     {
         fs::current_path(_before);
         fs::remove_all(_folder);
-    }
-
-    static void use(const std::string& json)
-    {
-        host(json);
-        hxal_adapter_scan();
-        hxasim::take_requests();
     }
 
     static hxa_status_t update(const Archive& archive, uint16_t devid = 0)
@@ -123,7 +116,7 @@ TEST_F(Boot_Update, writes_and_verifies_every_image_for_the_card_and_switches_th
 {
     for (const Archive& archive : {archive_of(description), wrapped(archive_of(description))})
     {
-        use(R"({"adapters": [{"kind": "fc-hba"}]})");
+        scan(R"({"adapters": [{"kind": "fc-hba"}]})");
         ASSERT_EQ(update(archive), HXA_STATUS_OK);
         EXPECT_THAT(requests(), ElementsAre("IOCMD_IOC_GET_ATTR", "IOCMD_FLASH_UPDATE_PART", "IOCMD_FLASH_READ_PART",
                                             "IOCMD_FLASH_UPDATE_PART", "IOCMD_FLASH_READ_PART", "IOCMD_FLASH_UPDATE_PART",
@@ -258,15 +251,15 @@ TEST_F(Boot_Update, ends_with_the_first_image_that_fails)
     EXPECT_EQ(update(archive_of(description), 0x14), HXA_STATUS_DEVID_MISSING);
     fail("IOCMD_FLASH_READ_PART", EIO);
     EXPECT_EQ(update(archive_of(description), 0x13), HXA_STATUS_EIO);
-    use(R"({"adapters": [{"kind": "fc-hba", "flash": [{"type": "optrom", "status": "bad"}]}]})");
+    scan(R"({"adapters": [{"kind": "fc-hba", "flash": [{"type": "optrom", "status": "bad"}]}]})");
     EXPECT_EQ(update(archive_of(description), 0x13), HXA_STATUS_FAILED) << "other bytes are read back";
-    use(R"({"adapters": [{"kind": "fc-hba", "flash": [{"type": "optrom", "size": 1023}]}]})");
+    scan(R"({"adapters": [{"kind": "fc-hba", "flash": [{"type": "optrom", "size": 1023}]}]})");
     EXPECT_EQ(update(archive_of(description), 0x13), HXA_STATUS_FLASH_BAD_LEN);
 }
 
 TEST_F(Boot_Update, of_every_card_tells_how_it_goes)
 {
-    use(R"({"adapters": [{"kind": "fc-hba"}, {"kind": "cna"}]})");
+    scan(R"({"adapters": [{"kind": "fc-hba"}, {"kind": "cna"}]})");
     archive_of(description).save("archive");
     testing::internal::CaptureStdout();
     EXPECT_EQ(hxal_boot_fwupdate(nullptr, "archive", 0), HXA_STATUS_DEVID_MISSING);

@@ -30,7 +30,6 @@ TEST_F(Config_Lookup, finds_and_adds_by_wwn)
     for (uint8_t i = 0; i < 200; ++i)
         hxal_config_ioc_add(port_wwn(9, i));
     EXPECT_EQ(hxal_config_ioc_get_num(), 128);
-    EXPECT_EQ(hxal_config_ioc_lookup(port_wwn(9, 122)), 126);
     EXPECT_EQ(hxal_config_ioc_lookup(port_wwn(9, 123)), -1);
 }
 
@@ -49,18 +48,6 @@ TEST_F(Config_Lookup, finds_and_adds_by_mac)
         hxal_config_ethioc_add(eth_mac(1, i));
     EXPECT_EQ(hxal_config_ethioc_lookup(eth_mac(1, 124)), 127);
     EXPECT_EQ(hxal_config_ethioc_lookup(eth_mac(1, 125)), -1);
-}
-
-TEST_F(Config_Lookup, adds_serial_numbers)
-{
-    hxal_config_ad_add("SN0123456789");
-    hxal_config_ad_add("SN1");
-    hxal_config_ad_add("");
-    hxal_config_ad_add(nullptr);
-    EXPECT_EQ(hxal_config_ad_get_num(), 2);
-    EXPECT_EQ(hxal_config_ad_lookup("SN012345678"), 0);
-    EXPECT_EQ(hxal_config_ad_lookup("SN1"), 1);
-    EXPECT_EQ(hxal_config_ad_lookup("SN"), -1);
 }
 
 class Config_Names : public Simulated_Host

@@ -24,9 +24,7 @@ protected:
     void plug_cna(int settle = 0, const std::string& state = "operational")
     {
         const std::string port = R"({"ioc_settle": )" + std::to_string(settle) + R"(, "ioc_state": ")" + state + R"("})";
-        host(R"({"adapters": [{"kind": "cna", "serial": "B1", "name": "blue", "ports": [)" + port + ", " + port + "]}]}");
-        ASSERT_EQ(hxal_adapter_scan(), 1);
-        hxasim::take_requests();
+        scan(R"({"adapters": [{"kind": "cna", "serial": "B1", "name": "blue", "ports": [)" + port + ", " + port + "]}]}");
         cna = hxal_adapter_open_idx(1);
     }
 

@@ -18,11 +18,9 @@ protected:
 
     void plug(const std::string& adapter)
     {
-        host(R"({"adapters": [)" + adapter + "]}");
-        hxal_adapter_scan();
+        scan(R"({"adapters": [)" + adapter + "]}");
         fc = hxal_ioc_open_idx(0);
         ethernet = hxal_adapter_get_ethioc(hxal_adapter_open_idx(1), 0);
-        hxasim::take_requests();
     }
 
     // The first port has these keys.

@@ -19,9 +19,7 @@ protected:
     {
         std::string name = fs::temp_directory_path() / "flash_test_XXXXXX";
         _folder = mkdtemp(name.data());
-        host(R"({"adapters": [{"kind": "fc-hba"}]})");
-        hxal_adapter_scan();
-        hxasim::take_requests();
+        scan(R"({"adapters": [{"kind": "fc-hba"}]})");
         ioc = hxal_adapter_get_port(1);
     }
 

@@ -9,11 +9,9 @@ class Ioc : public Simulated_Host
 protected:
     Ioc()
     {
-        host(R"({"adapters": [{"kind": "fc-hba", "name": "red", "hwpath": "0000:01:00", "ports": [{"name": "r0"}]},
+        scan(R"({"adapters": [{"kind": "fc-hba", "name": "red", "hwpath": "0000:01:00", "ports": [{"name": "r0"}]},
                               {"kind": "cna", "name": "blue", "hwpath": "0000:02:00", "serial": "ABC",
                                "ports": [{"name": "b0"}, {"name": "b1"}]}]})");
-        hxal_adapter_scan();
-        hxasim::take_requests();
     }
     ~Ioc() override { EXPECT_THAT(requests(), testing::IsEmpty()); }
 

@@ -17,10 +17,8 @@ protected:
 
     void scan(const std::string& json)
     {
-        host(json);
-        ASSERT_GT(hxal_adapter_scan(), 0);
+        ASSERT_GT(Simulated_Host::scan(json), 0);
         ioc = hxal_ioc_open_idx(0);
-        hxasim::take_requests();
     }
 
     hxa_pport_attr_t attributes()

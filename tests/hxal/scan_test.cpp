@@ -144,11 +144,9 @@ TEST_F(Scan, of_a_failing_node_adds_nothing_while_the_other_node_serves)
 
 TEST_F(Scan, without_any_driver_leaves_the_later_node_s_error)
 {
-    host(R"({"drivers": {"hxa": {"version_status": 70}, "hxn": {"present": false}}})");
-    EXPECT_EQ(hxal_adapter_scan(), 0);
+    EXPECT_EQ(scan(R"({"drivers": {"hxa": {"version_status": 70}, "hxn": {"present": false}}})"), 0);
     EXPECT_EQ(hxal_get_last_error(), HXA_STATUS_NO_DRIVER);
-    host(R"({"drivers": {"hxa": {"present": false}, "hxn": {"version_status": 70}}})");
-    EXPECT_EQ(hxal_adapter_scan(), 0);
+    EXPECT_EQ(scan(R"({"drivers": {"hxa": {"present": false}, "hxn": {"version_status": 70}}})"), 0);
     EXPECT_EQ(hxal_get_last_error(), HXA_STATUS_VERSION_FAIL);
     EXPECT_EQ(hxal_ioc_get_inst_num(), -1);
 }
@@ -194,8 +192,7 @@ TEST_F(Scan, of_adapters_stops_at_a_failing_ioc_and_forgets_the_earlier_adapters
     };
     for (const Case& each : cases)
     {
-        host(one_cna);
-        ASSERT_EQ(hxal_adapter_scan(), 1);
+        ASSERT_EQ(scan(one_cna), 1);
         hxasim::inject(each.fault);
         testing::internal::CaptureStdout();
         EXPECT_EQ(hxal_adapter_scan(), 0);
@@ -222,23 +219,20 @@ TEST_F(Scan, keeps_one_descriptor_for_each_node_that_a_list_uses)
 
     hxal_adapter_scan();
     EXPECT_EQ(hxasim::open_descriptors(), 2);
-    host("{}");
-    EXPECT_EQ(hxal_adapter_scan(), 0);
+    EXPECT_EQ(scan("{}"), 0);
     EXPECT_EQ(hxasim::open_descriptors(), 0);
 }
 
 TEST_F(Scan, leaves_a_registration_its_descriptor_until_it_is_taken_back)
 {
-    host(one_cna);
-    ASSERT_EQ(hxal_adapter_scan(), 1);
+    ASSERT_EQ(scan(one_cna), 1);
     const auto ignore = [](void*, uint32_t, const hxa_ioc_aen_data_t*, hxa_timeval_t) {};
     hxal_ioc_aen_cbhandle_t* registration = nullptr;
     ASSERT_EQ(hxal_ioc_aen_register(hxal_ioc_open_idx(0), ignore, nullptr, &registration), HXA_STATUS_OK);
     for (int i = 0; i < 3; ++i)
         ASSERT_EQ(hxal_adapter_scan(), 1);
     EXPECT_EQ(hxasim::open_descriptors(), 3);
-    host("{}");
-    hxal_adapter_scan();
+    scan("{}");
     EXPECT_EQ(hxasim::open_descriptors(), 1);
     EXPECT_EQ(hxal_ioc_aen_unregister(registration), HXA_STATUS_OK);
     EXPECT_EQ(hxasim::open_descriptors(), 0);
@@ -246,8 +240,7 @@ TEST_F(Scan, leaves_a_registration_its_descriptor_until_it_is_taken_back)
 
 TEST_F(Scan, of_iocs_alone_can_hand_its_descriptor_to_an_adapter)
 {
-    host(R"({"adapters": [{"kind": "cna", "ports": [{}]}]})");
-    hxal_adapter_scan();
+    scan(R"({"adapters": [{"kind": "cna", "ports": [{}]}]})");
     hxal_ioc_scan();
     hxal_adapter_t* ad = hxal_adapter_open_idx(1);
     for (int idx : {0, 1})

@@ -48,11 +48,9 @@ protected:
 
     void plug(const std::string& keys, const std::string& port = "")
     {
-        host(R"({"adapters": [{"kind": "fc-hba", "ports": [{)" + port +
+        scan(R"({"adapters": [{"kind": "fc-hba", "ports": [{)" + port +
              R"("remote_ports": [{"pwwn": "2100000000000001", "nwwn": "200000A0B0C0D0E0")" + keys + "}]}]}]}");
-        hxal_adapter_scan();
         ioc = hxal_ioc_open_idx(0);
-        hxasim::take_requests();
     }
 
     Answer send(decltype(&hxal_scsi_inquiry) function, lun_t unit, std::size_t room, scsi_cdb_t cdb = {},

@@ -26,12 +26,20 @@ protected:
     ~Simulated_Host() override
     {
         EXPECT_THAT(hxasim::violations(), testing::IsEmpty());
-        hxasim::load_text("{}");
-        hxal_adapter_scan();
+        scan("{}");
         hxasim::unload();
     }
 
     static void host(const std::string& json) { hxasim::load_text(json); }
+
+    // Loads a host and scans it: the number of adapters. Requests count from here on.
+    static int scan(const std::string& json)
+    {
+        host(json);
+        const int count = hxal_adapter_scan();
+        hxasim::take_requests();
+        return count;
+    }
 
     static void fail(const std::string& command, int error, std::optional<int> instance = {})
     {

@@ -22,18 +22,16 @@ class Statistics : public Simulated_Host
 protected:
     Statistics()
     {
-        host(R"({"adapters": [
+        scan(R"({"adapters": [
             {"kind": "fc-hba", "ports": [{"counters": {"fc": )" +
              counting(29) + R"(, "qos": [8, 9],
                                                        "logical_port": )" +
              counting(43) + R"(}}]},
             {"kind": "cna", "ports": [{"counters": {"ethernet": )" +
              counting(38) + R"(, "fcoe": )" + counting(45) + R"(}}]}]})");
-        hxal_adapter_scan();
         fc = hxal_ioc_open_idx(0);
         fcoe = hxal_ioc_open_idx(1);
         ethernet = hxal_ioc_open_idx(2);
-        hxasim::take_requests();
     }
 
     // The names of the pairs, whose values have to be their positions; the first may have counted on for a second or two. The
