@@ -24,24 +24,19 @@ int answer(const std::optional<std::string>& text, char* out, size_t size)
     return 0;
 }
 
-// The addresses in the form of a host entry; empty texts stand for nothing.
-std::vector<in_addr> addresses;
-std::vector<char*> address_list;
-
+// The addresses in the form of a host entry.
 void fill(hostent& entry)
 {
-    addresses.assign(fake_host.addresses.size(), in_addr());
-    address_list.clear();
-    for (size_t i = 0; i < addresses.size(); i++)
+    static in_addr addresses[4];
+    static char* list[5];
+    size_t count = 0;
+    for (const std::string& text : fake_host.addresses)
     {
-        inet_pton(AF_INET, fake_host.addresses[i].c_str(), &addresses[i]);
-        address_list.push_back(reinterpret_cast<char*>(&addresses[i]));
+        inet_pton(AF_INET, text.c_str(), &addresses[count]);
+        list[count] = reinterpret_cast<char*>(&addresses[count]);
+        list[++count] = nullptr;
     }
-    address_list.push_back(nullptr);
-    entry = {};
-    entry.h_addrtype = AF_INET;
-    entry.h_length = sizeof(in_addr);
-    entry.h_addr_list = address_list.data();
+    entry = {.h_name = nullptr, .h_aliases = nullptr, .h_addrtype = AF_INET, .h_length = sizeof(in_addr), .h_addr_list = list};
 }
 
 } // namespace

@@ -15,13 +15,7 @@ namespace
 class Host : public Inventory_Test
 {
 protected:
-    struct Info
-    {
-        int code;
-        std::string text;
-        friend bool operator==(const Info&, const Info&) = default;
-        friend void PrintTo(const Info& info, std::ostream* out) { *out << info.code << ' ' << info.text; }
-    };
+    using Info = std::pair<int, std::string>; // the code and the text
 
     static Info info(int len = 255)
     {
@@ -36,6 +30,10 @@ protected:
 TEST_F(Host, info_tells_the_best_text_there_is)
 {
     const std::string line = "INFO ProviderUtil: gethostbyname() FAILED. hostString will have hostname instead of ipAddress";
+    const std::string no_domain = "WARN ProviderUtil: getdomainname() failed",
+                      no_second_name = "WARN ProviderUtil: gethostname() failed";
+    const std::string no_name = "INFO ProviderUtil: gethostname() FAILED. hostString will be filled with localhost";
+    const std::vector<std::string> loopback = {"127.0.0.1", "127.0.1.1"};
     const struct
     {
         const char* what;
@@ -43,28 +41,18 @@ TEST_F(Host, info_tells_the_best_text_there_is)
         Info expected;
         std::vector<std::string> log;
     } cases[] = {
-        {"an address", {}, {0, "192.0.2.10"}, {}},
-        {"the first address that is no loopback one",
-         {.addresses = {"127.0.1.1", "198.51.100.7", "192.0.2.10"}},
-         {0, "198.51.100.7"},
-         {}},
-        {"no address", {.addresses = {}}, {2, "storage-host"}, {line}},
-        {"loopback and no domain", {.addresses = {"127.0.0.1", "127.0.1.1"}}, {2, "storage-host"}, {line}},
-        {"loopback and a domain", {.addresses = {"127.0.0.1"}, .domain = "example.com"}, {4, "storage-host.example.com"}, {}},
-        {"no domain name at all",
-         {.addresses = {"127.0.0.1"}, .domain = std::nullopt},
-         {2, "storage-host"},
-         {"WARN ProviderUtil: getdomainname() failed"}},
-        {"a name only once",
-         {.name_answers = 1, .addresses = {"127.0.0.1"}},
-         {2, "storage-host"},
-         {"WARN ProviderUtil: gethostname() failed"}},
-        {"no name",
-         {.name = std::nullopt},
-         {3, "localhost"},
-         {"INFO ProviderUtil: gethostname() FAILED. hostString will be filled with localhost"}},
-        {"an address list of 5000 bytes", {.memory_needed = 5000}, {0, "192.0.2.10"}, {}},
-        {"an address list without end", {.memory_needed = std::size_t{1} << 30}, {2, "storage-host"}, {line}},
+        // clang-format off
+        {"an address",                   {},                                                     {0, "192.0.2.10"},   {}},
+        {"the first usable address",     {.addresses = {"127.0.1.1", "198.51.100.7", "192.0.2.10"}}, {0, "198.51.100.7"}, {}},
+        {"no address",                   {.addresses = {}},                                      {2, "storage-host"}, {line}},
+        {"loopback and no domain",       {.addresses = loopback},                                {2, "storage-host"}, {line}},
+        {"loopback and a domain",        {.addresses = loopback, .domain = "example.com"},       {4, "storage-host.example.com"}, {}},
+        {"no domain name at all",        {.addresses = loopback, .domain = std::nullopt},        {2, "storage-host"}, {no_domain}},
+        {"a name only once",             {.name_answers = 1, .addresses = loopback},             {2, "storage-host"}, {no_second_name}},
+        {"no name",                      {.name = std::nullopt},                                 {3, "localhost"},    {no_name}},
+        {"an address list of 5000 bytes", {.memory_needed = 5000},                               {0, "192.0.2.10"},   {}},
+        {"an address list without end",  {.memory_needed = std::size_t{1} << 30},                {2, "storage-host"}, {line}},
+        // clang-format on
     };
     for (const auto& c : cases)
     {

@@ -1,7 +1,6 @@
 #include "runtime/log.h"
 
 #include "runtime/file_lock.h"
-#include "runtime/trace.h"
 #include "runtime/value.h"
 #include "tests/runtime/home.h"
 #include "tests/runtime/sample_classes.h"
@@ -116,15 +115,6 @@ TEST(Log, writes_time_level_source_and_line)
                                           MatchesRegex(time + "WARN: PortHelper\\(7\\): already ended"),
                                           MatchesRegex(time + "INFO: PortHelper\\(8\\): x{10000}"),
                                           MatchesRegex(time + "INFO: PortHelper\\(9\\): ")));
-}
-
-TEST(Log, traces_scopes_on_every_way_out)
-{
-    const Home home;
-    home.options("LOG_LEVEL=DBG\n");
-    ASSERT_TRUE(home.run([] { EXPECT_THROW((Scope_Trace(log_source, "getInstances"), throw 1), int); }));
-    EXPECT_THAT(home.lines(), ElementsAre(MatchesRegex(".* DBG: FCHBAManager\\([0-9]+\\): Entering: getInstances"),
-                                          MatchesRegex(".* DBG: FCHBAManager\\([0-9]+\\): Returning: getInstances")));
 }
 
 TEST(Log, lines_of_processes_and_threads_never_mix)
