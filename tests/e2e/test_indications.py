@@ -106,24 +106,19 @@ def serve(start):
     )
 
 
-class Manager:
-    """pywbem's subscription manager on one server."""
+def interop_of(host):
+    return pywbem.WBEMConnection(host.server.url, default_namespace="root/PG_InterOp")
 
-    def __init__(self, host, name="test"):
-        self.pywbem = pywbem.WBEMSubscriptionManager(name)
-        self.server = self.pywbem.add_server(pywbem.WBEMServer(host.pywbem))
-        self._count = 0
 
-    def subscribe(self, url, query=ALL, language="WQL", owned=True):
-        self._count += 1
-        names = (f"{self._count}", None) if owned else (None, f"permanent{self._count}")
-        destination = self.pywbem.add_destination(self.server, url, owned, *names)
-        event_filter = self.pywbem.add_filter(self.server, ["root/zemlar"], query, language, owned, *names)
-        return self.pywbem.add_subscriptions(self.server, event_filter.path, destination.path, owned)[0]
+def make(interop, class_name, **properties):
+    return interop.CreateInstance(pywbem.CIMInstance(class_name, properties))
 
-    def counts(self):
-        lists = (self.pywbem.get_all_filters, self.pywbem.get_all_destinations, self.pywbem.get_all_subscriptions)
-        return [len(instances(self.server)) for instances in lists]
+
+def subscribe(host, url, query=ALL, language="WQL"):
+    interop = interop_of(host)
+    event_filter = make(interop, "CIM_IndicationFilter", Name=url, Query=query, QueryLanguage=language)
+    destination = make(interop, "CIM_ListenerDestinationCIMXML", Name=url, Destination=url)
+    return make(interop, "CIM_IndicationSubscription", Filter=event_filter, Handler=destination)
 
 
 def ring(host, times, text="now"):
@@ -143,46 +138,51 @@ def test_subscription_manager_and_listener(serve):
     listener.add_callback(lambda indication, _: received.append((indication["Number"], indication["Text"])))
     listener.start()
     try:
-        manager = Manager(host)
         url = f"http://127.0.0.1:{listener.http_port}"
+        manager = pywbem.WBEMSubscriptionManager("test")
+        server = manager.add_server(pywbem.WBEMServer(host.pywbem))
+
+        def subscribe_with(owned):
+            names = ("a name", None) if owned else (None, "a name")
+            destination = manager.add_destination(server, url, owned, *names)
+            event_filter = manager.add_filter(server, ["root/zemlar"], ALL, "WQL", owned, *names)
+            return manager.add_subscriptions(server, event_filter.path, destination.path, owned)[0]
+
+        def counts():
+            lists = (manager.get_all_filters, manager.get_all_destinations, manager.get_all_subscriptions)
+            return [len(instances(server)) for instances in lists]
+
         assert ring(host, 1) == 0, "nobody wants them yet"
-        subscription = manager.subscribe(url)
-        assert subscription["SubscriptionState"] == 2
-        assert manager.counts() == [1, 1, 1]
+        assert subscribe_with(owned=True)["SubscriptionState"] == 2
         assert ring(host, 3, "<&> \u00e9") == 3
         wait_until(lambda: len(received) == 3)
         assert received == [(n, "<&> \u00e9") for n in (1, 2, 3)]
 
-        permanent = manager.subscribe(url, owned=False)
-        assert len(manager.pywbem.get_owned_subscriptions(manager.server)) == 1
-        assert code_of(manager.pywbem.remove_filter, manager.server, permanent["Filter"]) == 1, "it is in use"
-        manager.pywbem.remove_server(manager.server)  # takes what it owns along
-        manager = Manager(host)
-        assert manager.counts() == [1, 1, 1]
+        permanent = subscribe_with(owned=False)
+        assert counts() == [2, 2, 2]
+        assert len(manager.get_owned_subscriptions(server)) == 1
+        assert code_of(manager.remove_filter, server, permanent["Filter"]) == 1, "it is in use"
+        manager.remove_server(server)  # takes what it owns along
+        server = manager.add_server(pywbem.WBEMServer(host.pywbem))
+        assert counts() == [1, 1, 1]
         assert ring(host, 1) == 1
         wait_until(lambda: len(received) == 4)
 
-        manager.pywbem.remove_subscriptions(manager.server, permanent.path)
-        manager.pywbem.remove_filter(manager.server, permanent["Filter"])
-        manager.pywbem.remove_destinations(manager.server, permanent["Handler"])
-        assert manager.counts() == [0, 0, 0]
+        manager.remove_subscriptions(server, permanent.path)
+        manager.remove_filter(server, permanent["Filter"])
+        manager.remove_destinations(server, permanent["Handler"])
+        assert counts() == [0, 0, 0]
         assert ring(host, 1) == 0
-        for query, language, code in [("SELECT * FROM TST_Box", "WQL", 15), ("SELECT", "WQL", 15), (ALL, "SQL", 14)]:
-            assert code_of(manager.subscribe, url, query, language) == code
     finally:
         listener.stop()
 
 
 def test_subscriptions_lead_from_filters_to_destinations_and_back(serve):
-    interop = pywbem.WBEMConnection(serve().server.url, default_namespace="root/PG_InterOp")
-
-    def make(class_name, **properties):
-        return interop.CreateInstance(pywbem.CIMInstance(class_name, properties))
-
-    f, g = (make("CIM_IndicationFilter", Name=name, Query=ALL, QueryLanguage="WQL") for name in "fg")
-    d, e = (make("cim_listenerdestinationCIMXML", NAME=name, Destination=f"http://[::1]:1/{name}") for name in "de")
-    subscriptions = [make("CIM_IndicationSubscription", Filter=f, Handler=handler) for handler in (d, e)]
-    make("CIM_IndicationSubscription", Filter=g, Handler=e)
+    interop = interop_of(serve())
+    f, g = (make(interop, "CIM_IndicationFilter", Name=name, Query=ALL, QueryLanguage="WQL") for name in "fg")
+    d, e = (make(interop, "cim_listenerdestinationCIMXML", NAME=name, Destination=f"http://[::1]:1/{name}") for name in "de")
+    subscriptions = [make(interop, "CIM_IndicationSubscription", Filter=f, Handler=handler) for handler in (d, e)]
+    make(interop, "CIM_IndicationSubscription", Filter=g, Handler=e)
     for source, filters, found in [
         (f, {}, [d, e]),
         (e, {}, [f, g]),
@@ -201,10 +201,12 @@ def test_subscriptions_lead_from_filters_to_destinations_and_back(serve):
     assert len(interop.GetInstance(d)) == 13, "found by its superclass, with every property of its own class"
     assert interop.GetInstance(subscriptions[0])["SubscriptionState"] == 2
     for code, call in [
-        (4, lambda: make("CIM_ListenerDestinationCIMXML", Name="x", PersistenceType="-1")),
+        (4, lambda: make(interop, "CIM_ListenerDestinationCIMXML", Name="x", PersistenceType="-1")),
         (4, lambda: interop.AssociatorNames(f, AssocClass="CIM_Nothing")),
+        (14, lambda: make(interop, "CIM_IndicationFilter", Name="x", Query=ALL, QueryLanguage="SQL")),
+        (15, lambda: make(interop, "CIM_IndicationFilter", Name="x", Query="SELECT * FROM TST_Box", QueryLanguage="WQL")),
         (6, lambda: interop.DeleteInstance(pywbem.CIMInstanceName(f.classname, {**f.keybindings, "Name": "x"}, namespace=f.namespace))),
-        (7, lambda: make("CIM_ListenerDestination", Name="x")),
+        (7, lambda: make(interop, "CIM_ListenerDestination", Name="x")),
         (7, lambda: interop.ModifyInstance(pywbem.CIMInstance(f.classname, {"Query": ""}, path=f))),
     ]:
         assert code_of(call) == code
@@ -212,7 +214,7 @@ def test_subscriptions_lead_from_filters_to_destinations_and_back(serve):
 
 def test_the_message_is_what_listeners_read(serve, listen):
     host, listener = serve(), listen()
-    Manager(host).subscribe(listener.url, "SELECT Number, Text FROM TST_Alert WHERE Number = 2", "DMTF:CQL")
+    subscribe(host, listener.url, "SELECT Number, Text FROM TST_Alert WHERE Number = 2", "DMTF:CQL")
     ring(host, 3, "a < b")
     wait_until(lambda: listener.bodies)
     assert re.sub(r'MESSAGE ID="\d+"', 'MESSAGE ID=""', listener.bodies[0]) == (
@@ -242,7 +244,7 @@ def test_the_message_is_what_listeners_read(serve, listen):
 )
 def test_what_is_not_taken_is_tried_again_in_order(serve, listen, answers, numbers):
     host, listener = serve("--delivery-timeout", 1), listen(answers)
-    Manager(host).subscribe(listener.url)
+    subscribe(host, listener.url)
     ring(host, 3)
     wait_until(lambda: len(listener.numbers) == len(numbers))
     assert listener.numbers == numbers
@@ -250,9 +252,8 @@ def test_what_is_not_taken_is_tried_again_in_order(serve, listen, answers, numbe
 
 def test_dead_and_slow_listeners_hold_up_nobody(serve, listen):
     host, well, slow = serve("--delivery-timeout", 30), listen(), listen(["hang"])
-    manager = Manager(host)
     for url in (f"http://127.0.0.1:{free_port()}", slow.url, well.url):
-        manager.subscribe(url)
+        subscribe(host, url)
     begin = time.monotonic()
     assert ring(host, 200) == 200
     wait_until(lambda: len(well.bodies) == 200)
@@ -268,7 +269,7 @@ def test_dead_and_slow_listeners_hold_up_nobody(serve, listen):
 
 def test_a_full_queue_loses_the_oldest(serve, listen):
     host, listener = serve("--max-indications", 5, "--delivery-timeout", 60), listen(["hang"])
-    Manager(host).subscribe(listener.url)
+    subscribe(host, listener.url)
     ring(host, 1)
     wait_until(lambda: listener.bodies)
     ring(host, 20)
@@ -280,12 +281,12 @@ def test_a_full_queue_loses_the_oldest(serve, listen):
 
 def test_https_listeners_must_prove_who_they_are(serve, listen, identity):
     host, listener = serve("--listener-ca", identity[0]), listen(identity=identity)
-    Manager(host).subscribe(listener.url)
+    subscribe(host, listener.url)
     ring(host, 1)
     wait_until(lambda: listener.numbers == [1])
 
     distrusting = serve()
-    Manager(distrusting).subscribe(listener.url)
+    subscribe(distrusting, listener.url)
     ring(distrusting, 1)
     wait_until(lambda: any(listener.url in line and "1 indication is lost" in line for line in distrusting.server.lines))
     assert listener.numbers == [1]
@@ -295,7 +296,7 @@ def test_https_listeners_must_prove_who_they_are(serve, listen, identity):
 def test_subscriptions_survive_a_restart(serve, listen, tmp_path, order):
     listener, state = listen(), tmp_path / "state"
     host = serve("--state", state, "--indication-order", order)
-    before = Manager(host).subscribe(listener.url, owned=False)
+    before = host.pywbem.GetInstance(subscribe(host, listener.url))
     assert state.stat().st_mode & 0o777 == 0o700
     file = state / "subscriptions.json"
     assert file.stat().st_mode & 0o777 == 0o600
