@@ -88,6 +88,7 @@ std::vector<Object_Path> Interop_Operations::own_associators(const Object_Path& 
     return paths;
 }
 
+// One that is deleted meanwhile is left out.
 std::vector<Instance> Interop_Operations::associators(const Object_Path& path, const Association_Filter& filter,
                                                       const Property_List& properties)
 {
@@ -95,7 +96,15 @@ std::vector<Instance> Interop_Operations::associators(const Object_Path& path, c
         return _module_part.associators(path, filter, properties);
     std::vector<Instance> instances;
     for (const Object_Path& target : own_associators(path, filter))
-        instances.push_back(get_instance(target, properties));
+        try
+        {
+            instances.push_back(get_instance(target, properties));
+        }
+        catch (const Cim_Error& error)
+        {
+            if (error.code() != CIM_ERR_NOT_FOUND)
+                throw;
+        }
     return instances;
 }
 

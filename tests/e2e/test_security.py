@@ -195,22 +195,21 @@ def test_refuses_to_start_unsafe(program, users, identity, tmp_path):
     file = str(users)
     other_key = tmp_path / "other.pem"
     subprocess.run(["openssl", "genpkey", "-algorithm", "ed25519", "-out", other_key], check=True)
-    open_key = tmp_path / "open.pem"
-    open_key.write_bytes((identity[1]).read_bytes())
-    open_key.chmod(0o644)
-    shared = tmp_path / "shared"
-    shared.write_bytes(users.read_bytes())
-    shared.chmod(0o640)
-    empty = tmp_path / "empty"
-    empty.touch(0o600)
-    spoilt = tmp_path / "spoilt"
-    spoilt.touch(0o600)
-    spoilt.write_text("admin:secret\n", encoding="utf-8")
+
+    def written(name, content, mode):
+        (tmp_path / name).write_bytes(content)
+        (tmp_path / name).chmod(mode)
+        return str(tmp_path / name)
+
+    open_key = written("open.pem", identity[1].read_bytes(), 0o644)
+    shared = written("shared", users.read_bytes(), 0o640)
+    empty = written("empty", b"", 0o600)
+    spoilt = written("spoilt", b"admin:secret\n", 0o600)
     for options, code, told in [
         (["--users", str(tmp_path / "missing")], 1, "--add-user"),
-        (["--users", str(shared)], 1, "0600"),
-        (["--users", str(empty)], 1, "names no user"),
-        (["--users", str(spoilt)], 1, "line 1"),
+        (["--users", shared], 1, "0600"),
+        (["--users", empty], 1, "names no user"),
+        (["--users", spoilt], 1, "line 1"),
         (["--users", str(tmp_path)], 1, "no regular file"),
         (["--no-auth", "--address", "0.0.0.0", "--certificate", certificate, "--key", key], 2, "--no-auth"),
         (["--users", file, "--address", "0.0.0.0"], 2, "TLS"),
@@ -218,7 +217,7 @@ def test_refuses_to_start_unsafe(program, users, identity, tmp_path):
         (["--users", file, "--address", "localhost"], 2, "localhost"),
         (["--users", file, "--certificate", certificate], 2, "--key"),
         (["--users", file, "--certificate", certificate, "--key", str(other_key)], 1, str(other_key)),
-        (["--users", file, "--certificate", certificate, "--key", str(open_key)], 1, "0640"),
+        (["--users", file, "--certificate", certificate, "--key", open_key], 1, "0640"),
         (["--users", file, "--certificate", key, "--key", key], 1, key),
         (["--users", file, "--certificate", str(tmp_path / "missing"), "--key", key], 1, "missing"),
     ]:
