@@ -22,6 +22,13 @@ MEASURED = {
     "log_call": [("suppressed_log_call", 100_000, "call")],
 }
 
+# Where the instructions of one enumeration go: benchmark, units, and the functions whose whole cost is counted. What the
+# callback does belongs to the conversion and the rest, not to the provider that calls it.
+SHARES = {"enumerate_fc_ports": ("enumerate_fc_ports/16", 32, "port")}
+CONVERSION = ["zmlr::make_cmpi_object_path(", "zmlr::make_cmpi_instance("]
+PROVIDER = "ZEMLAR_FCPort_Provider::enum_instances("
+CALLBACK = "zmlr::answer_with<"
+
 NANOSECONDS = {"ns": 1, "us": 1_000, "ms": 1_000_000}
 
 
@@ -32,14 +39,6 @@ def nanoseconds(program, benchmark):
     )
     row = json.loads(run.stdout)["benchmarks"][0]
     return row["real_time"] * NANOSECONDS[row["time_unit"]]
-
-
-# Where the instructions of one enumeration go: benchmark, units, and the functions whose whole cost is counted. What the
-# callback does belongs to the conversion and the rest, not to the provider that calls it.
-SHARES = {"enumerate_fc_ports": ("enumerate_fc_ports/16", 32, "port")}
-CONVERSION = ["zmlr::make_cmpi_object_path(", "zmlr::make_cmpi_instance("]
-PROVIDER = "ZEMLAR_FCPort_Provider::enum_instances("
-CALLBACK = "zmlr::answer_with<"
 
 
 def callgrind(program, benchmark, output):
