@@ -90,14 +90,14 @@ TEST(Thread, runs_in_the_context_that_its_creator_supplies)
         {[](void*) -> void* { throw std::runtime_error("no"); }, nullptr},
         {[](void*) -> void* { throw 1; }, nullptr},
     };
-    for (const auto& [proc, result] : cases)
+    for (const auto& c : cases)
     {
         Events events;
         Recording_Context creator(events, new Recording_Context(events));
         Thread_Context::push(&creator);
-        EXPECT_EQ(in_thread(proc, &value), result);
+        EXPECT_EQ(in_thread(c.first, &value), c.second);
         Thread_Context::pop();
-        EXPECT_EQ(events, "create start exit delete ") << "case " << &proc - &cases[0].first;
+        EXPECT_EQ(events, "create start exit delete ") << "case " << &c - cases;
     }
 }
 
