@@ -4,7 +4,6 @@
 #include <gmock/gmock.h>
 
 #include <thread>
-#include <tuple>
 
 namespace cimserver
 {
@@ -78,7 +77,14 @@ TEST_F(Operations_Test, get_instance_finds_through_superclasses_and_tells_what_i
 {
     EXPECT_EQ(operations.get_instance(path("TST_Tape", id("tape0")), {}).path.class_name, "TST_Tape");
     EXPECT_EQ(operations.get_instance(path("TST_Top", id("disk2")), {}).path.class_name, "TST_Disk");
-    const std::tuple<const char*, std::vector<Named_Value>, int, const char*> rows[] = {
+    struct Row
+    {
+        const char* class_name;
+        std::vector<Named_Value> keys;
+        int code;
+        const char* told;
+    };
+    const Row rows[] = {
         {"TST_Disk", id("disk3"), CIM_ERR_NOT_FOUND, "there is no instance root/zemlar:TST_Disk.Id=\"disk3\""},
         {"TST_Tape", id("tape1"), CIM_ERR_NOT_FOUND, ""}, // its provider answers OK, without a result
         {"TST_Base", id("none"), CIM_ERR_NOT_FOUND, ""},
@@ -88,10 +94,11 @@ TEST_F(Operations_Test, get_instance_finds_through_superclasses_and_tells_what_i
         {"TST_Base", {}, CIM_ERR_INVALID_PARAMETER, "Id"},
     };
     std::string description;
-    for (const auto& [class_name, keys, code, told] : rows)
+    for (const Row& row : rows)
     {
-        EXPECT_EQ(error_of([&] { operations.get_instance(path(class_name, keys), {}); }, &description), code) << class_name;
-        EXPECT_THAT(description, HasSubstr(told));
+        const auto get = [&] { operations.get_instance(path(row.class_name, row.keys), {}); };
+        EXPECT_EQ(error_of(get, &description), row.code) << row.class_name;
+        EXPECT_THAT(description, HasSubstr(row.told));
     }
 }
 
