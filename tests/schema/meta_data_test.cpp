@@ -154,7 +154,7 @@ TEST(Meta_Data, flag_words)
         {"ZEMLAR_FCPort",               "RequestStateChange", nullptr, 0x00000004},
         {"ZEMLAR_AlarmDevice",          "SetAlarmState",      "State", 0x00040001},
         {"CIM_Service", "ChangeAffectedElementsAssignedSequence", "ManagedElements",  0x04040002}, // required
-        {"CIM_Service", "ChangeAffectedElementsAssignedSequence", "Job",              0x01000002}, // a reference that only goes out
+        {"CIM_Service", "ChangeAffectedElementsAssignedSequence", "Job",              0x01000002}, // only goes out
         {"CIM_DiagnosticService", "RunDiagnosticService",         "DiagnosticSettings", 0x80040001}, // an embedded instance
         // clang-format on
     };
