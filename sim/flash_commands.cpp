@@ -15,8 +15,10 @@ namespace
 Flash_Partition* partition_of(const Call& call, hxa_ioctl_flash_t& record)
 {
     auto* partition = call.ioc->adapter->flash.find(record.type, record.instance);
-    record.status = partition ? HXA_STATUS_OK : HXA_STATUS_EINVAL;
-    return partition;
+    if (partition && partition->status != HXA_FLASH_STATUS_NOT_PRESENT)
+        return partition;
+    record.status = HXA_STATUS_EINVAL;
+    return nullptr;
 }
 
 // The same, which has to hold as many bytes as the sender's buffer.

@@ -62,6 +62,14 @@ void tell_link(Host& host, Ioc& ioc, bool up)
         tell_logical_port(host, ioc, logical, up);
 }
 
+void tell_module(Host& host, Ioc& ioc)
+{
+    const auto& module = ioc.port->sfp;
+    raise(host, ioc, HXA_AEN_CAT_PORT, module.present ? HXA_PORT_AEN_SFP_INSERT : HXA_PORT_AEN_SFP_REMOVE);
+    if (module.present && module.media == HXA_SFP_MEDIA_UNSUPPORT)
+        raise(host, ioc, HXA_AEN_CAT_PORT, HXA_PORT_AEN_SFP_UNSUPPORT);
+}
+
 void start_link(Port& port)
 {
     const auto& configuration = port.configuration;
@@ -144,8 +152,8 @@ void set_sfp(Host& host, const Port& port, bool inserted)
                   {
                       ioc.port->sfp.present = inserted;
                       if (ioc.node == Node::hxa)
-                          raise(host, ioc, HXA_AEN_CAT_PORT, inserted ? HXA_PORT_AEN_SFP_INSERT : HXA_PORT_AEN_SFP_REMOVE);
-                      change_link(host, ioc, inserted);
+                          tell_module(host, ioc);
+                      change_link(host, ioc, inserted && ioc.port->sfp.media != HXA_SFP_MEDIA_UNSUPPORT);
                   });
 }
 

@@ -28,7 +28,8 @@ void tell_remote_port(Host& host, Ioc& ioc, const Logical_Port& logical, const R
 // Throws std::runtime_error without a module in the cage.
 void set_link(Host& host, const Port& port, bool up);
 
-// The module in the cage of a port; its link goes with it. Throws std::runtime_error when there is nothing to do.
+// The module in the cage of a port; its link goes with it, but not up on one that the driver does not support. Throws
+// std::runtime_error when there is nothing to do.
 void set_sfp(Host& host, const Port& port, bool inserted);
 
 // Pulls a card out, or puts it back as it was. Its IOCs are gone meanwhile; the events they raised before can still be
