@@ -10,7 +10,6 @@
 #include <unistd.h>
 
 #include <atomic>
-#include <csignal>
 #include <filesystem>
 #include <numeric>
 #include <thread>
@@ -46,28 +45,6 @@ Archive archive_of(const std::string& text, const Bytes& firmware_image = firmwa
         .add("overlay.bin", overlay)
         .add("else.bin", bytes_of("else"));
 }
-
-// While it lives no file can grow beyond this many bytes: a full disk.
-class File_Size_Limit
-{
-public:
-    explicit File_Size_Limit(rlim_t bytes) : _handler(::signal(SIGXFSZ, SIG_IGN))
-    {
-        ::getrlimit(RLIMIT_FSIZE, &_before);
-        const rlimit limit{bytes, _before.rlim_max};
-        ::setrlimit(RLIMIT_FSIZE, &limit);
-    }
-
-    ~File_Size_Limit()
-    {
-        ::setrlimit(RLIMIT_FSIZE, &_before);
-        ::signal(SIGXFSZ, _handler);
-    }
-
-private:
-    sighandler_t _handler;
-    rlimit _before;
-};
 
 // One HBA of two ports with device id 0x13, the library on it, and a folder of its own to be in.
 class Boot_Update : public Simulated_Host
@@ -184,11 +161,14 @@ TEST_F(Boot_Update, unpacks_to_a_file_of_its_own_or_not_at_all)
     EXPECT_EQ(fs::file_size("victim"), 4u);
     EXPECT_FALSE(fs::exists(fs::symlink_status("zmlrtmpfile")));
 
-    {
-        const File_Size_Limit limit(1024);
-        EXPECT_EQ(hxal_boot_fwupdate(hxal_adapter_get_port(1), "archive", 0x13), HXA_STATUS_CREATE_FILE) << "no room";
-        EXPECT_FALSE(fs::exists("zmlrtmpfile"));
-    }
+    rlimit before{};
+    ::getrlimit(RLIMIT_FSIZE, &before);
+    const rlimit full{1024, before.rlim_max};
+    ::setrlimit(RLIMIT_FSIZE, &full); // a full disk, with a signal that would end the process
+    const hxa_status_t no_room = hxal_boot_fwupdate(hxal_adapter_get_port(1), "archive", 0x13);
+    ::setrlimit(RLIMIT_FSIZE, &before);
+    EXPECT_EQ(no_room, HXA_STATUS_CREATE_FILE);
+    EXPECT_FALSE(fs::exists("zmlrtmpfile"));
     fs::create_directory("zmlrtmpfile");
     EXPECT_EQ(update(wrapped(archive_of(description)), 0x13), HXA_STATUS_CREATE_FILE);
     EXPECT_TRUE(fs::is_directory("zmlrtmpfile"));
@@ -255,6 +235,8 @@ TEST_F(Boot_Update, ends_with_the_first_image_that_fails)
     EXPECT_EQ(update(archive_of(description), 0x13), HXA_STATUS_FAILED) << "other bytes are read back";
     scan(R"({"adapters": [{"kind": "fc-hba", "flash": [{"type": "optrom", "size": 1023}]}]})");
     EXPECT_EQ(update(archive_of(description), 0x13), HXA_STATUS_FLASH_BAD_LEN);
+    scan(R"({"adapters": [{"kind": "fc-hba", "flash": [{"type": "optrom", "status": "not-present"}]}]})");
+    EXPECT_EQ(update(archive_of(description), 0x13), HXA_STATUS_EINVAL);
 }
 
 TEST_F(Boot_Update, of_every_card_tells_how_it_goes)

@@ -9,13 +9,6 @@ namespace
 using testing::ElementsAre;
 using testing::IsEmpty;
 
-wwn_t wwn(std::initializer_list<uint8_t> bytes)
-{
-    wwn_t value = 0;
-    std::copy(bytes.begin(), bytes.end(), reinterpret_cast<uint8_t*>(&value));
-    return value;
-}
-
 const std::string two_ports = R"({"adapters": [{"kind": "fc-hba", "ports": [
     {"address": "0x010203", "fabric_name": "100000051EF00001",
      "counters": {"logical_port": [7]},

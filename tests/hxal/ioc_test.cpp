@@ -1,5 +1,7 @@
 #include "simulated_host.h"
 
+#include <cerrno>
+
 namespace
 {
 
@@ -95,6 +97,21 @@ TEST_F(Ioc, tells_its_fields)
     EXPECT_EQ(int{hxal_ioc_get_ioc_type(nullptr)}, 0);
     hxal_ioc_get_path(nullptr, devpath, hwpath, adapter_hwpath);
     hxal_ioc_close(nullptr);
+}
+
+TEST_F(Ioc, refreshes_its_current_mac_unless_the_request_fails)
+{
+    hxal_t* ethernet = hxal_ioc_open_idx(3);
+    const mac_t own = ethernet->mac;
+    distort("IOCMD_IOC_GET_INFO", offsetof(hxa_ioctl_ioc_info_t, current_mac), {1, 2, 3, 4, 5, 6}, 0, "/dev/hxn");
+    EXPECT_EQ(hxal_ioc_get_current_mac(ethernet).mac[5], 6);
+    EXPECT_EQ(ethernet->current_mac.mac[5], 6);
+    EXPECT_EQ(std::memcmp(&ethernet->mac, &own, sizeof own), 0);
+
+    hxasim::clear_faults();
+    fail("IOCMD_IOC_GET_INFO", EIO);
+    EXPECT_EQ(hxal_ioc_get_current_mac(ethernet).mac[5], 6);
+    EXPECT_EQ(requests().size(), 2u);
 }
 
 } // namespace

@@ -71,14 +71,6 @@ TEST_F(Port, is_refused_what_it_cannot_do)
     EXPECT_EQ(hxal_port_enable(hxal_ioc_open_idx(1)), HXA_STATUS_IOC_NON_OP);
 }
 
-TEST_F(Port, names_its_states_up_to_13)
-{
-    const std::pair<uint32_t, const char*> names[] = {{0, "Unknown"},  {5, "Linkup"},   {13, "Disabled#"},
-                                                      {14, "Unknown"}, {99, "Unknown"}, {UINT32_MAX, "Unknown"}};
-    for (const auto& [state, name] : names)
-        EXPECT_STREQ(hxal_port_get_state_name(state), name) << state;
-}
-
 // A CNA with an HBA before it, so that instances and list indexes differ: FCoE 1 and 2, Ethernet 0 and 1.
 class Port_Pair : public Port
 {

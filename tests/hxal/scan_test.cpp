@@ -23,26 +23,19 @@ TEST_F(Scan, of_a_converged_adapter_sends_these_requests_and_no_others)
     const auto sent = hxasim::take_requests();
     std::vector<std::string> lines;
     std::transform(sent.begin(), sent.end(), std::back_inserter(lines), line);
+    // clang-format off
     const std::vector<std::string> expected = {
-        "/dev/hxa C0084301 IOCMD_IOC_GET_VERSION -1", //
-        "/dev/hxa C0284302 IOCMD_IOC_GET_INST -1",    //
-        "/dev/hxa C058432A IOCMD_AEN_SYNC -1",        //
-        "/dev/hxa C2084307 IOCMD_IOC_GET_INFO 0",     //
-        "/dev/hxa C2084307 IOCMD_IOC_GET_INFO 1",     //
-        "/dev/hxn C0084401 IOCMD_IOC_GET_VERSION -1", //
-        "/dev/hxn C0284402 IOCMD_IOC_GET_INST -1",    //
-        "/dev/hxn C058442A IOCMD_AEN_SYNC -1",        //
-        "/dev/hxn C2084407 IOCMD_IOC_GET_INFO 0",     //
-        "/dev/hxn C2084407 IOCMD_IOC_GET_INFO 1",     //
-        "/dev/hxa C6484306 IOCMD_IOC_GET_ATTR 0",     //
-        "/dev/hxa C2084307 IOCMD_IOC_GET_INFO 0",     //
-        "/dev/hxa C6484306 IOCMD_IOC_GET_ATTR 1",     //
-        "/dev/hxa C2084307 IOCMD_IOC_GET_INFO 1",     //
-        "/dev/hxn C6484406 IOCMD_IOC_GET_ATTR 0",     //
-        "/dev/hxn C2084407 IOCMD_IOC_GET_INFO 0",     //
-        "/dev/hxn C6484406 IOCMD_IOC_GET_ATTR 1",     //
-        "/dev/hxn C2084407 IOCMD_IOC_GET_INFO 1",     //
+        "/dev/hxa C0084301 IOCMD_IOC_GET_VERSION -1",   "/dev/hxa C0284302 IOCMD_IOC_GET_INST -1",
+        "/dev/hxa C058432A IOCMD_AEN_SYNC -1",          "/dev/hxa C2084307 IOCMD_IOC_GET_INFO 0",
+        "/dev/hxa C2084307 IOCMD_IOC_GET_INFO 1",       "/dev/hxn C0084401 IOCMD_IOC_GET_VERSION -1",
+        "/dev/hxn C0284402 IOCMD_IOC_GET_INST -1",      "/dev/hxn C058442A IOCMD_AEN_SYNC -1",
+        "/dev/hxn C2084407 IOCMD_IOC_GET_INFO 0",       "/dev/hxn C2084407 IOCMD_IOC_GET_INFO 1",
+        "/dev/hxa C6484306 IOCMD_IOC_GET_ATTR 0",       "/dev/hxa C2084307 IOCMD_IOC_GET_INFO 0",
+        "/dev/hxa C6484306 IOCMD_IOC_GET_ATTR 1",       "/dev/hxa C2084307 IOCMD_IOC_GET_INFO 1",
+        "/dev/hxn C6484406 IOCMD_IOC_GET_ATTR 0",       "/dev/hxn C2084407 IOCMD_IOC_GET_INFO 0",
+        "/dev/hxn C6484406 IOCMD_IOC_GET_ATTR 1",       "/dev/hxn C2084407 IOCMD_IOC_GET_INFO 1",
     };
+    // clang-format on
     EXPECT_EQ(lines, expected);
 
     for (const auto& request : sent)

@@ -8,15 +8,6 @@ using testing::ElementsAre;
 using testing::IsEmpty;
 using Bytes = std::vector<std::uint8_t>;
 
-wwn_t wwn(std::initializer_list<std::uint8_t> bytes)
-{
-    wwn_t value = 0;
-    std::copy(bytes.begin(), bytes.end(), reinterpret_cast<std::uint8_t*>(&value));
-    return value;
-}
-
-lun_t lun(std::initializer_list<std::uint8_t> bytes) { return wwn(bytes); }
-
 std::uint64_t number(const Bytes& bytes, std::size_t at, std::size_t size)
 {
     std::uint64_t value = 0;

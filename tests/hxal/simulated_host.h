@@ -7,7 +7,9 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
+#include <algorithm>
 #include <cstring>
+#include <initializer_list>
 #include <string>
 
 // Instances 0 and 1 of both drivers.
@@ -62,21 +64,18 @@ protected:
     }
 };
 
-// WWNs and MACs as the simulated product line numbers them.
-inline wwn_t port_wwn(uint8_t adapter, uint8_t port)
+// The first bytes of a WWN or of a LUN; the others are 0.
+inline wwn_t wwn(std::initializer_list<uint8_t> bytes)
 {
-    const uint8_t bytes[] = {0x10, 0, 0, 0x05, 0x1E, 0x10, adapter, port};
-    wwn_t wwn;
-    std::memcpy(&wwn, bytes, sizeof wwn);
-    return wwn;
+    wwn_t value = 0;
+    std::copy(bytes.begin(), bytes.end(), reinterpret_cast<uint8_t*>(&value));
+    return value;
 }
+inline lun_t lun(std::initializer_list<uint8_t> bytes) { return wwn(bytes); }
 
-inline wwn_t node_wwn(uint8_t adapter, uint8_t port)
-{
-    wwn_t wwn = port_wwn(adapter, port);
-    *reinterpret_cast<uint8_t*>(&wwn) = 0x20;
-    return wwn;
-}
+// WWNs and MACs as the simulated product line numbers them.
+inline wwn_t port_wwn(uint8_t adapter, uint8_t port) { return wwn({0x10, 0, 0, 0x05, 0x1E, 0x10, adapter, port}); }
+inline wwn_t node_wwn(uint8_t adapter, uint8_t port) { return wwn({0x20, 0, 0, 0x05, 0x1E, 0x10, adapter, port}); }
 
 inline mac_t eth_mac(uint8_t adapter, uint8_t port) { return {{0x00, 0x05, 0x1E, 0x20, adapter, port}}; }
 inline mac_t fcoe_mac(uint8_t adapter, uint8_t port) { return {{0x00, 0x05, 0x1E, 0x30, adapter, port}}; }

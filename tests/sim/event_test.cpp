@@ -226,35 +226,17 @@ TEST_F(Events, tell_of_the_objects_of_their_IOC)
         hxasim::raise_event({.node = path, .category = category, .type = 1, .level = 2});
         return digits_of(fetch(Open_File(path), 0, 2).at(0).aen_data).substr(0, 2 * size);
     };
-    EXPECT_EQ(data(HXA_AEN_CAT_ADAPTER, 24), "5A4D43303030303030310000" // ZMC0000001
-                                             "01000000"
-                                             "100000051E100000");
-    EXPECT_EQ(data(HXA_AEN_CAT_PORT, 32), "100000051E100000"
-                                          "100000051EF00000"
-                                          "00000000"
-                                          "02000200"
-                                          "00051E300000"
-                                          "0000");
-    EXPECT_EQ(data(HXA_AEN_CAT_PORT, 32, "/dev/hxn"), std::string(32, '0') + "00000000"
-                                                                             "03000200"
-                                                                             "00051E200000"
-                                                                             "0000");
-    EXPECT_EQ(data(HXA_AEN_CAT_LPORT, 24), "0000010000000000"
-                                           "100000051E100000"
-                                           "100000051E100000");
-    const std::string nexus = "0000000000000000"
-                              "100000051E100000"
-                              "100000051E100000"
-                              "210000051F000000";
-    EXPECT_EQ(data(HXA_AEN_CAT_RPORT, 40), nexus + "0000000000000000");
-    EXPECT_EQ(data(HXA_AEN_CAT_ITNIM, 32), nexus);
-    EXPECT_EQ(data(HXA_AEN_CAT_AUDIT, 8), "100000051E100000");
-    EXPECT_EQ(data(HXA_AEN_CAT_IOC, 16), "100000051E100000"
-                                         "0200"
-                                         "00051E300000");
-    EXPECT_EQ(data(HXA_AEN_CAT_ETHPORT, 12, "/dev/hxn"), "00051E200000"
-                                                         "0000"
-                                                         "02000000");
+    const std::string pwwn = "100000051E100000", target = "210000051F000000", no_wwn(16, '0');
+    const std::string fcoe_mac = "00051E300000", mac = "00051E200000";
+    EXPECT_EQ(data(HXA_AEN_CAT_ADAPTER, 24), "5A4D4330303030303031000001000000" + pwwn) << "ZMC0000001, 1 port";
+    EXPECT_EQ(data(HXA_AEN_CAT_PORT, 32), pwwn + "100000051EF000000000000002000200" + fcoe_mac + "0000");
+    EXPECT_EQ(data(HXA_AEN_CAT_PORT, 32, "/dev/hxn"), no_wwn + no_wwn + "0000000003000200" + mac + "0000");
+    EXPECT_EQ(data(HXA_AEN_CAT_LPORT, 24), "0000010000000000" + pwwn + pwwn);
+    EXPECT_EQ(data(HXA_AEN_CAT_RPORT, 40), no_wwn + pwwn + pwwn + target + no_wwn);
+    EXPECT_EQ(data(HXA_AEN_CAT_ITNIM, 32), no_wwn + pwwn + pwwn + target);
+    EXPECT_EQ(data(HXA_AEN_CAT_AUDIT, 8), pwwn);
+    EXPECT_EQ(data(HXA_AEN_CAT_IOC, 16), pwwn + "0200" + fcoe_mac);
+    EXPECT_EQ(data(HXA_AEN_CAT_ETHPORT, 12, "/dev/hxn"), mac + "000002000000");
     hxasim::raise_event({.category = HXA_AEN_CAT_PORT, .type = 1, .data = {1, 2}});
     EXPECT_EQ(digits_of(fetch(hxa, 0, 2).at(0).aen_data), "0102" + std::string(76, '0'));
     EXPECT_THROW(hxasim::raise_event({.instance = 9}), std::runtime_error);
@@ -327,6 +309,14 @@ TEST_F(Events, follow_the_state_of_ports_and_IOCs)
         EXPECT_THAT(words(hxa, 0), ElementsAreArray(on_hxa)) << step;
         EXPECT_THAT(words(hxn, 0), ElementsAreArray(on_hxn)) << step;
     }
+}
+
+TEST_F(Events, of_a_module_that_is_not_supported_bring_no_link)
+{
+    hxasim::load_text(R"({"adapters": [{"kind": "fc-hba", "ports": [{"sfp": {"media": "unsupported", "present": false}}]}]})");
+    Open_File hxa("/dev/hxa");
+    hxasim::set_sfp(0, 0, true);
+    EXPECT_THAT(words(hxa, 0), ElementsAre("port sfp-insert", "port sfp-unsupport", "port offline", "lport offline"));
 }
 
 TEST_F(Events, of_an_IOC_that_takes_its_time_come_when_it_arrives)
