@@ -1,5 +1,4 @@
-#include "runtime/instance.h"
-
+#include "runtime/features.h"
 #include "tests/runtime/sample_classes.h"
 
 #include <gmock/gmock.h>
@@ -15,16 +14,13 @@ using namespace sample;
 namespace
 {
 
-constexpr const char* property_names[] = {"Name",  "Online",  "Slot",   "Size",  "Delta",     "Load",   "Letter",
-                                          "Since", "Caption", "Labels", "Codes", "Intervals", "Samples"};
-
 // The names of the properties that are non-null, in their order.
 std::string set_properties(const Instance* instance)
 {
     std::string result;
-    for (const char* name : property_names)
-        if (!null_of(instance, find_property(instance->meta_class, name)))
-            result += std::string(result.empty() ? "" : " ") + name;
+    for (const Meta_Feature* feature : features_of(instance))
+        if (is_property(feature) && !null_of(instance, as_property(feature)))
+            result += std::string(result.empty() ? "" : " ") + feature->name;
     return result;
 }
 

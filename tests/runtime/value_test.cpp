@@ -1,12 +1,11 @@
+#include "runtime/features.h"
 #include "runtime/value.h"
-
 #include "tests/runtime/printed.h"
 #include "tests/runtime/sample_classes.h"
 
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
-#include <span>
 #include <string>
 
 using namespace zmlr;
@@ -99,7 +98,7 @@ TEST(Value, carries_every_property_from_one_instance_to_another)
     from->Load.set(0.25);
     from->Caption.clear();
     const Ref<Sample_Element> to(create<Sample_Element>(false));
-    for (const Meta_Feature* feature : std::span(from->meta_class->meta_features, from->meta_class->num_meta_features))
+    for (const Meta_Feature* feature : features_of(from.ptr()))
     {
         Value value;
         EXPECT_EQ(value.set(from.ptr(), feature), is_method(feature) ? -1 : 0);
