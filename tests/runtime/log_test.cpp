@@ -46,11 +46,7 @@ void log_to_no_avail()
 
 TEST(Log, option_file_decides_what_is_written)
 {
-    const struct
-    {
-        const char* options;
-        std::size_t written;
-    } rows[] = {
+    const std::pair<const char*, std::size_t> rows[] = {
         {"LOG_LEVEL=FATAL\n", 1},
         {"LOG_LEVEL = warn", 3},
         {"# LOG_LEVEL=DBG\n\n   \nLOG_LEVEL\t=\t Info \r\n", 4},
@@ -58,12 +54,12 @@ TEST(Log, option_file_decides_what_is_written)
         {"LOG_LEVEL_OLD=DBG\nLOG_LEVEL=ERR\n", 2},
         {"LOG_LEVEL DBG\nlog_level=DBG\n LOG_LEVEL=DBG\nLOG_LEVEL=err\n", 2},
     };
-    for (const auto& row : rows)
+    for (const auto& [options, written] : rows)
     {
         const Home home;
-        home.options(row.options);
+        home.options(options);
         ASSERT_TRUE(home.run(log_one_of_each));
-        EXPECT_EQ(home.lines().size(), row.written) << row.options;
+        EXPECT_EQ(home.lines().size(), written) << options;
         EXPECT_TRUE(home.has(".cimple/messages.lock"));
     }
 }
@@ -194,23 +190,19 @@ TEST(Log, stays_off_when_something_else_has_the_name_of_a_file)
         std::fclose(std::fopen(path.c_str(), "w"));
         fs::resize_file(path, std::uintmax_t{1} << 40);
     };
-    const struct
-    {
-        const char* file;
-        Make make;
-    } rows[] = {
+    const std::pair<const char*, Make> rows[] = {
         {".cimplerc", directory}, {".cimplerc", pipe},        {".cimplerc", endless_device},   {".cimplerc", terabyte_of_nothing},
         {".cimple", file},        {".cimple/messages", pipe}, {".cimple/messages", directory}, {".cimple/messages.lock", pipe},
     };
-    for (const auto& row : rows)
+    for (const auto& [name, make] : rows)
     {
         const Home home;
-        const fs::path path(home.path(row.file));
+        const fs::path path(home.path(name));
         if (path.filename() != ".cimplerc")
             home.options("LOG_LEVEL=DBG\n");
         fs::create_directory(path.parent_path());
-        row.make(path);
-        EXPECT_TRUE(home.run(log_to_no_avail)) << &row - rows << row.file;
+        make(path);
+        EXPECT_TRUE(home.run(log_to_no_avail)) << name;
     }
 }
 
