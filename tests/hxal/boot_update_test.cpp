@@ -1,5 +1,6 @@
 #include "tests/hxal/boot_files.h"
 #include "tests/hxal/simulated_host.h"
+#include "tests/hxal/temporary_folder.h"
 
 #include "hxal/internal/boot_description.h"
 #include "hxal/internal/option_rom.h"
@@ -10,7 +11,6 @@
 #include <unistd.h>
 
 #include <atomic>
-#include <filesystem>
 #include <numeric>
 #include <thread>
 
@@ -47,22 +47,16 @@ Archive archive_of(const std::string& text, const Bytes& firmware_image = firmwa
 }
 
 // One HBA of two ports with device id 0x13, the library on it, and a folder of its own to be in.
-class Boot_Update : public Simulated_Host
+class Boot_Update : public Simulated_Host, Temporary_Folder
 {
 protected:
-    Boot_Update() : _before(fs::current_path())
+    Boot_Update()
     {
-        std::string name = fs::temp_directory_path() / "boot_update_XXXXXX";
-        _folder = mkdtemp(name.data());
-        fs::current_path(_folder);
+        fs::current_path(folder);
         scan(R"({"adapters": [{"kind": "fc-hba"}]})");
     }
 
-    ~Boot_Update() override
-    {
-        fs::current_path(_before);
-        fs::remove_all(_folder);
-    }
+    ~Boot_Update() override { fs::current_path(_before); }
 
     static hxa_status_t update(const Archive& archive, uint16_t devid = 0)
     {
@@ -82,8 +76,7 @@ protected:
     static bool left_nothing() { return std::distance(fs::directory_iterator("."), {}) == 1; }
 
 private:
-    fs::path _before;
-    std::string _folder;
+    const fs::path _before = fs::current_path();
 };
 
 using testing::ElementsAre;

@@ -1,27 +1,22 @@
-// A test on the configuration model: it starts empty, and files go to a directory of its own.
+// A test on the configuration model: it starts empty, and files go to a folder of its own.
 #pragma once
 
 #include "config_model.h"
 #include "hxal/hxal.h"
+#include "temporary_folder.h"
 
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
-#include <filesystem>
-#include <fstream>
 #include <initializer_list>
 #include <iterator>
 #include <vector>
 
-class Config_Model : public testing::Test
+class Config_Model : public testing::Test, protected Temporary_Folder
 {
 protected:
     Config_Model() { empty_model(); }
-    ~Config_Model() override
-    {
-        empty_model();
-        std::filesystem::remove_all(directory);
-    }
+    ~Config_Model() override { empty_model(); }
 
     static const hxal_ioc_config_t& ioc(int idx) { return hxal_config_get()->iocs[idx]; }
     static const hxal_ad_config_t& adapter(int idx) { return hxal_config_get()->adapters[idx]; }
@@ -33,14 +28,6 @@ protected:
             hxal_config_parse(line);
     }
 
-    std::string path(const std::string& name) const { return directory / name; }
-
-    std::string file(const std::string& name, const std::string& content) const
-    {
-        std::ofstream(path(name), std::ios::binary) << content;
-        return path(name);
-    }
-
     static std::string content(const std::string& path)
     {
         std::ifstream stream(path, std::ios::binary);
@@ -50,20 +37,11 @@ protected:
     std::vector<std::string> names() const
     {
         std::vector<std::string> found;
-        for (const auto& entry : std::filesystem::directory_iterator(directory))
+        for (const auto& entry : std::filesystem::directory_iterator(folder))
             found.push_back(entry.path().filename());
         return found;
     }
 
     // Loads what a file of this content says.
     void load(const std::string& text) const { hxal_config_load(file("hxa.conf", text).c_str()); }
-
-private:
-    static std::filesystem::path make_directory()
-    {
-        std::string name = std::filesystem::temp_directory_path() / "hxal_config.XXXXXX";
-        return ::mkdtemp(name.data()) ? name : "";
-    }
-
-    const std::filesystem::path directory = make_directory();
 };

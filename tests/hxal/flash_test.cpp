@@ -1,7 +1,6 @@
 #include "simulated_host.h"
+#include "temporary_folder.h"
 
-#include <filesystem>
-#include <fstream>
 #include <iterator>
 
 namespace
@@ -12,44 +11,35 @@ using testing::ElementsAre;
 using testing::IsEmpty;
 
 // One HBA and a folder for images.
-class Flash : public Simulated_Host
+class Flash : public Simulated_Host, Temporary_Folder
 {
 protected:
     Flash()
     {
-        std::string name = fs::temp_directory_path() / "flash_test_XXXXXX";
-        _folder = mkdtemp(name.data());
         scan(R"({"adapters": [{"kind": "fc-hba"}]})");
         ioc = hxal_adapter_get_port(1);
     }
 
-    ~Flash() override { fs::remove_all(_folder); }
-
-    std::string path(const std::string& name) const { return _folder / name; }
-
-    void save(const std::string& name, const std::string& bytes) const { std::ofstream(path(name)) << bytes; }
+    using Temporary_Folder::file, Temporary_Folder::path;
 
     hxa_status_t update_from_file(const std::string& name, hxa_flash_part_type_t type = HXA_FLASH_PART_PBC) const
     {
-        const std::string file = path(name);
-        return hxal_flash_update_part(ioc, type, 0, reinterpret_cast<const unsigned char*>(file.c_str()), HXA_TRUE, 0);
+        const std::string from = path(name);
+        return hxal_flash_update_part(ioc, type, 0, reinterpret_cast<const unsigned char*>(from.c_str()), HXA_TRUE, 0);
     }
 
-    hxa_status_t read_to_file(const std::string& file, uint32_t size) const
+    hxa_status_t read_to_file(const std::string& to, uint32_t size) const
     {
-        std::string writable = file;
+        std::string writable = to;
         return hxal_flash_read_part(ioc, HXA_FLASH_PART_PBC, 0, writable.data(), size, HXA_TRUE);
     }
 
     const hxal_t* ioc;
-
-private:
-    fs::path _folder;
 };
 
 TEST_F(Flash, partition_goes_from_file_to_file)
 {
-    save("in", "pre-boot");
+    file("in", "pre-boot");
     EXPECT_EQ(update_from_file("in"), HXA_STATUS_OK);
     const auto sent = hxasim::take_requests();
     ASSERT_EQ(sent.size(), 2u);
@@ -68,20 +58,19 @@ TEST_F(Flash, partition_goes_from_file_to_file)
 
 TEST_F(Flash, image_file_that_cannot_be_read_is_not_sent)
 {
-    save("empty", "");
+    file("empty", "");
     fs::create_directory(path("folder"));
-    std::ofstream(path("huge")).close();
-    fs::resize_file(path("huge"), 64 * 1024 * 1024 + 1);
+    fs::resize_file(file("huge", ""), 64 * 1024 * 1024 + 1);
     EXPECT_EQ(update_from_file("missing"), HXA_STATUS_FAILED);
     EXPECT_EQ(update_from_file("empty"), HXA_STATUS_FAILED);
     EXPECT_EQ(update_from_file("folder"), HXA_STATUS_FAILED);
     EXPECT_EQ(update_from_file("huge"), HXA_STATUS_ENOMEM);
     EXPECT_EQ(hxal_flash_update_part(ioc, HXA_FLASH_PART_PBC, 0, nullptr, HXA_FALSE, 1), HXA_STATUS_EINVAL);
-    save("firmware", "1234123");
+    file("firmware", "1234123");
     EXPECT_EQ(update_from_file("firmware", HXA_FLASH_PART_FWIMG), HXA_STATUS_CHECKSUM_FAIL);
     EXPECT_EQ(hxal_flash_mfg_info(ioc, "S", "P", 0, {}, 42), HXA_STATUS_EINVAL);
     EXPECT_THAT(requests(), IsEmpty());
-    save("firmware", "12341234123");
+    file("firmware", "12341234123");
     EXPECT_EQ(update_from_file("firmware", HXA_FLASH_PART_FWIMG), HXA_STATUS_OK) << "the last bytes are no word";
 }
 

@@ -10,7 +10,6 @@
 #include <cstdio>
 #include <fstream>
 #include <memory>
-#include <stdexcept>
 
 namespace
 {
@@ -145,28 +144,17 @@ TEST_F(Control, serves_only_its_own_user_and_cleans_up)
 
 TEST_F(Control, takes_the_place_of_a_dead_socket_only)
 {
-    const auto refused = [&](const std::string& path) -> std::string
-    {
-        try
-        {
-            hxasim::serve_control(path);
-            return "served";
-        }
-        catch (const std::runtime_error& error)
-        {
-            return error.what();
-        }
-    };
+    const auto serve = [](const std::string& path) { return refusal_of([&] { hxasim::serve_control(path); }); };
     ASSERT_GE(*socket_at(_path + "x", bind), 0); // and nobody listens, or cleans up
-    EXPECT_EQ(refused(_path + "x"), "served");
+    EXPECT_EQ(serve(_path + "x"), "done");
     hxasim::serve_control(_path);
 
     const std::string file = _path + ".txt";
     std::ofstream(file) << "mine";
-    EXPECT_EQ(refused(file), "bind: Address already in use");
+    EXPECT_EQ(serve(file), "bind: Address already in use");
     EXPECT_EQ(unlink(file.c_str()), 0);
-    EXPECT_EQ(refused("/no/such/folder/socket"), "bind: No such file or directory");
-    EXPECT_EQ(refused(std::string(200, 'x')), "socket: File name too long");
+    EXPECT_EQ(serve("/no/such/folder/socket"), "bind: No such file or directory");
+    EXPECT_EQ(serve(std::string(200, 'x')), "socket: File name too long");
 }
 
 TEST_F(Control, keeps_answering_whatever_clients_do)

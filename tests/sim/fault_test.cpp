@@ -2,7 +2,6 @@
 #include "tests/sim/simulated_host.h"
 
 #include <chrono>
-#include <stdexcept>
 #include <thread>
 
 namespace
@@ -108,18 +107,8 @@ TEST_F(Faults, that_could_not_do_what_they_say_are_refused)
         {{.command = "IOCMD_IOC_GET_INST", .answer = {{.offset = SIZE_MAX, .bytes = {1, 2}}}},
          "fault.answer: beyond the 40 bytes of IOCMD_IOC_GET_INST"},
     };
-    for (const auto& [fault, message] : cases)
-    {
-        try
-        {
-            hxasim::inject(fault);
-            ADD_FAILURE() << "accepted: " << message;
-        }
-        catch (const std::runtime_error& error)
-        {
-            EXPECT_STREQ(error.what(), message);
-        }
-    }
+    for (const auto& row : cases)
+        EXPECT_EQ(refusal_of([&] { hxasim::inject(row.first); }), row.second);
 }
 
 } // namespace

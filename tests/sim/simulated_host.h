@@ -14,6 +14,7 @@
 
 #include <cerrno>
 #include <cstring>
+#include <stdexcept>
 #include <string>
 #include <utility>
 
@@ -51,6 +52,20 @@ inline std::uint32_t code_of(std::string_view name, char group)
 template <typename Record> int send(int descriptor, std::string_view name, char group, Record& record)
 {
     return ioctl(descriptor, code_of(name, group), &record) == 0 ? 0 : errno;
+}
+
+// What an action says that is refused; "done" when it is not.
+template <typename Action> std::string refusal_of(Action action)
+{
+    try
+    {
+        action();
+        return "done";
+    }
+    catch (const std::runtime_error& error)
+    {
+        return error.what();
+    }
 }
 
 // Text of a fixed field, terminated or not.
