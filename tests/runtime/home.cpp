@@ -3,7 +3,6 @@
 #include <cstdlib>
 #include <filesystem>
 #include <fstream>
-#include <iterator>
 #include <sys/wait.h>
 #include <unistd.h>
 
@@ -44,14 +43,9 @@ bool Home::finish(int pid)
 std::vector<std::string> Home::lines() const
 {
     std::ifstream file(path(".cimple/messages"));
-    const std::string text{std::istreambuf_iterator<char>(file), {}};
     std::vector<std::string> result;
-    for (std::size_t begin = 0; begin < text.size();)
-    {
-        const std::size_t end = text.find('\n', begin);
-        result.push_back(end == std::string::npos ? text.substr(begin) + "(no newline)" : text.substr(begin, end - begin));
-        begin = end == std::string::npos ? text.size() : end + 1;
-    }
+    for (std::string line; std::getline(file, line);)
+        result.push_back(file.eof() ? line + "(no newline)" : line);
     return result;
 }
 

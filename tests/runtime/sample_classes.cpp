@@ -30,10 +30,12 @@ constexpr Meta_Reference make(uint32 flags, const char* name, bool array, const 
     return {{{0}, flags, name, nullptr, 0}, static_cast<uint16>(array), meta_class, static_cast<uint32>(offset)};
 }
 
-constexpr Meta_Class make(uint32 flags, const char* name, const Meta_Feature* const* features, uint32 count, std::size_t size,
-                          const Meta_Feature_Local* locals, const Meta_Class* super, uint32 num_keys)
+// The local marks are left out: only a server reads them.
+template <class T>
+constexpr Meta_Class make(uint32 flags, const char* name, const Meta_Feature* const* features, uint32 count, uint32 num_keys,
+                          const Meta_Class* super = nullptr)
 {
-    return {{{{0}, flags, name, nullptr, 0}, features, count, static_cast<uint32>(size)}, locals, super, num_keys, &repository};
+    return {{{{0}, flags, name, nullptr, 0}, features, count, sizeof(T)}, nullptr, super, num_keys, &repository};
 }
 
 constexpr uint32 one = 1;
@@ -88,9 +90,6 @@ constexpr const Meta_Feature* link_features[] = {&link_antecedent, &link_depende
 constexpr const Meta_Feature* person_features[] = {&person_name};
 constexpr const Meta_Feature* setting_features[] = {&setting_level};
 
-constexpr Meta_Feature_Local all_local[14] = {{1}, {1}, {1}, {1}, {1}, {1}, {1}, {1}, {1}, {1}, {1}, {1}, {1}, {1}};
-constexpr Meta_Feature_Local disk_locals[15] = {{0}, {0}, {0}, {0}, {0}, {0}, {0}, {0}, {0}, {0}, {0}, {0}, {0}, {0}, {1}};
-
 constexpr const Meta_Class* classes[] = {&Sample_Element::static_meta_class, &Sample_Disk::static_meta_class,
                                          &Sample_Link::static_meta_class, &Sample_Person::static_meta_class,
                                          &Sample_Setting::static_meta_class};
@@ -101,15 +100,15 @@ constinit const Meta_Method Sample_Element_Reset_method::static_meta_class = {
     {{{0}, Flag_Method, "Reset", nullptr, 0}, reset_features, 3, sizeof(Sample_Element_Reset_method)}, UINT32};
 
 constinit const Meta_Class Sample_Element::static_meta_class =
-    make(Flag_Class, "Sample_Element", disk_features, 14, sizeof(Sample_Element), all_local, nullptr, 1);
+    make<Sample_Element>(Flag_Class, "Sample_Element", disk_features, 14, 1);
 constinit const Meta_Class Sample_Disk::static_meta_class =
-    make(Flag_Class, "Sample_Disk", disk_features, 15, sizeof(Sample_Disk), disk_locals, &Sample_Element::static_meta_class, 1);
+    make<Sample_Disk>(Flag_Class, "Sample_Disk", disk_features, 15, 1, &Sample_Element::static_meta_class);
 constinit const Meta_Class Sample_Link::static_meta_class =
-    make(Flag_Association, "Sample_Link", link_features, 4, sizeof(Sample_Link), all_local, nullptr, 2);
+    make<Sample_Link>(Flag_Association, "Sample_Link", link_features, 4, 2);
 constinit const Meta_Class Sample_Person::static_meta_class =
-    make(Flag_Class, "Sample_Person", person_features, 1, sizeof(Sample_Person), all_local, nullptr, 1);
+    make<Sample_Person>(Flag_Class, "Sample_Person", person_features, 1, 1);
 constinit const Meta_Class Sample_Setting::static_meta_class =
-    make(Flag_Class, "Sample_Setting", setting_features, 1, sizeof(Sample_Setting), all_local, nullptr, 0);
+    make<Sample_Setting>(Flag_Class, "Sample_Setting", setting_features, 1, 0);
 
 constinit const Meta_Repository repository = {classes, 5};
 
