@@ -31,33 +31,37 @@ hxa_aen_entry_t adapter_event(uint32_t type, const char* serial, wwn_t pwwn = 0)
     data.pwwn = pwwn;
     return event(HXA_AEN_CAT_ADAPTER, type, 99, data);
 }
-hxa_port_aen_data_t  port_data(wwn_t pwwn, mac_t mac)           { hxa_port_aen_data_t d{};  d.pwwn = pwwn; d.mac = mac; return d; }
-hxa_lport_aen_data_t lport_data(wwn_t lpwwn)                    { hxa_lport_aen_data_t d{}; d.lpwwn = lpwwn; return d; }
-hxa_rport_aen_data_t rport_data(wwn_t lpwwn)                    { hxa_rport_aen_data_t d{}; d.lpwwn = lpwwn; return d; }
-hxa_itnim_aen_data_t itnim_data(wwn_t lpwwn, wwn_t rpwwn)       { hxa_itnim_aen_data_t d{}; d.lpwwn = lpwwn; d.rpwwn = rpwwn; return d; }
-hxa_audit_aen_data_t audit_data(wwn_t pwwn)                     { hxa_audit_aen_data_t d{}; d.pwwn = pwwn; return d; }
-hxa_ethport_aen_data_t ethport_data(mac_t mac)                  { hxa_ethport_aen_data_t d{}; d.mac = mac; return d; }
+auto port_data(wwn_t pwwn, mac_t mac) { hxa_port_aen_data_t d{}; d.pwwn = pwwn; d.mac = mac; return d; }
+auto lport_data(wwn_t lpwwn) { hxa_lport_aen_data_t d{}; d.lpwwn = lpwwn; return d; }
+auto rport_data(wwn_t lpwwn) { hxa_rport_aen_data_t d{}; d.lpwwn = lpwwn; return d; }
+auto itnim_data(wwn_t lpwwn, wwn_t rpwwn) { hxa_itnim_aen_data_t d{}; d.lpwwn = lpwwn; d.rpwwn = rpwwn; return d; }
+auto audit_data(wwn_t pwwn) { hxa_audit_aen_data_t d{}; d.pwwn = pwwn; return d; }
+auto ethport_data(mac_t mac) { hxa_ethport_aen_data_t d{}; d.mac = mac; return d; }
 
-hxa_aen_entry_t port_event(int inst, wwn_t pwwn, mac_t mac)     { return event(HXA_AEN_CAT_PORT, HXA_PORT_AEN_ONLINE, inst, port_data(pwwn, mac)); }
-hxa_aen_entry_t lport_event(int inst, uint32_t type, wwn_t wwn) { return event(HXA_AEN_CAT_LPORT, type, inst, lport_data(wwn)); }
-hxa_aen_entry_t rport_event(int inst, wwn_t wwn)                { return event(HXA_AEN_CAT_RPORT, HXA_RPORT_AEN_ONLINE, inst, rport_data(wwn)); }
-hxa_aen_entry_t itnim_event(int inst, wwn_t lpwwn, wwn_t rpwwn) { return event(HXA_AEN_CAT_ITNIM, HXA_ITNIM_AEN_ONLINE, inst, itnim_data(lpwwn, rpwwn)); }
-hxa_aen_entry_t audit_event(int inst, wwn_t pwwn)               { return event(HXA_AEN_CAT_AUDIT, HXA_AUDIT_AEN_AUTH_ENABLE, inst, audit_data(pwwn)); }
-hxa_aen_entry_t ioc_event(int inst)                             { return event(HXA_AEN_CAT_IOC, HXA_IOC_AEN_ENABLE, inst, hxa_ioc_aen_data_t{}); }
-hxa_aen_entry_t ethport_event(int inst, mac_t mac)              { return event(HXA_AEN_CAT_ETHPORT, HXA_ETHPORT_AEN_LINKUP, inst, ethport_data(mac)); }
+auto port_event(int inst, wwn_t pwwn, mac_t mac)
+{ return event(HXA_AEN_CAT_PORT, HXA_PORT_AEN_ONLINE, inst, port_data(pwwn, mac)); }
+auto lport_event(int inst, uint32_t type, wwn_t wwn) { return event(HXA_AEN_CAT_LPORT, type, inst, lport_data(wwn)); }
+auto rport_event(int inst, wwn_t wwn) { return event(HXA_AEN_CAT_RPORT, HXA_RPORT_AEN_ONLINE, inst, rport_data(wwn)); }
+auto itnim_event(int inst, wwn_t lpwwn, wwn_t rpwwn)
+{ return event(HXA_AEN_CAT_ITNIM, HXA_ITNIM_AEN_ONLINE, inst, itnim_data(lpwwn, rpwwn)); }
+auto audit_event(int inst, wwn_t pwwn) { return event(HXA_AEN_CAT_AUDIT, HXA_AUDIT_AEN_AUTH_ENABLE, inst, audit_data(pwwn)); }
+auto ioc_event(int inst) { return event(HXA_AEN_CAT_IOC, HXA_IOC_AEN_ENABLE, inst, hxa_ioc_aen_data_t{}); }
+auto ethport_event(int inst, mac_t mac) { return event(HXA_AEN_CAT_ETHPORT, HXA_ETHPORT_AEN_LINKUP, inst, ethport_data(mac)); }
 
 TEST_F(Aen, reaches_the_registrations_that_match)
 {
     const mac_t mac = eth_mac(0, 0);
     const mac_t other_mac = eth_mac(0, 1);
-    const auto adapter_of = [&](const hxal_adapter_t* object) { return [=](Listener& to) { return listen_adapter(to, object); }; };
-    const auto port    = [](const hxal_t* ioc, hxa_port_aen_data_t data)  { return [=](Listener& to) { return listen_port(to, ioc, data); }; };
-    const auto lport   = [&](wwn_t lpwwn)               { return [=, this](Listener& to) { return listen_lport(to, fc, lport_data(lpwwn)); }; };
-    const auto rport   = [&](wwn_t lpwwn)               { return [=, this](Listener& to) { return listen_rport(to, fc, rport_data(lpwwn)); }; };
-    const auto itnim   = [&](wwn_t lpwwn, wwn_t rpwwn)  { return [=, this](Listener& to) { return listen_itnim(to, fc, itnim_data(lpwwn, rpwwn)); }; };
-    const auto audit   = [&](wwn_t pwwn)                { return [=, this](Listener& to) { return listen_audit(to, fc, audit_data(pwwn)); }; };
-    const auto ioc     = [](const hxal_t* object)       { return [=](Listener& to) { return listen_ioc(to, object); }; };
-    const auto ethport = [](const hxal_t* object)       { return [=](Listener& to) { return listen_ethport(to, object); }; };
+    const auto adapter_of = [](const hxal_adapter_t* card) { return [=](Listener& to) { return listen_adapter(to, card); }; };
+    const auto port = [](const hxal_t* ioc, hxa_port_aen_data_t data)
+    { return [=](Listener& to) { return listen_port(to, ioc, data); }; };
+    const auto lport = [&](wwn_t lpwwn) { return [=, this](Listener& to) { return listen_lport(to, fc, lport_data(lpwwn)); }; };
+    const auto rport = [&](wwn_t lpwwn) { return [=, this](Listener& to) { return listen_rport(to, fc, rport_data(lpwwn)); }; };
+    const auto itnim = [&](wwn_t lpwwn, wwn_t rpwwn)
+    { return [=, this](Listener& to) { return listen_itnim(to, fc, itnim_data(lpwwn, rpwwn)); }; };
+    const auto audit = [&](wwn_t pwwn) { return [=, this](Listener& to) { return listen_audit(to, fc, audit_data(pwwn)); }; };
+    const auto ioc = [](const hxal_t* object) { return [=](Listener& to) { return listen_ioc(to, object); }; };
+    const auto ethport = [](const hxal_t* object) { return [=](Listener& to) { return listen_ethport(to, object); }; };
 
     const struct
     {

@@ -147,10 +147,12 @@ const std::vector<Operation>& operations()
         Op{common, 0x31, 8,   call(hxal_port_reset_stats)},
         Op{common, 0x32, 16,  call(hxal_port_cfg_topology, HXA_PPORT_TOPOLOGY_LOOP)}.sends({{8, {2}}})
             .records({"hxa1-port-topology = \"loop\";"}),
-        Op{common, 0x33, 16,  call(hxal_port_cfg_speed, HXA_PPORT_SPEED_8GBPS)}.sends({{8, {8}}}).records({"hxa1-port-speed = 8;"}),
+        Op{common, 0x33, 16,  call(hxal_port_cfg_speed, HXA_PPORT_SPEED_8GBPS)}.sends({{8, {8}}})
+            .records({"hxa1-port-speed = 8;"}),
         Op{common, 0x34, 16,  call(hxal_port_cfg_hardalpa, 0xEF)}.sends({{8, {0xEF}}}).records({"hxa1-port-hardalpa = 0xef;"}),
         Op{common, 0x35, 16,  call(hxal_port_clr_hardalpa)},
-        Op{common, 0x36, 8,   call(hxal_port_cfg_maxfrsize, 0x0804)}.sends({{6, {4, 8}}}).records({"hxa1-port-maxfrsize = 2052;"}),
+        Op{common, 0x36, 8,   call(hxal_port_cfg_maxfrsize, 0x0804)}.sends({{6, {4, 8}}})
+            .records({"hxa1-port-maxfrsize = 2052;"}),
         Op{common, 0x37, 8,   call(hxal_port_trunk_enable, 0x70503)}.sends({{6, {3}}})
             .records({"hxa1-port-trunk = 0, 1, 8, 10, 16, 17, 18;"}),
         Op{common, 0x38, 8,   call(hxal_port_trunk_disable)},

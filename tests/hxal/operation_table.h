@@ -72,7 +72,7 @@ struct Operation
     Operation sends(std::vector<Sent> parts)         { sent = std::move(parts); return *this; }
     Operation copies(std::vector<Copied> parts)      { copied = std::move(parts); return *this; }
     Operation may_copy(std::vector<Copied> parts)    { output_is_optional = true; return copies(std::move(parts)); }
-    Operation records(Lines on_fc, Lines on_ll = {}) { fc_recorded = std::move(on_fc); ll_recorded = std::move(on_ll); return *this; }
+    Operation records(Lines fc, Lines ll = {})       { fc_recorded = std::move(fc); ll_recorded = std::move(ll); return *this; }
     Operation prints_on_error(const char* text)      { printed_on_error = text; return *this; }
     Operation prints_on_refusal(const char* text)    { printed_on_refusal = text; return *this; }
     Operation in_place()                             { is_in_place = true; return *this; }
