@@ -1,5 +1,7 @@
 #include "sim/scsi_inquiry.h"
 
+#include <algorithm>
+#include <array>
 #include <cstdio>
 #include <string_view>
 
@@ -70,12 +72,17 @@ Bytes eui64(const Scsi_Target& target, std::uint32_t number)
     return id;
 }
 
-Bytes descriptor(std::uint8_t code_set, std::uint8_t type, const Bytes& id)
+// Two bytes that say what follows, its length, and what follows.
+Bytes with_head(std::uint8_t first, std::uint8_t second, const Bytes& contents)
 {
-    Bytes bytes{code_set, type, 0, static_cast<std::uint8_t>(id.size())};
-    bytes.insert(bytes.end(), id.begin(), id.end());
+    const std::array head{first, second, static_cast<std::uint8_t>(contents.size() >> 8),
+                          static_cast<std::uint8_t>(contents.size())};
+    Bytes bytes(head.size() + contents.size());
+    std::ranges::copy(contents, std::ranges::copy(head, bytes.begin()).out);
     return bytes;
 }
+
+Bytes descriptor(std::uint8_t code_set, std::uint8_t type, const Bytes& id) { return with_head(code_set, type, id); }
 
 Bytes text_bytes(std::string_view text) { return {text.begin(), text.end()}; }
 
@@ -117,13 +124,6 @@ Bytes page_list(const Unit_Range& unit)
     return pages;
 }
 
-Bytes page_of(const Unit_Range& unit, std::uint8_t page, const Bytes& contents)
-{
-    Bytes bytes{unit.type, page, static_cast<std::uint8_t>(contents.size() >> 8), static_cast<std::uint8_t>(contents.size())};
-    bytes.insert(bytes.end(), contents.begin(), contents.end());
-    return bytes;
-}
-
 } // namespace
 
 Bytes standard_inquiry(const Unit_Range* unit)
@@ -150,11 +150,11 @@ std::optional<Bytes> vital_product_data(const Scsi_Target& target, const Unit_Ra
                                         std::uint8_t page)
 {
     if (page == supported_pages)
-        return page_of(unit, page, page_list(unit));
+        return with_head(unit.type, page, page_list(unit));
     if (page == unit_serial_number && unit.serial_page)
-        return page_of(unit, page, text_bytes(serial_number(target, unit, number)));
+        return with_head(unit.type, page, text_bytes(serial_number(target, unit, number)));
     if (page == device_identification && has_identification(unit))
-        return page_of(unit, page, identification(target, unit, number));
+        return with_head(unit.type, page, identification(target, unit, number));
     return std::nullopt;
 }
 
