@@ -24,7 +24,7 @@ def interop(mixed):
     return pywbem.WBEMConnection(mixed.server.url, default_namespace=INTEROP, timeout=60)
 
 
-def test_the_server_describes_itself(mixed):
+def test_the_server_describes_itself(mixed, interop):
     server = pywbem.WBEMServer(mixed.pywbem)
     assert server.interop_ns == INTEROP
     assert sorted(server.namespaces) == [INTEROP, "root/zemlar"]
@@ -32,6 +32,7 @@ def test_the_server_describes_itself(mixed):
     assert server.version and server.version[0].isdigit()
     assert server.cimom_inst["SystemName"] == socket.gethostname()
     assert server.cimom_inst["OperationalStatus"] == [2]
+    assert server.profiles == interop.EnumerateInstances("CIM_RegisteredProfile")
 
 
 def test_only_the_servers_own_object_manager_is_there(interop):
