@@ -3,6 +3,7 @@
 #include "cmpi/converter.h"
 #include "cmpi/request.h"
 #include "cmpi/status_to_rc.h"
+#include "runtime/features.h"
 
 namespace zmlr
 {
@@ -80,20 +81,22 @@ CMPIrc send_named_instance(const Answer& answer, Instance* object)
     return CMPI_RC_OK;
 }
 
-// With a list, what it names stays and every key is left to the path. filter_properties makes what is wanted non-null: that
+bool listed(const char* name, const char** properties)
+{
+    while (*properties && !eqi(*properties, name))
+        ++properties;
+    return *properties != nullptr;
+}
+
+// With a list, what it names stays and every key is left to the path. filter_properties would make what is wanted non-null: that
 // is for models; an association's null property must not get a value.
 void keep_listed(Instance* association, const char** properties)
 {
     if (!properties)
         return;
-    const Ref<Instance> wanted(create(association->meta_class, false));
-    filter_properties(wanted.ptr(), properties, false);
-    for (uint32 i = 0; i < association->meta_class->num_meta_features; ++i)
-    {
-        const Meta_Feature* feature = association->meta_class->meta_features[i];
-        if (is_property(feature) && null_of(static_cast<const Instance*>(wanted.ptr()), as_property(feature)))
+    for (const Meta_Feature* feature : features_of(association))
+        if (is_property(feature) && (is_key(feature) || !listed(feature->name, properties)))
             null_of(association, as_property(feature)) = 1;
-    }
 }
 
 CMPIrc send_reference(const Answer& answer, Instance* association)
