@@ -20,10 +20,11 @@ constexpr const char* log_source = "CMPI_Adapter";
 // Counts the adapters that have gone, for factories that wait for one to.
 constinit std::atomic<unsigned> departures = 0;
 
+// Fills the record the first time only: whoever was handed it before reads it without a lock.
 template <class MI, class FT> MI* hand_out(MI& mi, FT& ft, CMPI_Static_Data* sd)
 {
-    mi.hdl = sd;
-    mi.ft = &ft;
+    if (!mi.hdl)
+        mi = {sd, &ft};
     return &mi;
 }
 

@@ -37,6 +37,11 @@ bool settles_at(std::size_t count)
 class Aen_Thread : public Aen
 {
 protected:
+    // With a process's first thread the thread sanitizer starts another, which stays.
+    Aen_Thread()
+    {
+        std::thread([] {}).join();
+    }
     ~Aen_Thread() override { hxal_aen_exit(); }
 
     // The event number is the `type`; the data is of no interest.
