@@ -54,7 +54,11 @@ json written(const Card_Summary& card)
     json ports = json::array();
     for (const auto& port : card.ports)
         ports.push_back(written(port));
-    return {{"serial", card.serial}, {"model", card.model}, {"plugged", card.plugged}, {"ports", ports}};
+    return {{"serial", card.serial},
+            {"model", card.model},
+            {"plugged", card.plugged},
+            {"option_rom", card.option_rom},
+            {"ports", ports}};
 }
 
 json raise_event(Json_Object& object)

@@ -3,12 +3,9 @@
 namespace hxasim
 {
 
-namespace
-{
-
 void log_in(Remote_Port& port)
 {
-    if (!port.known || port.state != HXA_RPORT_ONLINE)
+    if (port.state != HXA_RPORT_ONLINE)
         return;
     ++port.counters->plogis;
     ++port.counters->plogi_accs;
@@ -22,14 +19,12 @@ void log_in(Remote_Port& port)
 
 void log_out(Remote_Port& port)
 {
-    if (!port.known || port.state != HXA_RPORT_ONLINE)
+    if (port.state != HXA_RPORT_ONLINE)
         return;
     ++port.counters->offlines;
     if (port.is_target())
         ++port.nexus.counters->offlines;
 }
-
-} // namespace
 
 void log_in(Logical_Port& port)
 {
@@ -38,13 +33,15 @@ void log_in(Logical_Port& port)
     ++port.counters->ns_gidft_sent;
     ++port.counters->ns_gidft_accepts;
     for (auto& remote : port.remote_ports)
-        log_in(remote);
+        if (remote.known)
+            log_in(remote);
 }
 
 void log_out(Logical_Port& port)
 {
     for (auto& remote : port.remote_ports)
-        log_out(remote);
+        if (remote.known)
+            log_out(remote);
 }
 
 } // namespace hxasim

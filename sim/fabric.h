@@ -84,4 +84,8 @@ template <typename Ports> auto* port_with_wwn(Ports& ports, wwn_t wwn)
 void log_in(Logical_Port& port);
 void log_out(Logical_Port& port);
 
+// The driver has logged into a remote port, or lost it; nothing while that is not online.
+void log_in(Remote_Port& port);
+void log_out(Remote_Port& port);
+
 } // namespace hxasim

@@ -24,7 +24,11 @@ std::vector<Card_Summary> summarize(const Host& host)
     std::vector<Card_Summary> cards;
     for (const auto& adapter : host.adapters())
     {
-        cards.push_back({.serial = adapter.serial, .model = adapter.model, .plugged = adapter.plugged, .ports = {}});
+        cards.push_back({.serial = adapter.serial,
+                         .model = adapter.model,
+                         .plugged = adapter.plugged,
+                         .option_rom = adapter.flash.optrom_enabled,
+                         .ports = {}});
         for (const auto& port : adapter.ports)
             cards.back().ports.push_back(summarize(host, port));
     }

@@ -25,6 +25,7 @@ struct Card_Summary
     std::string serial;
     std::string model;
     bool plugged;
+    bool option_rom; // is switched on
     std::vector<Port_Summary> ports;
 };
 

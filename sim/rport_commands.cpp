@@ -31,7 +31,10 @@ Remote_Port absent_port(wwn_t wwn)
 void make_known(Call& call, const Logical_Port& logical, Remote_Port& remote, bool known)
 {
     if (remote.known != known && state_of(*call.ioc, remote) == HXA_RPORT_ONLINE)
+    {
+        known ? log_in(remote) : log_out(remote);
         tell_remote_port(call.host, *call.ioc, logical, remote, known);
+    }
     remote.known = known;
 }
 

@@ -160,6 +160,7 @@ void Scenario_Reader::read_adapter(Json_Object& object)
     for (auto& port : (object.has("ports") ? object : usual_object).objects("ports", max_ports))
         read_port(port, adapter);
     adapter.flash = read_flash(object, adapter.ports.size());
+    adapter.flash.optrom_enabled = object.boolean("option_rom", adapter.flash.optrom_enabled);
     object.done();
     _scenario.adapters.push_back(std::move(adapter));
 }

@@ -95,7 +95,8 @@ std::string refusal(const std::string& why) { return "{\"error\":\"" + why + "\"
 
 TEST_F(Control, answers_every_request_with_one_line)
 {
-    hxasim::load_text(R"({"adapters": [{"kind": "fc-hba", "ports": [{}]}]})");
+    hxasim::load_text(R"({"adapters": [{"kind": "fc-hba", "option_rom": false, "ports": [{}]}]})");
+    Simulated_Host::ask<hxa_ioctl_gen_t>(Open_File("/dev/hxa"), "IOCMD_FLASH_ENABLE_OPTROM", '\xB5', 0);
     const std::pair<const char*, std::string> cases[] = {
         {R"({"request": "event", "category": "port", "event": "sfp-pom", "level": 2})", done},
         {R"({"request": "event", "category": 9, "event": 77, "data": "0011"})", done},
@@ -104,11 +105,11 @@ TEST_F(Control, answers_every_request_with_one_line)
         {R"({"request": "unplug", "adapter": 0})", done},
         {R"({"request": "plug", "adapter": 0})", done},
         {R"({"request": "fault", "command": "IOCMD_PORT_GET_ATTR", "error": "EIO", "delay": 5})", done},
-        {R"({"request": "requests"})", "{\"ok\":true,\"requests\":0}\n"},
+        {R"({"request": "requests"})", "{\"ok\":true,\"requests\":1}\n"},
         {R"({"request": "status"})",
-         R"({"adapters":[{"model":"Zemlar-F86","plugged":true,"ports":[{"functions":[{"instance":0,"ioc":"operational",)"
-         R"("node":"/dev/hxa","port":"linkdown"}],"sfp":false}],"serial":"ZMF0000001"}],"faults":1,"lost_events":[0,0,0,0],)"
-         R"("ok":true,"open_descriptors":0,"requests":0,"violations":[]})"
+         R"({"adapters":[{"model":"Zemlar-F86","option_rom":true,"plugged":true,"ports":[{"functions":[{"instance":0,)"
+         R"("ioc":"operational","node":"/dev/hxa","port":"linkdown"}],"sfp":false}],"serial":"ZMF0000001"}],)"
+         R"("faults":1,"lost_events":[0,0,0,0],"ok":true,"open_descriptors":0,"requests":1,"violations":[]})"
          "\n"},
         {R"({"request": "clear-faults"})", done},
         {R"({"request": "event", "category": "port", "event": "melted"})",
