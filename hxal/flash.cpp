@@ -67,10 +67,7 @@ hxa_status_t update_part(const hxal_t& ioc, Part part, const Image& image)
 
 hxa_status_t hxal_flash_get_attr(const hxal_t* ioc, hxa_flash_attr_t* attr)
 {
-    if (!ioc || !attr)
-        return HXA_STATUS_EINVAL;
-    auto record = hxal::request_for<hxa_ioctl_flash_attr_t>(*ioc);
-    return hxal::exchange(*ioc, "IOCMD_FLASH_GET_ATTR", record, &hxa_ioctl_flash_attr_t::attr, attr);
+    return hxal::read(ioc, "IOCMD_FLASH_GET_ATTR", &hxa_ioctl_flash_attr_t::attr, attr);
 }
 
 hxa_status_t hxal_flash_erase_part(const hxal_t* ioc, hxa_flash_part_type_t type, uint8_t instance)
