@@ -154,6 +154,9 @@ template <typename Fits> const Setting* first_setting(Fits fits)
     return found == std::end(settings) ? nullptr : found;
 }
 
+// A tab is a blank to the parser: it can stand in a text that a person wrote.
+bool is_control(char character) { return (character >= 0 && character < ' ' && character != '\t') || character == '\x7F'; }
+
 bool store_adapter(hxal_ad_config_t& entry, int code, std::string_view value)
 {
     switch (code)
@@ -211,7 +214,7 @@ bool store(hxal_config_t& model, int code, int idx, std::string_view value)
 void write_text(std::FILE* file, const char* text, std::size_t size)
 {
     for (const char character : std::string_view(text, ::strnlen(text, size)))
-        std::fputc((character >= 0 && character < ' ') || character == '\x7F' ? '?' : character, file);
+        std::fputc(is_control(character) ? '?' : character, file);
 }
 
 } // namespace hxal::config

@@ -2,8 +2,8 @@
 //
 // The file is written whole. What the parser ignored, comments and the numbers that tune the drivers are not in it. A setting
 // that was given for all instances is written once, with the value of entry 0; any other once for every entry that has it. A
-// control character in a text is written as "?", so that a line stays one line; a value for which the file has no word is left
-// out.
+// control character in a text, other than a tab, is written as "?", so that a line stays one line; a value for which the file
+// has no word is left out.
 #pragma once
 
 #include "hxal/config/model.h"

@@ -14,21 +14,14 @@ protected:
     static std::string golden(const std::string& name) { return content(std::string(CONFIG_FILES) + "/" + name); }
 };
 
-TEST_F(Config_Writer, writes_what_each_instance_has)
+TEST_F(Config_Writer, writes_what_nobody_has_each_instance_has_and_all_instances_have)
 {
-    load(golden("instances.conf"));
-    EXPECT_EQ(written(), golden("instances.conf"));
-}
-
-TEST_F(Config_Writer, writes_once_what_all_instances_have)
-{
-    load(golden("for_all.conf"));
-    EXPECT_EQ(written(), golden("for_all.conf"));
-}
-
-TEST_F(Config_Writer, writes_headings_only_of_an_empty_model)
-{
-    EXPECT_EQ(written(), golden("empty.conf"));
+    for (const char* name : {"empty.conf", "instances.conf", "for_all.conf"})
+    {
+        empty_model();
+        load(golden(name));
+        EXPECT_EQ(written(), golden(name)) << name;
+    }
     hxal_config_ad_update(nullptr);
     hxal_config_ioc_update(nullptr);
     vport_traverse(nullptr, 0);
@@ -51,9 +44,9 @@ TEST_F(Config_Writer, keeps_a_text_on_its_line)
 {
     hxal_config_set_data(HXAL_CONFIG_AD_SERIAL, 0, "S\nN");
     hxal_config_set_data(HXAL_CONFIG_AD_NAME, 0, "a\";\nqos = \"TRUE\";\x7F\x1B");
-    hxal_config_set_data(HXAL_CONFIG_PORT_NAME, 0, "gr\xC3\xBC\xC3\x9F");
+    hxal_config_set_data(HXAL_CONFIG_PORT_NAME, 0, "gr\xC3\xBC\xC3\x9F\tb");
     EXPECT_THAT(settings(),
-                ElementsAre("adapter-S?N-name = \"a\";?qos = \"TRUE\";??\";", "hxa0-port-name = \"gr\xC3\xBC\xC3\x9F\";"));
+                ElementsAre("adapter-S?N-name = \"a\";?qos = \"TRUE\";??\";", "hxa0-port-name = \"gr\xC3\xBC\xC3\x9F\tb\";"));
 }
 
 TEST_F(Config_Writer, writes_the_virtual_ports_of_one_entry)

@@ -47,7 +47,7 @@ const Setting* setting_for_all(std::string_view key);
 bool store(hxal_config_t& model, const Setting& setting, int idx, std::string_view text);
 bool store(hxal_config_t& model, int code, int idx, std::string_view text);
 
-// Writes a text of at most `size` characters. A control character would end the line or hide in it.
+// Writes a text of at most `size` characters. A control character other than a tab would end the line or hide in it.
 void write_text(std::FILE* file, const char* text, std::size_t size);
 
 } // namespace hxal::config
