@@ -2,10 +2,9 @@
 #include "hxal/frame.h"
 #include "hxal/internal/frame.h"
 #include "hxal/internal/ioc_list.h"
+#include "hxal/internal/memory.h"
 #include "hxal/internal/request.h"
 #include "hxal/internal/text.h"
-
-#include <new>
 
 namespace
 {
@@ -143,23 +142,12 @@ hxa_status_t scan_node(hxal::List<hxal_s>& found, const Device_Node& node)
     return list_instances(found, node, descriptor, instances);
 }
 
-hxa_status_t scan_node_within_memory(hxal::List<hxal_s>& found, const Device_Node& node)
-{
-    try
-    {
-        return scan_node(found, node);
-    }
-    catch (const std::bad_alloc&)
-    {
-        return HXA_STATUS_ENOMEM;
-    }
-}
-
 // Adds what a node has to the list; a node that fails part-way adds nothing.
 void add_node(const Device_Node& node)
 {
     hxal::List<hxal_s> found;
-    if (const hxa_status_t failed = scan_node_within_memory(found, node); failed != HXA_STATUS_OK)
+    const hxa_status_t failed = hxal::within_memory([&] { return scan_node(found, node); });
+    if (failed != HXA_STATUS_OK)
     {
         hxal_set_last_error(failed);
         return;
