@@ -127,7 +127,7 @@ const std::vector<Operation>& operations()
     static const std::vector<Operation> table = {
         Op{common, 0x07, 520,  read(hxal_ioc_get_info)}.copies({{0, 520}}).in_place(),
         Op{common, 0x06, 1608, read(hxal_ioc_get_attr)}.copies({{8, 1600}})
-            .prints_on_error("IOCTL ERR  IOCMD_IOC_GET_ATTR   No such device or address\n"),
+            .prints_on_error("IOCTL ERR  IOCMD_IOC_GET_ATTR   Interrupted system call\n"),
         Op{common, 0x08, 84,   read(hxal_ioc_get_stats)}.copies({{8, 76}}),
         Op{common, 0x09, 8,    call(hxal_ioc_reset_stats)},
         Op{common, 0x0A, 16,   call(hxal_ioc_set_power, HXA_PM_DS_D2)}.sends({{8, {2}}}),
@@ -164,7 +164,7 @@ const std::vector<Operation>& operations()
         Op{{0xC1, 'D'}, 0x02, 8, call(hxal_fcoe_reset_stats)},
         Op{common, 0x43, 24,     read(hxal_ethport_get_attr)}.copies({{8, 16}}),
         Op{common, 0x42, 288,    read(hxal_ethport_get_stats)}.copies({{8, 280}})
-            .prints_on_error("IOCTL ERR  IOCMD_ETHPORT_GET_STATS   No such device or address\n"),
+            .prints_on_error("IOCTL ERR  IOCMD_ETHPORT_GET_STATS   Interrupted system call\n"),
         Op{common, 0x31, 8,      call(hxal_ethport_reset_stats)},
 
         Op{lports, 0x01, 232, read(hxal_lport_get_attr, vf, logical)}.sends({lport}).copies({{16, 216}}),

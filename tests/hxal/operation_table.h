@@ -63,7 +63,7 @@ struct Operation
     std::vector<Copied> copied = {};     // none: the operation takes no buffer
     Lines fc_recorded = {};              // what status 0 adds to the configuration, for instance 1 of "/dev/hxa"
     Lines ll_recorded = {};              // the same for instance 1 of "/dev/hxn"
-    const char* printed_on_error = "";   // on standard output when the call fails with ENXIO
+    const char* printed_on_error = "";   // on standard output when the call fails with EINTR
     const char* printed_on_refusal = ""; // on standard output when an Ethernet IOC is refused
     bool is_in_place = false;            // the record is the caller's buffer, also when the call fails
     bool output_is_optional = false;     // the caller may give no buffer
