@@ -3,10 +3,10 @@
 #include "hxal/frame.h"
 #include "hxal/internal/adapter_list.h"
 #include "hxal/internal/addresses.h"
+#include "hxal/internal/memory.h"
 #include "hxal/internal/text.h"
 
 #include <algorithm>
-#include <new>
 
 namespace
 {
@@ -74,21 +74,21 @@ hxa_status_t add_ioc(Adapter_List& list, hxal_s& ioc)
     return HXA_STATUS_OK;
 }
 
-// Groups all IOCs. False when one of them fails or an index has none; indexes only grow along the IOC list.
-bool group_all(Adapter_List& list, int ioc_count)
+// Groups all IOCs. One that fails leaves no adapter, and so does an index without an IOC, which is nobody's failure. Indexes only
+// grow along the IOC list.
+hxa_status_t group_all(int ioc_count)
 {
+    Adapter_List found;
     hxal_t* ioc = hxal_ioc_get_list();
     for (int idx = 0; idx < ioc_count; ++idx, ioc = ioc->next)
     {
         if (!ioc || ioc->id != idx)
-            return false;
-        if (const hxa_status_t failed = add_ioc(list, *ioc); failed != HXA_STATUS_OK)
-        {
-            hxal_set_last_error(failed);
-            return false;
-        }
+            return HXA_STATUS_OK;
+        if (const hxa_status_t failed = add_ioc(found, *ioc); failed != HXA_STATUS_OK)
+            return failed;
     }
-    return true;
+    adapters = std::move(found);
+    return HXA_STATUS_OK;
 }
 
 } // namespace
@@ -98,16 +98,8 @@ int hxal_adapter_scan(void)
     const int ioc_count = hxal_ioc_scan();
     adapters.count = 0;
     hxal::list_free(adapters.head);
-    try
-    {
-        Adapter_List found;
-        if (group_all(found, ioc_count))
-            adapters = std::move(found);
-    }
-    catch (const std::bad_alloc&)
-    {
-        hxal_set_last_error(HXA_STATUS_ENOMEM);
-    }
+    if (const hxa_status_t failed = hxal::within_memory([=] { return group_all(ioc_count); }); failed != HXA_STATUS_OK)
+        hxal_set_last_error(failed);
     return adapters.count;
 }
 
