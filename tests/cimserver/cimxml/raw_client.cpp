@@ -7,6 +7,7 @@
 #include <unistd.h>
 
 #include <algorithm>
+#include <cstdlib>
 
 namespace test
 {
@@ -21,7 +22,7 @@ std::size_t size_of_answer(const std::string& bytes)
     if (head == std::string::npos)
         return 0;
     const std::size_t length = bytes.find("Content-Length: ");
-    return head + 4 + (length < head ? std::stoul(bytes.substr(length + 16)) : 0);
+    return head + 4 + (length < head ? std::strtoul(bytes.c_str() + length + 16, nullptr, 10) : 0);
 }
 
 } // namespace
