@@ -24,6 +24,8 @@ bool is_regular(int fd)
     return ::fstat(fd, &status) == 0 && S_ISREG(status.st_mode);
 }
 
+bool rewind(int fd) { return ::lseek(fd, 0, SEEK_SET) == 0; }
+
 // The unpacked inner archive: a new file of ours for as long as this lives. What stands in its place beforehand is
 // unlinked, and what is planted there in the meantime is not opened.
 class Temporary_File
@@ -51,8 +53,6 @@ public:
     }
 
     int number() const { return _file.number(); }
-
-    static bool rewind(int fd) { return ::lseek(fd, 0, SEEK_SET) == 0; }
 
 private:
     int _unlinked;
@@ -88,11 +88,17 @@ hxa_status_t read_image_files(Tar_Reader& reader, std::vector<HXAL_IMAGE_DATA_T>
 }
 
 // Reads the archive that an open file is, from its start: the description, then one member for each image of it.
-hxa_status_t read_archive(int fd, std::vector<HXAL_IMAGE_DATA_T>& images)
+hxa_status_t populate_data_from_file(int fd, std::vector<HXAL_IMAGE_DATA_T>& images)
 {
     Tar_Reader reader(fd);
     const hxa_status_t read = read_config_file(reader, images);
     return read == HXA_STATUS_OK ? read_image_files(reader, images) : read;
+}
+
+// Reads the first member, the description or an archive inside.
+hxa_status_t check_file_contains_tar(int fd, Tar_Member& first)
+{
+    return is_regular(fd) ? Tar_Reader(fd).next(first) : HXA_STATUS_BAD_FILE;
 }
 
 } // namespace
@@ -103,15 +109,13 @@ hxa_status_t read_boot_archive(const char* path, std::vector<HXAL_IMAGE_DATA_T>&
     const Descriptor file(path, O_RDONLY | O_NONBLOCK);
     if (!file.is_open())
         return HXA_STATUS_FAILED;
-    if (!is_regular(file.number()))
-        return HXA_STATUS_BAD_FILE;
     Tar_Member first;
-    if (const hxa_status_t read = Tar_Reader(file.number()).next(first); read != HXA_STATUS_OK)
+    if (const hxa_status_t read = check_file_contains_tar(file.number(), first); read != HXA_STATUS_OK)
         return read;
     if (is_description(first))
-        return Temporary_File::rewind(file.number()) ? read_archive(file.number(), images) : HXA_STATUS_BAD_FILE;
+        return rewind(file.number()) ? populate_data_from_file(file.number(), images) : HXA_STATUS_BAD_FILE;
     const Temporary_File inner;
-    return inner.fill(first.data) ? read_archive(inner.number(), images) : HXA_STATUS_CREATE_FILE;
+    return inner.fill(first.data) ? populate_data_from_file(inner.number(), images) : HXA_STATUS_CREATE_FILE;
 }
 
 } // namespace hxal

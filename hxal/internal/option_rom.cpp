@@ -1,6 +1,7 @@
 #include "hxal/internal/option_rom.h"
 
 #include "hxal/frame.h"
+#include "hxal/internal/option_rom_layout.h"
 
 #include <algorithm>
 #include <span>
@@ -10,30 +11,6 @@ namespace hxal
 
 namespace
 {
-
-// Where the fields stand, in bytes; all are little-endian.
-namespace rom_header
-{
-constexpr size_t data_structure = 24; // offset of the PCI data structure, from the image
-constexpr size_t pnp_header = 26;     // offset of the Plug and Play header, from the image
-constexpr size_t size = 28;
-} // namespace rom_header
-
-namespace data_structure
-{
-constexpr size_t device_id = 6;
-constexpr size_t image_length = 16; // units of 512 bytes
-constexpr size_t code_type = 20;
-constexpr size_t indicator = 21; // bit 7: the last image
-constexpr size_t size = 28;
-} // namespace data_structure
-
-namespace pnp_header
-{
-constexpr size_t length = 5; // units of 16 bytes
-constexpr size_t checksum = 9;
-constexpr size_t device_id = 12; // second half of the Plug and Play device id
-} // namespace pnp_header
 
 constexpr size_t image_length_unit = 512;
 constexpr size_t pnp_length_unit = 16;
@@ -68,18 +45,18 @@ bool is_patched(uint16_t devid) { return devid == 0x14 || devid == 0x17 || devid
 // What stands in an image from its Plug and Play header on; empty when there is none.
 Bytes pnp_header_of(Bytes image)
 {
-    const size_t offset = word_at(image, rom_header::pnp_header);
+    const size_t offset = word_at(image, offsetof(pci_optrom_hdr_t, pnphdr));
     return offset == 0 ? Bytes() : structure_at(image, offset, pnp_length_unit);
 }
 
 // False when the header is shorter than its fields or longer than the image.
 bool patch_pnp_header(Bytes rest, uint16_t devid)
 {
-    const size_t length = rest[pnp_header::length] * pnp_length_unit;
+    const size_t length = rest[offsetof(pnp_hdr_t, len)] * pnp_length_unit;
     if (length == 0 || length > rest.size())
         return false;
-    put_word(rest, pnp_header::device_id, devid);
-    put_checksum(rest.first(length), pnp_header::checksum);
+    put_word(rest, offsetof(pnp_hdr_t, pnp_dev_id[1]), devid);
+    put_checksum(rest.first(length), offsetof(pnp_hdr_t, cksum));
     return true;
 }
 
@@ -94,17 +71,17 @@ struct Rom_Image
 
 Rom_Image image_at(Bytes rom, size_t offset)
 {
-    const Bytes rest = structure_at(rom, offset, rom_header::size);
+    const Bytes rest = structure_at(rom, offset, sizeof(pci_optrom_hdr_t));
     if (rest.empty())
         return {};
-    const Bytes found = structure_at(rest, word_at(rest, rom_header::data_structure), data_structure::size);
-    const size_t length = found.empty() ? 0 : word_at(found, data_structure::image_length) * image_length_unit;
+    const Bytes found = structure_at(rest, word_at(rest, offsetof(pci_optrom_hdr_t, pcids)), sizeof(pci_3_0_ds_t));
+    const size_t length = found.empty() ? 0 : word_at(found, offsetof(pci_3_0_ds_t, imglen)) * image_length_unit;
     if (length > rest.size())
         return {};
     return {.bytes = rest.first(length),
             .data_structure = found,
-            .is_x86 = !found.empty() && found[data_structure::code_type] == x86_code,
-            .is_last = !found.empty() && (found[data_structure::indicator] & last_image) != 0};
+            .is_x86 = !found.empty() && found[offsetof(pci_3_0_ds_t, codetype)] == x86_code,
+            .is_last = !found.empty() && (found[offsetof(pci_3_0_ds_t, indr)] & last_image) != 0};
 }
 
 } // namespace
@@ -118,7 +95,7 @@ hxa_status_t update_device_id_chksum(Image& rom, uint16_t devid)
         if (image.bytes.empty())
             return HXA_STATUS_FAILED;
         if (patched)
-            put_word(image.data_structure, data_structure::device_id, devid);
+            put_word(image.data_structure, offsetof(pci_3_0_ds_t, devid), devid);
         if (image.is_x86)
         {
             const Bytes header = pnp_header_of(image.bytes);

@@ -21,6 +21,8 @@ TEST(Commands, have_the_codes_that_the_drivers_know)
     constexpr Code codes[] = {
         {"IOCMD_IOC_GET_VERSION", 0xC0084301, 0xC0084401},
         {"IOCMD_IOC_GET_INST", 0xC0284302, 0xC0284402},
+        {"IOCMD_IOC_ENABLE", 0xC0084303, 0xC0084403},
+        {"IOCMD_IOC_DISABLE", 0xC0084304, 0xC0084404},
         {"IOCMD_IOC_SET_ADAPTER_NAME", 0xC048430C, 0xC048440C},
         {"IOCMD_AEN_GET", 0xC0584329, 0xC0584329},
         {"IOCMD_AEN_SYNC", 0xC058432A, 0xC058442A},
