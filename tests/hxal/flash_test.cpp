@@ -56,7 +56,7 @@ TEST_F(Flash, partition_goes_from_file_to_file)
     EXPECT_EQ(std::string(std::istreambuf_iterator(out), {}), "pre-boot\xFF\xFF") << "erased behind what was written";
 }
 
-TEST_F(Flash, image_file_that_cannot_be_read_is_not_sent)
+TEST_F(Flash, image_that_cannot_be_read_or_is_too_large_is_not_sent)
 {
     file("empty", "");
     fs::create_directory(path("folder"));
@@ -65,6 +65,9 @@ TEST_F(Flash, image_file_that_cannot_be_read_is_not_sent)
     EXPECT_EQ(update_from_file("empty"), HXA_STATUS_FAILED);
     EXPECT_EQ(update_from_file("folder"), HXA_STATUS_FAILED);
     EXPECT_EQ(update_from_file("huge"), HXA_STATUS_ENOMEM);
+    unsigned char image[1];
+    EXPECT_EQ(hxal_flash_update_part(ioc, HXA_FLASH_PART_PBC, 0, image, HXA_FALSE, UINT32_MAX), HXA_STATUS_ENOMEM);
+    EXPECT_EQ(read_to_file(path("out"), UINT32_MAX), HXA_STATUS_ENOMEM);
     EXPECT_EQ(hxal_flash_update_part(ioc, HXA_FLASH_PART_PBC, 0, nullptr, HXA_FALSE, 1), HXA_STATUS_EINVAL);
     file("firmware", "1234123");
     EXPECT_EQ(update_from_file("firmware", HXA_FLASH_PART_FWIMG), HXA_STATUS_CHECKSUM_FAIL);
