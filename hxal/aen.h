@@ -72,9 +72,10 @@ extern "C"
     typedef void (*hxal_lport_snia_cbfn_t)(void* userData, wwn_t lpwwn, uint32_t code, uint32_t pid);
     typedef void (*hxal_itnim_snia_cbfn_t)(void* userData, wwn_t lpwwn, wwn_t rpwwn, uint32_t code);
 
-    // Register: HXA_STATUS_OK and the handle in `*cbhandle`, HXA_STATUS_EINVAL without a callback, a place for the handle or the
-    // data that the filter comes from, HXA_STATUS_ENOMEM. The library keeps the registration, and what it needs of `data` and
-    // of the driver's node, until it is unregistered. Without an IOC (null) it waits for events of instance 0xFFFF: none.
+    // Register: HXA_STATUS_OK and the handle in `*cbhandle`, where the first call finds it already; HXA_STATUS_EINVAL without a
+    // callback, a place for the handle or the data that the filter comes from, HXA_STATUS_ENOMEM. The library keeps the
+    // registration, and what it needs of `data` and of the driver's node, until it is unregistered. Without an IOC (null) it
+    // waits for events of instance 0xFFFF: none.
     //
     // Which events of its kind a registration gets, besides that they come from the IOC's instance:
     //     adapter   those with the adapter's serial number; without an adapter (null) that any adapter was added

@@ -162,7 +162,7 @@ hxa_status_t enlist(hxal::Registration_List<Record>& list, const hxal_t* ioc, Ca
             record->cbfn = cbfn;
             record->filter = filter;
             record->flags = flag & hxal::snia_form;
-            *cbhandle = list.add(std::move(record));
+            list.add(std::move(record), *cbhandle);
             return HXA_STATUS_OK;
         });
 }

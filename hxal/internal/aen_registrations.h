@@ -61,12 +61,12 @@ template <typename Record, typename Callback, typename Filter> struct Registrati
 template <typename Record> class Registration_List
 {
 public:
-    // The list owns the record from then on; the newest stands first.
-    Record* add(std::unique_ptr<Record> record)
+    // The list owns the record from then on; the newest stands first. `handle` is set before the record can be called.
+    void add(std::unique_ptr<Record> record, Record*& handle)
     {
         const std::lock_guard lock(_mutex);
         record->next = _head;
-        return _head = record.release();
+        handle = _head = record.release();
     }
 
     // False when it is not in the list (any more). A record that is being called is freed by its caller.

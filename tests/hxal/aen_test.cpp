@@ -3,7 +3,9 @@
 #include "tests/hxal/aen_listeners.h"
 
 #include <algorithm>
+#include <atomic>
 #include <set>
+#include <thread>
 
 namespace
 {
@@ -166,6 +168,37 @@ TEST_F(Aen, calls_the_newest_registration_first_and_those_that_are_made_meanwhil
     second.then = {};
     hxal::dispatch_event(ioc_event(0));
     EXPECT_THAT(heard.take(), ElementsAre("third 3", "second 3"));
+}
+
+TEST_F(Aen, calls_nobody_before_he_has_his_handle)
+{
+    struct Guest
+    {
+        hxal_ioc_aen_cbhandle_t* handle = nullptr;
+        std::atomic<hxa_status_t> left = HXA_STATUS_PENDING;
+    };
+    const auto leave = [](void* to, uint32_t, const hxa_ioc_aen_data_t*, hxa_timeval_t)
+    {
+        auto& guest = *static_cast<Guest*>(to);
+        guest.left = hxal_ioc_aen_unregister(guest.handle);
+    };
+    std::atomic<bool> stop = false;
+    std::thread dispatcher(
+        [&]
+        {
+            for (; !stop; std::this_thread::yield())
+                hxal::dispatch_event(ioc_event(0));
+        });
+    for (int round = 0; round < 200; ++round)
+    {
+        Guest guest;
+        EXPECT_EQ(hxal_ioc_aen_register(fc, leave, &guest, &guest.handle), HXA_STATUS_OK);
+        while (guest.left == HXA_STATUS_PENDING)
+            std::this_thread::yield();
+        EXPECT_EQ(guest.left, HXA_STATUS_OK) << round;
+    }
+    stop = true;
+    dispatcher.join();
 }
 
 TEST_F(Aen, registrations_end_once)
