@@ -1,9 +1,9 @@
 // Diagnostics of one IOC and of the port behind it.
 //
-// Every call is one request at most, on the handle's own node; a call that needs the card out of service, or in it, is refused
-// by the driver, which also lets one test run at a time on an IOC (HXA_STATUS_DIAG_BUSY). A null output is allowed: then only
-// the status comes back. What an output holds after a request that did not fail is what the driver left there, also when the
-// status is not HXA_STATUS_OK: that is how a failed test tells what it found.
+// Every call but hxal_diag_beacon_lport() is one request at most, on the handle's own node; a call that needs the card out of
+// service, or in it, is refused by the driver, which also lets one test run at a time on an IOC (HXA_STATUS_DIAG_BUSY). A null
+// output is allowed: then only the status comes back. What an output holds after a request that did not fail is what the driver
+// left there, also when the status is not HXA_STATUS_OK: that is how a failed test tells what it found.
 #pragma once
 
 #include "hxal/ioc.h"
