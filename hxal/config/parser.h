@@ -26,7 +26,8 @@ extern "C"
     hxa_status_t hxal_config_load(const char* path);
 
     // One line, terminated, of any length. Every line of the kind "adapter-..." fills a further adapter entry, also for a
-    // serial number that has one already; beyond 128 they are ignored.
+    // serial number that has one already; beyond 128 they are ignored. The entries are filled from 0 on, over those that a scan
+    // has made: a card that loses its entry so has its settings recorded again after the next scan.
     void hxal_config_parse(const char* line);
 
     // Stores a value, which is the text behind "=", into entry `idx`: adapter settings 0 to 2, IOC settings 3 to 33, except

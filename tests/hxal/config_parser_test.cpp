@@ -42,15 +42,13 @@ TEST_F(Config_Parser, takes_values_in_every_form_and_drops_those_that_are_none)
 
 TEST_F(Config_Parser, stores_values_as_numbers)
 {
-    parse({"hxa3-port-trunk = 0, 1", "hxa3-port-topology = auto", "hxa3-log-level = Info", "hxa3-auth-algo = ms",
-           "hxa3-auth-secretsource = RADIUS", "hxa3-port-hardalpa = 0x1f", "hxa3-qos = TRUE", "hxa3-qos = maybe"});
+    parse({"hxa3-port-topology = auto", "hxa3-log-level = Info", "hxa3-auth-algo = ms", "hxa3-auth-secretsource = RADIUS",
+           "hxa3-qos = TRUE", "hxa3-qos = maybe"});
     EXPECT_FALSE(has(ioc(3).flags, HXAL_CONFIG_QOS)) << "a later word that is none";
-    EXPECT_EQ(ioc(3).trunking, 3u);
     EXPECT_EQ(ioc(3).topology, uint32_t{HXA_PPORT_TOPOLOGY_AUTO});
     EXPECT_EQ(ioc(3).log, HXA_LOG_INFO);
     EXPECT_EQ(ioc(3).authalgo, uint32_t{HXA_AUTH_ALGO_MS});
     EXPECT_EQ(ioc(3).authssource, uint32_t{HXA_AUTH_SECSRC_RADIUS});
-    EXPECT_EQ(ioc(3).alpa, 31);
 }
 
 TEST_F(Config_Parser, ignores_what_does_not_fit)
