@@ -18,7 +18,7 @@ namespace cimserver
 class Test_Module
 {
 public:
-    Test_Module() : _library(dlopen(TEST_MODULE, RTLD_NOW)) { state().disks = 3; } // it may have stayed since a test before
+    explicit Test_Module(const std::string& file = TEST_MODULE) : _library(dlopen(file.c_str(), RTLD_NOW)) {}
     ~Test_Module() { dlclose(_library); }
     Test_Module(const Test_Module&) = delete;
     Test_Module& operator=(const Test_Module&) = delete;
