@@ -126,19 +126,35 @@ bool may_be_utf8(std::string_view document)
     return first_bytes.find(document.front()) != std::string_view::npos && document.find('\0') == std::string_view::npos;
 }
 
+// The last character of the markup without attributes that begins at i; i itself when none does.
+std::size_t end_of_opaque_markup(std::string_view document, std::size_t i)
+{
+    constexpr std::pair<std::string_view, std::string_view> kinds[] = {{"<![CDATA[", "]]>"}, {"<!--", "-->"}, {"<?", "?>"}};
+    for (const auto& [begin, end] : kinds)
+        if (document.substr(i).starts_with(begin))
+        {
+            const std::size_t found = document.find(end, i + begin.size());
+            return (found == std::string_view::npos ? document.size() : found + end.size()) - 1;
+        }
+    return i;
+}
+
 // The parser compares each attribute of a tag with each other one, however many there are.
 bool has_crowded_tag(std::string_view document)
 {
     std::size_t attributes = 0;
     bool in_tag = false;
     char quote = 0;
-    for (const char c : document)
+    for (std::size_t i = 0; i < document.size(); ++i)
     {
+        const char c = document[i];
         if (c == '<')
         {
-            in_tag = true;
+            const std::size_t end = end_of_opaque_markup(document, i);
+            in_tag = end == i;
             quote = 0;
             attributes = 0;
+            i = end;
         }
         else if (quote != 0)
             quote = c == quote ? '\0' : quote;

@@ -80,6 +80,10 @@ const Case cases[] = {
     {"ASCII, said to be another encoding", replaced(good, "utf-8", "iso-8859-1"), "200"},
     {"a byte order mark", "\xEF\xBB\xBF" + good, "200"},
     {"a later minor version", replaced(good, "DTDVERSION=\"2.0\"", "DTDVERSION=\"2.4\""), "200"},
+    {"many signs that would be attributes in a tag",
+     replaced(intrinsic("X", parameter("Y", "<VALUE><![CDATA[" + repeated("a='' ", 300) + "]]></VALUE>")), "<MESSAGE",
+              "<?x " + repeated("a='' ", 300) + "?><!-- " + repeated("a='' ", 300) + "--><MESSAGE"),
+     "200"},
     {"a correlator",
      replaced(good, "<SIMPLEREQ>", "<SIMPLEREQ><CORRELATOR NAME=\"x\" TYPE=\"string\"><VALUE>1</VALUE></CORRELATOR>"), "200"},
 
@@ -128,6 +132,8 @@ const Case cases[] = {
                                        repeated("<KEYBINDING NAME=\"K\"><KEYVALUE/></KEYBINDING>", 65) + "</INSTANCENAME>")),
      not_valid},
     {"very many attributes", replaced(good, " ID=", repeated(" a=''", 300) + " ID="), not_valid},
+    {"very many behind what only looks like the start of a comment",
+     intrinsic("X", parameter("Y", "<VALUE><![CDATA[<!--]]></VALUE>") + "<Z" + repeated(" a=''", 300) + "/>"), not_valid},
     {"very many elements", intrinsic("X", parameter("Y", "<VALUE.ARRAY>" + repeated("<VALUE/>", 50000) + "</VALUE.ARRAY>")),
      not_valid},
 
