@@ -2,31 +2,17 @@
 
 #include "cimserver/broker/names.h"
 #include "cimserver/indications/export_transfer.h"
+#include "cimserver/indications/listener_queue.h"
 
 #include <algorithm>
-#include <cstdio>
-#include <deque>
 #include <new>
-#include <optional>
 
 namespace cimserver
 {
 namespace
 {
 
-using Message = std::shared_ptr<const std::string>;
-
 constexpr std::chrono::milliseconds longest_wait{60'000};
-
-void tell(const std::string& url, const std::string& text)
-{
-    std::fprintf(stderr, "zmlr-cimserver: listener %s: %s\n", url.c_str(), text.c_str());
-}
-
-std::string indications(std::size_t count)
-{
-    return std::to_string(count) + (count == 1 ? " indication is lost" : " indications are lost");
-}
 
 struct Free_Url
 {
@@ -56,27 +42,17 @@ bool is_listener_url(const std::string& url)
            !has_part(parts.get(), CURLUPART_USER) && !has_part(parts.get(), CURLUPART_PASSWORD);
 }
 
-struct Delivery::Listener
-{
-    const std::string url;
-    std::deque<Message> waiting; // the first one may be under way
-    bool under_way = false;
-    bool removed = false;
-    unsigned attempts = 0;   // of the first one
-    Clock::time_point due{}; // when it may be tried again
-    std::size_t lost = 0;    // since it was last told
-};
-
 class Delivery::Transfer : public Export_Transfer
 {
 public:
-    Transfer(std::shared_ptr<Listener> listener_, const Delivery_Limits& limits)
-        : Export_Transfer(listener_->url, listener_->waiting.front(), limits.timeout, limits.ca_file)
+    Transfer(std::shared_ptr<Listener_Queue> listener_, const Delivery_Limits& limits)
+        : Export_Transfer(listener_->url, {listener_->waiting.front(), &listener_->waiting.front()->text}, limits.timeout,
+                          limits.ca_file)
         , listener(std::move(listener_))
     {
     }
 
-    const std::shared_ptr<Listener> listener;
+    const std::shared_ptr<Listener_Queue> listener;
 };
 
 Delivery::Delivery(const Delivery_Limits& limits) : _limits(limits)
@@ -100,32 +76,47 @@ void Delivery::keep(const std::set<std::string>& urls)
         const std::lock_guard lock(_mutex);
         for (const std::string& url : urls)
             if (!_listeners.contains(url))
-                _listeners.emplace(url, std::make_shared<Listener>(Listener{url, {}}));
+                _listeners.emplace(url, std::make_shared<Listener_Queue>(url));
         for (const auto& [url, listener] : _listeners)
+        {
             listener->removed = !urls.contains(url);
+            if (listener->removed)
+                listener->tell_end("nobody subscribes for it any more");
+        }
         std::erase_if(_listeners, [](const auto& entry) { return entry.second->removed; });
     }
     curl_multi_wakeup(_multi);
 }
 
-void Delivery::send(const std::string& url, std::string message)
+void Delivery::send(const std::vector<std::string>& urls, std::string text)
 {
-    auto shared = std::make_shared<const std::string>(std::move(message));
     {
         const std::lock_guard lock(_mutex);
-        const auto found = _listeners.find(url);
-        if (_stopping || found == _listeners.end())
+        if (_stopping)
             return;
-        Listener& listener = *found->second;
-        listener.waiting.push_back(std::move(shared));
-        if (listener.waiting.size() > _limits.waiting + (listener.under_way ? 1 : 0))
-        {
-            listener.waiting.erase(listener.waiting.begin() + (listener.under_way ? 1 : 0));
-            if (++listener.lost == 1)
-                tell(url, "its queue is full, indications are lost");
-        }
+        const auto message = std::make_shared<const Waiting_Message>(std::move(text), ++_last_number, _bytes);
+        make_room();
+        for (const std::string& url : urls)
+            if (const auto found = _listeners.find(url); found != _listeners.end())
+                found->second->append(message, _limits.waiting);
     }
     curl_multi_wakeup(_multi);
+}
+
+// The oldest message gives way in every queue that holds it: only then its memory is free.
+void Delivery::make_room()
+{
+    while (_bytes > _limits.bytes)
+    {
+        std::size_t oldest = Listener_Queue::no_number;
+        for (const auto& [url, listener] : _listeners)
+            oldest = std::min(oldest, listener->oldest_number());
+        if (oldest == Listener_Queue::no_number)
+            return;
+        for (const auto& [url, listener] : _listeners)
+            if (listener->oldest_number() == oldest)
+                listener->drop_oldest();
+    }
 }
 
 void Delivery::stop(std::chrono::milliseconds grace)
@@ -168,8 +159,7 @@ bool Delivery::finished()
     if (left > 0 && Clock::now() < _deadline)
         return false;
     for (const auto& [url, listener] : _listeners)
-        if (!listener->waiting.empty())
-            tell(url, "the server stops, " + indications(listener->waiting.size()));
+        listener->tell_end("the server stops");
     return true;
 }
 
@@ -184,8 +174,12 @@ void Delivery::start_due()
         try
         {
             _transfers.push_back(std::make_unique<Transfer>(listener, _limits));
-            listener->under_way = true;
-            curl_multi_add_handle(_multi, _transfers.back()->handle());
+            listener->under_way = curl_multi_add_handle(_multi, _transfers.back()->handle()) == CURLM_OK;
+            if (!listener->under_way)
+            {
+                _transfers.pop_back();
+                throw std::bad_alloc();
+            }
         }
         catch (const std::bad_alloc&)
         {
@@ -204,7 +198,8 @@ void Delivery::end_transfers()
         curl_multi_remove_handle(_multi, (*ended)->handle());
         {
             const std::lock_guard lock(_mutex);
-            settle(*(*ended)->listener, **ended, result);
+            if (!(*ended)->listener->removed)
+                settle(*(*ended)->listener, **ended, result);
         }
         _transfers.erase(ended);
     }
@@ -223,24 +218,22 @@ void Delivery::abandon_removed()
 }
 
 // A server that stops tries nothing twice.
-void Delivery::settle(Listener& listener, const Transfer& transfer, int curl_result)
+void Delivery::settle(Listener_Queue& listener, const Transfer& transfer, int curl_result)
 {
     const auto result = static_cast<CURLcode>(curl_result);
     const Export_Outcome outcome = transfer.outcome(result);
     listener.under_way = false;
     ++listener.attempts;
+    listener.tell_dropped();
     if (outcome == Export_Outcome::not_taken && listener.attempts < _limits.attempts && !_stopping)
     {
         listener.due = Clock::now() + _limits.pause;
-        tell(listener.url, transfer.problem(result) + "; attempt " + std::to_string(listener.attempts) + " of " +
-                               std::to_string(_limits.attempts));
+        listener.tell(transfer.problem(result) + "; attempt " + std::to_string(listener.attempts) + " of " +
+                      std::to_string(_limits.attempts));
         return;
     }
     if (outcome != Export_Outcome::taken)
-        tell(listener.url, transfer.problem(result) + "; " + indications(1));
-    if (listener.lost > 0)
-        tell(listener.url, "its queue was full, " + indications(listener.lost));
-    listener.lost = 0;
+        listener.tell(transfer.problem(result) + "; " + lost_indications(1));
     listener.waiting.pop_front();
     listener.attempts = 0;
     listener.due = {};

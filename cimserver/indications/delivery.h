@@ -6,9 +6,10 @@
 //
 // What a listener does not take (no connection, no answer in time, HTTP status 408, 429 or 5xx) is tried again after a pause,
 // a few times; what it refuses (another status, or a CIM error) is not. When a queue is full its oldest waiting message gives
-// way. Everything that is lost is told on standard error.
+// way; when all queues together hold too much, the oldest one of all does. Everything that is lost is told on standard error.
 #pragma once
 
+#include <atomic>
 #include <chrono>
 #include <cstddef>
 #include <map>
@@ -22,12 +23,15 @@
 namespace cimserver
 {
 
+struct Listener_Queue;
+
 struct Delivery_Limits
 {
     unsigned attempts = 3;
     std::chrono::milliseconds pause{20'000};   // between attempts
     std::chrono::milliseconds timeout{15'000}; // of one attempt, from connecting to the end of the answer
     std::size_t waiting = 1000;                // messages per listener
+    std::size_t bytes = std::size_t{64} << 20; // of the messages of all listeners; one that several wait for counts once
     std::string ca_file;                       // certificates that vouch for HTTPS listeners; empty: the system's
 };
 
@@ -47,28 +51,30 @@ public:
     // gone is dropped.
     void keep(const std::set<std::string>& urls);
 
-    // Appends a message to a listener's queue, without waiting for anything; nothing happens when there is no such listener.
-    void send(const std::string& url, std::string message);
+    // Appends a message to the queue of each of these listeners, without waiting for anything; who is no listener is left out.
+    void send(const std::vector<std::string>& urls, std::string text);
 
     // Takes no more messages, tries those that wait once more until the time is over, and ends. Later calls do nothing.
     void stop(std::chrono::milliseconds grace);
 
 private:
     using Clock = std::chrono::steady_clock;
-    struct Listener;
     class Transfer;
 
+    void make_room();
     void run();
     bool finished();
     void start_due();
     void end_transfers();
     void abandon_removed();
-    void settle(Listener& listener, const Transfer& transfer, int curl_result);
+    void settle(Listener_Queue& listener, const Transfer& transfer, int curl_result);
     std::chrono::milliseconds time_to_next();
 
     const Delivery_Limits _limits;
-    std::mutex _mutex; // guards what follows, and the listeners
-    std::map<std::string, std::shared_ptr<Listener>> _listeners;
+    std::atomic<std::size_t> _bytes = 0; // of the messages that live
+    std::mutex _mutex;                   // guards what follows, and the listeners
+    std::size_t _last_number = 0;        // of a message
+    std::map<std::string, std::shared_ptr<Listener_Queue>> _listeners;
     bool _stopping = false;
     Clock::time_point _deadline;
 

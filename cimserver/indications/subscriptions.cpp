@@ -125,15 +125,20 @@ Subscriptions::Entry Subscriptions::take(Kind kind, const std::string& id)
 
 void Subscriptions::update_routes()
 {
-    auto routes = std::make_shared<std::vector<Route>>();
+    std::map<std::string, Route> by_filter;
     std::set<std::string> urls;
     for (const auto& [id, subscription] : table(Kind::subscription))
     {
         const Instance& destination = table(Kind::destination).at(subscription.destination_id).instance;
         const auto& url = std::get<std::string>(find_named(destination.properties, "Destination")->value.content);
-        routes->push_back({table(Kind::filter).at(subscription.filter_id).filter, url});
+        Route& route = by_filter[subscription.filter_id];
+        route.filter = table(Kind::filter).at(subscription.filter_id).filter;
+        route.urls.push_back(url);
         urls.insert(url);
     }
+    auto routes = std::make_shared<std::vector<Route>>();
+    for (auto& [id, route] : by_filter)
+        routes->push_back(std::move(route));
     _routes = std::move(routes);
     _delivery.keep(urls);
 }
@@ -261,7 +266,7 @@ void Subscriptions::deliver(const std::string& name_space, const Instance& indic
         const bool from_here =
             std::ranges::any_of(filter.name_spaces, [&](const std::string& name) { return equal_names(name, name_space); });
         if (from_here && Repository::is_a(entry->meta_class, filter.entry->meta_class) && filter.query.wants(indication))
-            _delivery.send(route.url, export_message(filter.query.selected(indication)));
+            _delivery.send(route.urls, export_message(filter.query.selected(indication)));
     }
 }
 

@@ -61,7 +61,7 @@ private:
     struct Route
     {
         std::shared_ptr<const Event_Filter> filter;
-        std::string url;
+        std::vector<std::string> urls;
     };
     using Table = std::map<std::string, Entry>;
 
