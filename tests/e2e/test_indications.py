@@ -243,7 +243,7 @@ def test_the_message_is_what_listeners_read(serve, listen):
     ],
 )
 def test_what_is_not_taken_is_tried_again_in_order(serve, listen, answers, numbers):
-    host, listener = serve("--delivery-timeout", 1), listen(answers)
+    host, listener = serve("--delivery-timeout", 3), listen(answers)
     subscribe(host, listener.url)
     ring(host, 3)
     wait_until(lambda: len(listener.numbers) == len(numbers))
@@ -257,9 +257,9 @@ def test_dead_and_slow_listeners_hold_up_nobody(serve, listen):
     begin = time.monotonic()
     assert ring(host, 200) == 200
     wait_until(lambda: len(well.bodies) == 200)
-    assert time.monotonic() - begin < 20
+    assert time.monotonic() - begin < 30
     assert well.numbers == list(range(1, 201))
-    assert slow.numbers == [1]
+    wait_until(lambda: slow.numbers == [1])
 
     begin = time.monotonic()
     assert host.server.stop() == 0

@@ -63,13 +63,13 @@ std::string Raw_Client::receive(std::chrono::milliseconds time)
 {
     const auto deadline = std::chrono::steady_clock::now() + time;
     std::string bytes;
+    std::string buffer(std::size_t{1} << 20, '\0');
     while (bytes.empty() || size_of_answer(bytes) == 0 || bytes.size() < size_of_answer(bytes))
     {
-        char buffer[4096];
-        const ssize_t result = readable_until(deadline) ? recv(_socket, buffer, sizeof buffer, 0) : 0;
+        const ssize_t result = readable_until(deadline) ? recv(_socket, buffer.data(), buffer.size(), 0) : 0;
         if (result <= 0)
             break;
-        bytes.append(buffer, static_cast<std::size_t>(result));
+        bytes.append(buffer, 0, static_cast<std::size_t>(result));
     }
     return bytes;
 }
