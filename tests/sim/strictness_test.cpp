@@ -44,15 +44,20 @@ const Bad_Request bad_requests[] = {
     {"/dev/hxa", 0xC0084301,    4,   2, EINVAL, "/dev/hxa IOCMD_IOC_GET_VERSION: byte 4 is 2, must be 0"},
     {"/dev/hxa", 0xC058432A,    0,   1, EINVAL, "/dev/hxa IOCMD_AEN_SYNC: byte 0 is 1, must be 0"},
     {"/dev/hxa", 0xC058432A,   16,   1, EINVAL, "/dev/hxa IOCMD_AEN_SYNC: byte 16 is 1, must be 0"},
+    {"/dev/hxa", 0xC0584329,   12,   1, EINVAL, "/dev/hxa IOCMD_AEN_GET instance 0: byte 12 is 1, must be 0"},
+    {"/dev/hxa", 0xC0584329,   16,   1, EINVAL, "/dev/hxa IOCMD_AEN_GET instance 0: byte 16 is 1, must be 0"},
     {"/dev/hxa", 0xC060BA02,   36,   1, EINVAL, "/dev/hxa IOCMD_FCPT instance 0: byte 36 is 1, must be 0"},
     {"/dev/hxa", 0xC020B207,   12,   1, EINVAL, "/dev/hxa IOCMD_RPORT_SET_SPEED instance 0: byte 12 is 1, must be 0"},
-    // inputs that contradict each other
+    // inputs that make no sense
     {"/dev/hxa", 0xC018432E,    8,   1, EINVAL, "/dev/hxa IOCMD_PORT_GET_STATS instance 0: buffer of 1 bytes, must be 304"},
     {"/dev/hxa", 0xC060BA02,   64,   1, EINVAL, "/dev/hxa IOCMD_FCPT instance 0: needs a nexus: 1"},
+    {"/dev/hxa", 0xC0584329,    7, 128, EINVAL, "/dev/hxa IOCMD_AEN_GET instance 0: room for -2147483648 events"},
     // instances and applications that are not there
     {"/dev/hxa", 0xC178432D,    4,   2, ENODEV, "/dev/hxa IOCMD_PORT_GET_ATTR instance 2: no such instance"},
     {"/dev/hxn", 0xC178442D,    5,   1, ENODEV, "/dev/hxn IOCMD_PORT_GET_ATTR instance 256: no such instance"},
+    {"/dev/hxa", 0xC0584329,    0,   2, ENODEV, "/dev/hxa IOCMD_AEN_GET instance 2: no such instance"},
     {"/dev/hxa", 0xC058432A,    8,   5, EINVAL, "/dev/hxa IOCMD_AEN_SYNC: no such application: 5"},
+    {"/dev/hxa", 0xC0584329,    8,   5, EINVAL, "/dev/hxa IOCMD_AEN_GET instance 0: no such application: 5"},
 };
 // clang-format on
 
