@@ -4,6 +4,7 @@
 
 #include <libxml/parser.h>
 
+#include <cstddef>
 #include <cstdint>
 #include <memory>
 #include <mutex>
@@ -54,7 +55,7 @@ Xml_Element make_element(const xmlChar* name, const xmlChar* prefix, int num_att
     element.name = prefix ? std::string(chars(prefix)) + ":" + chars(name) : chars(name);
     for (int i = 0; i < num_attributes; ++i)
     {
-        const xmlChar** row = attributes + 5 * i; // name, prefix, URI, start and end of the value
+        const xmlChar** row = attributes + std::ptrdiff_t{5} * i; // name, prefix, URI, start and end of the value
         element.attributes.emplace_back(chars(row[0]), std::string(chars(row[3]), chars(row[4])));
     }
     return element;

@@ -203,8 +203,6 @@ def test_subscriptions_lead_from_filters_to_destinations_and_back(serve):
     for code, call in [
         (4, lambda: make(interop, "CIM_ListenerDestinationCIMXML", Name="x", PersistenceType="-1")),
         (4, lambda: interop.AssociatorNames(f, AssocClass="CIM_Nothing")),
-        (14, lambda: make(interop, "CIM_IndicationFilter", Name="x", Query=ALL, QueryLanguage="SQL")),
-        (15, lambda: make(interop, "CIM_IndicationFilter", Name="x", Query="SELECT * FROM TST_Box", QueryLanguage="WQL")),
         (6, lambda: interop.DeleteInstance(pywbem.CIMInstanceName(f.classname, {**f.keybindings, "Name": "x"}, namespace=f.namespace))),
         (7, lambda: make(interop, "CIM_ListenerDestination", Name="x")),
         (7, lambda: interop.ModifyInstance(pywbem.CIMInstance(f.classname, {"Query": ""}, path=f))),

@@ -145,13 +145,6 @@ def test_class_origins_are_told_when_asked_for(mixed):
         assert {port.properties["DeviceID"].class_origin for port in ports} == {origin}
 
 
-def test_class_names_are_compared_without_regard_to_case(mixed):
-    path = mixed.pywbem.EnumerateInstanceNames("zemlar_FCPORT")[0]
-    path.keybindings = {name.upper(): value for name, value in path.keybindings.items()}
-    path.classname = "zemlar_fcport"
-    assert mixed.pywbem.GetInstance(path)["PortNumber"] is not None
-
-
 GOOD = dict(zip(FC_PORT_KEYS, ["ZEMLAR_ComputerSystem", "nowhere", "ZEMLAR_FCPort", "0000000000000000"]))
 
 
