@@ -18,7 +18,8 @@ class SimulatedServer:
     def __init__(self, scenario="mixed", environment=None, options=None, module=None):
         """`options`, if any, replace --no-auth on the server's command line; `module` is served instead of the product's."""
         self.lines = []
-        self._listening = threading.Event()
+        self.port = None
+        self._started_or_ended = threading.Event()
         self._process = subprocess.Popen(
             [
                 *[ROOT / "script/server", "--scenario", scenario, "--port", "0"],
@@ -39,7 +40,8 @@ class SimulatedServer:
         for reader in self._readers:
             reader.start()
 
-        if not self._listening.wait(START_TIMEOUT):
+        self._started_or_ended.wait(START_TIMEOUT)
+        if self.port is None:
             self._process.kill()
             raise RuntimeError("the server did not start:\n" + "\n".join(self.lines))
 
@@ -50,7 +52,8 @@ class SimulatedServer:
             if listening:
                 self.port = int(listening[1])
                 self.url = f"http://127.0.0.1:{self.port}"
-                self._listening.set()
+                self._started_or_ended.set()
+        self._started_or_ended.set()
 
     @property
     def pid(self):
