@@ -33,6 +33,10 @@ MAY_INCLUDE = {
     "sim": ["hxal/records", "hxal/commands.h"],
 }
 
+# The floors inside a big folder: its sub-folder ("." is the folder itself): the sub-folders (or single files) of the same big
+# folder that it may include besides itself. A folder of this table has no sub-folder that stands in no row.
+FLOORS = {}
+
 
 def includes(folder):
     """(file, line number, included name) of every quoted include below a folder."""
@@ -53,6 +57,28 @@ def test_folder_includes_only_what_lies_below_it(folder):
         if not name.startswith(allowed)
     ]
     assert strays == []
+
+
+@pytest.mark.parametrize("folder", FLOORS)
+def test_floor_includes_only_floors_below_it(folder):
+    def floor(name):
+        return name.split("/")[0] if "/" in name else "."
+
+    strays = []
+    for path, number, name in includes(folder):
+        if not name.startswith(f"{folder}/"):
+            continue
+        here, there = str(path.relative_to(folder)), name.removeprefix(f"{folder}/")
+        allowed = [floor(here), *FLOORS[folder].get(floor(here), [])]
+        if floor(there) not in allowed and there not in allowed:
+            strays.append(f"{path}:{number} includes {name}")
+    assert strays == []
+
+
+@pytest.mark.parametrize("folder", FLOORS)
+def test_every_sub_folder_has_a_floor(folder):
+    sub_folders = {path.name for path in (ROOT / folder).iterdir() if path.is_dir()}
+    assert sub_folders - FLOORS[folder].keys() == set()
 
 
 def test_every_folder_of_the_table_exists_and_says_what_it_is():
