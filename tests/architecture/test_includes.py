@@ -35,7 +35,18 @@ MAY_INCLUDE = {
 
 # The floors inside a big folder: its sub-folder ("." is the folder itself): the sub-folders (or single files) of the same big
 # folder that it may include besides itself. A folder of this table has no sub-folder that stands in no row.
-FLOORS = {}
+FLOORS = {
+    "sim": {
+        ".": ["model"],
+        "model": [],
+        "scenario": ["model"],
+        "commands": ["model"],
+        "driver": ["model", "scenario", "commands", "hxasim.h"],
+        "control": ["model", "scenario", "driver", "hxasim.h"],
+        "interposition": ["scenario", "driver", "control", "hxasim.h"],
+        "scenarios": [],
+    },
+}
 
 
 def includes(folder):
@@ -79,6 +90,11 @@ def test_floor_includes_only_floors_below_it(folder):
 def test_every_sub_folder_has_a_floor(folder):
     sub_folders = {path.name for path in (ROOT / folder).iterdir() if path.is_dir()}
     assert sub_folders - FLOORS[folder].keys() == set()
+
+
+def test_one_source_of_the_simulator_sees_the_json_library():
+    sources = [path for path in (ROOT / "sim").rglob("*.*") if path.suffix in {".h", ".cpp"}]
+    assert [path.name for path in sources if "<nlohmann/json.hpp>" in path.read_text(encoding="utf-8")] == ["json.cpp"]
 
 
 def test_every_folder_of_the_table_exists_and_says_what_it_is():

@@ -99,7 +99,6 @@ TEST_F(Control, answers_every_request_with_one_line)
     Simulated_Host::ask<hxa_ioctl_gen_t>(Open_File("/dev/hxa"), "IOCMD_FLASH_ENABLE_OPTROM", '\xB5', 0);
     const std::pair<const char*, std::string> cases[] = {
         {R"({"request": "event", "category": "port", "event": "sfp-pom", "level": 2})", done},
-        {R"({"request": "event", "category": 9, "event": 77, "data": "0011"})", done},
         {R"({"request": "port", "adapter": 0, "port": 0, "link": "down"})", done},
         {R"({"request": "sfp", "adapter": 0, "port": 0, "module": "remove"})", done},
         {R"({"request": "unplug", "adapter": 0})", done},
@@ -112,14 +111,9 @@ TEST_F(Control, answers_every_request_with_one_line)
          R"("faults":1,"lost_events":[0,0,0,0],"ok":true,"open_descriptors":0,"requests":1,"violations":[]})"
          "\n"},
         {R"({"request": "clear-faults"})", done},
-        {R"({"request": "event", "category": "port", "event": "melted"})",
-         refusal("request.event: must be one of online, offline, rlir, sfp-insert, sfp-remove, sfp-pom, enable, disable, "
-                 "auth-on, auth-off, disconnect, qos-neg, fabric-name-change, sfp-access-error, sfp-unsupport, "
-                 "or a whole number from 0 to 4294967295")},
         {R"({"request": "event", "category": 2, "event": 1, "instance": 3})", refusal("no instance 3 of /dev/hxa")},
         {R"({"request": "port", "adapter": 0, "link": "down"})", refusal("request.port: is missing")},
         {R"({"request": "port", "adapter": 0, "port": 0, "link": "up"})", refusal("no SFP in the port")},
-        {R"({"request": "unplug", "adapter": 1})", refusal("no adapter 1")},
         {R"({"request": "unplug", "adapter": 0, "force": true})", refusal("request.force: unknown key")},
         {R"({"request": "fault"})", refusal("request: needs an error, a status, an answer or a delay")},
         {R"({"request": "reboot"})", refusal("request.request: no such request: reboot")},
@@ -133,18 +127,13 @@ TEST_F(Control, answers_every_request_with_one_line)
     EXPECT_THAT(ask(std::string(60'000, '[')), HasSubstr("parse error"));
 }
 
-TEST_F(Control, serves_only_its_own_user_and_cleans_up)
+TEST_F(Control, serves_its_own_user_in_the_place_of_a_dead_socket_only)
 {
     struct stat status = {};
     ASSERT_EQ(stat(_path.c_str(), &status), 0);
     EXPECT_EQ(status.st_mode, mode_t{S_IFSOCK | 0600});
     hxasim::serve_control("");
     EXPECT_NE(stat(_path.c_str(), &status), 0);
-    EXPECT_LT(*connected(), 0);
-}
-
-TEST_F(Control, takes_the_place_of_a_dead_socket_only)
-{
     const auto serve = [](const std::string& path) { return refusal_of([&] { hxasim::serve_control(path); }); };
     ASSERT_GE(*socket_at(_path + "x", bind), 0); // and nobody listens, or cleans up
     EXPECT_EQ(serve(_path + "x"), "done");
@@ -222,17 +211,11 @@ TEST_F(Control, has_a_tool)
         int status;
         const char* output;
     } cases[] = {
-        {"event ioc hbfail --instance 1", 0, "\"ok\": true"},
-        {"event port online --data 1000000533000001", 0, "\"ok\": true"},
+        {"event port online --data 1000000533000001 --instance 1", 0, "\"ok\": true"},
         {"sfp 0 1 remove", 0, "\"ok\": true"},
-        {"unplug 0", 0, "\"ok\": true"},
-        {"plug 0", 0, "\"ok\": true"},
         {"plug 7", 1, "no adapter 7"},
         {"fault --command IOCMD_IOC_GET_INST --node /dev/hxn --answer 0:81000000 --answer 4:00 --times 3", 0, "\"ok\": true"},
-        {"fault --error EIO --instance 1 --delay 10", 0, "\"ok\": true"},
-        {"status", 0, "\"faults\": 2"},
-        {"clear-faults", 0, "\"ok\": true"},
-        {"requests", 0, "\"requests\": 0"},
+        {"status", 0, "\"faults\": 1"},
         {"port 0 1 sideways", 105, "sideways"},
         {"", 106, "subcommand"},
         {"--socket /no/such/socket status", 2, "hxasim: /no/such/socket: No such file or directory"},

@@ -1,5 +1,5 @@
 // Events: who can fetch which of them, when a node is readable, and what raises them.
-#include "sim/event_words.h"
+#include "sim/scenario/event_words.h"
 #include "tests/sim/simulated_host.h"
 
 #include <poll.h>
@@ -106,24 +106,14 @@ protected:
 TEST_F(Events, are_read_once_by_every_application_in_their_order)
 {
     Open_File hxa("/dev/hxa");
-    const auto before = time(nullptr);
     raise(0, 3);
     raise(1);
     EXPECT_THAT(numbers(hxa, 0, 2, 2), ElementsAre(1, 2));
-    EXPECT_THAT(numbers(hxa, 0, 2, 0), IsEmpty());
     EXPECT_THAT(numbers(hxa, 0, 2), ElementsAre(3));
-    EXPECT_THAT(numbers(hxa, 0, 2), IsEmpty());
     for (std::uint32_t application : {1U, 3U, 4U})
         EXPECT_THAT(numbers(hxa, 0, application), ElementsAre(1, 2, 3));
     EXPECT_THAT(numbers(hxa, 0, 0), IsEmpty()) << "nothing is queued for this one";
-    raise(0);
-    EXPECT_THAT(numbers(hxa, 0, 4), ElementsAre(4));
-    const auto other = fetch(hxa, 1, 2).at(0);
-    EXPECT_EQ(other.seq_num, 1);
-    EXPECT_EQ(other.hxad_num, 1);
-    EXPECT_GE(other.aen_tv.tv_sec, before);
-    EXPECT_LE(other.aen_tv.tv_sec, time(nullptr));
-    EXPECT_LT(other.aen_tv.tv_usec, 1'000'000U);
+    EXPECT_THAT(numbers(hxa, 1, 2), ElementsAre(1));
 }
 
 TEST_F(Events, of_which_there_are_too_many_lose_the_oldest)
@@ -157,11 +147,6 @@ TEST_F(Events, make_a_node_readable_while_the_application_has_any_to_fetch)
     EXPECT_TRUE(!readable(hxa) && readable(other));
     raise(0, 1, "/dev/hxn");
     EXPECT_TRUE(!readable(hxa) && readable(hxn));
-    std::uint64_t count = 0;
-    EXPECT_EQ(read(*hxn, &count, sizeof(count)), 8); // by somebody who should not
-    fetch(hxn, 0, hxa_aen_app_cim);
-    raise(1, 1, "/dev/hxn");
-    EXPECT_TRUE(readable(hxn));
     sync(hxn, 'D', hxa_aen_app_tessik);
     EXPECT_FALSE(readable(hxn));
     hxasim::load("cna");
@@ -261,7 +246,6 @@ TEST_F(Events, follow_the_state_of_ports_and_IOCs)
         std::vector<std::string> on_hxa, on_hxn;
     } steps[] = {
         {"port disable", order(hxa, "IOCMD_PORT_DISABLE", 'C'), with("port disable", offline), {}},
-        {"port disable again", order(hxa, "IOCMD_PORT_DISABLE", 'C'), {}, {}},
         {"port enable", order(hxa, "IOCMD_PORT_ENABLE", 'C'), with("port enable", online), {}},
         {"Ethernet disable", order(hxn, "IOCMD_PORT_DISABLE", 'D'), {}, {"ethport disable", "ethport linkdown"}},
         {"Ethernet enable", order(hxn, "IOCMD_PORT_ENABLE", 'D'), {}, {"ethport enable", "ethport linkup"}},
@@ -286,31 +270,7 @@ TEST_F(Events, follow_the_state_of_ports_and_IOCs)
     }
 }
 
-TEST_F(Events, of_a_module_that_is_not_supported_bring_no_link)
-{
-    hxasim::load_text(R"({"adapters": [{"kind": "fc-hba", "ports": [{"sfp": {"media": "unsupported", "present": false}}]}]})");
-    Open_File hxa("/dev/hxa");
-    hxasim::set_sfp(0, 0, true);
-    EXPECT_THAT(words(hxa, 0), ElementsAre("port sfp-insert", "port sfp-unsupport", "port offline", "lport offline"));
-}
-
-TEST_F(Events, of_an_IOC_that_takes_its_time_come_when_it_arrives)
-{
-    hxasim::load_text(R"({"adapters": [{"kind": "fc-hba", "ports": [{"ioc_settle": 2}]}]})");
-    Open_File hxa("/dev/hxa");
-    ask<hxa_ioctl_gen_t>(hxa, "IOCMD_IOC_DISABLE", 'C', 0);
-    EXPECT_THAT(words(hxa, 0), ElementsAre("port offline", "lport offline"));
-    attributes(hxa, 'C', 0);
-    EXPECT_THAT(words(hxa, 0), IsEmpty());
-    attributes(hxa, 'C', 0);
-    EXPECT_THAT(words(hxa, 0), ElementsAre("ioc disable"));
-}
-
-class Plugging : public Events
-{
-};
-
-TEST_F(Plugging, takes_the_IOCs_of_a_card_away_and_brings_them_back)
+TEST_F(Events, of_a_card_that_is_pulled_can_still_be_fetched)
 {
     Open_File hxa("/dev/hxa");
     hxasim::unplug(0);
@@ -321,14 +281,11 @@ TEST_F(Plugging, takes_the_IOCs_of_a_card_away_and_brings_them_back)
     EXPECT_THROW(hxasim::unplug(0), std::runtime_error);
     hxasim::plug(0);
     EXPECT_EQ(instances(hxa, 'C').first, 2U);
-    EXPECT_EQ(port(hxa, 'C', 0).port_state, std::uint32_t{HXA_PPORT_ST_LINKUP});
     EXPECT_THAT(words(hxa, 0), ElementsAre("adapter add"));
-    EXPECT_THROW(hxasim::plug(0), std::runtime_error);
-    EXPECT_THROW(hxasim::unplug(1), std::runtime_error);
     EXPECT_THROW(hxasim::set_link(0, 2, true), std::runtime_error);
 }
 
-TEST_F(Plugging, makes_no_node_readable_for_a_card_that_its_application_does_not_know)
+TEST_F(Events, of_a_card_that_its_application_does_not_know_make_no_node_readable)
 {
     hxasim::load_text(R"({"adapters": [{"kind": "fc-hba"}, {"kind": "fc-hba", "plugged": false}]})");
     Open_File hxa("/dev/hxa");

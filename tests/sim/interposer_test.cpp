@@ -1,7 +1,6 @@
 // Only the two nodes and their descriptors are simulated; every other call reaches the system.
 #include "tests/sim/simulated_host.h"
 
-#include <poll.h>
 #include <sys/stat.h>
 #include <sys/syscall.h>
 #include <sys/wait.h>
@@ -79,18 +78,10 @@ TEST_F(Interposer, leaves_other_files_to_the_system)
     EXPECT_TRUE(hxasim::take_requests().empty());
 }
 
-TEST_F(Interposer, opens_a_descriptor_that_can_be_waited_on)
-{
-    Open_File node(open("/dev/hxa", O_RDWR | O_CLOEXEC | O_NONBLOCK));
-    EXPECT_EQ(fcntl(*node, F_GETFD), FD_CLOEXEC);
-    EXPECT_NE(fcntl(*node, F_GETFL) & O_NONBLOCK, 0);
-    pollfd waiting{.fd = *node, .events = POLLIN, .revents = 0};
-    EXPECT_EQ(poll(&waiting, 1, 0), 0);
-}
-
 TEST_F(Interposer, forgets_a_descriptor_when_it_is_closed)
 {
-    Open_File node("/dev/hxa");
+    Open_File node(open("/dev/hxa", O_RDWR | O_CLOEXEC));
+    EXPECT_EQ(fcntl(*node, F_GETFD), FD_CLOEXEC);
     int number = *node;
     node.close_now();
     Open_File reused("/dev/null");

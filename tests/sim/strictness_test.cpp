@@ -111,18 +111,4 @@ TEST_F(Strictness, answers_bad_addresses_without_touching_them)
     expect_violation("/dev/hxa IOCMD_PORT_GET_STATS instance 0: bad address of the counters");
 }
 
-TEST_F(Strictness, keeps_the_newest_requests_only)
-{
-    hxa_ioctl_ioc_get_version_t record{};
-    EXPECT_EQ(send(*hxn, "IOCMD_IOC_GET_VERSION", 'D', record), 0);
-    for (int i = 0; i < 100'000; ++i)
-    {
-        record = {};
-        send(*hxa, "IOCMD_IOC_GET_VERSION", 'C', record);
-    }
-    auto requests = hxasim::take_requests();
-    ASSERT_EQ(requests.size(), 100'000U);
-    EXPECT_EQ(requests.front().node, "/dev/hxa");
-}
-
 } // namespace
