@@ -1,8 +1,9 @@
 #include "inventory/adapter_helper.h"
 
+#include "inventory/builder.h"
 #include "inventory/cim_values.h"
-#include "inventory/property_text.h"
-#include "inventory/provider_util.h"
+#include "inventory/hba_reading.h"
+#include "inventory/port_controller.h"
 #include "runtime/log.h"
 #include "runtime/trace.h"
 
@@ -14,25 +15,29 @@ namespace
 
 constexpr const char* log_source = "AdapterHelper";
 
-const char* display_name(const _hbaInfo& info) { return info.is_cna ? "Zemlar CNA" : "Zemlar FC HBA"; }
+constexpr Walk_Row walk = {
+    .log_source = log_source,
+    .iocs = Iocs::of_card,
+    .count = {LL_INFO, "Number of Adapters: %d"},
+    .none = {LL_INFO, "No adapters in the system!"},
+    .not_opened = {LL_INFO, "Unable to open handle to Adapter id %d"},
+    .kind = {LL_INFO, "Adapter Type : %s"},
+    .no_ports = {LL_WARN, "There are no ports associated to Adapter id %d"},
+    .no_ethernet = {LL_WARN, "hxal_adapter_get_ethioc failed for adapter Index: %d"},
+    .no_fc = {LL_WARN, "hxal_adapter_get_fcioc failed for adapter Index: %d"},
+    .no_ioc = {LL_WARN, "no ioc retrieved for adapter Index: %d"},
+};
 
-sint32 adapter_state(int index)
+void append_controller(Instance_Array& instances, Hba_Reading& reading)
 {
-    return hxal_adapter_is_disabled(index) ? OPERATIONAL_STATUS_STOPPED : OPERATIONAL_STATUS_IN_SERVICE;
+    const bool is_disabled = hxal_adapter_is_disabled(reading.port.adapter) != HXA_FALSE;
+    reading.info.adapter_state = is_disabled ? OPERATIONAL_STATUS_STOPPED : OPERATIONAL_STATUS_IN_SERVICE;
+    instances.adopt(Ref<Instance>(getPortControllerInstance(reading.info).steal()));
 }
 
-void append(Instance_Array& instances, classId_t id, int index, _hbaInfo& info)
-{
-    switch (id)
-    {
-    case CLASSID_PortController:
-        info.adapter_state = adapter_state(index);
-        instances.adopt(Ref<Instance>(AdapterHelper::getPortControllerInstance(info).steal()));
-        break;
-    default:
-        ZMLR_LOG(LL_INFO, "Default case . Other classes ");
-    }
-}
+constexpr Builder<Hba_Reading> builders[] = {
+    {CLASSID_PortController, append_controller},
+};
 
 } // namespace
 
@@ -42,54 +47,24 @@ const AdapterHelper& AdapterHelper::getAdapterHelperInstance()
     return helper;
 }
 
-Instance_Array AdapterHelper::getInstancesByClass(classId_t id) const
+Instance_Array AdapterHelper::getInstancesByClass(classId_t id, const Inventory_Request& request) const
 {
     const Scope_Trace trace(log_source);
     Instance_Array instances;
-    const int adapters = static_cast<int>(hxal_adapter_get_num());
-    ZMLR_LOG(LL_INFO, "Number of Adapters: %d", adapters);
-    if (adapters == 0)
-    {
-        ZMLR_LOG(LL_INFO, "No adapters in the system!");
+    Adapter_Walk adapters(walk);
+    if (adapters.count() == 0)
         return instances;
-    }
 
-    char host[sizeof(_hbaInfo::host)] = {};
-    ProviderUtil::getHostInfo(host, sizeof host - 1);
-    for (int index = 1; index <= adapters; index++)
+    while (adapters.next())
     {
-        std::optional<_hbaInfo> info = read_hba_info(index);
-        if (!info)
+        std::optional<Open_Port> port = open_port(walk, adapters.adapter(), 0);
+        if (!port)
             continue;
-        copy_text(info->host, host);
-        append(instances, id, index, *info);
+        if (std::optional<Hba_Reading> reading = read_hba(adapters.adapter(), std::move(*port), request))
+            build(instances, builders, id, *reading, log_source, "Default case . Other classes ");
     }
     ZMLR_LOG(LL_INFO, "Number of instances: %d", static_cast<int>(instances.size()));
     return instances;
-}
-
-Ref<ZEMLAR_PortController> AdapterHelper::getPortControllerInstance(const _hbaInfo& info)
-{
-    const Scope_Trace trace(log_source);
-    const bool in_service = info.adapter_state == OPERATIONAL_STATUS_IN_SERVICE;
-    const String serial_number = property_text(info.serial_number);
-
-    Ref<ZEMLAR_PortController> controller(ZEMLAR_PortController::create());
-    controller->CreationClassName.set(ProviderUtil::getClassName(CLASSID_PortController));
-    controller->SystemCreationClassName.set(ProviderUtil::getClassName(CLASSID_ComputerSystem));
-    controller->SystemName.set(property_text(info.host));
-    controller->DeviceID.set(info.address());
-    controller->Name.set(serial_number);
-    controller->ElementName.set(serial_number);
-    controller->Caption.set(display_name(info));
-    controller->Description.set(display_name(info));
-    controller->OperationalStatus.set({static_cast<uint16>(info.adapter_state)});
-    controller->StatusDescriptions.set({in_service ? "The adapter is in service" : "The adapter is disabled"});
-    controller->EnabledState.set(in_service ? ENABLED_STATE_ENABLED : ENABLED_STATE_DISABLED);
-    controller->ControllerType.set(info.is_cna ? CONTROLLER_TYPE_OTHER : CONTROLLER_TYPE_FC);
-    if (info.is_cna)
-        controller->OtherControllerType.set("CNA - FC and Ethernet types");
-    return controller;
 }
 
 } // namespace zmlr

@@ -2,9 +2,8 @@
 #pragma once
 
 #include "inventory/class_id.h"
-#include "inventory/hba_info.h"
+#include "inventory/inventory_request.h"
 #include "runtime/instance.h"
-#include "schema/ZEMLAR_PortController.h"
 
 namespace zmlr
 {
@@ -16,10 +15,7 @@ public:
 
     // The class's instances over all adapters, in their order. Reads the adapters afresh; one that cannot be read is skipped
     // with a log line.
-    Instance_Array getInstancesByClass(classId_t id) const;
-
-    // The adapter's controller, from a complete record.
-    static Ref<ZEMLAR_PortController> getPortControllerInstance(const _hbaInfo& info);
+    Instance_Array getInstancesByClass(classId_t id, const Inventory_Request& request = {}) const;
 
 private:
     AdapterHelper() = default;

@@ -1,6 +1,9 @@
-#include "inventory/hba_info.h"
+#include "inventory/adapter_lookup.h"
+
+#include "inventory/adapter_walk.h"
+#include "inventory/address_text.h"
+#include "inventory/hba_reading.h"
 #include "inventory/property_text.h"
-#include "inventory/provider_util.h"
 #include "runtime/log.h"
 #include "runtime/trace.h"
 
@@ -12,15 +15,29 @@ namespace
 
 constexpr const char* log_source = "ProviderUtil";
 
-int adapter_count() { return static_cast<int>(hxal_adapter_get_num()); }
+constexpr Walk_Line not_opened = {LL_ERR, "Unable to open handle to Adapter id %d"};
 
-hxal_adapter_t* open_adapter(int adapter)
+constexpr Walk_Row port_0_of_card = {.log_source = log_source, .iocs = Iocs::of_card, .not_opened = not_opened};
+
+constexpr Walk_Row first_ioc = {.log_source = log_source, .iocs = Iocs::any, .not_opened = not_opened};
+
+constexpr Walk_Row first_answer = {.log_source = log_source, .iocs = Iocs::any, .none = {LL_WARN, "No adapters in the system!"}};
+
+constexpr Walk_Row by_address(Iocs iocs)
 {
-    hxal_adapter_t* opened = hxal_adapter_open_idx(adapter);
-    if (!opened)
-        ZMLR_LOG(LL_ERR, "Unable to open handle to Adapter id %d", adapter);
-    return opened;
+    return {
+        .log_source = log_source,
+        .iocs = iocs,
+        .ends_at_unopened = true,
+        .none = {LL_WARN, "No adapters in the system!"},
+        .not_opened = not_opened,
+        .no_ports = {LL_WARN, "Number of ports in adapter %d = %d"},
+        .no_ports_remark = {LL_WARN, "Continuing with the next adapter"},
+    };
 }
+
+constexpr Walk_Row by_wwn = by_address(Iocs::fc);
+constexpr Walk_Row by_mac = by_address(Iocs::ethernet);
 
 bool parse_mac(const String& text, mac_t& mac) { return ProviderUtil::getRawMacFromStr(text.c_str(), mac.mac); }
 
@@ -45,15 +62,18 @@ bool has_mac(hxal_t* ethernet, const String& address)
     return address.equali(text);
 }
 
-hxal_t* find_port(hxal_adapter_t* adapter, int ports, const String& address, bool is_wwn)
+bool read_attributes(hxal_t* ioc, hxa_ioc_attr_t& attributes)
 {
-    for (int port = 0; port < ports; port++)
-    {
-        hxal_t* ioc = is_wwn ? hxal_adapter_get_fcioc(adapter, port) : hxal_adapter_get_ethioc(adapter, port);
-        if (ioc && (is_wwn ? has_wwn(ioc, address) : has_mac(ioc, address)))
-            return ioc;
-    }
-    return nullptr;
+    attributes = {};
+    return ioc && hxal_ioc_get_attr(ioc, &attributes) == HXA_STATUS_OK;
+}
+
+String version_in(const hxa_ioc_attr_t& attributes)
+{
+    char version[sizeof attributes.driver_attr.driver_ver];
+    copy_text(version, attributes.driver_attr.driver_ver);
+    ProviderUtil::trimString(version, version);
+    return property_text(version);
 }
 
 } // namespace
@@ -95,71 +115,60 @@ int ProviderUtil::getAdapterId(const String& address)
     }
 }
 
-String ProviderUtil::getAddrByAdapterId(int adapter)
+String ProviderUtil::getAddrByAdapterId(int index)
 {
     const Scope_Trace trace(log_source);
-    const hxal_adapter_t* opened = open_adapter(adapter);
-    const bool is_cna = hxal_adapter_is_cna_capable(adapter) != HXA_FALSE;
-    const hxal_t* fc = hxal_adapter_get_fcioc(opened, 0);
-    const hxal_t* ethernet = is_cna ? hxal_adapter_get_ethioc(opened, 0) : nullptr;
-    if (!fc && !ethernet)
+    const std::optional<Open_Adapter> adapter = open_adapter(port_0_of_card, index);
+    const std::optional<Open_Port> port = adapter ? open_port(port_0_of_card, *adapter, 0) : std::nullopt;
+    if (!port)
         return String();
 
     char text[wwn_text_size];
-    if (is_cna)
+    if (adapter->is_cna)
     {
-        const mac_t mac = read_cna_mac(fc, ethernet);
+        const mac_t mac = read_cna_mac(port->fc.get(), port->ethernet.get());
         MAC2str(text, &mac);
     }
     else
     {
-        const wwn_t wwn = hxal_ioc_get_nwwn(fc);
+        const wwn_t wwn = hxal_ioc_get_nwwn(port->fc.get());
         WWN2str(text, &wwn);
     }
     return text;
 }
 
-hxal_t* ProviderUtil::getHxalHandlerByAdapterId(int adapter)
+hxal_t* ProviderUtil::getHxalHandlerByAdapterId(int index)
 {
     const Scope_Trace trace(log_source);
-    if (adapter < 0 || adapter > adapter_count())
+    if (index < 0 || index > static_cast<int>(hxal_adapter_get_num()))
     {
         ZMLR_LOG(LL_ERR, "Invalid adapter id.");
         return nullptr;
     }
-    hxal_adapter_t* opened = open_adapter(adapter);
-    const int ports = opened ? hxal_adapter_get_num_port(adapter) : 0;
-    for (int port = 0; port < ports; port++)
-    {
-        if (hxal_t* ethernet = hxal_adapter_get_ethioc(opened, port))
-            return ethernet;
-        if (hxal_t* fc = hxal_adapter_get_fcioc(opened, port))
-            return fc;
-    }
-    return nullptr;
+    const std::optional<Open_Adapter> adapter = open_adapter(first_ioc, index);
+    if (!adapter)
+        return nullptr;
+    Port_Walk ports(first_ioc, *adapter);
+    if (!ports.next())
+        return nullptr;
+    Open_Port& port = ports.port();
+    return port.ethernet ? port.ethernet.release() : port.fc.release();
 }
 
 hxal_t* ProviderUtil::getHxalHandlerByPortAddress(const String& address, bool is_wwn)
 {
     const Scope_Trace trace(log_source);
-    const int adapters = adapter_count();
-    if (adapters == 0)
-        ZMLR_LOG(LL_WARN, "No adapters in the system!");
-
-    for (int index = 1; index <= adapters; index++)
+    const Walk_Row& row = is_wwn ? by_wwn : by_mac;
+    for (Adapter_Walk adapters(row); adapters.next();)
     {
-        hxal_adapter_t* adapter = open_adapter(index);
-        if (!adapter)
-            return nullptr;
-
-        const int ports = hxal_adapter_get_num_port(index);
-        if (ports <= 0)
+        for (Port_Walk ports(row, adapters.adapter()); ports.next();)
         {
-            ZMLR_LOG(LL_WARN, "Number of ports in adapter %d = %d", index, ports);
-            ZMLR_LOG(LL_WARN, "Continuing with the next adapter");
+            Open_Port& port = ports.port();
+            if (is_wwn && has_wwn(port.fc.get(), address))
+                return port.fc.release();
+            if (!is_wwn && has_mac(port.ethernet.get(), address))
+                return port.ethernet.release();
         }
-        else if (hxal_t* ioc = find_port(adapter, ports, address, is_wwn))
-            return ioc;
     }
     return nullptr;
 }
@@ -171,6 +180,21 @@ String ProviderUtil::getEthDeviceNameByMAC(const String& mac)
     const int index = parse_mac(mac, raw) ? hxal_ioc_get_idx_by_mac(raw) : -1;
     hxal_t* ioc = index >= 0 ? hxal_ioc_open_idx(index) : nullptr;
     return ioc ? property_text(hxal_ioc_get_eth_name(ioc), sizeof ioc->eth_name) : String();
+}
+
+String ProviderUtil::getDriverVersion()
+{
+    const Scope_Trace trace(log_source);
+    for (Adapter_Walk adapters(first_answer); adapters.next();)
+    {
+        for (Port_Walk ports(first_answer, adapters.adapter()); ports.next();)
+        {
+            hxa_ioc_attr_t attributes;
+            if (read_attributes(ports.port().ethernet.get(), attributes) || read_attributes(ports.port().fc.get(), attributes))
+                return version_in(attributes);
+        }
+    }
+    return String();
 }
 
 } // namespace zmlr

@@ -1,4 +1,5 @@
-#include "inventory/provider_util.h"
+#include "inventory/address_text.h"
+
 #include "runtime/log.h"
 #include "runtime/trace.h"
 

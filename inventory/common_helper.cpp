@@ -5,6 +5,7 @@
 #include "inventory/provider_util.h"
 #include "runtime/log.h"
 #include "runtime/trace.h"
+#include "schema/ZEMLAR_ComputerSystem.h"
 
 namespace zmlr
 {
@@ -51,18 +52,16 @@ const CommonHelper& CommonHelper::getCommonHelperObject()
     return helper;
 }
 
-Instance_Array CommonHelper::getComputerSystemInstances(classId_t id) const
+Instance_Array CommonHelper::getComputerSystemInstances(classId_t id, const Inventory_Request& request) const
 {
     const Scope_Trace trace(log_source);
     const String description = "The host with Zemlar's adapters installed.";
-    char buffer[256] = {};
-    const Host_Info info = ProviderUtil::getHostInfo(buffer, sizeof buffer - 1);
-    const String host = property_text(buffer);
+    const String host = property_text(request.host.text());
 
     Ref<ZEMLAR_ComputerSystem> system(ZEMLAR_ComputerSystem::create());
     system->Name.set(host);
     system->CreationClassName.set(ProviderUtil::getClassName(id));
-    identify(*system.ptr(), host, info);
+    identify(*system.ptr(), host, request.host.info());
     system->ElementName.set(description);
     system->Description.set(description);
     system->Caption.set(description);

@@ -2,8 +2,8 @@
 #pragma once
 
 #include "inventory/class_id.h"
+#include "inventory/inventory_request.h"
 #include "runtime/instance.h"
-#include "schema/ZEMLAR_ComputerSystem.h"
 
 namespace zmlr
 {
@@ -14,7 +14,7 @@ public:
     static const CommonHelper& getCommonHelperObject();
 
     // Exactly one ZEMLAR_ComputerSystem, with or without a driver; its CreationClassName is the name of `id`.
-    Instance_Array getComputerSystemInstances(classId_t id) const;
+    Instance_Array getComputerSystemInstances(classId_t id, const Inventory_Request& request = {}) const;
 
 private:
     CommonHelper() = default;

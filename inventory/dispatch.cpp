@@ -9,7 +9,7 @@
 namespace zmlr
 {
 
-Instance_Array dispatch(const char* log_source, std::span<const Route> routes, classId_t id)
+Instance_Array dispatch(const char* log_source, std::span<const Route> routes, classId_t id, const Inventory_Request& request)
 {
     const Scope_Trace trace(log_source, "getInstances");
     ZMLR_LOG(LL_INFO, "Requested classId : %d", static_cast<int>(id));
@@ -22,12 +22,12 @@ Instance_Array dispatch(const char* log_source, std::span<const Route> routes, c
         ZMLR_LOG(LL_INFO, "Requested class is NOT supported.");
         return Instance_Array();
     }
-    if (route->gate == Gate::checked && !gate_open)
+    if (route->driver == Driver::needed && !gate_open)
     {
         ZMLR_LOG(LL_ERR, "Driver is not installed or there is a hxal mismatch hence no instances returned");
         return Instance_Array();
     }
-    return route->build ? route->build(id) : Instance_Array();
+    return route->build ? route->build(id, request) : Instance_Array();
 }
 
 } // namespace zmlr

@@ -2,6 +2,7 @@
 #pragma once
 
 #include "inventory/class_id.h"
+#include "inventory/inventory_request.h"
 #include "runtime/instance.h"
 
 #include <span>
@@ -9,11 +10,11 @@
 namespace zmlr
 {
 
-// Whether a class is served while the driver gate is closed.
-enum class Gate
+// Whether a class has instances while the driver gate is closed.
+enum class Driver
 {
-    checked,
-    open
+    needed,
+    not_needed
 };
 
 // The classes first to last (both included) and their builder; null while nothing builds them: they have no instances then.
@@ -21,12 +22,12 @@ struct Route
 {
     classId_t first;
     classId_t last;
-    Gate gate;
-    Instance_Array (*build)(classId_t id);
+    Driver driver;
+    Instance_Array (*build)(classId_t id, const Inventory_Request& request);
 };
 
 // The instances of the class by the first route that holds it. Empty, with a log line of the manager named `log_source`, when
 // the gate is closed or no route holds the class.
-Instance_Array dispatch(const char* log_source, std::span<const Route> routes, classId_t id);
+Instance_Array dispatch(const char* log_source, std::span<const Route> routes, classId_t id, const Inventory_Request& request);
 
 } // namespace zmlr

@@ -4,6 +4,7 @@
 #include "inventory/common_helper.h"
 #include "inventory/dispatch.h"
 #include "inventory/port_helper.h"
+#include "inventory/served_above.h"
 #include "runtime/log.h"
 #include "runtime/trace.h"
 
@@ -15,25 +16,37 @@ namespace
 
 constexpr const char* log_source = "FCHBAManager";
 
-Instance_Array common(classId_t id) { return CommonHelper::getCommonHelperObject().getComputerSystemInstances(id); }
-Instance_Array adapter(classId_t id) { return AdapterHelper::getAdapterHelperInstance().getInstancesByClass(id); }
-Instance_Array port(classId_t id) { return PortHelper::getPortHelperObject().getInstancesByClass(id); }
+Instance_Array common(classId_t id, const Inventory_Request& request)
+{
+    return CommonHelper::getCommonHelperObject().getComputerSystemInstances(id, request);
+}
+
+Instance_Array adapter(classId_t id, const Inventory_Request& request)
+{
+    return AdapterHelper::getAdapterHelperInstance().getInstancesByClass(id, request);
+}
+
+Instance_Array port(classId_t id, const Inventory_Request& request)
+{
+    return PortHelper::getPortHelperObject().getInstancesByClass(id, request);
+}
 
 // clang-format off
 constexpr Route routes[] = {
-    {CLASSID_ComputerSystem,                 CLASSID_ComputerSystem,                             Gate::open,    common},
-    {CLASSID_PortController,                 CLASSID_PortController,                             Gate::checked, adapter},
-    {CLASSID_FCPort,                         CLASSID_FCPort,                                     Gate::checked, port},
-    {CLASSID_SCSIProtocolEndpoint,           CLASSID_AdapterSoftwareIdentity,                    Gate::checked, nullptr},
-    {CLASSID_RemoteServiceAccessPoint,       CLASSID_RemoteServiceAccessPoint,                   Gate::open,    nullptr},
-    {CLASSID_HBASoftwareInstallationService, CLASSID_HBASoftwareInstallationServiceCapabilities, Gate::checked, nullptr},
-    {CLASSID_EthernetPort,                   CLASSID_EthernetPort,                               Gate::checked, nullptr},
-    {CLASSID_MemoryDiagnosticTest,           CLASSID_DiagnosticCompletionRecord,                 Gate::checked, nullptr},
-    {CLASSID_LogicalPortGroup,               CLASSID_LogicalPortGroup,                           Gate::checked, nullptr},
-    {CLASSID_AffectedJobElement,             CLASSID_CompletionRecordAppliesToElement,           Gate::checked, nullptr},
-    {CLASSID_LANEndpoint,                    CLASSID_LANEndpoint,                                Gate::checked, nullptr},
-    {CLASSID_PhysicalConnector,              CLASSID_PhysicalConnector,                          Gate::checked, nullptr},
-    {CLASSID_AlarmDevice,                    CLASSID_AlarmDevice,                                Gate::checked, nullptr},
+    {CLASSID_ComputerSystem,                  CLASSID_ComputerSystem,                              Driver::not_needed, common},
+    {CLASSID_PortController,                  CLASSID_PortController,                              Driver::needed,     adapter},
+    {CLASSID_FCPort,                          CLASSID_FCPort,                                      Driver::needed,     port},
+    {CLASSID_SCSIProtocolEndpoint,            CLASSID_FCPortStatistics,                            Driver::needed,     nullptr},
+    {CLASSID_PhysicalPackage,                 CLASSID_AdapterSoftwareIdentity,                     Driver::needed,     nullptr},
+    {CLASSID_RemoteServiceAccessPoint,        CLASSID_RemoteServiceAccessPoint,                    Driver::not_needed, nullptr},
+    {CLASSID_HBASoftwareInstallationService,  CLASSID_HBASoftwareInstallationServiceCapabilities,  Driver::needed,     nullptr},
+    {CLASSID_EthernetPort,                    CLASSID_EthernetPort,                                Driver::needed,     nullptr},
+    {CLASSID_MemoryDiagnosticTest,            CLASSID_DiagnosticCompletionRecord,                  Driver::needed,     diagnostic_instances},
+    {CLASSID_LogicalPortGroup,                CLASSID_LogicalPortGroup,                            Driver::needed,     nullptr},
+    {CLASSID_AffectedJobElement,              CLASSID_CompletionRecordAppliesToElement,            Driver::needed,     diagnostic_instances},
+    {CLASSID_LANEndpoint,                     CLASSID_LANEndpoint,                                 Driver::needed,     nullptr},
+    {CLASSID_PhysicalConnector,               CLASSID_PhysicalConnector,                           Driver::needed,     nullptr},
+    {CLASSID_AlarmDevice,                     CLASSID_AlarmDevice,                                 Driver::needed,     nullptr},
 };
 // clang-format on
 
@@ -47,12 +60,15 @@ const FCHBAManager& FCHBAManager::getFCHBAManager()
     return manager;
 }
 
-Instance_Array FCHBAManager::getInstances(classId_t id) const { return dispatch(log_source, routes, id); }
+Instance_Array FCHBAManager::getInstances(classId_t id, const Inventory_Request& request) const
+{
+    return dispatch(log_source, routes, id, request);
+}
 
-Instance_Array FCHBAManager::getFCPortInstancesByAdapter(const String& address) const
+Instance_Array FCHBAManager::getFCPortInstancesByAdapter(const String& address, const Inventory_Request& request) const
 {
     const Scope_Trace trace(log_source);
-    return PortHelper::getPortHelperObject().getFCPortInstancesByAdapter(address);
+    return PortHelper::getPortHelperObject().getFCPortInstancesByAdapter(address, request);
 }
 
 } // namespace zmlr

@@ -2,6 +2,7 @@
 #pragma once
 
 #include "inventory/class_id.h"
+#include "inventory/inventory_request.h"
 #include "runtime/instance.h"
 #include "runtime/string.h"
 
@@ -15,10 +16,10 @@ public:
 
     // All instances of the class, new objects that the caller owns. Empty when there are none, when the class needs the
     // adapters and the driver gate is closed, or when no helper builds the class.
-    Instance_Array getInstances(classId_t id) const;
+    Instance_Array getInstances(classId_t id, const Inventory_Request& request = {}) const;
 
     // The ZEMLAR_FCPort instances of the adapter with this MAC address or node WWN.
-    Instance_Array getFCPortInstancesByAdapter(const String& address) const;
+    Instance_Array getFCPortInstancesByAdapter(const String& address, const Inventory_Request& request = {}) const;
 
 private:
     FCHBAManager();

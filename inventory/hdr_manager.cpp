@@ -12,8 +12,8 @@ namespace
 constexpr const char* log_source = "HDRManager";
 
 constexpr Route routes[] = {
-    {CLASSID_StorageExtent, CLASSID_StorageExtent, Gate::checked, nullptr},
-    {CLASSID_TapeDrive, CLASSID_TapeDrive, Gate::checked, nullptr},
+    {CLASSID_StorageExtent, CLASSID_StorageExtent, Driver::needed, nullptr},
+    {CLASSID_TapeDrive, CLASSID_TapeDrive, Driver::needed, nullptr},
 };
 
 } // namespace
@@ -26,6 +26,9 @@ const HDRManager& HDRManager::getHDRManager()
     return manager;
 }
 
-Instance_Array HDRManager::getInstances(classId_t id) const { return dispatch(log_source, routes, id); }
+Instance_Array HDRManager::getInstances(classId_t id, const Inventory_Request& request) const
+{
+    return dispatch(log_source, routes, id, request);
+}
 
 } // namespace zmlr

@@ -2,6 +2,7 @@
 #pragma once
 
 #include "inventory/class_id.h"
+#include "inventory/inventory_request.h"
 #include "runtime/instance.h"
 
 namespace zmlr
@@ -13,7 +14,7 @@ public:
     static const HDRManager& getHDRManager();
 
     // All instances of ZEMLAR_StorageExtent or ZEMLAR_TapeDrive; as FCHBAManager::getInstances.
-    Instance_Array getInstances(classId_t id) const;
+    Instance_Array getInstances(classId_t id, const Inventory_Request& request = {}) const;
 
 private:
     HDRManager();

@@ -9,6 +9,7 @@ The MOF files are compiled in the given order. Below the output directory:
     providers/<Class>_Provider_Skeleton.h     per row of providers.def: what its provider derives from
     providers/skeletons.h                     all of them
     providers/skeletons.cpp                   default answers, method dispatch, provider procedures
+    providers/row_providers.cpp               the providers of the classes that are rows of a table
     cimserver/qualifier_table.cpp             Description, EmbeddedInstance, ValueMap and Values
 
 The same input gives the same bytes. A file is written only when its content changes; files of former classes go away.
@@ -58,6 +59,7 @@ def generate(mof, providers_file):
         files[f"providers/{provider.skeleton}.h"] = write_skeletons.skeleton_header(provider)
     files["providers/skeletons.h"] = write_skeletons.all_skeletons_header(providers)
     files["providers/skeletons.cpp"] = write_skeletons.skeleton_source(providers)
+    files["providers/row_providers.cpp"] = write_skeletons.row_providers_source(providers)
     files["cimserver/qualifier_table.cpp"] = write_qualifiers.qualifier_table_source(classes)
     return files
 

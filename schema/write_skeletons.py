@@ -12,6 +12,10 @@ _KINDS = {  # interfaces of providers.def: base class, procedure template
     "INDICATION": ("Indication_Provider", "indication_provider_proc"),
 }
 
+_ROW_PROVIDERS = {  # words of providers.def: the template that serves the class by its row of a table, and its header
+    "ENUMERATED": ("Enumerating_Provider", "providers/enumerating_provider.h"),
+}
+
 _PROC_PARAMETERS = "const Registration* registration, int operation, " + ", ".join(f"void* arg{i}" for i in range(8))
 _ROW = re.compile(r"^ZMLR_PROVIDER\(\s*(\w+)\s*,\s*(\w+)\s*,\s*(\w+)\s*\)", re.MULTILINE)
 
@@ -22,7 +26,7 @@ class Provider:
 
     cls: object
     interfaces: str
-    written: bool
+    state: str
 
     @property
     def skeleton(self):
@@ -44,9 +48,9 @@ def load_providers(file, classes):
     for name, interfaces, state in _ROW.findall(file.read_text(encoding="utf-8")):
         if name not in known:
             raise Model_Error(f"{file}: {name} is not declared in the MOF")
-        if interfaces not in _KINDS or state not in ("WRITTEN", "SKELETON"):
+        if interfaces not in _KINDS or state not in ("WRITTEN", "SKELETON", *_ROW_PROVIDERS):
             raise Model_Error(f"{file}: {name}: {interfaces}, {state}: unknown interfaces or provider state")
-        providers.append(Provider(known[name], interfaces, state == "WRITTEN"))
+        providers.append(Provider(known[name], interfaces, state))
     if not providers:
         raise Model_Error(f"{file}: no ZMLR_PROVIDER rows")
     return providers
@@ -82,6 +86,17 @@ def skeleton_source(providers):
     return BANNER + _includes(includes) + "\n" + in_name_space("zmlr", "\n\n".join(sections))
 
 
+def row_providers_source(providers):
+    bound = [(provider, *_ROW_PROVIDERS[provider.state]) for provider in providers if provider.state in _ROW_PROVIDERS]
+    includes = {"providers/skeletons.h", *(header for _, _, header in bound)}
+    functions = [
+        f"{provider.skeleton}* {provider.create}()\n{{\n"
+        f'    return new {template}<{provider.skeleton}>("{provider.cls.name}_Provider");\n}}'
+        for provider, template, _ in bound
+    ]
+    return BANNER + _includes(includes) + "\n" + in_name_space("zmlr", "\n\n".join(functions))
+
+
 def _includes(files):
     return "".join(f'#include "{file}"\n' for file in sorted(files))
 
@@ -114,7 +129,7 @@ def _definitions(provider):
         for method in cls.methods
     ]
     parts.append(_invoke(cls, skeleton))
-    if not provider.written:
+    if provider.state == "SKELETON":
         parts.append(f"{skeleton}* {provider.create}() {{ return new {skeleton}; }}")
     parts.append(_proc(provider))
     return "\n".join(parts)

@@ -1,5 +1,5 @@
+#include "inventory/adapter_lookup.h"
 #include "inventory/fchba_manager.h"
-#include "inventory/provider_util.h"
 #include "tests/inventory/inventory_fixture.h"
 
 #include <cerrno>

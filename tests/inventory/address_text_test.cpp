@@ -1,3 +1,4 @@
+#include "inventory/address_text.h"
 #include "inventory/class_id.h"
 #include "inventory/property_text.h"
 #include "inventory/provider_util.h"

@@ -1,5 +1,6 @@
 #include "inventory/fchba_manager.h"
 #include "inventory/port_helper.h"
+#include "inventory/port_states.h"
 #include "tests/inventory/inventory_fixture.h"
 
 #include <cerrno>
@@ -61,7 +62,7 @@ TEST_F(FC_Ports, have_the_states_and_types_of_the_driver)
 
     constexpr int types[][2] = {{0, 0}, {1, 0}, {2, 10}, {5, 10}, {6, 11}, {7, 0}, {20, 11}, {21, 10}, {22, 10}, {23, 0}};
     for (const auto [driver, cim] : types)
-        EXPECT_EQ(PortHelper::getPortType(static_cast<uint32>(driver)), cim) << driver;
+        EXPECT_EQ(getPortType(static_cast<uint32>(driver)), cim) << driver;
 }
 
 TEST_F(FC_Ports, have_what_a_hostile_driver_says)

@@ -1,4 +1,5 @@
 #include "inventory/fchba_manager.h"
+#include "inventory/host_text.h"
 #include "inventory/provider_util.h"
 #include "tests/inventory/inventory_fixture.h"
 
@@ -79,10 +80,9 @@ TEST_F(Host, has_paths_files_and_a_node_name)
     EXPECT_TRUE(ProviderUtil::IsFileExist("/"));
     EXPECT_FALSE(ProviderUtil::IsFileExist("/no/such/file"));
 
-    const ProviderUtil& util = ProviderUtil::getProviderUtil();
-    EXPECT_STREQ(util.getHostName().c_str(), "storage-host");
+    EXPECT_STREQ(ProviderUtil::getHostName().c_str(), "storage-host");
     fake_host.name.reset();
-    EXPECT_STREQ(util.getHostName().c_str(), "localhost");
+    EXPECT_STREQ(ProviderUtil::getHostName().c_str(), "localhost");
 }
 
 TEST_F(Host, is_one_computer_system)

@@ -1,5 +1,5 @@
 #include "hxal/hxal.h"
-#include "inventory/provider_util.h"
+#include "inventory/adapter_lookup.h"
 #include "tests/inventory/inventory_fixture.h"
 
 #include <cerrno>

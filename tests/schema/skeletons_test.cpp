@@ -8,8 +8,9 @@
 
 #include <gtest/gtest.h>
 
-// The classes whose provider a source of the module makes: here their skeletons serve.
+// The classes whose provider the module makes of a source or a row: here their skeletons serve.
 #define ZMLR_CREATE_SKELETON(class_name)
+#define ZMLR_CREATE_ENUMERATED(class_name) ZMLR_CREATE_WRITTEN(class_name)
 #define ZMLR_CREATE_WRITTEN(class_name)                                                                                          \
     class_name##_Provider_Skeleton* create_##class_name##_Provider() { return new class_name##_Provider_Skeleton; }
 #define ZMLR_PROVIDER(class_name, interfaces, state) ZMLR_CREATE_##state(class_name)

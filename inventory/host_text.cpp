@@ -1,10 +1,10 @@
-#include "inventory/provider_util.h"
+#include "inventory/host_text.h"
+
 #include "runtime/log.h"
 #include "runtime/trace.h"
 
 #include <arpa/inet.h>
 #include <netdb.h>
-#include <sys/stat.h>
 #include <sys/utsname.h>
 #include <unistd.h>
 
@@ -141,11 +141,12 @@ String ProviderUtil::updateNamespacePath(const String& path)
     return String("//") + host + "/root/zemlar:" + path;
 }
 
-bool ProviderUtil::IsFileExist(const char* path)
+const Host_Text& Host_Text::look_up() const
 {
-    const Scope_Trace trace(log_source);
-    struct stat status;
-    return stat(path, &status) == 0;
+    if (!_is_known)
+        _info = ProviderUtil::getHostInfo(_text, sizeof _text - 1);
+    _is_known = true;
+    return *this;
 }
 
 } // namespace zmlr

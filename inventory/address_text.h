@@ -1,0 +1,32 @@
+// Addresses as texts: a WWN is 16, a MAC address 12 upper-case hexadecimal digits without separators. Texts are compared without
+// regard to case.
+#pragma once
+
+#include "hxal/hxal.h"
+#include "runtime/string.h"
+
+#include <cstddef>
+
+namespace zmlr::ProviderUtil
+{
+
+// Room for an address text and its terminator.
+inline constexpr std::size_t wwn_text_size = 17;
+inline constexpr std::size_t mac_text_size = 13;
+
+// Write the text of an address to `out` (wwn_text_size or mac_text_size bytes). The bytes of a WWN count in memory order.
+void WWN2str(char* out, const wwn_t* wwn);
+void MAC2str(char* out, const mac_t* mac);
+
+// Read 16 (12) hexadecimal digits into the 8 (6) bytes at `out`; false, and zero bytes, when the text does not begin with
+// that many.
+bool getRawWWNFromStr(const char* text, unsigned char* out);
+bool getRawMacFromStr(const char* text, unsigned char* out);
+
+// The adapter's address in a ZEMLAR_PhysicalPackage tag, by the adapter's model; empty for a model that is not known.
+String getNodeMACOrWWNFromTag(const String& tag, const String& model);
+
+// Copies a text without leading and trailing blanks; `out` has as much room as `in` takes.
+void trimString(const char* in, char* out);
+
+} // namespace zmlr::ProviderUtil

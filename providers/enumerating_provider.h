@@ -1,0 +1,38 @@
+// The provider of every class that providers.def marks ENUMERATED: the generator binds the class's skeleton to it, and with it to
+// the row of enumerations.h that names the class. A class without a row does not compile.
+//
+// A provider that does more derives from it in a source of its own and is marked WRITTEN; its row stays.
+#pragma once
+
+#include "providers/delivery.h"
+#include "providers/enumerations.h"
+#include "providers/row_of.h"
+#include "runtime/trace.h"
+
+namespace zmlr
+{
+
+template <class Skeleton> class Enumerating_Provider : public Skeleton
+{
+public:
+    using Class = typename Skeleton::Class;
+
+    // The name by which the provider logs.
+    explicit Enumerating_Provider(const char* name) : _name(name) {}
+
+    // Always a success.
+    Enum_Instances_Status enum_instances(const Class*, Enum_Instances_Handler<Class>& handler) override
+    {
+        const Scope_Trace trace(_name, "enum_instances");
+        Instance_Array instances = instances_of(_row, _name);
+        deliver(instances, handler);
+        return ENUM_INSTANCES_OK;
+    }
+
+private:
+    static constexpr const Enumeration& _row = row_of(enumerations, Class::static_meta_class);
+
+    const char* _name;
+};
+
+} // namespace zmlr

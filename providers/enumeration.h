@@ -1,0 +1,35 @@
+// The row of a provider that only enumerates, and what all of them do with it.
+#pragma once
+
+#include "inventory/class_id.h"
+#include "inventory/inventory_request.h"
+#include "runtime/instance.h"
+#include "runtime/log.h"
+
+namespace zmlr
+{
+
+// The managers' way to the instances of a class.
+using Get_Instances = Instance_Array (*)(classId_t id, const Inventory_Request& request);
+Instance_Array fchba_manager(classId_t id, const Inventory_Request& request);
+Instance_Array hdr_manager(classId_t id, const Inventory_Request& request);
+
+// A line of the log; without a text there is none.
+struct Log_Row
+{
+    Log_Level level = LL_ERR;
+    const char* text = nullptr;
+};
+
+struct Enumeration
+{
+    const Meta_Class* meta_class;
+    Get_Instances get_instances;
+    classId_t id;
+    Log_Row empty[2]; // what is logged when there is no instance
+};
+
+// The row's instances; the provider named `log_source` logs whether there are any.
+Instance_Array instances_of(const Enumeration& row, const char* log_source);
+
+} // namespace zmlr
