@@ -2,7 +2,7 @@
 
 #include "hxal/internal/adapter_list.h"
 #include "hxal/internal/addresses.h"
-#include "hxal/internal/text.h"
+#include "hxal/internal/fixed_text.h"
 
 #include <algorithm>
 

@@ -1,10 +1,10 @@
 // The name of an adapter, which each of its two drivers keeps for itself.
 #include "hxal/adapter.h"
 #include "hxal/config/setters.h"
-#include "hxal/frame.h"
 #include "hxal/internal/addresses.h"
+#include "hxal/internal/fixed_text.h"
 #include "hxal/internal/request.h"
-#include "hxal/internal/text.h"
+#include "hxal/library.h"
 
 namespace
 {

@@ -1,10 +1,10 @@
 #include "hxal/adapter.h"
 #include "hxal/config/model.h"
-#include "hxal/frame.h"
 #include "hxal/internal/adapter_list.h"
 #include "hxal/internal/addresses.h"
+#include "hxal/internal/fixed_text.h"
 #include "hxal/internal/memory.h"
-#include "hxal/internal/text.h"
+#include "hxal/library.h"
 
 #include <algorithm>
 

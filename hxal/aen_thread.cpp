@@ -1,8 +1,8 @@
 #include "hxal/aen.h"
 
-#include "hxal/frame.h"
-#include "hxal/internal/aen_dispatch.h"
-#include "hxal/internal/frame.h"
+#include "hxal/internal/aen_kinds.h"
+#include "hxal/internal/application.h"
+#include "hxal/library.h"
 
 #include <algorithm>
 #include <atomic>

@@ -2,10 +2,10 @@
 
 #include "hxal/adapter.h"
 #include "hxal/flash.h"
-#include "hxal/frame.h"
 #include "hxal/internal/boot_archive.h"
 #include "hxal/internal/memory.h"
 #include "hxal/internal/option_rom.h"
+#include "hxal/library.h"
 
 #include <algorithm>
 #include <array>

@@ -1,9 +1,9 @@
 #include "hxal/flash.h"
 
-#include "hxal/frame.h"
 #include "hxal/internal/image.h"
 #include "hxal/internal/memory.h"
 #include "hxal/internal/request.h"
+#include "hxal/library.h"
 
 #include <algorithm>
 #include <array>

@@ -1,8 +1,8 @@
 #include "hxal/ioc.h"
 
 #include "hxal/internal/addresses.h"
+#include "hxal/internal/fixed_text.h"
 #include "hxal/internal/list.h"
-#include "hxal/internal/text.h"
 
 namespace
 {

@@ -1,6 +1,6 @@
 #include "hxal/config/setters.h"
+#include "hxal/internal/fixed_text.h"
 #include "hxal/internal/request.h"
-#include "hxal/internal/text.h"
 
 #include <cstdio>
 

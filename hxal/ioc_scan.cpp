@@ -1,10 +1,10 @@
 #include "hxal/config/model.h"
-#include "hxal/frame.h"
-#include "hxal/internal/frame.h"
+#include "hxal/internal/application.h"
+#include "hxal/internal/fixed_text.h"
 #include "hxal/internal/ioc_list.h"
 #include "hxal/internal/memory.h"
 #include "hxal/internal/request.h"
-#include "hxal/internal/text.h"
+#include "hxal/library.h"
 
 namespace
 {

@@ -1,7 +1,7 @@
 #include "hxal/port.h"
 
 #include "hxal/internal/request.h"
-#include "hxal/texts.h"
+#include "hxal/value_names.h"
 
 hxa_status_t hxal_port_get_attr(const hxal_t* ioc, hxa_pport_attr_t* attr)
 {

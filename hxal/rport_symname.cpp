@@ -1,5 +1,5 @@
 #include "hxal/fcpt.h"
-#include "hxal/internal/text.h"
+#include "hxal/internal/fixed_text.h"
 #include "hxal/lport.h"
 #include "hxal/rport.h"
 

@@ -1,7 +1,7 @@
 #include "hxal/statistics.h"
 
+#include "hxal/internal/fixed_text.h"
 #include "hxal/internal/lport_request.h"
-#include "hxal/internal/text.h"
 
 #include <bit>
 

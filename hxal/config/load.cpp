@@ -1,6 +1,6 @@
 // Opening and reading the file, which may be anything.
 #include "hxal/config/parser.h"
-#include "hxal/config/text.h"
+#include "hxal/config/syntax.h"
 
 #include <algorithm>
 #include <cstdio>

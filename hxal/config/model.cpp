@@ -3,9 +3,9 @@
 #include "hxal/adapter.h"
 #include "hxal/config/internal/settings.h"
 #include "hxal/config/internal/state.h"
-#include "hxal/config/internal/text.h"
+#include "hxal/config/internal/syntax.h"
 #include "hxal/internal/addresses.h"
-#include "hxal/internal/text.h"
+#include "hxal/internal/fixed_text.h"
 
 namespace hxal::config
 {

@@ -1,7 +1,7 @@
 #include "hxal/config/parser.h"
 
 #include "hxal/config/internal/settings.h"
-#include "hxal/config/internal/text.h"
+#include "hxal/config/internal/syntax.h"
 #include "hxal/config/internal/vports.h"
 
 namespace

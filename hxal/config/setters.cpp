@@ -2,7 +2,7 @@
 
 #include "hxal/adapter.h"
 #include "hxal/config/internal/state.h"
-#include "hxal/config/internal/text.h"
+#include "hxal/config/internal/syntax.h"
 #include "hxal/config/internal/vports.h"
 #include "hxal/internal/addresses.h"
 

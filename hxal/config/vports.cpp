@@ -1,6 +1,6 @@
 #include "hxal/config/internal/vports.h"
 
-#include "hxal/config/internal/text.h"
+#include "hxal/config/internal/syntax.h"
 #include "hxal/config/parser.h"
 #include "hxal/internal/list.h"
 

@@ -4,9 +4,7 @@
 // walk them.
 #pragma once
 
-#include "hxal/internal/adapter_list.h"
-#include "hxal/internal/ioc_list.h"
-#include "hxal/internal/memory.h"
+#include "hxal/internal/descriptor.h"
 #include "hxal/records/aen.h"
 
 #include <memory>
@@ -21,118 +19,64 @@ constexpr uint32_t delivered = 0x4; // the event at hand was handed to this regi
 
 constexpr int16_t no_instance = -1;
 
-// A share of an open descriptor that a handle of the library uses; null when none does.
-inline std::shared_ptr<Descriptor> listed_descriptor(int fd)
+// Whose events of its kind a registration is for. What a kind does not look at stays 0.
+struct Filter
 {
-    if (auto found = descriptor_of(fd))
-        return found;
-    const auto has_it = [=](const hxal_s& ioc) { return ioc.fd == fd; };
-    for (hxal_adapter_t* adapter = adapter_list(); adapter; adapter = adapter->next)
-        for (hxal_s* head : {adapter->fcioc_list, adapter->ethioc_list})
-            if (hxal_s* ioc = first_that(head, has_it))
-                return static_cast<Ioc_Node*>(ioc)->node;
-    return nullptr;
-}
+    wwn_t wwn = 0;            // of the port or the logical port
+    wwn_t rpwwn = 0;          // of the remote port; 0: any
+    mac_t mac = {};           // of the port
+    char serial_num[12] = {}; // of the card
+    bool any_added = false;   // cards that are added, whichever
+};
 
-// What a registration is underneath. `Filter` tells which events it is for.
-template <typename Record, typename Callback, typename Filter> struct Registration
+// A callback of any kind and form; whoever calls it knows which.
+using Any_Callback = void (*)();
+
+struct Registration
 {
-    // Takes descriptor and instance from a handle, which may be missing.
-    void bind(const hxal_s* ioc)
-    {
-        if (!ioc)
-            return;
-        fd = ioc->fd;
-        inst = static_cast<int16_t>(ioc->instance);
-        node = listed_descriptor(ioc->fd);
-    }
-
     void* userData = nullptr;
-    Callback cbfn = nullptr;
+    Any_Callback callback = nullptr;
     Filter filter = {};
     uint32_t flags = 0;
     int fd = -1;
     int16_t inst = no_instance;
-    std::shared_ptr<Descriptor> node; // keeps `fd` open
-    Record* next = nullptr;
+    std::shared_ptr<Descriptor> node = {}; // keeps `fd` open
+    Registration* next = nullptr;
 };
 
-// `Record` derives from Registration.
-template <typename Record> class Registration_List
+class Registration_List
 {
 public:
-    // The list owns the record from then on; the newest stands first. `handle` is set before the record can be called.
-    void add(std::unique_ptr<Record> record, Record*& handle)
+    using Is_For = bool (*)(const Registration& registration, const hxa_aen_entry_t& event);
+    using Call = hxa_status_t (*)(const Registration& registration, const hxa_aen_entry_t& event);
+
+    // The list owns the registration from then on; the newest stands first. `handle`, a client's name for its address, is set
+    // before it can be called.
+    template <typename Handle> void add(std::unique_ptr<Registration> registration, Handle*& handle)
     {
         const std::lock_guard lock(_mutex);
-        record->next = _head;
-        handle = _head = record.release();
+        registration->next = _head;
+        _head = registration.release();
+        handle = reinterpret_cast<Handle*>(_head);
     }
 
-    // False when it is not in the list (any more). A record that is being called is freed by its caller.
-    bool remove(const Record* record)
-    {
-        const std::lock_guard lock(_mutex);
-        Record** link = &_head;
-        while (*link && *link != record)
-            link = &(*link)->next;
-        Record* const found = *link;
-        if (!found)
-            return false;
-        *link = found->next;
-        if (found == _called)
-            _called_is_removed = true;
-        else
-            delete found;
-        return true;
-    }
+    // False when it is not in the list (any more). A registration that is being called is freed by its caller.
+    bool remove(const void* handle);
 
-    void collect(std::vector<int>& descriptors)
-    {
-        const std::lock_guard lock(_mutex);
-        for (const Record* record = _head; record; record = record->next)
-            if (record->fd >= 0)
-                descriptors.push_back(record->fd);
-    }
+    // Adds the descriptors that the registrations were made on.
+    void collect(std::vector<int>& descriptors);
 
-    // Calls every record that matches once, without the lock, and starts again from the first one after each call: the list
-    // may have changed. The first call that does not return HXA_STATUS_OK ends the dispatch. One thread dispatches at a time.
-    template <typename Matches, typename Deliver> hxa_status_t dispatch(Matches matches, Deliver deliver)
-    {
-        std::unique_lock lock(_mutex);
-        hxa_status_t status = HXA_STATUS_OK;
-        Record* record;
-        while (status == HXA_STATUS_OK && (record = first_that(_head, [&](const Record& each) { return is_due(each, matches); })))
-        {
-            record->flags |= delivered;
-            _called = record;
-            lock.unlock();
-            status = deliver(*record);
-            lock.lock();
-            end_call();
-        }
-        for (record = _head; record; record = record->next)
-            record->flags &= ~delivered;
-        return status;
-    }
+    // Calls every registration that the event is for once, without the lock, and starts again from the first one after each
+    // call: the list may have changed. The first call that does not return HXA_STATUS_OK ends the dispatch. One thread
+    // dispatches at a time.
+    void dispatch(const hxa_aen_entry_t& event, Is_For is_for, Call call);
 
 private:
-    template <typename Matches> static bool is_due(const Record& record, Matches& matches)
-    {
-        return (record.flags & delivered) == 0 && matches(record);
-    }
-
-    void end_call()
-    {
-        if (_called_is_removed)
-            delete _called;
-        _called_is_removed = false;
-        _called = nullptr;
-    }
+    void end_call();
 
     std::mutex _mutex;
-    Record* _head = nullptr;
-    Record* _called = nullptr; // whose callback runs
+    Registration* _head = nullptr;
+    Registration* _called = nullptr; // whose callback runs
     bool _called_is_removed = false;
 };
 

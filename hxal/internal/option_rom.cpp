@@ -1,7 +1,7 @@
 #include "hxal/internal/option_rom.h"
 
-#include "hxal/frame.h"
 #include "hxal/internal/option_rom_layout.h"
+#include "hxal/library.h"
 
 #include <algorithm>
 #include <span>

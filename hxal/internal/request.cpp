@@ -1,6 +1,6 @@
 #include "hxal/internal/request.h"
 
-#include "hxal/frame.h"
+#include "hxal/library.h"
 
 #include <cerrno>
 #include <cstdio>

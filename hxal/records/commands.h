@@ -153,4 +153,41 @@ constexpr std::uint32_t command_code(const Command& command, std::uint8_t group)
     return std::uint32_t{3} << 30 | command.size << 16 | std::uint32_t{group} << 8 | command.number;
 }
 
+consteval bool has_codes(std::string_view name, std::uint32_t fc, std::uint32_t ll)
+{
+    for (const Command& each : catalogue)
+        if (each.name == name)
+            return command_code(each, each.family.fc) == fc && command_code(each, each.family.ll) == ll;
+    return false;
+}
+
+// The commands that operations compose: what their requests are, each by itself. The number of the fetch tells another size than
+// its record has, and its group does not follow the IOC's type.
+static_assert(has_codes("IOCMD_IOC_GET_VERSION", 0xC0084301, 0xC0084401));
+static_assert(has_codes("IOCMD_IOC_GET_INST", 0xC0284302, 0xC0284402));
+static_assert(has_codes("IOCMD_IOC_ENABLE", 0xC0084303, 0xC0084403));
+static_assert(has_codes("IOCMD_IOC_DISABLE", 0xC0084304, 0xC0084404));
+static_assert(has_codes("IOCMD_IOC_SET_ADAPTER_NAME", 0xC048430C, 0xC048440C));
+static_assert(has_codes("IOCMD_AEN_GET", 0xC0584329, 0xC0584329));
+static_assert(has_codes("IOCMD_AEN_SYNC", 0xC058432A, 0xC058442A));
+static_assert(has_codes("IOCMD_PORT_GET_STATS", 0xC018432E, 0xC018442E));
+static_assert(has_codes("IOCMD_LPORT_GET_STATS", 0xC0C0B102, 0xC0C0B102));
+static_assert(has_codes("IOCMD_FLASH_UPDATE_PART", 0xC018B503, 0xC018B503));
+static_assert(has_codes("IOCMD_FLASH_READ_PART", 0xC018B504, 0xC018B504));
+static_assert(has_codes("IOCMD_ITNIM_GET_ATTR", 0xC038BB01, 0xC038BB01));
+static_assert(has_codes("IOCMD_FCOE_GET_STATS", 0xC170C101, 0xC1704401));
+
+// On the FC node every code stands for one command. On the Ethernet node two commands share one, which the library tells apart
+// before it sends.
+consteval bool codes_differ()
+{
+    for (const Command& one : catalogue)
+        for (const Command& other : catalogue)
+            if (&one != &other &&
+                (one.name == other.name || command_code(one, one.family.fc) == command_code(other, other.family.fc)))
+                return false;
+    return true;
+}
+static_assert(catalogue.size() == 72 && codes_differ());
+
 } // namespace hxal

@@ -46,6 +46,12 @@ FLOORS = {
         "interposition": ["scenario", "driver", "control", "hxasim.h"],
         "scenarios": [],
     },
+    "hxal": {
+        "records": [],
+        "internal": ["records", "adapter.h", "ioc.h", "library.h"],
+        "config": ["internal", "records", "adapter.h", "ioc.h"],
+        ".": ["config", "internal", "records"],
+    },
 }
 
 

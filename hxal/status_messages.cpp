@@ -1,18 +1,18 @@
-#include "hxal/frame.h"
+#include "hxal/library.h"
 
 #include <array>
 
 namespace
 {
 
-struct Status_Text
+struct Status_Message
 {
     hxa_status_t status;
     const char* text;
 };
 
 // clang-format off
-constexpr auto status_texts = std::to_array<Status_Text>({
+constexpr auto status_messages = std::to_array<Status_Message>({
     {HXA_STATUS_OK,                         "Success "},
     {HXA_STATUS_FAILED,                     "Operation failed "},
     {HXA_STATUS_EINVAL,                     "Invalid params Check input parameters "},
@@ -178,12 +178,12 @@ constexpr auto status_texts = std::to_array<Status_Text>({
 
 constexpr bool rows_are_in_code_order()
 {
-    for (std::size_t code = 0; code < status_texts.size(); ++code)
-        if (status_texts[code].status != static_cast<hxa_status_t>(code))
+    for (std::size_t code = 0; code < status_messages.size(); ++code)
+        if (status_messages[code].status != static_cast<hxa_status_t>(code))
             return false;
     return true;
 }
-static_assert(status_texts.size() == HXA_STATUS_MAX_VAL + 1 && rows_are_in_code_order());
+static_assert(status_messages.size() == HXA_STATUS_MAX_VAL + 1 && rows_are_in_code_order());
 
 } // namespace
 
@@ -191,5 +191,5 @@ const char* hxal_status_to_string(int code)
 {
     if (code < 0 || code >= HXA_STATUS_MAX_VAL)
         return "Unknown Failure";
-    return status_texts[static_cast<std::size_t>(code)].text;
+    return status_messages[static_cast<std::size_t>(code)].text;
 }

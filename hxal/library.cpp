@@ -1,8 +1,8 @@
-#include "hxal/frame.h"
+#include "hxal/library.h"
 
 #include "hxal/config/parser.h"
 #include "hxal/config/writer.h"
-#include "hxal/internal/frame.h"
+#include "hxal/internal/application.h"
 
 #include <atomic>
 #include <cerrno>

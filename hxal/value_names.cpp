@@ -1,4 +1,4 @@
-#include "hxal/texts.h"
+#include "hxal/value_names.h"
 
 #include "hxal/records/ethport.h"
 #include "hxal/records/flash.h"

@@ -1,4 +1,4 @@
-// The texts of the configuration file, as views: what the helpers of hxal/config/text.h do, without a buffer to overrun.
+// The texts of the configuration file, as views: what the helpers of hxal/config/syntax.h do, without a buffer to overrun.
 #pragma once
 
 #include "hxal/records/types.h"

@@ -1,6 +1,6 @@
-#include "hxal/config/text.h"
+#include "hxal/config/syntax.h"
 
-#include "hxal/config/internal/text.h"
+#include "hxal/config/internal/syntax.h"
 
 #include <climits>
 #include <cstring>

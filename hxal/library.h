@@ -1,4 +1,4 @@
-// The frame of the library: start and end, the last error, status texts, checksums.
+// The library itself: start and end, the last error, status messages, checksums.
 #pragma once
 
 #include "hxal/records/status.h"
