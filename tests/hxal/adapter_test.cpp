@@ -1,4 +1,4 @@
-#include "simulated_host.h"
+#include "tests/hxal/library_fixture.h"
 
 #include <cerrno>
 
@@ -8,7 +8,7 @@ namespace
 using testing::Each;
 
 // Adapter 1 is the CNA: its FC instances come first.
-class Adapter : public Simulated_Host
+class Adapter : public Library_Test
 {
 protected:
     Adapter()
@@ -105,7 +105,7 @@ TEST_F(Adapter, that_does_not_exist_is_null_or_0_or_minus_1)
     EXPECT_THAT(indexes, Each(0u));
     EXPECT_EQ(hxal_adapter_get_by_pwwn(1), -1);
     EXPECT_EQ(hxal_adapter_get_pcifn(1), -1);
-    EXPECT_THAT(requests(), testing::IsEmpty());
+    EXPECT_THAT(commands(), testing::IsEmpty());
 }
 
 TEST_F(Adapter, finds_its_ports)
@@ -142,7 +142,7 @@ TEST_F(Adapter, refreshes_its_name_unless_the_request_fails)
     distort("IOCMD_IOC_GET_INFO", offsetof(hxa_ioctl_ioc_info_t, name), {'n', 'e', 'w', 0}, 2);
     EXPECT_STREQ(hxal_adapter_get_name(2), "new");
     EXPECT_STREQ(hba->name, "new");
-    EXPECT_THAT(requests(), testing::ElementsAre("IOCMD_IOC_GET_INFO"));
+    EXPECT_THAT(commands(), testing::ElementsAre("IOCMD_IOC_GET_INFO"));
 
     fail("IOCMD_IOC_GET_INFO", EIO, 0);
     EXPECT_STREQ(hxal_adapter_get_name(1), "blue");
@@ -151,9 +151,9 @@ TEST_F(Adapter, refreshes_its_name_unless_the_request_fails)
 TEST_F(Adapter, is_enabled_or_disabled_when_every_ioc_says_so)
 {
     EXPECT_EQ(hxal_adapter_is_enabled(1), HXA_TRUE);
-    EXPECT_EQ(requests().size(), 4u);
+    EXPECT_EQ(commands().size(), 4u);
     EXPECT_EQ(hxal_adapter_is_disabled(1), HXA_FALSE);
-    EXPECT_EQ(requests().size(), 1u);
+    EXPECT_EQ(commands().size(), 1u);
 
     const std::size_t state = offsetof(hxa_ioctl_ioc_attr_t, attr) + offsetof(hxa_ioc_attr_t, state);
     distort("IOCMD_IOC_GET_ATTR", state, {HXA_IOC_DISABLED}, 1, "/dev/hxn");

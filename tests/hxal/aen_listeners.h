@@ -2,7 +2,7 @@
 #pragma once
 
 #include "hxal/aen.h"
-#include "tests/hxal/simulated_host.h"
+#include "tests/hxal/library_fixture.h"
 
 #include <chrono>
 #include <condition_variable>
@@ -132,7 +132,7 @@ inline hxa_status_t listen_ethport(Listener& to, const hxal_t* ioc)
 }
 
 // A scanned host with one two-port CNA: instances 0 and 1 of both drivers.
-class Aen : public Simulated_Host
+class Aen : public Library_Test
 {
 protected:
     Aen() { scan_anew(); }

@@ -1,5 +1,5 @@
 // Which registrations an event is for, and in which form they are told of it.
-#include "hxal/internal/aen_dispatch.h"
+#include "hxal/internal/aen_kinds.h"
 #include "tests/hxal/aen_listeners.h"
 
 #include <algorithm>
@@ -280,7 +280,7 @@ TEST_F(Aen, tells_in_the_short_form_who_asks_for_it)
     hxal::dispatch_event(adapter_event(HXA_ADAPTER_AEN_REMOVE, "ZMC0000001", a_wwn));
     hxal::dispatch_event(lport_event(0, HXA_LPORT_AEN_OFFLINE, base));
     hxal::dispatch_event(itnim_event(0, a_wwn, b_wwn));
-    EXPECT_THAT(requests(), ElementsAre("IOCMD_LPORT_GET_ATTR"));
+    EXPECT_THAT(commands(), ElementsAre("IOCMD_LPORT_GET_ATTR"));
     fail("IOCMD_LPORT_GET_ATTR", EIO);
     hxal::dispatch_event(lport_event(0, HXA_LPORT_AEN_OFFLINE, base));
     hxa_port_attr_t attributes{};

@@ -1,6 +1,6 @@
 #include "tests/hxal/boot_files.h"
-#include "tests/hxal/simulated_host.h"
-#include "tests/hxal/temporary_folder.h"
+#include "tests/hxal/library_fixture.h"
+#include "tests/support/temporary_folder.h"
 
 #include "hxal/internal/boot_description.h"
 #include "hxal/internal/option_rom.h"
@@ -47,7 +47,7 @@ Archive archive_of(const std::string& text, const Bytes& firmware_image = firmwa
 }
 
 // One HBA of two ports with device id 0x13, the library on it, and a folder of its own to be in.
-class Boot_Update : public Simulated_Host, Temporary_Folder
+class Boot_Update : public Library_Test, Temporary_Folder
 {
 protected:
     Boot_Update()
@@ -88,7 +88,7 @@ TEST_F(Boot_Update, writes_and_verifies_every_image_for_the_card_and_switches_th
     {
         scan(R"({"adapters": [{"kind": "fc-hba"}]})");
         ASSERT_EQ(update(archive), HXA_STATUS_OK);
-        EXPECT_THAT(requests(), ElementsAre("IOCMD_IOC_GET_ATTR", "IOCMD_FLASH_UPDATE_PART", "IOCMD_FLASH_READ_PART",
+        EXPECT_THAT(commands(), ElementsAre("IOCMD_IOC_GET_ATTR", "IOCMD_FLASH_UPDATE_PART", "IOCMD_FLASH_READ_PART",
                                             "IOCMD_FLASH_UPDATE_PART", "IOCMD_FLASH_READ_PART", "IOCMD_FLASH_UPDATE_PART",
                                             "IOCMD_FLASH_READ_PART", "IOCMD_FLASH_UPDATE_PART", "IOCMD_FLASH_READ_PART",
                                             "IOCMD_FLASH_UPDATE_PART", "IOCMD_FLASH_READ_PART", "IOCMD_FLASH_ENABLE_OPTROM"));
@@ -110,9 +110,9 @@ TEST_F(Boot_Update, fits_the_option_rom_to_the_card)
     ASSERT_EQ(hxal::update_device_id_chksum(rom, 0x17), HXA_STATUS_OK);
     hxal::reverse_words(rom);
     EXPECT_EQ(part(HXA_FLASH_PART_OPTROM, rom.size()), rom);
-    EXPECT_THAT(requests(), testing::Contains("IOCMD_FLASH_ENABLE_OPTROM"));
+    EXPECT_THAT(commands(), testing::Contains("IOCMD_FLASH_ENABLE_OPTROM"));
     ASSERT_EQ(update(archive_of(description), 0x21), HXA_STATUS_OK);
-    EXPECT_THAT(requests(), ElementsAre("IOCMD_FLASH_UPDATE_PART", "IOCMD_FLASH_READ_PART")) << "no option ROM switch";
+    EXPECT_THAT(commands(), ElementsAre("IOCMD_FLASH_UPDATE_PART", "IOCMD_FLASH_READ_PART")) << "no option ROM switch";
 }
 
 TEST_F(Boot_Update, asks_nothing_of_the_card_unless_the_whole_archive_was_read)
@@ -142,7 +142,7 @@ TEST_F(Boot_Update, asks_nothing_of_the_card_unless_the_whole_archive_was_read)
     EXPECT_EQ(hxal_boot_fwupdate(hxal_adapter_get_port(1), "missing", 0x13), HXA_STATUS_FAILED);
     EXPECT_EQ(hxal_boot_fwupdate(hxal_adapter_get_port(1), "missing", 0x22), HXA_STATUS_INVALID_DEVID);
     EXPECT_EQ(update(wrapped(wrapped(whole)), 0x13), HXA_STATUS_FAILED) << "one wrapper, not two";
-    EXPECT_THAT(requests(), IsEmpty());
+    EXPECT_THAT(commands(), IsEmpty());
     EXPECT_FALSE(fs::exists("zmlrtmpfile"));
 }
 
@@ -211,7 +211,7 @@ TEST_F(Boot_Update, takes_no_more_than_a_card_holds)
         add_hole();
     }
     EXPECT_EQ(hxal_boot_fwupdate(hxal_adapter_get_port(1), "archive", 0x13), HXA_STATUS_ENOMEM);
-    EXPECT_THAT(requests(), IsEmpty());
+    EXPECT_THAT(commands(), IsEmpty());
 }
 
 TEST_F(Boot_Update, ends_with_the_first_image_that_fails)
@@ -219,7 +219,7 @@ TEST_F(Boot_Update, ends_with_the_first_image_that_fails)
     Bytes broken = firmware;
     broken[0] ^= 1;
     EXPECT_EQ(update(archive_of(description, broken), 0x13), HXA_STATUS_CHECKSUM_FAIL);
-    EXPECT_THAT(requests(), ElementsAre("IOCMD_FLASH_UPDATE_PART", "IOCMD_FLASH_READ_PART"));
+    EXPECT_THAT(commands(), ElementsAre("IOCMD_FLASH_UPDATE_PART", "IOCMD_FLASH_READ_PART"));
 
     EXPECT_EQ(update(archive_of(description), 0x14), HXA_STATUS_DEVID_MISSING);
     fail("IOCMD_FLASH_READ_PART", EIO);

@@ -3,7 +3,7 @@
 
 #include "config_model.h"
 #include "hxal/hxal.h"
-#include "temporary_folder.h"
+#include "tests/support/temporary_folder.h"
 
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>

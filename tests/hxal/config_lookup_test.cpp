@@ -1,6 +1,6 @@
 // Whose an entry of the configuration model is.
 #include "config_fixture.h"
-#include "simulated_host.h"
+#include "tests/hxal/library_fixture.h"
 
 namespace
 {
@@ -50,7 +50,7 @@ TEST_F(Config_Lookup, finds_and_adds_by_mac)
     EXPECT_EQ(hxal_config_ethioc_lookup(eth_mac(1, 125)), -1);
 }
 
-class Config_Names : public Simulated_Host
+class Config_Names : public Library_Test
 {
 protected:
     Config_Names()

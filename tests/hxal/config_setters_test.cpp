@@ -1,6 +1,6 @@
 // What a setter leaves in the file.
 #include "config_fixture.h"
-#include "simulated_host.h"
+#include "tests/hxal/library_fixture.h"
 
 #include <functional>
 #include <thread>

@@ -1,7 +1,7 @@
 // Starting, stopping, powering and naming IOCs and adapters: the requests and pauses, the answers, what is recorded, and that
 // the drivers are then as told.
 #include "config_model.h"
-#include "simulated_host.h"
+#include "tests/hxal/library_fixture.h"
 
 #include <cerrno>
 
@@ -15,7 +15,7 @@ using testing::ElementsAre;
 using testing::IsEmpty;
 using testing::Not;
 
-class Control : public Simulated_Host
+class Control : public Library_Test
 {
 protected:
     Control() { empty_model(); }
@@ -116,7 +116,7 @@ TEST_F(Control, of_an_adapter_reaches_every_ioc_port_by_port)
     hxasim::take_requests();
 
     EXPECT_EQ(hxal_adapter_enable(1), HXA_STATUS_AD_IS_ENABLE);
-    EXPECT_THAT(requests(), ElementsAre("IOCMD_IOC_GET_ATTR", "IOCMD_IOC_GET_ATTR", "IOCMD_IOC_GET_ATTR", "IOCMD_IOC_GET_ATTR"));
+    EXPECT_THAT(commands(), ElementsAre("IOCMD_IOC_GET_ATTR", "IOCMD_IOC_GET_ATTR", "IOCMD_IOC_GET_ATTR", "IOCMD_IOC_GET_ATTR"));
     for (int ad : {-1, 0, 2})
     {
         EXPECT_EQ(hxal_adapter_enable(ad), HXA_STATUS_FAILED);
@@ -191,7 +191,7 @@ TEST_F(Control, of_a_name_tells_both_drivers)
         hxal_set_last_error(HXA_STATUS_DIAG_BUSY);
         hxal_adapter_set_name(each.ad, "green");
         EXPECT_EQ(hxal_get_last_error(), each.last_error);
-        EXPECT_EQ(requests().size(), each.requests);
+        EXPECT_EQ(commands().size(), each.requests);
         const bool named = each.last_error == HXA_STATUS_OK;
         EXPECT_STREQ(cna->name, named ? "green" : "blue");
         EXPECT_EQ(std::ranges::count(settings(), R"(adapter-B1-name = "green";)"), named ? 1 : 0);

@@ -1,5 +1,5 @@
-#include "simulated_host.h"
-#include "temporary_folder.h"
+#include "tests/hxal/library_fixture.h"
+#include "tests/support/temporary_folder.h"
 
 #include <iterator>
 
@@ -11,7 +11,7 @@ using testing::ElementsAre;
 using testing::IsEmpty;
 
 // One HBA and a folder for images.
-class Flash : public Simulated_Host, Temporary_Folder
+class Flash : public Library_Test, Temporary_Folder
 {
 protected:
     Flash()
@@ -72,7 +72,7 @@ TEST_F(Flash, image_that_cannot_be_read_or_is_too_large_is_not_sent)
     file("firmware", "1234123");
     EXPECT_EQ(update_from_file("firmware", HXA_FLASH_PART_FWIMG), HXA_STATUS_CHECKSUM_FAIL);
     EXPECT_EQ(hxal_flash_mfg_info(ioc, "S", "P", 0, {}, 42), HXA_STATUS_EINVAL);
-    EXPECT_THAT(requests(), IsEmpty());
+    EXPECT_THAT(commands(), IsEmpty());
     file("firmware", "12341234123");
     EXPECT_EQ(update_from_file("firmware", HXA_FLASH_PART_FWIMG), HXA_STATUS_OK) << "the last bytes are no word";
 }

@@ -3,7 +3,7 @@
 #include "boot_files.h"
 #include "hxal/records/commands.h"
 #include "operation_table.h"
-#include "simulated_host.h"
+#include "tests/hxal/library_fixture.h"
 
 #include <algorithm>
 #include <cstddef>
@@ -15,7 +15,7 @@ namespace
 
 constexpr std::size_t memory_limit = 64 << 20;
 
-class Hostile_Driver : public Simulated_Host
+class Hostile_Driver : public Library_Test
 {
 protected:
     Hostile_Driver() { allocations::reset_peak(); }

@@ -1,4 +1,4 @@
-#include "simulated_host.h"
+#include "tests/hxal/library_fixture.h"
 
 #include <cerrno>
 
@@ -6,7 +6,7 @@ namespace
 {
 
 // Indexes: 0 FC (one-port HBA), 1 and 2 FCoE, 3 and 4 Ethernet.
-class Ioc : public Simulated_Host
+class Ioc : public Library_Test
 {
 protected:
     Ioc()
@@ -15,7 +15,7 @@ protected:
                               {"kind": "cna", "name": "blue", "hwpath": "0000:02:00", "serial": "ABC",
                                "ports": [{"name": "b0"}, {"name": "b1"}]}]})");
     }
-    ~Ioc() override { EXPECT_THAT(requests(), testing::IsEmpty()); }
+    ~Ioc() override { EXPECT_THAT(commands(), testing::IsEmpty()); }
 
     static int id(const hxal_t* ioc) { return ioc ? ioc->id : -1; }
 };
@@ -111,7 +111,7 @@ TEST_F(Ioc, refreshes_its_current_mac_unless_the_request_fails)
     hxasim::clear_faults();
     fail("IOCMD_IOC_GET_INFO", EIO);
     EXPECT_EQ(hxal_ioc_get_current_mac(ethernet).mac[5], 6);
-    EXPECT_EQ(requests().size(), 2u);
+    EXPECT_EQ(commands().size(), 2u);
 }
 
 } // namespace

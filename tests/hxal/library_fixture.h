@@ -1,38 +1,33 @@
-// A test on a simulated host: the library under test, the drivers behind it, and the check that it sent nothing they refuse.
+// A test of the library on a simulated host: its verbs, and the addresses of the simulated product line.
 #pragma once
 
 #include "hxal/hxal.h"
-#include "sim/hxasim.h"
-
-#include <gmock/gmock.h>
-#include <gtest/gtest.h>
+#include "tests/support/simulated_host.h"
 
 #include <algorithm>
 #include <cstring>
 #include <initializer_list>
 #include <string>
+#include <vector>
 
 // Instances 0 and 1 of both drivers.
 inline const std::string one_cna = R"({"adapters": [{"kind": "cna"}]})";
 
-class Simulated_Host : public testing::Test
+class Library_Test : public Simulated_Host
 {
 protected:
-    Simulated_Host()
+    Library_Test()
     {
         hxasim::set_time_scale(0);
         hxal_libinit(hxa_aen_app_cim);
         hxal_set_last_error(HXA_STATUS_OK);
     }
 
-    ~Simulated_Host() override
+    ~Library_Test() override
     {
-        EXPECT_THAT(hxasim::violations(), testing::IsEmpty());
+        expect_violations();
         scan("{}");
-        hxasim::unload();
     }
-
-    static void host(const std::string& json) { hxasim::load_text(json); }
 
     // Loads a host and scans it: the number of adapters. Requests count from here on.
     static int scan(const std::string& json)
@@ -42,27 +37,16 @@ protected:
         hxasim::take_requests();
         return count;
     }
-
-    static void fail(const std::string& command, int error, std::optional<int> instance = {})
-    {
-        hxasim::inject({.command = command, .instance = instance, .error = error});
-    }
-
-    // The driver's record goes out with these bytes in it.
-    static void distort(const std::string& command, std::size_t offset, std::vector<std::uint8_t> bytes,
-                        std::optional<int> instance = {}, const std::string& node = "/dev/hxa")
-    {
-        hxasim::inject({.command = command, .node = node, .instance = instance, .answer = {{offset, std::move(bytes)}}});
-    }
-
-    static std::vector<std::string> requests()
-    {
-        std::vector<std::string> names;
-        for (const auto& request : hxasim::take_requests())
-            names.push_back(request.name);
-        return names;
-    }
 };
+
+// What `work` prints.
+template <typename Work> std::string printed_by(Work work)
+{
+    testing::internal::CaptureStdout();
+    work();
+    std::fflush(stdout);
+    return testing::internal::GetCapturedStdout();
+}
 
 // The first bytes of a WWN or of a LUN; the others are 0.
 inline wwn_t wwn(std::initializer_list<uint8_t> bytes)

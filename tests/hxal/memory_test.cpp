@@ -1,11 +1,11 @@
 // What is left when the memory ends in the middle of a scan, or of a virtual port's line.
 #include "allocations.h"
-#include "simulated_host.h"
+#include "tests/hxal/library_fixture.h"
 
 namespace
 {
 
-using Memory = Simulated_Host;
+using Memory = Library_Test;
 
 TEST_F(Memory, that_ends_in_a_node_scan_costs_that_node)
 {

@@ -1,7 +1,7 @@
 // Every operation of the tables against the simulator's record of requests.
 #include "config_model.h"
 #include "operation_table.h"
-#include "simulated_host.h"
+#include "tests/hxal/library_fixture.h"
 
 #include <algorithm>
 #include <cerrno>
@@ -38,7 +38,7 @@ std::vector<std::uint8_t> expected_record(const Operation& operation, int instan
     return record;
 }
 
-class Operations : public Simulated_Host
+class Operations : public Library_Test
 {
 protected:
     static constexpr int instance = 1;
@@ -96,7 +96,7 @@ protected:
     static void expect_nothing_sent(const Operation& operation, hxal_t* ioc, void* output, hxa_status_t status)
     {
         EXPECT_EQ(operation.call(ioc, output), status);
-        EXPECT_THAT(requests(), testing::IsEmpty());
+        EXPECT_THAT(commands(), testing::IsEmpty());
     }
 
     static void expect_refused(const Operation& operation, hxal_t* ioc)
@@ -137,7 +137,7 @@ protected:
             return expect_nothing_sent(operation, ioc, nullptr, HXA_STATUS_EINVAL);
         answer_with_status(HXA_STATUS_FAILED, operation);
         EXPECT_EQ(operation.call(ioc, nullptr), HXA_STATUS_FAILED);
-        EXPECT_THAT(requests(), testing::SizeIs(1));
+        EXPECT_THAT(commands(), testing::SizeIs(1));
     }
 };
 

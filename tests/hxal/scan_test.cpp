@@ -1,11 +1,11 @@
-#include "simulated_host.h"
+#include "tests/hxal/library_fixture.h"
 
 #include <cerrno>
 
 namespace
 {
 
-using Scan = Simulated_Host;
+using Scan = Library_Test;
 
 std::string line(const hxasim::Request& request)
 {
@@ -164,7 +164,7 @@ TEST_F(Scan, that_finds_a_hole_lists_the_iocs_and_no_adapter)
     hxal_set_last_error(HXA_STATUS_DIAG_BUSY);
     hxasim::take_requests();
     EXPECT_EQ(hxal_adapter_scan(), 0);
-    const auto sent = requests();
+    const auto sent = commands();
     EXPECT_EQ(std::count(sent.begin(), sent.end(), "IOCMD_IOC_GET_ATTR"), 2) << "those behind the hole are not asked";
     EXPECT_EQ(hxal_get_last_error(), HXA_STATUS_DIAG_BUSY);
     EXPECT_EQ(hxal_adapter_get_num(), 0u);

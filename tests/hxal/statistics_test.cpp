@@ -1,5 +1,5 @@
 // Counters by name: every name beside its counter, converted on status 0 only.
-#include "simulated_host.h"
+#include "tests/hxal/library_fixture.h"
 
 #include <algorithm>
 #include <cerrno>
@@ -16,7 +16,7 @@ std::string counting(std::size_t size)
     return list + "]";
 }
 
-class Statistics : public Simulated_Host
+class Statistics : public Library_Test
 {
 protected:
     Statistics()
@@ -40,7 +40,7 @@ protected:
         Pair pairs[64];
         std::memset(pairs, 0xEE, sizeof pairs);
         EXPECT_EQ(read(pairs), HXA_STATUS_OK);
-        EXPECT_EQ(requests().size(), 1u);
+        EXPECT_EQ(commands().size(), 1u);
         std::vector<std::string> names;
         for (int i = 0; i < count; ++i)
         {
@@ -125,7 +125,7 @@ TEST_F(Statistics, are_converted_on_status_0_only)
     EXPECT_EQ(hxal_fcoe_get_stats(fcoe, nullptr), HXA_STATUS_EINVAL);
     EXPECT_EQ(hxal_lport_get_stats(nullptr, 0, 0, short_pairs), HXA_STATUS_EINVAL);
     EXPECT_EQ(hxal_lport_get_stats(fc, 0, 0, nullptr), HXA_STATUS_EINVAL);
-    EXPECT_THAT(requests(), testing::IsEmpty());
+    EXPECT_THAT(commands(), testing::IsEmpty());
 }
 
 TEST_F(Statistics, of_an_fc_port_under_fcoe_names_are_its_quality_of_service)

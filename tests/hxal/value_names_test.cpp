@@ -17,58 +17,48 @@ TEST(Texts, of_statuses_end_in_a_blank_and_cover_0_to_158)
         EXPECT_STREQ(hxal_status_to_string(code), "Unknown Failure") << code;
 }
 
-TEST(Texts, of_values_first_last_and_beside_the_table)
+TEST(Texts, of_values_are_known_up_to_the_last_of_the_table_and_not_behind_it)
 {
-    struct Case
+    struct Row
     {
         const char* (*function)(uint32_t);
-        uint32_t value;
-        const char* text;
+        uint32_t last;
+        const char* text; // of the last value
+        const char* other = "unknown";
     };
     // clang-format off
-    const Case cases[] = {
-        {hxal_flash_status_to_string,         5,           "badcksum"},
-        {hxal_flash_status_to_string,         6,           "unknown"},
-        {hxal_flash_part_type_to_string,      0,           "null"},
-        {hxal_flash_part_type_to_string,      11,          "bootovl"},
-        {hxal_pm_ds_to_string,                3,           "off"},
-        {hxal_ioc_state_to_string,            0,           "unknown"},
-        {hxal_ioc_state_to_string,            6,           "hwfail"},
-        {hxal_ioc_state_to_string,            10,          "firmware mismatch"},
-        {hxal_pport_states_to_string,         0,           "Unknown"},
-        {hxal_pport_states_to_string,         13,          "Disabled#"},
-        {hxal_pport_states_to_string,         14,          "Invalid"},
-        {hxal_port_get_state_name,            0,           "Unknown"},
-        {hxal_port_get_state_name,            13,          "Disabled#"},
-        {hxal_port_get_state_name,            14,          "Unknown"},
-        {hxal_pport_speed_to_string,          1,           "1G "},
-        {hxal_pport_speed_to_string,          3,           "unknown"},
-        {hxal_pport_speed_to_string,          15,          "Auto"},
-        {hxal_pport_type_to_string,           3,           "unknown"},
-        {hxal_pport_type_to_string,           22,          "VP"},
-        {hxal_pport_topology_to_string,       2,           "Loop"},
-        {hxal_rport_state_to_string,          4,           "retry"},
-        {hxal_itnim_state_to_string,          7,           "initiator"},
-        {hxal_auth_status_to_string,          9,           "unknown"},
-        {hxal_auth_rej_code_to_string,        2,           "Logical err"},
-        {hxal_auth_rej_code_exp_to_string,    10,          "Proto Ver."},
-        {hxal_vport_state_to_string,          9,           "Error"},
-        {hxal_log_severity_to_string,         4,           "Info"},
-        {hxal_log_severity_to_string,         5,           "unknown"},
-        {hxal_qos_state_to_string,            2,           "Offline"},
-        {hxal_qos_priority_to_string,         2,           "Medium"},
-        {hxal_pport_linkstate_rsn_to_string,  5,           "unknown"},
-        {hxal_pport_linkstate_rsn_to_string,  20,          "Timeout waiting to receive from peer"},
-        {hxal_pport_linkstate_rsn_to_string,  38,          "Physical link down"},
-        {hxal_ethport_cee_state_to_string,    1,           "Linkdown"},
-        {hxal_ethport_cee_state_to_string,    UINT32_MAX,  "unknown"},
-        {hxal_get_sfp_media,                  0,           "--"},
-        {hxal_get_sfp_media,                  5,           "us"},
-        {hxal_get_sfp_media,                  6,           "--"},
+    const Row rows[] = {
+        {hxal_flash_status_to_string,        5,  "badcksum"},
+        {hxal_flash_part_type_to_string,     11, "bootovl"},
+        {hxal_pm_ds_to_string,               3,  "off"},
+        {hxal_ioc_state_to_string,           10, "firmware mismatch"},
+        {hxal_pport_states_to_string,        14, "Invalid"},
+        {hxal_port_get_state_name,           13, "Disabled#", "Unknown"},
+        {hxal_pport_speed_to_string,         15, "Auto"},
+        {hxal_pport_type_to_string,          22, "VP"},
+        {hxal_pport_topology_to_string,      3,  "Auto"},
+        {hxal_rport_state_to_string,         9,  "nsdisc"},
+        {hxal_itnim_state_to_string,         7,  "initiator"},
+        {hxal_auth_status_to_string,         8,  "failed"},
+        {hxal_auth_rej_code_to_string,       2,  "Logical err"},
+        {hxal_auth_rej_code_exp_to_string,   10, "Proto Ver."},
+        {hxal_vport_state_to_string,         9,  "Error"},
+        {hxal_log_severity_to_string,        4,  "Info"},
+        {hxal_qos_state_to_string,           2,  "Offline"},
+        {hxal_qos_priority_to_string,        3,  "Low"},
+        {hxal_pport_linkstate_rsn_to_string, 38, "Physical link down"},
+        {hxal_ethport_cee_state_to_string,   2,  "Linkup"},
+        {hxal_get_sfp_media,                 5,  "us", "--"},
     };
     // clang-format on
-    for (const Case& each : cases)
-        EXPECT_STREQ(each.function(each.value), each.text) << each.value;
+    for (const Row& row : rows)
+    {
+        EXPECT_STREQ(row.function(row.last), row.text);
+        EXPECT_STREQ(row.function(row.last + 1), row.other) << row.text;
+        EXPECT_STREQ(row.function(UINT32_MAX), row.other) << row.text;
+    }
+    EXPECT_STREQ(hxal_pport_speed_to_string(1), "1G ");
+    EXPECT_STREQ(hxal_pport_speed_to_string(3), "unknown") << "a gap";
 }
 
 TEST(Texts, of_the_port_log)

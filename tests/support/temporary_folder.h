@@ -4,16 +4,15 @@
 #include <cstdlib>
 #include <filesystem>
 #include <fstream>
+#include <iterator>
 #include <string>
 
 class Temporary_Folder
 {
 public:
+    Temporary_Folder() = default;
     Temporary_Folder(const Temporary_Folder&) = delete;
     Temporary_Folder& operator=(const Temporary_Folder&) = delete;
-
-protected:
-    Temporary_Folder() = default;
     ~Temporary_Folder() { std::filesystem::remove_all(folder); }
 
     std::string path(const std::string& name) const { return folder / name; }
@@ -25,12 +24,19 @@ protected:
         return path(name);
     }
 
+    // What a file holds; nothing when there is none.
+    static std::string content(const std::string& path)
+    {
+        std::ifstream stream(path, std::ios::binary);
+        return {std::istreambuf_iterator<char>(stream), {}};
+    }
+
     const std::filesystem::path folder = make();
 
 private:
     static std::filesystem::path make()
     {
-        std::string name = std::filesystem::temp_directory_path() / "hxal_test.XXXXXX";
+        std::string name = std::filesystem::temp_directory_path() / "zmlr_test.XXXXXX";
         return ::mkdtemp(name.data()) ? name : "";
     }
 };
