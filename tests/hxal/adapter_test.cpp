@@ -45,7 +45,6 @@ TEST_F(Adapter, groups_the_iocs_of_one_card_by_port_in_the_order_of_the_lowest_i
         EXPECT_EQ(ethernet->ioc_type, HXA_IOC_TYPE_LL);
         EXPECT_EQ(hxal_adapter_get_ioc(cna, port), fc);
     }
-    EXPECT_STREQ(hxal_adapter_get_serial_num_by_idx(2), "R1");
     char serial[12], model[128], hwpath[32];
     hxal_adapter_get_serial_num(cna, serial);
     hxal_adapter_get_model(cna, model);
@@ -54,11 +53,9 @@ TEST_F(Adapter, groups_the_iocs_of_one_card_by_port_in_the_order_of_the_lowest_i
     EXPECT_STREQ(serial, "B1");
     EXPECT_STREQ(model, cna->model_descr);
     EXPECT_STREQ(hwpath, "0000:02:00");
-    EXPECT_STREQ(hba->name, "red");
+    EXPECT_STREQ(hxal_adapter_get_serial_num_by_idx(2), "R1");
     EXPECT_EQ(hxal_adapter_get_num_ioc(2), 2);
-    EXPECT_EQ(hba->ethioc_list, nullptr);
-    EXPECT_EQ(hxal_adapter_is_cna_capable(2), HXA_FALSE);
-    EXPECT_EQ(hba->next, nullptr);
+    EXPECT_TRUE(!hba->ethioc_list && !hba->next && !hxal_adapter_is_cna_capable(2));
 }
 
 TEST_F(Adapter, is_found_by_index_serial_name_path_and_address)
@@ -90,21 +87,14 @@ TEST_F(Adapter, that_does_not_exist_is_null_or_0_or_minus_1)
             hxal_adapter_get_num_ioc(ad), hxal_adapter_get_num_port(ad), hxal_adapter_get_ioc_idx_by_pwwn(ad, port_wwn(1, 0)),
             hxal_adapter_get_ioc_idx_by_mac(ad, eth_mac(1, 0)), hxal_adapter_get_ioc_idx_by_hwpath(ad, "0000:02:00.0")};
         EXPECT_THAT(numbers, Each(-1));
-        const hxa_boolean_t flags[] = {hxal_adapter_is_cna_capable(ad), hxal_adapter_is_enabled(ad),
-                                       hxal_adapter_is_disabled(ad)};
-        EXPECT_THAT(flags, Each(HXA_FALSE));
+        EXPECT_FALSE(hxal_adapter_is_cna_capable(ad) || hxal_adapter_is_enabled(ad) || hxal_adapter_is_disabled(ad));
     }
     EXPECT_EQ(hxal_adapter_get_serial_num_by_idx(0xFFFF), nullptr);
     EXPECT_TRUE(!hxal_adapter_lookup("red") && !hxal_adapter_lookup(nullptr));
-    const unsigned indexes[] = {static_cast<unsigned>(hxal_adapter_open_by_name("green")),
-                                hxal_adapter_get_idx_by_name(nullptr),
-                                hxal_adapter_get_idx_by_sn("red"),
-                                hxal_adapter_get_idx_by_hwpath("0000:01:00.0"),
-                                static_cast<unsigned>(hxal_adapter_open_by_wwn(1)),
-                                hxal_adapter_get_by_mac(mac_t{{1}})};
-    EXPECT_THAT(indexes, Each(0u));
-    EXPECT_EQ(hxal_adapter_get_by_pwwn(1), -1);
-    EXPECT_EQ(hxal_adapter_get_pcifn(1), -1);
+    EXPECT_FALSE(hxal_adapter_open_by_name("green") || hxal_adapter_get_idx_by_name(nullptr) ||
+                 hxal_adapter_get_idx_by_sn("red") || hxal_adapter_get_idx_by_hwpath("0000:01:00.0") ||
+                 hxal_adapter_open_by_wwn(1) || hxal_adapter_get_by_mac(mac_t{{1}}));
+    EXPECT_EQ(hxal_adapter_get_by_pwwn(1) & hxal_adapter_get_pcifn(1), -1);
     EXPECT_THAT(commands(), testing::IsEmpty());
 }
 

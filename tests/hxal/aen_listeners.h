@@ -62,6 +62,23 @@ struct Listener
             then();
         heard->add(name + " " + what);
     }
+
+    // Registers for a kind of event, in the full form of the callback unless told otherwise: on an IOC, or for an adapter, which
+    // may be missing, with what the kind looks at in `filter`.
+    template <typename Callback = std::nullptr_t>
+    hxa_status_t listen(hxa_aen_category_t kind, const hxal_t* ioc, const hxa_aen_data_t& filter = {}, Callback short_form = {});
+    template <typename Callback = std::nullptr_t> hxa_status_t listen(const hxal_adapter_t* adapter, Callback short_form = {});
+
+private:
+    // What `enlist` returned, which stores the handle where it is told; the listener unregisters it.
+    template <typename Handle> hxa_status_t keep(hxa_status_t (*delist)(Handle*), auto enlist)
+    {
+        Handle* handle = nullptr;
+        const hxa_status_t status = enlist(&handle);
+        if (status == HXA_STATUS_OK)
+            unregister = [=] { return delist(handle); };
+        return status;
+    }
 };
 
 template <typename Data> void hear_event(void* listener, uint32_t event, const Data*, hxa_timeval_t)
@@ -69,66 +86,48 @@ template <typename Data> void hear_event(void* listener, uint32_t event, const D
     static_cast<Listener*>(listener)->hear(std::to_string(event));
 }
 
-// What `enlist` returned, which stores the handle where it is told; the listener unregisters it.
-template <typename Handle> hxa_status_t keep(Listener& listener, hxa_status_t (*delist)(Handle*), auto enlist)
+// The callback as a registration takes it: in the full form, or the short one in disguise.
+template <typename Full_Form, typename Short_Form> Full_Form form_of(Short_Form callback, Full_Form full)
 {
-    Handle* handle = nullptr;
-    const hxa_status_t status = enlist(&handle);
-    if (status == HXA_STATUS_OK)
-        listener.unregister = [=] { return delist(handle); };
-    return status;
+    if constexpr (std::is_null_pointer_v<Short_Form>)
+        return full;
+    else
+        return reinterpret_cast<Full_Form>(reinterpret_cast<void (*)()>(callback));
 }
 
-// One for each kind, with the full form of the callback unless told otherwise.
-
-inline hxa_status_t listen_adapter(Listener& to, const hxal_adapter_t* adapter, hxal_adapter_aen_cbfn_t callback = hear_event,
-                                   uint32_t flag = 0)
+template <typename Callback> hxa_status_t Listener::listen(const hxal_adapter_t* adapter, Callback short_form)
 {
-    return keep(to, hxal_adapter_aen_unregister,
-                [&](auto handle) { return hxal_adapter_aen_register(adapter, callback, &to, handle, flag); });
+    const uint32_t flag = std::is_null_pointer_v<Callback> ? 0 : HXAL_AEN_SNIA;
+    const auto callback = form_of<hxal_adapter_aen_cbfn_t>(short_form, hear_event);
+    return keep(hxal_adapter_aen_unregister,
+                [&](auto handle) { return hxal_adapter_aen_register(adapter, callback, this, handle, flag); });
 }
 
-inline hxa_status_t listen_port(Listener& to, const hxal_t* ioc, hxa_port_aen_data_t data)
+template <typename Callback>
+hxa_status_t Listener::listen(hxa_aen_category_t kind, const hxal_t* ioc, const hxa_aen_data_t& filter, Callback short_form)
 {
-    return keep(to, hxal_port_aen_unregister,
-                [&](auto handle) { return hxal_port_aen_register(ioc, hear_event, &to, &data, handle); });
-}
-
-inline hxa_status_t listen_lport(Listener& to, const hxal_t* ioc, hxa_lport_aen_data_t data,
-                                 hxal_lport_aen_cbfn_t callback = hear_event, uint32_t flag = 0)
-{
-    return keep(to, hxal_lport_aen_unregister,
-                [&](auto handle) { return hxal_lport_aen_register(ioc, callback, &to, &data, handle, flag); });
-}
-
-inline hxa_status_t listen_rport(Listener& to, const hxal_t* ioc, hxa_rport_aen_data_t data)
-{
-    return keep(to, hxal_rport_aen_unregister,
-                [&](auto handle) { return hxal_rport_aen_register(ioc, hear_event, &to, &data, handle); });
-}
-
-inline hxa_status_t listen_itnim(Listener& to, const hxal_t* ioc, hxa_itnim_aen_data_t data,
-                                 hxal_itnim_aen_cbfn_t callback = hear_event, uint32_t flag = 0)
-{
-    return keep(to, hxal_itnim_aen_unregister,
-                [&](auto handle) { return hxal_itnim_aen_register(ioc, callback, &to, &data, handle, flag); });
-}
-
-inline hxa_status_t listen_audit(Listener& to, const hxal_t* ioc, hxa_audit_aen_data_t data)
-{
-    return keep(to, hxal_audit_aen_unregister,
-                [&](auto handle) { return hxal_audit_aen_register(ioc, hear_event, &to, &data, handle); });
-}
-
-inline hxa_status_t listen_ioc(Listener& to, const hxal_t* ioc)
-{
-    return keep(to, hxal_ioc_aen_unregister, [&](auto handle) { return hxal_ioc_aen_register(ioc, hear_event, &to, handle); });
-}
-
-inline hxa_status_t listen_ethport(Listener& to, const hxal_t* ioc)
-{
-    return keep(to, hxal_ethport_aen_unregister,
-                [&](auto handle) { return hxal_ethport_aen_register(ioc, hear_event, &to, nullptr, handle); });
+    const uint32_t flag = std::is_null_pointer_v<Callback> ? 0 : HXAL_AEN_SNIA;
+    const auto lport_form = form_of<hxal_lport_aen_cbfn_t>(short_form, hear_event);
+    const auto itnim_form = form_of<hxal_itnim_aen_cbfn_t>(short_form, hear_event);
+    // clang-format off
+    switch (kind)
+    {
+    case HXA_AEN_CAT_PORT:
+        return keep(hxal_port_aen_unregister, [&](auto to) { return hxal_port_aen_register(ioc, hear_event, this, &filter.port, to); });
+    case HXA_AEN_CAT_LPORT:
+        return keep(hxal_lport_aen_unregister, [&](auto to) { return hxal_lport_aen_register(ioc, lport_form, this, &filter.lport, to, flag); });
+    case HXA_AEN_CAT_RPORT:
+        return keep(hxal_rport_aen_unregister, [&](auto to) { return hxal_rport_aen_register(ioc, hear_event, this, &filter.rport, to); });
+    case HXA_AEN_CAT_ITNIM:
+        return keep(hxal_itnim_aen_unregister, [&](auto to) { return hxal_itnim_aen_register(ioc, itnim_form, this, &filter.itnim, to, flag); });
+    case HXA_AEN_CAT_AUDIT:
+        return keep(hxal_audit_aen_unregister, [&](auto to) { return hxal_audit_aen_register(ioc, hear_event, this, &filter.audit, to); });
+    case HXA_AEN_CAT_ETHPORT:
+        return keep(hxal_ethport_aen_unregister, [&](auto to) { return hxal_ethport_aen_register(ioc, hear_event, this, nullptr, to); });
+    default:
+        return keep(hxal_ioc_aen_unregister, [&](auto to) { return hxal_ioc_aen_register(ioc, hear_event, this, to); });
+    }
+    // clang-format on
 }
 
 // A scanned host with one two-port CNA: instances 0 and 1 of both drivers.

@@ -70,7 +70,7 @@ TEST_F(Aen_Thread, fetches_again_when_a_batch_was_full)
     for (const auto& [events, expected] : cases)
     {
         Listener listener(heard, "it");
-        listen_ioc(listener, fc);
+        listener.listen(HXA_AEN_CAT_IOC, fc);
         raise(0, 7, events);
         EXPECT_EQ(hxal_aen_init(), HXA_STATUS_OK);
         auto instances = std::vector<int>(expected, 0);
@@ -86,8 +86,8 @@ TEST_F(Aen_Thread, tells_two_instances_of_one_descriptor_apart)
     ASSERT_EQ(fc->fd, fc1->fd);
     Listener first(heard, "first");
     Listener second(heard, "second");
-    listen_ioc(first, fc);
-    listen_ioc(second, fc1);
+    first.listen(HXA_AEN_CAT_IOC, fc);
+    second.listen(HXA_AEN_CAT_IOC, fc1);
     raise(1, 2);
     raise(0, 1);
     hxasim::raise_event({.node = "/dev/hxn", .instance = 0, .category = HXA_AEN_CAT_IOC, .type = 9}); // nobody listens there
@@ -132,7 +132,7 @@ TEST_F(Aen_Thread, delivers_bursts_once_each_and_in_order)
 TEST_F(Aen_Thread, stops_and_starts_a_hundred_times_without_losing_an_event)
 {
     Listener listener(heard, "it");
-    listen_ioc(listener, fc);
+    listener.listen(HXA_AEN_CAT_IOC, fc);
     const auto before = threads();
     for (uint32_t round = 0; round < 100; ++round)
     {
@@ -149,7 +149,7 @@ TEST_F(Aen_Thread, stops_and_starts_a_hundred_times_without_losing_an_event)
 TEST_F(Aen_Thread, sees_the_stop_between_full_batches)
 {
     Listener listener(heard, "it");
-    listen_ioc(listener, fc);
+    listener.listen(HXA_AEN_CAT_IOC, fc);
     hxasim::inject({.command = "IOCMD_AEN_GET", .answer = {{4, {64, 0, 0, 0}}}}); // never ends
     raise(0, 1);
     hxal_aen_init();
@@ -163,7 +163,7 @@ TEST_F(Aen_Thread, starts_none_for_an_application_without_events)
 {
     hxal_libinit(hxa_aen_app_tessik);
     Listener listener(heard, "it");
-    listen_ioc(listener, fc);
+    listener.listen(HXA_AEN_CAT_IOC, fc);
     const auto before = threads();
     EXPECT_EQ(hxal_aen_init(), HXA_STATUS_OK);
     EXPECT_TRUE(settles_at(before));
@@ -172,7 +172,7 @@ TEST_F(Aen_Thread, starts_none_for_an_application_without_events)
 TEST_F(Aen_Thread, can_be_stopped_and_kept_by_a_callback)
 {
     Listener listener(heard, "it");
-    listen_ioc(listener, fc);
+    listener.listen(HXA_AEN_CAT_IOC, fc);
     listener.then = hxal_aen_exit;
     raise(0, 1);
     hxal_aen_init();
@@ -193,7 +193,7 @@ TEST_F(Aen_Thread, can_be_stopped_and_kept_by_a_callback)
 TEST_F(Aen_Thread, loses_no_event_when_callbacks_and_others_stop_and_start_it_at_once)
 {
     Listener listener(heard, "it");
-    listen_ioc(listener, fc);
+    listener.listen(HXA_AEN_CAT_IOC, fc);
     listener.then = []
     {
         hxal_aen_exit();
@@ -223,7 +223,7 @@ TEST_F(Aen_Thread, does_not_hold_up_the_end_of_the_process)
             alarm(60);
             scan_anew();
             Listener listener(heard, "it");
-            listen_ioc(listener, fc);
+            listener.listen(HXA_AEN_CAT_IOC, fc);
             hxasim::inject({.command = "IOCMD_AEN_GET", .answer = {{4, {64, 0, 0, 0}}}}); // never ends
             raise(0, 1);
             if (in_callback)
@@ -243,11 +243,11 @@ TEST_F(Aen_Thread, allows_registrations_to_change_while_it_dispatches)
 {
     Listener steady(heard, "steady");
     Listener born(heard, "born");
-    listen_ioc(steady, fc);
+    steady.listen(HXA_AEN_CAT_IOC, fc);
     steady.then = [&]
     {
         born.end();
-        listen_ioc(born, fc);
+        born.listen(HXA_AEN_CAT_IOC, fc);
     };
     // A callback may still run when its registration has ended: what it uses has to last.
     static Heard unheard;
@@ -258,7 +258,7 @@ TEST_F(Aen_Thread, allows_registrations_to_change_while_it_dispatches)
         {
             while (!stop)
             {
-                listen_ioc(guest, fc);
+                guest.listen(HXA_AEN_CAT_IOC, fc);
                 guest.end();
             }
         });
@@ -279,7 +279,7 @@ TEST_F(Aen_Thread, allows_registrations_to_change_while_it_dispatches)
 TEST_F(Aen_Thread, goes_on_after_a_failed_fetch)
 {
     Listener listener(heard, "it");
-    listen_ioc(listener, fc);
+    listener.listen(HXA_AEN_CAT_IOC, fc);
     hxasim::inject({.command = "IOCMD_AEN_GET", .instance = 0, .error = EIO, .times = 1});
     raise(0, 1);
     testing::internal::CaptureStdout();
@@ -297,7 +297,7 @@ TEST_F(Aen_Thread, survives_a_count_that_lies)
     for (const std::vector<uint8_t>& count : {std::vector<uint8_t>{0xE8, 3, 0, 0}, {0xFF, 0xFF, 0xFF, 0xFF}, {0, 0, 0, 0x80}})
     {
         Listener listener(heard, "it");
-        listen_ioc(listener, fc);
+        listener.listen(HXA_AEN_CAT_IOC, fc);
         hxasim::inject({.command = "IOCMD_AEN_GET", .instance = 0, .times = 1, .answer = {{4, count}}});
         hxasim::take_requests();
         raise(0, 1);
@@ -351,7 +351,7 @@ TEST_F(Aen_Thread, waits_on_any_descriptor)
     scan_anew();
     EXPECT_GT(fc->fd, FD_SETSIZE);
     Listener listener(heard, "it");
-    listen_ioc(listener, fc);
+    listener.listen(HXA_AEN_CAT_IOC, fc);
     hxal_aen_init();
     raise(0, 1);
     EXPECT_THAT(heard.take(1), ElementsAre("it 1"));

@@ -9,7 +9,6 @@
 #include <gtest/gtest.h>
 
 #include <initializer_list>
-#include <iterator>
 #include <vector>
 
 class Config_Model : public testing::Test, protected Temporary_Folder
@@ -26,12 +25,6 @@ protected:
     {
         for (const char* line : lines)
             hxal_config_parse(line);
-    }
-
-    static std::string content(const std::string& path)
-    {
-        std::ifstream stream(path, std::ios::binary);
-        return {std::istreambuf_iterator<char>(stream), {}};
     }
 
     std::vector<std::string> names() const

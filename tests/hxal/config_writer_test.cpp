@@ -1,8 +1,6 @@
 // The file as it is written, whole.
 #include "config_fixture.h"
 
-#include <random>
-
 namespace
 {
 
@@ -58,96 +56,6 @@ TEST_F(Config_Writer, writes_the_virtual_ports_of_one_entry)
         vport_traverse(file, idx);
     std::fclose(file);
     EXPECT_STREQ(text, "hxa2-vport-0 = \"e,f,g,h,2\";\n");
-}
-
-// A model of arbitrary settings, made as a file could make it.
-class Random_Model
-{
-public:
-    explicit Random_Model(unsigned seed) : random(seed) {}
-
-    void fill()
-    {
-        for (int adapters = below(5), i = 0; i <= adapters; ++i)
-        {
-            parse("adapter-" + text(12) + "-name = " + text(127));
-            parse("adapter-" + text(11) + "-power = " + std::to_string(below(4)));
-        }
-        for (int iocs = below(8), i = 0; i <= iocs; ++i)
-            parse("hxa" + std::to_string(below(128)) + "-port-wwn = " + wwn());
-        for (int lines = below(400), i = 0; i < lines; ++i)
-            parse(below(12) ? "hxa" + std::to_string(below(128)) + "-" + setting() : setting());
-        for (int lines = below(20), i = 0; i < lines; ++i)
-            parse("hxn" + std::to_string(below(128)) + (below(2) ? "-port-name = " + text(127) : "-port-mac = " + text(31)));
-        for (int lines = below(20), i = 0; i < lines; ++i)
-            parse("hxa" + std::to_string(below(8)) + "-vport-" + std::to_string(below(300)) + " = " + wwn() + "," + wwn() + "," +
-                  (below(3) ? text(127) : "") + "," + text(15) + "," + std::to_string(below(65536)));
-        if (below(2))
-            parse("power = " + std::to_string(below(4)));
-    }
-
-private:
-    static void parse(const std::string& line) { hxal_config_parse(line.c_str()); }
-
-    int below(int end) { return std::uniform_int_distribution(0, end - 1)(random); }
-
-    template <typename Items> const auto& one_of(const Items& items)
-    {
-        return items[static_cast<std::size_t>(below(static_cast<int>(std::size(items))))];
-    }
-
-    std::string text(int longest)
-    {
-        constexpr std::string_view letters = "bcefgijkmoqsuvwyzBCE0123456789_.:"; // no word that tells the kind of a line
-        std::string made(static_cast<std::size_t>(1 + below(longest)), ' ');
-        for (char& letter : made)
-            letter = one_of(letters);
-        return made;
-    }
-
-    std::string wwn() { return "10:00:00:05:1e:10:" + std::to_string(below(10)) + ":" + std::to_string(below(10)); }
-
-    std::string setting()
-    {
-        struct Keys
-        {
-            std::vector<const char*> keys;
-            std::vector<const char*> words; // none: a number
-        };
-        // clang-format off
-        static const Keys kinds[] = {
-            {{"port-speed", "port-maxfrsize", "vf-default", "pathtov", "qdepth", "delay", "latency", "auth-group",
-              "ratelim-defspeed"}, {}},
-            {{"port-trunk", "vf-list"}, {"", "0", "1, 15", "7,3"}},
-            {{"port-hardalpa"}, {"0x1f", "EF"}},
-            {{"port-enable", "ipfc-enable", "vf-enable", "qos", "ratelim", "persistent-binding"}, {"TRUE", "FALSE", "true"}},
-            {{"auth-policy", "coalesce"}, {"on", "off"}},
-            {{"port-topology"}, {"none", "p2p", "loop", "auto", "ring"}},
-            {{"log-level"}, {"Critical", "Error", "Warning", "Info", "None"}},
-            {{"auth-algo"}, {"md5", "sha1", "ms", "sm"}},
-            {{"auth-secretsource"}, {"LOCAL", "RADIUS", "TACACS"}},
-            {{"auth-encrypt"}, {"7", "1,22,333"}},
-        };
-        // clang-format on
-        const Keys& kind = one_of(kinds);
-        const std::string key = one_of(kind.keys);
-        return key + " = " + (kind.words.empty() ? std::to_string(below(70000)) : one_of(kind.words));
-    }
-
-    std::mt19937 random;
-};
-
-TEST_F(Config_Writer, writes_the_same_bytes_of_what_was_read_from_them)
-{
-    for (unsigned seed = 0; seed < 200; ++seed)
-    {
-        empty_model();
-        Random_Model(seed).fill();
-        const std::string first = written();
-        empty_model();
-        load(first);
-        ASSERT_EQ(written(), first) << seed;
-    }
 }
 
 } // namespace
