@@ -7,7 +7,6 @@
 
 using namespace zmlr;
 using testing::ElementsAre;
-using testing::IsEmpty;
 
 namespace
 {
@@ -33,6 +32,8 @@ TEST_F(Host, info_tells_the_best_text_there_is)
     const std::string no_domain = "WARN ProviderUtil: getdomainname() failed",
                       no_second_name = "WARN ProviderUtil: gethostname() failed";
     const std::string no_name = "INFO ProviderUtil: gethostname() FAILED. hostString will be filled with localhost";
+    const std::string remark =
+        "WARN CommonHelper: No host IP / Name  retrived in the function, So function fills localhost for host info.";
     const std::vector<std::string> loopback = {"127.0.0.1", "127.0.1.1"};
     const struct
     {
@@ -56,9 +57,18 @@ TEST_F(Host, info_tells_the_best_text_there_is)
     };
     for (const auto& c : cases)
     {
+        SCOPED_TRACE(c.what);
         fake_host = c.host;
-        EXPECT_EQ(info(), c.expected) << c.what;
-        EXPECT_EQ(log(), c.log) << c.what;
+        EXPECT_EQ(info(), c.expected);
+        EXPECT_EQ(log(), c.log);
+
+        fake_host = c.host;
+        const Instance_Array systems = FCHBAManager::getFCHBAManager().getInstances(CLASSID_ComputerSystem);
+        const std::string name = '"' + c.expected.second + '"';
+        EXPECT_THAT(values_of(systems, "Name"), ElementsAre(name));
+        EXPECT_THAT(values_of(systems, "OtherIdentifyingInfo"), ElementsAre("{ " + name + " }"));
+        EXPECT_THAT(values_of(systems, "NameFormat"), ElementsAre(c.expected.first == 0 ? "\"IP\"" : "\"Other\""));
+        EXPECT_EQ(testing::Value(log(), testing::Contains(remark)), c.expected.first == 3);
     }
 }
 
@@ -83,53 +93,4 @@ TEST_F(Host, has_paths_files_and_a_node_name)
     EXPECT_STREQ(ProviderUtil::getHostName().c_str(), "storage-host");
     fake_host.name.reset();
     EXPECT_STREQ(ProviderUtil::getHostName().c_str(), "localhost");
-}
-
-TEST_F(Host, is_one_computer_system)
-{
-    EXPECT_EQ(describe(FCHBAManager::getFCHBAManager().getInstances(CLASSID_ComputerSystem)), R"(ZEMLAR_ComputerSystem
-    Caption = "The host with Zemlar's adapters installed."
-    Description = "The host with Zemlar's adapters installed."
-    ElementName = "The host with Zemlar's adapters installed."
-    Name = "192.0.2.10"
-    OperationalStatus = { 2 }
-    StatusDescriptions = { "The System is in service" }
-    EnabledState = 5
-    RequestedState = 12
-    EnabledDefault = 2
-    TransitioningToState = 12
-    CreationClassName = "ZEMLAR_ComputerSystem"
-    NameFormat = "IP"
-    OtherIdentifyingInfo = { "192.0.2.10" }
-    IdentifyingDescriptions = { "Ipv4 Address" }
-    Dedicated = { 0, 14 }
-)");
-    EXPECT_THAT(requests(), IsEmpty());
-}
-
-TEST_F(Host, computer_system_is_named_as_the_info_says)
-{
-    const std::string remark =
-        "WARN CommonHelper: No host IP / Name  retrived in the function, So function fills localhost for host info.";
-    const struct
-    {
-        Fake_Host host;
-        std::string name;
-        bool remarked;
-    } cases[] = {
-        {{.addresses = {}}, "\"storage-host\"", false},
-        {{.name = std::nullopt}, "\"localhost\"", true},
-        {{.name = "bad\x01name", .addresses = {}}, "\"bad?name\"", false},
-    };
-    for (const auto& c : cases)
-    {
-        fake_host = c.host;
-        log();
-        const Instance_Array systems = FCHBAManager::getFCHBAManager().getInstances(CLASSID_ComputerSystem);
-        EXPECT_THAT(values_of(systems, "Name"), ElementsAre(c.name));
-        EXPECT_THAT(values_of(systems, "NameFormat"), ElementsAre("\"Other\""));
-        EXPECT_THAT(values_of(systems, "OtherIdentifyingInfo"), ElementsAre("{ " + c.name + " }"));
-        EXPECT_THAT(values_of(systems, "IdentifyingDescriptions"), ElementsAre("{ \"Fully Qualified Domain Name\" }"));
-        EXPECT_EQ(testing::Value(log(), testing::Contains(remark)), c.remarked);
-    }
 }

@@ -43,33 +43,23 @@ std::string text_of(const Instance* instance, const Meta_Property* property)
 void Inventory_Test::SetUp()
 {
     fake_host = Fake_Host();
-    plug("mixed");
+    hxasim::load("mixed");
+    scan();
 }
 
 void Inventory_Test::TearDown() { EXPECT_THAT(hxasim::violations(), testing::IsEmpty()); }
 
-void Inventory_Test::rescan()
+void Inventory_Test::plug_text(const std::string& json)
+{
+    hxasim::load_text(json);
+    scan();
+}
+
+void Inventory_Test::scan()
 {
     hxal_adapter_scan();
     requests();
     log();
-}
-
-void Inventory_Test::plug(const std::string& scenario)
-{
-    hxasim::load(scenario);
-    rescan();
-}
-
-void Inventory_Test::plug_text(const std::string& json)
-{
-    hxasim::load_text(json);
-    rescan();
-}
-
-void Inventory_Test::fail(const char* command, const char* node, std::optional<int> instance, int error)
-{
-    hxasim::inject({.command = command, .node = node, .instance = instance, .error = error});
 }
 
 std::vector<std::string> Inventory_Test::requests()

@@ -21,13 +21,13 @@ protected:
     void SetUp() override;
     void TearDown() override; // fails on requests that no driver would accept
 
-    void plug(const std::string& scenario); // replaces the host by a shipped one and scans it
-    void plug_text(const std::string& json);
-    void rescan();
-    void fail(const char* command, const char* node, std::optional<int> instance, int error); // with an errno
+    void plug_text(const std::string& json); // replaces the host ("mixed" at first) and scans it
 
     std::vector<std::string> requests(); // "COMMAND node instance", since the last call
     std::vector<std::string> log();      // "LEVEL Source: message", since the last call, without entries and exits
+
+private:
+    void scan();
 };
 
 // The class name, then a line for each property that is not null, in the order of the class.
