@@ -42,18 +42,6 @@ void Loaded_Module::load(const std::string& scenario)
 {
     unload();
     hxasim::load(scenario);
-    load_module();
-}
-
-void Loaded_Module::load_text(const std::string& json)
-{
-    unload();
-    hxasim::load_text(json);
-    load_module();
-}
-
-void Loaded_Module::load_module()
-{
     _module = std::make_unique<cimserver::Module>(module_path);
     _operations = std::make_unique<cimserver::Name_Spaces>(*_module);
 }

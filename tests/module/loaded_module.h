@@ -24,9 +24,8 @@ std::string describe(const cimserver::Instance& instance);
 class Loaded_Module : public testing::Test
 {
 protected:
-    // Loads the module anew on a shipped scenario, or on one given as JSON text.
+    // Loads the module anew on a shipped scenario.
     void load(const std::string& scenario);
-    void load_text(const std::string& json);
 
     // The instances of a class, asked for as a client would.
     std::vector<cimserver::Instance> enumerate(const std::string& class_name);
@@ -41,7 +40,6 @@ protected:
     cimserver::Operations& operations() { return *_operations; }
 
 private:
-    void load_module();
     void unload();
 
     std::unique_ptr<cimserver::Module> _module;
