@@ -31,6 +31,7 @@ struct Request
     std::vector<std::uint8_t> sent;     // the record as it came in
     std::vector<std::uint8_t> answered; // the record as it went out
     int error = 0;                      // the errno the call failed with, 0 when it succeeded
+    bool carries_status = false;        // a fault may give it a record status
     std::chrono::nanoseconds slept{};   // how long the process asked to sleep since the request before
 };
 
@@ -57,12 +58,16 @@ std::vector<Request> take_requests();
 std::uint64_t request_count(); // requests since load(), taken ones included
 
 // Throws std::runtime_error for a fault that could never do what it says: an unknown command or node, a status for a record
-// that carries none, bytes beyond the record, nothing to do at all.
+// that carries none, bytes beyond the record, a LUN for what is no SCSI command, nothing to do at all.
 void inject(const Fault& fault);
 void clear_faults();
 
-// Requests that no driver would accept (unknown command, wrong size, dirty reserved field, bad instance), since load():
-// one text each, at most the first 1,000.
+// Strikes once, and among recorded requests that are sent again in their order the one at `index`: what is to happen to it is
+// for the caller to set. Faults that are injected already must not strike the same requests.
+Fault fault_at(const std::vector<Request>& requests, std::size_t index);
+
+// Requests that no driver would accept (unknown command, wrong size, dirty reserved field, bad instance, a node that is not
+// opened for reading and writing), since load(): one text each, at most the first 1,000.
 std::vector<std::string> violations();
 
 // Open descriptors on the simulated nodes.

@@ -38,7 +38,7 @@ static_assert(offsetof(hxa_port_cfg_t, tag) == 152, "hxa_port_cfg_t");
 typedef struct
 {
     uint32_t state;             //   0  hxa_port_state_t
-    uint32_t pid;               //   4  FC address; 0 while it has none
+    uint32_t pid;               //   4  FC address, bytes in wire order; 0 while it has none
     hxa_port_cfg_t port_cfg;    //   8
     uint32_t port_type;         // 176  hxa_pport_type_t
     uint32_t loopback;          // 180

@@ -114,7 +114,7 @@ typedef struct
     uint32_t beacon;           // 336  hxa_boolean_t
     uint32_t link_e2e_beacon;  // 340  hxa_boolean_t
     uint32_t plog_enabled;     // 344  hxa_boolean_t
-    uint32_t pid;              // 348  FC address
+    uint32_t pid;              // 348  FC address, bytes in wire order
     uint32_t port_type;        // 352  hxa_pport_type_t
     uint32_t loopback;         // 356
     uint32_t authfail;         // 360

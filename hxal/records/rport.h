@@ -37,7 +37,7 @@ typedef struct
     wwn_t nwwn;                    //   0
     wwn_t pwwn;                    //   8
     uint32_t cos_supported;        //  16  fc_cos_t
-    uint32_t pid;                  //  20  FC address
+    uint32_t pid;                  //  20  FC address, bytes in wire order
     uint32_t df_sz;                //  24  data field of a frame, bytes
     uint32_t state;                //  28  hxa_rport_state_t
     uint32_t fc_cos;               //  32  fc_cos_t in use

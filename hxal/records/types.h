@@ -13,6 +13,9 @@
 // it, walk the bytes, never the integer.
 typedef uint64_t wwn_t;
 
+// The address of a port in the fabric (`pid` in records) lies as it goes over the wire (FC-FS-2): domain, area, port, from the
+// lowest memory address on, and a 0 behind them. Like a name it is walked, never read as a number.
+
 // A SCSI LUN, 8 bytes as delivered.
 typedef uint64_t lun_t;
 

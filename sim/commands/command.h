@@ -7,6 +7,7 @@
 #include "hxal/records/commands.h"
 
 #include <bitset>
+#include <cstdint>
 #include <optional>
 #include <span>
 #include <string>
@@ -20,11 +21,11 @@ namespace hxasim
 struct Descriptor
 {
     Node node;
-    std::uint64_t host_number;          // of the host that it was opened on
-    std::uint32_t application = 0;      // that synchronised on it; 0: none
-    std::bitset<max_instances> known{}; // IOCs that were there then
-    bool readable = false;              // now
-    bool inherited = false;             // from the process that this one was forked from, which makes it readable
+    std::uint64_t host_number;                     // of the host that it was opened on
+    std::optional<std::uint32_t> application = {}; // that synchronised on it
+    std::bitset<max_instances> known{};            // IOCs that were there then
+    bool readable = false;                         // now
+    bool inherited = false;                        // from the process that this one was forked from, which makes it readable
 };
 
 // One request while it is answered. The answer sets `status` in its record, or refuses the whole call.
@@ -57,18 +58,30 @@ enum class Target : std::uint8_t
     ioc
 };
 
+// Memory of the sender's for an answer that is not in the record.
+struct Buffer
+{
+    std::uint64_t pointer;
+    std::uint64_t size; // bytes
+};
+
 struct Row
 {
     const hxal::Command* command;
     Target target;
-    std::size_t record_size;           // largest one that is answered
-    std::size_t sent_size;             // what of it is read from the sender
-    Field instance;                    // where the record carries it, in a request to one IOC
-    std::optional<std::size_t> status; // where the record keeps its status
-    bool of_absent;                    // answered also for an IOC whose card is gone
+    std::size_t record_size;                // largest one that is answered
+    std::size_t sent_size;                  // what of it is read from the sender
+    Field instance;                         // where the record carries it, in a request to one IOC
+    std::optional<std::size_t> status;      // where the record keeps its status
+    std::optional<std::size_t> remote_port; // where the record names one
+    bool of_absent;                         // answered also for an IOC whose card is gone
+    bool is_scsi;                           // the record is a hxa_ioctl_scsi_t
 
     // Makes 0 of what the sender may set, the instance included: what is left has to be 0.
     void (*clear_inputs)(std::span<std::uint8_t> record);
+
+    // The buffers that a record refers to, the one for data first; null where records of this kind do not.
+    std::vector<Buffer> (*buffers)(std::span<const std::uint8_t> record);
 
     // `record` comes in as it was sent and goes out as it is to be answered.
     void (*answer)(Call& call, std::vector<std::uint8_t>& record);

@@ -36,6 +36,8 @@ void answer_fetch(Call& call, hxal_ioctl_aen_t& record)
         return;
     if (record.aen_count < 0)
         return call.refuse(EINVAL, "room for " + std::to_string(record.aen_count) + " events");
+    if (call.descriptor.application != record.app_id)
+        return call.refuse(EINVAL, "application " + std::to_string(record.app_id) + " has not synchronised on this descriptor");
     const auto room = static_cast<std::size_t>(std::min(record.aen_count, HXA_AEN_MAX_ENTRIES));
     const auto count = call.ioc->events.take(record.app_id, {record.aen_list, room});
     record.aen_count = static_cast<std::int32_t>(count);

@@ -3,6 +3,7 @@
 #include "sim/commands/lport_requests.h"
 #include "sim/commands/name_server.h"
 #include "sim/commands/row.h"
+#include "sim/model/record_fields.h"
 
 #include <algorithm>
 #include <cerrno>
@@ -25,7 +26,22 @@ bool is_for_name_server(const fchs_t& header)
 
 bool is_from(const fchs_t& header, const Logical_Port& port)
 {
-    return std::memcmp(header.s_id, &port.address, sizeof(header.s_id)) == 0;
+    const auto address = wire_address(port.address);
+    return std::equal(address.begin(), address.end(), header.s_id);
+}
+
+// What a frame that asks for something never goes without (FC-FS-2); null when nothing is missing.
+const char* missing_in(const fchs_t& header)
+{
+    const auto is_empty = [](const auto& field)
+    { return std::all_of(std::begin(field), std::end(field), [](std::uint8_t byte) { return byte == 0; }); };
+    if (header.r_ctl == 0)
+        return "R_CTL";
+    if (is_empty(header.d_id))
+        return "D_ID";
+    if (header.type == 0)
+        return "TYPE";
+    return is_empty(header.f_ctl) ? "F_CTL" : nullptr;
 }
 
 void count_exchange(Ioc& ioc)
@@ -76,6 +92,8 @@ void answer_pass_through(Call& call, hxa_ioctl_fcpt_t& record)
 {
     if (record.nport_nexus_needed != (record.dpwwn != 0))
         return call.refuse(EINVAL, "needs a nexus: " + std::to_string(record.nport_nexus_needed));
+    if (const char* missing = missing_in(record.fchs))
+        return call.refuse(EINVAL, std::string("frame without ") + missing);
     const auto* logical = logical_port_of(call, record, record.lpwwn);
     if (!logical || !may_send(call, record, *logical))
         return;
@@ -90,10 +108,11 @@ constexpr auto frame = [](auto& record)
     return std::tie(record.vf_id, record.lpwwn, record.dpwwn, record.tsecs, record.cts, record.cos, record.fchs,
                     record.nport_nexus_needed, record.reqsz, record.rspsz, record.reqbuf_ptr, record.rspbuf_ptr);
 };
+constexpr auto buffers = [](const auto& record) { return std::vector{Buffer{record.rspbuf_ptr, record.rspsz}}; };
 
 // clang-format off
 constexpr Row rows[] = {
-    ioc_row<answer_pass_through>("IOCMD_FCPT", frame),
+    ioc_row<answer_pass_through>("IOCMD_FCPT", frame, buffers),
 };
 // clang-format on
 

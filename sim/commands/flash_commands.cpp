@@ -93,13 +93,16 @@ void answer_optrom_disable(Call& call, hxa_ioctl_gen_t&) { call.ioc->adapter->fl
 constexpr auto partition = [](auto& record) { return std::tie(record.instance, record.type); };
 constexpr auto partition_data = [](auto& record) { return std::tie(record.instance, record.type, record.buf_ptr, record.bufsz); };
 constexpr auto block = [](auto& record) { return std::tie(record.mfg_block); };
+constexpr auto buffers = [](const auto& record) {
+    return std::vector{Buffer{record.buf_ptr, record.bufsz > 0 ? static_cast<std::uint32_t>(record.bufsz) : 0}};
+};
 
 // clang-format off
 constexpr Row rows[] = {
     ioc_row<answer_attributes>(    "IOCMD_FLASH_GET_ATTR"),
     ioc_row<answer_erase>(         "IOCMD_FLASH_ERASE_PART",     partition),
     ioc_row<answer_update>(        "IOCMD_FLASH_UPDATE_PART",    partition_data),
-    ioc_row<answer_read>(          "IOCMD_FLASH_READ_PART",      partition_data),
+    ioc_row<answer_read>(          "IOCMD_FLASH_READ_PART",      partition_data, buffers),
     ioc_row<answer_manufacturing>( "IOCMD_FLASH_MFG_INFO",       block),
     ioc_row<answer_optrom_enable>( "IOCMD_FLASH_ENABLE_OPTROM"),
     ioc_row<answer_optrom_disable>("IOCMD_FLASH_DISABLE_OPTROM"),

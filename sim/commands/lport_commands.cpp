@@ -17,17 +17,13 @@ namespace
 // Fabric-provided MAC address of an FCoE port (FC-BB-5): the usual prefix of the fabric, then the FC address.
 Mac fabric_mac(std::uint32_t address)
 {
-    return {0x0E,
-            0xFC,
-            0x00,
-            static_cast<std::uint8_t>(address >> 16),
-            static_cast<std::uint8_t>(address >> 8),
-            static_cast<std::uint8_t>(address)};
+    const auto own = wire_address(address);
+    return {0x0E, 0xFC, 0x00, own[0], own[1], own[2]};
 }
 
 void put_fabric(hxa_port_attr_t& field, const Ioc& ioc, const Logical_Port& logical)
 {
-    field.pid = logical.address;
+    field.pid = address_field(logical.address);
     if (ioc.port->topology != HXA_PPORT_TOPOLOGY_LOOP)
         put_address(field.fabric_name, ioc.port->fabric_name);
     if (ioc.type == HXA_IOC_TYPE_FCoE)
@@ -75,12 +71,15 @@ void answer_remote_ports(Call& call, hxa_ioctl_lport_get_rports_t& record)
 
 constexpr auto logical_port = [](auto& record) { return std::tie(record.vf_id, record.pwwn); };
 constexpr auto list = [](auto& record) { return std::tie(record.vf_id, record.pwwn, record.rbuf_ptr, record.nrports); };
+constexpr auto buffers = [](const auto& record) {
+    return std::vector{Buffer{record.rbuf_ptr, sizeof(wwn_t) * std::uint64_t{record.nrports}}};
+};
 
 // clang-format off
 constexpr Row rows[] = {
     ioc_row<answer_attributes>(      "IOCMD_LPORT_GET_ATTR",    logical_port),
     ioc_row<answer_reset_statistics>("IOCMD_LPORT_RESET_STATS", logical_port),
-    ioc_row<answer_remote_ports>(    "IOCMD_LPORT_GET_RPORTS",  list),
+    ioc_row<answer_remote_ports>(    "IOCMD_LPORT_GET_RPORTS",  list, buffers),
 };
 // clang-format on
 

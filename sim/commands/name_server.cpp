@@ -1,5 +1,7 @@
 #include "sim/commands/name_server.h"
 
+#include "sim/model/record_fields.h"
+
 #include "hxal/records/fcpt.h"
 
 #include <algorithm>
@@ -73,7 +75,10 @@ std::vector<std::uint8_t> ask_name_server(const Logical_Port& asking, std::span<
     if (request.size() != sizeof(header) + 4)
         return reject(invalid_size);
     auto has_address = [&](const Remote_Port& remote)
-    { return std::memcmp(&remote.address, &request[sizeof(header) + 1], 3) == 0 && remote.state == HXA_RPORT_ONLINE; };
+    {
+        const auto address = wire_address(remote.address);
+        return std::equal(address.begin(), address.end(), &request[sizeof(header) + 1]) && remote.state == HXA_RPORT_ONLINE;
+    };
     auto found = std::find_if(asking.remote_ports.begin(), asking.remote_ports.end(), has_address);
     return found == asking.remote_ports.end() ? reject(unable_to_perform, no_such_port_identifier) : accept(found->symbolic_name);
 }

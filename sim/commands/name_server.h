@@ -8,8 +8,7 @@
 namespace hxasim
 {
 
-// The answer to a CT request of a logical port: an accept with what was asked for, or a reject with its reason. Addresses are
-// compared byte by byte, as they lie in memory.
+// The answer to a CT request of a logical port: an accept with what was asked for, or a reject with its reason.
 std::vector<std::uint8_t> ask_name_server(const Logical_Port& asking, std::span<const std::uint8_t> request);
 
 } // namespace hxasim

@@ -21,7 +21,7 @@ void put_fibre_channel(hxa_pport_attr_t& field, const Port& port, bool link_up)
     if (!link_up)
         return;
     field.topology = port.topology;
-    field.pid = port.base_port.address;
+    field.pid = address_field(port.base_port.address);
 }
 
 void answer_attributes(Call& call, hxa_ioctl_port_attr_t& record)

@@ -47,6 +47,16 @@ template <typename Record> consteval std::optional<std::size_t> status_offset()
         return std::nullopt;
 }
 
+template <typename Record> consteval std::optional<std::size_t> remote_port_offset()
+{
+    if constexpr (requires(Record record) { record.rpwwn; })
+        return offsetof(Record, rpwwn);
+    else if constexpr (requires(Record record) { record.dpwwn; })
+        return offsetof(Record, dpwwn);
+    else
+        return std::nullopt;
+}
+
 template <typename Record, Target target> consteval Field instance_field()
 {
     if constexpr (target == Target::ioc)
@@ -82,7 +92,26 @@ template <auto function> void answer_with(Call& call, std::vector<std::uint8_t>&
     std::memcpy(bytes.data(), &record, bytes.size());
 }
 
-template <auto function, Target target, typename Inputs> consteval Row row(std::string_view name)
+template <typename Record, typename Buffers> std::vector<Buffer> buffers_of(std::span<const std::uint8_t> bytes)
+{
+    return Buffers{}(record_of<Record>(bytes));
+}
+
+struct No_Buffers
+{
+};
+
+using List_Buffers = std::vector<Buffer> (*)(std::span<const std::uint8_t>);
+
+template <typename Record, typename Buffers> consteval List_Buffers choose_buffers()
+{
+    if constexpr (std::is_same_v<Buffers, No_Buffers>)
+        return nullptr;
+    else
+        return buffers_of<Record, Buffers>;
+}
+
+template <auto function, Target target, typename Inputs, typename Buffers = No_Buffers> consteval Row row(std::string_view name)
 {
     using Record = typename Answer_Record<function>::type;
     const auto* command = catalogued(name);
@@ -94,8 +123,11 @@ template <auto function, Target target, typename Inputs> consteval Row row(std::
             .sent_size = is_event_fetch(*command) ? offsetof(hxal_ioctl_aen_t, aen_list) : sizeof(Record),
             .instance = instance_field<Record, target>(),
             .status = status_offset<Record>(),
+            .remote_port = remote_port_offset<Record>(),
             .of_absent = is_event_fetch(*command),
+            .is_scsi = std::is_same_v<Record, hxa_ioctl_scsi_t>,
             .clear_inputs = clear_inputs<Record, target, Inputs>,
+            .buffers = choose_buffers<Record, Buffers>(),
             .answer = answer_with<function>};
 }
 
@@ -110,10 +142,11 @@ template <auto function, typename Inputs = decltype(nothing)> consteval Row driv
     return row_parts::row<function, Target::driver, Inputs>(name);
 }
 
-// A request to one IOC.
-template <auto function, typename Inputs = decltype(nothing)> consteval Row ioc_row(std::string_view name, Inputs = {})
+// A request to one IOC. `Buffers` lists the sender's buffers that the answer fills, the one for data first.
+template <auto function, typename Inputs = decltype(nothing), typename Buffers = row_parts::No_Buffers>
+consteval Row ioc_row(std::string_view name, Inputs = {}, Buffers = {})
 {
-    return row_parts::row<function, Target::ioc, Inputs>(name);
+    return row_parts::row<function, Target::ioc, Inputs, Buffers>(name);
 }
 
 } // namespace hxasim

@@ -71,7 +71,7 @@ void answer_attributes(Call& call, hxa_ioctl_rport_attr_t& record)
     put_text(field.symname, remote->symbolic_name);
     field.cos_supported = FC_CLASS_3;
     field.fc_cos = FC_CLASS_3;
-    field.pid = remote->address;
+    field.pid = address_field(remote->address);
     field.df_sz = remote->frame_size;
     field.state = state_of(*call.ioc, *remote);
     field.scsi_function = remote->function;

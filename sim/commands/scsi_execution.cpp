@@ -95,6 +95,8 @@ Scsi_Answer report_luns(const Scsi_Target& target, const std::uint8_t* cdb)
     const auto selected = cdb[2];
     if (selected > all)
         return refuse(invalid_field_in_cdb);
+    if (!target.report_luns.empty())
+        return deliver(target.report_luns, number_at(cdb + 6, 4));
     std::vector<std::uint8_t> list;
     if (selected != well_known)
         for (const auto& range : target.units)

@@ -109,15 +109,17 @@ Bytes identification(const Scsi_Target& target, const Unit_Range& unit, std::uin
     }
 }
 
+bool has_serial(const Unit_Range& unit) { return unit.serial_page || !unit.page_80.empty(); }
+
 bool has_identification(const Unit_Range& unit)
 {
-    return unit.identification != Identification::none || !unit.descriptors.empty();
+    return !unit.page_83.empty() || unit.identification != Identification::none || !unit.descriptors.empty();
 }
 
 Bytes page_list(const Unit_Range& unit)
 {
     Bytes pages{supported_pages};
-    if (unit.serial_page)
+    if (has_serial(unit))
         pages.push_back(unit_serial_number);
     if (has_identification(unit))
         pages.push_back(device_identification);
@@ -131,6 +133,8 @@ Bytes standard_inquiry(const Unit_Range* unit)
     constexpr std::uint8_t not_capable = 0x60; // peripheral qualifier: no unit can be here
     constexpr std::uint8_t removable = 0x80;
     constexpr std::uint8_t hierarchical = 0x10; // LUNs as REPORT LUNS has them
+    if (unit && !unit->inquiry.empty())
+        return unit->inquiry;
     const bool has_media = unit && (unit->type == tape || unit->type == cdrom);
     Bytes data{unit ? unit->type : static_cast<std::uint8_t>(not_capable | no_device),
                has_media ? removable : std::uint8_t{0},
@@ -151,6 +155,10 @@ std::optional<Bytes> vital_product_data(const Scsi_Target& target, const Unit_Ra
 {
     if (page == supported_pages)
         return with_head(unit.type, page, page_list(unit));
+    if (page == unit_serial_number && !unit.page_80.empty())
+        return unit.page_80;
+    if (page == device_identification && !unit.page_83.empty())
+        return unit.page_83;
     if (page == unit_serial_number && unit.serial_page)
         return with_head(unit.type, page, text_bytes(serial_number(target, unit, number)));
     if (page == device_identification && has_identification(unit))

@@ -175,21 +175,32 @@ private:
         auto* command = add("fault", "make requests go wrong");
         take_text(command, "--command", "command", "IOCMD_...; without it every command");
         add_place(command);
+        take_text(command, "--remote-port", "remote_port", "WWN of the remote port that the request names");
+        take(command, "--lun", "lun", "of a SCSI command");
+        take_text(command, "--cdb", "cdb", "hexadecimal, what the command block of a SCSI command begins with");
         take(command, "--error", "error", "fail the call with this errno");
         take(command, "--status", "status", "answer with this record status");
+        take(command, "--scsi-status", "scsi_status", "answer a SCSI command with this status");
+        take(command, "--garbage", "garbage", "answer random bytes; the number is their seed");
         take(command, "--delay", "delay", "answer that many ms later");
         take(command, "--skip", "skip", "let so many requests pass first");
         take(command, "--times", "times", "then strike so many; without it all");
+        take_patches(command, "--answer", "answer", "OFFSET:HEX, bytes of the answer to overwrite");
+        take_patches(command, "--data", "data", "OFFSET:HEX, bytes of the data that come with it to overwrite");
+    }
+
+    void take_patches(CLI::App* command, const std::string& option, const std::string& key, const std::string& help)
+    {
         command->add_option_function<std::vector<std::string>>(
-            "--answer",
-            [this](const std::vector<std::string>& patches)
+            option,
+            [this, key](const std::vector<std::string>& patches)
             {
                 Json_Value::List list;
                 for (const auto& patch : patches)
                     list.push_back(as_patch(patch));
-                question["answer"] = {list};
+                question[key] = {list};
             },
-            "OFFSET:HEX, bytes of the answer to overwrite");
+            help);
     }
 
     CLI::App _app{"Steers the simulated drivers of a running process."};

@@ -5,6 +5,7 @@
 #include "sim/model/fault.h"
 
 #include <optional>
+#include <span>
 #include <string>
 #include <vector>
 
@@ -23,13 +24,10 @@ public:
     std::size_t size() const { return _faults.size(); }
 
     // The fault that strikes this request, if any. Every fault asked counts the request against its `skip` or `times`.
-    std::optional<Fault> strike(const Row& row, Node node, int instance);
+    std::optional<Fault> strike(const Row& row, Node node, int instance, std::span<const std::uint8_t> sent);
 
 private:
     std::vector<Fault> _faults;
 };
-
-// Overwrites the patched bytes of an answered record, as far as it reaches.
-void overwrite(const std::vector<Patch>& patches, std::span<std::uint8_t> record);
 
 } // namespace hxasim

@@ -33,6 +33,7 @@ Request as_request(Journal_Entry& entry)
             .sent = std::move(entry.sent),
             .answered = std::move(entry.answered),
             .error = entry.error,
+            .carries_status = entry.carries_status,
             .slept = entry.slept};
 }
 

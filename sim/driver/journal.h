@@ -20,6 +20,7 @@ struct Journal_Entry
     std::vector<std::uint8_t> sent = {};
     std::vector<std::uint8_t> answered = {};
     int error = 0;
+    bool carries_status = false;
     std::chrono::nanoseconds slept{};
 };
 

@@ -3,8 +3,10 @@
 #include "sim/commands/caller_memory.h"
 #include "sim/commands/request_check.h"
 #include "sim/driver/event_descriptor.h"
+#include "sim/driver/fault_effects.h"
 #include "sim/model/state_changes.h"
 
+#include <fcntl.h>
 #include <sys/syscall.h>
 #include <unistd.h>
 
@@ -113,6 +115,11 @@ std::optional<int> Simulator::open(Node node, int flags)
         return -ENODEV;
     if (!_host->driver(node).present)
         return -ENOENT;
+    if ((flags & O_ACCMODE) != O_RDWR)
+    {
+        _journal.add_violation(std::string(path_of(node)) + ": not opened for reading and writing");
+        return -EACCES;
+    }
     int descriptor = make_event_descriptor(flags);
     if (descriptor >= 0)
         _descriptors.insert_or_assign(descriptor, Descriptor{.node = node, .host_number = _host_number});
@@ -181,6 +188,7 @@ const Row* Simulator::accept(Journal_Entry& entry, const void* record)
     if (!row)
         return refuse(ENOTTY, "not simulated");
     entry.instance = instance_of(*row, entry.sent);
+    entry.carries_status = row->status.has_value();
     if (auto dirt = find_dirt(*row, entry.sent); !dirt.empty())
         return refuse(EINVAL, dirt);
     if (row->target == Target::ioc && !_host->find(entry.node, static_cast<std::uint32_t>(entry.instance)))
@@ -193,7 +201,7 @@ int Simulator::answer(std::unique_lock<std::mutex>& lock, int descriptor, Journa
     const Row* row = accept(entry, record);
     if (!row)
         return entry.error;
-    auto fault = _faults.strike(*row, entry.node, entry.instance);
+    auto fault = _faults.strike(*row, entry.node, entry.instance, entry.sent);
     const auto host_number = _host_number;
     if (fault && fault->delay > 0)
     {
@@ -216,24 +224,23 @@ int Simulator::answer(std::unique_lock<std::mutex>& lock, int descriptor, Journa
 
 int Simulator::answer_row(Call& call, const Row& row, const std::optional<Fault>& fault, Journal_Entry& entry, void* record)
 {
-    if (fault && fault->error != 0)
-        return fault->error;
     auto answered = entry.sent;
     const auto before = call.ioc ? std::optional(function_state(*call.ioc)) : std::nullopt;
-    if (fault && fault->status != 0)
-        std::memcpy(&answered[*row.status], &fault->status, sizeof(fault->status));
-    else
+    if (!fault || is_carried_out(*fault))
         row.answer(call, answered);
     if (before)
         follow(call.host, *call.ioc, *before);
     if (call.error != 0)
         return violate(entry, call.error, call.why);
     if (fault)
-        overwrite(fault->answer, answered);
+        spoil(*fault, row, entry.sent, answered);
+    const int error = fault ? fault->error : 0;
+    if (error != 0 && answered == entry.sent)
+        return error; // a driver leaves the record alone
     if (!copy_to_caller(record, answered))
         return violate(entry, EFAULT, "bad address");
     entry.answered = std::move(answered);
-    return 0;
+    return error;
 }
 
 bool Simulator::has_events(const Descriptor& descriptor) const
@@ -243,7 +250,7 @@ bool Simulator::has_events(const Descriptor& descriptor) const
     const auto& iocs = _host->iocs(descriptor.node);
     return std::any_of(iocs.begin(), iocs.end(),
                        [&](const Ioc& ioc)
-                       { return descriptor.known[ioc.instance] && ioc.events.unread(descriptor.application) > 0; });
+                       { return descriptor.known[ioc.instance] && ioc.events.unread(descriptor.application.value_or(0)) > 0; });
 }
 
 void Simulator::show_news()

@@ -3,6 +3,8 @@
 #include "sim/interposition/process.h"
 #include "sim/interposition/waits.h"
 
+#include <algorithm>
+
 namespace hxasim
 {
 
@@ -32,6 +34,14 @@ std::vector<Request> take_requests() { return simulator().take_requests(); }
 std::uint64_t request_count() { return simulator().request_count(); }
 
 void inject(const Fault& fault) { simulator().inject(fault); }
+
+Fault fault_at(const std::vector<Request>& requests, std::size_t index)
+{
+    const auto& chosen = requests.at(index);
+    const auto same = [&](const Request& request) { return request.name == chosen.name && request.node == chosen.node; };
+    const auto before = std::count_if(requests.begin(), requests.begin() + static_cast<std::ptrdiff_t>(index), same);
+    return {.command = chosen.name, .node = chosen.node, .skip = static_cast<int>(before), .times = 1};
+}
 
 void clear_faults() { simulator().clear_faults(); }
 

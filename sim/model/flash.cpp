@@ -45,6 +45,7 @@ Flash usual_flash(std::size_t ports)
     for (const auto& row : usual_partitions)
         for (std::uint32_t instance = 0; instance < (row.per_port ? ports : 1); ++instance)
             flash.partitions.push_back({.type = row.type, .instance = instance, .size = row.size});
+    flash.partitions.front().status = HXA_FLASH_STATUS_GOOD;
     return flash;
 }
 

@@ -30,7 +30,7 @@ struct Flash
     Flash_Partition* find(std::uint32_t type, std::uint32_t instance); // null when there is none
 };
 
-// The partitions of a new card with this many ports, all erased.
+// The partitions of a new card with this many ports: good boot code, all others erased.
 Flash usual_flash(std::size_t ports);
 
 // Writes from the start of the partition; the rest of it becomes erased. A partition whose status is HXA_FLASH_STATUS_BAD

@@ -28,4 +28,22 @@ template <std::size_t size> std::string get_text(const char (&field)[size]) { re
 inline void put_address(wwn_t& field, const std::array<std::uint8_t, 8>& wwn) { std::memcpy(&field, wwn.data(), wwn.size()); }
 inline void put_address(mac_t& field, const std::array<std::uint8_t, 6>& mac) { std::memcpy(field.mac, mac.data(), mac.size()); }
 
+// The address of a port in the fabric as it goes over the wire (FC-FS-2): domain, area, port.
+using Fc_Address = std::array<std::uint8_t, 3>;
+
+inline Fc_Address wire_address(std::uint32_t address)
+{
+    return {static_cast<std::uint8_t>(address >> 16), static_cast<std::uint8_t>(address >> 8),
+            static_cast<std::uint8_t>(address)};
+}
+
+// In a record such an address lies as on the wire, from the lowest memory address on, and a 0 behind it.
+inline std::uint32_t address_field(std::uint32_t address)
+{
+    std::uint32_t field = 0;
+    const auto bytes = wire_address(address);
+    std::memcpy(&field, bytes.data(), bytes.size());
+    return field;
+}
+
 } // namespace hxasim

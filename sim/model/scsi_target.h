@@ -55,6 +55,9 @@ struct Unit_Range
     Unit_State state = Unit_State::ready;
     Identification identification = Identification::naa;
     std::vector<std::uint8_t> descriptors; // instead
+    std::vector<std::uint8_t> inquiry;     // instead of the standard INQUIRY data
+    std::vector<std::uint8_t> page_80;     // instead of the whole page, as the next one
+    std::vector<std::uint8_t> page_83;
 };
 
 constexpr std::uint32_t max_units = 65536;
@@ -64,6 +67,7 @@ struct Scsi_Target
     std::array<std::uint8_t, 8> name{}; // node WWN, the same through all ports of a device
     bool flat = false;                  // every LUN in flat addressing; else those from 256 on
     std::vector<Unit_Range> units;
+    std::vector<std::uint8_t> report_luns; // instead of the list of its units
 };
 
 } // namespace hxasim

@@ -1,7 +1,10 @@
 #include "sim/scenario/fault_scenario.h"
 
+#include "sim/model/fabric.h"
 #include "sim/model/record_fields.h"
 #include "sim/scenario/scenario_words.h"
+
+#include "hxal/records/scsi.h"
 
 #include <limits>
 
@@ -13,12 +16,23 @@ namespace
 
 constexpr std::uint32_t max_requests = 1'000'000'000;
 constexpr std::uint32_t max_delay = 600'000;
+constexpr std::uint32_t max_data = 64 * 1024 * 1024;
 
-Patch read_patch(Json_Object object)
+std::vector<Patch> read_patches(Json_Object& object, std::string_view key, std::uint32_t last)
 {
-    Patch patch{.offset = object.number("offset", max_record_size, 0), .bytes = object.bytes("bytes", max_record_size)};
-    object.done();
-    return patch;
+    std::vector<Patch> patches;
+    for (auto& patch : object.objects(key, 64))
+    {
+        patches.push_back({.offset = patch.number("offset", last, 0), .bytes = patch.bytes("bytes", max_record_size)});
+        patch.done();
+    }
+    return patches;
+}
+
+template <typename Number> std::optional<Number> read_optional(Json_Object& object, std::string_view key, std::uint32_t most)
+{
+    const auto number = object.number(key, most);
+    return number ? std::optional(static_cast<Number>(*number)) : std::nullopt;
 }
 
 } // namespace
@@ -28,16 +42,20 @@ Fault read_fault(Json_Object& object)
     Fault fault;
     fault.command = object.text("command", 64, "");
     fault.node = object.text("node", 64, "");
-    if (auto instance = object.number("instance", 0xFFFF))
-        fault.instance = static_cast<int>(*instance);
+    fault.instance = read_optional<int>(object, "instance", 0xFFFF);
+    if (object.has("remote_port"))
+        fault.remote_port = object.address("remote_port", Wwn{});
+    fault.lun = object.number("lun", max_units - 1);
+    fault.cdb = object.bytes("cdb", sizeof(scsi_cdb_t));
     fault.error = static_cast<int>(object.choice("error", errno_words, 4095, 0));
     fault.status = object.number("status", std::numeric_limits<std::uint32_t>::max(), 0);
     fault.delay = static_cast<int>(object.number("delay", max_delay, 0));
     fault.skip = static_cast<int>(object.number("skip", max_requests, 0));
-    if (auto times = object.number("times", max_requests))
-        fault.times = static_cast<int>(*times);
-    for (auto& patch : object.objects("answer", 64))
-        fault.answer.push_back(read_patch(patch));
+    fault.times = read_optional<int>(object, "times", max_requests).value_or(fault.times);
+    fault.answer = read_patches(object, "answer", max_record_size);
+    fault.scsi_status = read_optional<std::uint8_t>(object, "scsi_status", 255);
+    fault.data = read_patches(object, "data", max_data);
+    fault.garbage = object.number("garbage", std::numeric_limits<std::uint32_t>::max());
     object.done();
     return fault;
 }

@@ -65,6 +65,14 @@ std::optional<std::vector<std::uint8_t>> parse_bytes(const json& value)
     return bytes;
 }
 
+std::optional<std::string> parse_text(const json& value)
+{
+    if (value.is_string())
+        return value.get<std::string>();
+    const auto bytes = value.is_object() && value.size() == 1 && value.contains("hex") ? parse_bytes(value["hex"]) : std::nullopt;
+    return bytes ? std::optional(std::string(bytes->begin(), bytes->end())) : std::nullopt;
+}
+
 std::string listed(std::span<const Choice> words)
 {
     std::string list;
@@ -219,9 +227,10 @@ std::string Json_Object::text(std::string_view key, std::size_t longest, std::st
     const json* value = find(key);
     if (!value)
         return std::string(otherwise);
-    if (!value->is_string() || value->get_ref<const std::string&>().size() > longest)
+    auto text = parse_text(*value);
+    if (!text || text->size() > longest)
         refuse(place_of(key), "must be a text of at most " + std::to_string(longest) + " bytes");
-    return value->get<std::string>();
+    return *text;
 }
 
 std::vector<std::uint8_t> Json_Object::bytes(std::string_view key, std::size_t longest)

@@ -62,7 +62,8 @@ public:
     std::uint32_t choice(std::string_view key, std::span<const Choice> words, std::uint32_t most, std::uint32_t otherwise);
     std::uint32_t word(std::string_view key, std::span<const Choice> words); // required, no bare number
 
-    // A text of at most `longest` bytes; a text as long as its field is delivered without a terminator.
+    // A text of at most `longest` bytes; a text as long as its field is delivered without a terminator. What is no text is
+    // written as its bytes: {"hex": "FF0041"}.
     std::string text(std::string_view key, std::size_t longest, std::string_view otherwise);
 
     // Bytes written as hexadecimal digits, first byte first.

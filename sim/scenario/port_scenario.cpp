@@ -5,6 +5,8 @@
 
 #include <algorithm>
 #include <limits>
+#include <numeric>
+#include <optional>
 
 namespace hxasim
 {
@@ -51,6 +53,26 @@ void read_block(Json_Object& object, std::string_view key, Counters<Block, Numbe
 {
     counters.assign(object.numbers(key, counters.size, std::numeric_limits<Number>::max()));
 }
+
+// Numbers for all counters of a port, each another one.
+class Rising_Numbers
+{
+public:
+    explicit Rising_Numbers(std::optional<std::uint32_t> first) : _next(first) {}
+
+    template <typename Block, typename Number> void give(Counters<Block, Number>& counters)
+    {
+        if (!_next)
+            return;
+        std::vector<std::uint64_t> numbers(counters.size);
+        std::iota(numbers.begin(), numbers.end(), *_next);
+        *_next += static_cast<std::uint32_t>(counters.size);
+        counters.assign(numbers);
+    }
+
+private:
+    std::optional<std::uint32_t> _next;
+};
 
 Nexus read_nexus(Json_Object object)
 {
@@ -163,18 +185,24 @@ void read_counters(Json_Object& object, Port& port, bool converged)
     auto counters = object.object("counters");
     if (!counters)
         return;
+    Rising_Numbers rising(counters->number("from", max_u32 / 2));
+    const auto read = [&](std::string_view key, auto& block)
+    {
+        rising.give(block);
+        read_block(*counters, key, block);
+    };
     if (converged)
     {
-        read_block(*counters, "ethernet", port.counters.ethernet);
-        read_block(*counters, "ethernet_function", port.counters.ethernet_function);
-        read_block(*counters, "fcoe", port.counters.fcoe);
+        read("ethernet", port.counters.ethernet);
+        read("ethernet_function", port.counters.ethernet_function);
+        read("fcoe", port.counters.fcoe);
     }
     else
     {
-        read_block(*counters, "fc", port.counters.fc);
-        read_block(*counters, "qos", port.counters.qos);
+        read("fc", port.counters.fc);
+        read("qos", port.counters.qos);
     }
-    read_block(*counters, "logical_port", port.base_port.counters);
+    read("logical_port", port.base_port.counters);
     counters->done();
 }
 

@@ -46,6 +46,9 @@ Unit_Range read_range(Json_Object& object, std::uint32_t first)
     range.identification =
         static_cast<Identification>(object.choice("identification", identification_words, identification_words.size() - 1, 0));
     range.descriptors = object.bytes("descriptors", 1024);
+    range.inquiry = object.bytes("inquiry", 255);
+    range.page_80 = object.bytes("page_80", 1024);
+    range.page_83 = object.bytes("page_83", 1024);
     object.done();
     return range;
 }
@@ -69,6 +72,7 @@ void read_units(Json_Object& object, Remote_Port& remote)
     auto& target = remote.scsi;
     target.name = remote.nwwn;
     target.flat = object.boolean("flat_luns", false);
+    target.report_luns = object.bytes("report_luns", 65536);
     auto ranges = object.objects("luns", max_ranges);
     if (!object.has("luns") && remote.is_target())
         ranges.push_back(Json_Object::empty(object.place_of("luns"))); // one disk

@@ -327,7 +327,6 @@ TEST_F(Aen, hands_on_the_room_and_the_drivers_count)
     EXPECT_EQ(get(1000, hxa_aen_app_cim), std::pair(HXA_STATUS_OK, 1));
     EXPECT_EQ(room[0].aen_type, 2U);
     EXPECT_EQ(get(64, hxa_aen_app_cim), std::pair(HXA_STATUS_OK, 0));
-    EXPECT_EQ(get(64, hxa_aen_app_test), std::pair(HXA_STATUS_OK, 2));
     hxasim::inject({.command = "IOCMD_AEN_GET", .status = 5, .times = 1});
     EXPECT_EQ(get(3, hxa_aen_app_cim), std::pair(static_cast<hxa_status_t>(5), 3));
     hxasim::inject({.command = "IOCMD_AEN_GET", .times = 1, .answer = {{4, {0xE8, 3, 0, 0}}}});

@@ -29,7 +29,7 @@ protected:
     }
 
     // Asks for the name of the disk array.
-    hxa_status_t ask(hxa_rport_symname_t& name, uint32_t pid = 0x020304)
+    hxa_status_t ask(hxa_rport_symname_t& name, uint32_t pid = 0x040302)
     {
         return hxal_get_rport_symname(ioc, 0, pid, base, disks, &name);
     }
@@ -117,7 +117,7 @@ TEST_F(Fabric, tells_the_symbolic_name_of_a_remote_port)
     EXPECT_EQ(sent[0].name, "IOCMD_LPORT_GET_ATTR");
     EXPECT_EQ(sent[1].name, "IOCMD_FCPT");
     // FC-FS-2: R_CTL, D_ID, CS_CTL, S_ID, TYPE, F_CTL, SEQ_ID, DF_CTL, SEQ_CNT, OX_ID, RX_ID, parameter
-    const std::vector<uint8_t> header = {0x02, 0xFF, 0xFF, 0xFC, 0, 0x03, 0x02, 0x01, 0x20, 0x29, 0, 0,
+    const std::vector<uint8_t> header = {0x02, 0xFF, 0xFF, 0xFC, 0, 0x01, 0x02, 0x03, 0x20, 0x29, 0, 0,
                                          0,    0,    0,    0,    0, 0,    0xFF, 0xFF, 0,    0,    0, 0};
     hxa_ioctl_fcpt_t record;
     std::memcpy(&record, sent[1].sent.data(), sizeof record);
@@ -133,7 +133,7 @@ TEST_F(Fabric, cuts_the_symbolic_name_to_its_field)
     for (const std::size_t length : {254u, 255u})
     {
         scan(R"({"adapters": [{"kind": "fc-hba", "ports": [{"remote_ports": [
-              {"pwwn": "2100000000000001", "address": 7, "symbolic_name": ")" +
+              {"pwwn": "2100000000000001", "address": "0x070000", "symbolic_name": ")" +
              std::string(length, 'n') + R"("}]}]}]})");
         ioc = hxal_ioc_open_idx(0);
         base = ioc->pwwn;
@@ -147,16 +147,16 @@ TEST_F(Fabric, cuts_the_symbolic_name_to_its_field)
 TEST_F(Fabric, leaves_the_name_alone_when_there_is_none)
 {
     hxa_rport_symname_t name{"before"};
-    EXPECT_EQ(hxal_get_rport_symname(ioc, 0, 0x020305, base, initiator, &name), HXA_STATUS_OK) << "an empty name";
+    EXPECT_EQ(hxal_get_rport_symname(ioc, 0, 0x050302, base, initiator, &name), HXA_STATUS_OK) << "an empty name";
     EXPECT_EQ(ask(name, 0x999999), HXA_STATUS_FABRIC_RJT) << "an address of nobody";
-    EXPECT_EQ(hxal_get_rport_symname(ioc, 0, 0x020304, base, nobody, &name), HXA_STATUS_UNKNOWN_RWWN);
-    EXPECT_EQ(hxal_get_rport_symname(ioc, 0, 0x020304, nobody, disks, &name), HXA_STATUS_UNKNOWN_LWWN);
+    EXPECT_EQ(hxal_get_rport_symname(ioc, 0, 0x040302, base, nobody, &name), HXA_STATUS_UNKNOWN_RWWN);
+    EXPECT_EQ(hxal_get_rport_symname(ioc, 0, 0x040302, nobody, disks, &name), HXA_STATUS_UNKNOWN_LWWN);
     const hxal_t* down = hxal_ioc_open_idx(1);
     hxasim::take_requests();
-    EXPECT_EQ(hxal_get_rport_symname(down, 0, 0x020304, down->pwwn, disks, &name), HXA_STATUS_PORT_OFFLINE);
+    EXPECT_EQ(hxal_get_rport_symname(down, 0, 0x040302, down->pwwn, disks, &name), HXA_STATUS_PORT_OFFLINE);
     EXPECT_THAT(commands(), ElementsAre("IOCMD_LPORT_GET_ATTR"));
-    EXPECT_EQ(hxal_get_rport_symname(ioc, 0, 0x020304, base, disks, nullptr), HXA_STATUS_EINVAL);
-    EXPECT_EQ(hxal_get_rport_symname(nullptr, 0, 0x020304, base, disks, &name), HXA_STATUS_EINVAL);
+    EXPECT_EQ(hxal_get_rport_symname(ioc, 0, 0x040302, base, disks, nullptr), HXA_STATUS_EINVAL);
+    EXPECT_EQ(hxal_get_rport_symname(nullptr, 0, 0x040302, base, disks, &name), HXA_STATUS_EINVAL);
     EXPECT_THAT(commands(), IsEmpty());
 
     distort("IOCMD_FCPT", offsetof(hxa_ioctl_fcpt_t, rspsz), {0, 0, 0, 0});

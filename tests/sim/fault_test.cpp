@@ -1,6 +1,7 @@
 // Requests that are made to fail, by a test or by the scenario.
 #include "tests/sim/simulated_host.h"
 
+#include <array>
 #include <chrono>
 #include <thread>
 
@@ -8,12 +9,13 @@ namespace
 {
 
 using hxasim::Fault;
+using Wwn = std::array<std::uint8_t, 8>;
 using ::testing::ElementsAre;
 
-class Faults : public Simulated_Host
+class Faults : public Raw_Host
 {
 protected:
-    Faults() : Simulated_Host("cna") {}
+    Faults() : Raw_Host("cna") {}
 
     // The errno, or the status as a negative number, of one request for the port attributes.
     static int outcome(std::uint16_t instance)
@@ -95,17 +97,129 @@ TEST_F(Faults, delay_an_answer_without_holding_up_others)
     EXPECT_THAT(order, ElementsAre(0, 1));
 }
 
+// Two targets of two units each.
+class Scsi_Faults : public Faults
+{
+protected:
+    struct Answer
+    {
+        int error;
+        hxa_ioctl_scsi_t record;
+        std::array<std::uint8_t, 36> data;
+    };
+
+    // Sends INQUIRY, for a page unless it is 0.
+    Answer inquire(std::uint8_t target = 1, std::uint8_t lun = 0, std::uint8_t page = 0)
+    {
+        Answer answer{};
+        auto& record = answer.record;
+        record.lpwwn = 0x01'00'00'00'00'00'00'10;
+        record.rpwwn = std::uint64_t{target} << 56 | 0x21;
+        record.lun = std::uint64_t{lun} << 8;
+        record.cdb = {{0x12, page != 0, page, 0, 36}};
+        record.iosz = answer.data.size();
+        record.snssz = 18;
+        record.iobuf_ptr = reinterpret_cast<std::uintptr_t>(answer.data.data());
+        record.snsbuf_pt = reinterpret_cast<std::uintptr_t>(_sense.data());
+        answer.error = send(*_hxa, "IOCMD_SCSI_CMND", '\xBA', record);
+        return answer;
+    }
+
+private:
+    Open_File _hxa{node_on(R"({"adapters": [{"kind": "fc-hba", "ports": [{"pwwn": "1000000000000001", "remote_ports": [
+        {"pwwn": "2100000000000001", "luns": {"count": 2}}, {"pwwn": "2100000000000002", "luns": {"count": 2}}]}]}]})")};
+    std::array<std::uint8_t, 18> _sense{};
+};
+
+TEST_F(Scsi_Faults, choose_a_remote_port_a_unit_and_a_command)
+{
+    const Wwn second{0x21, 0, 0, 0, 0, 0, 0, 2};
+    const std::pair<Fault, std::vector<int>> cases[] = {
+        {{.remote_port = second, .error = EIO}, {4, 5, 6, 7}},
+        {{.lun = 1, .error = EIO}, {2, 3, 6, 7}},
+        {{.cdb = {0x12, 1, 0x83}, .error = EIO}, {1, 3, 5, 7}},
+        {{.remote_port = second, .lun = 0, .cdb = {0x12, 0}, .error = EIO}, {4}},
+    };
+    for (const auto& [fault, expected] : cases)
+    {
+        hxasim::inject(fault);
+        std::vector<int> struck;
+        for (std::uint8_t i = 0; i < 8; ++i)
+            if (inquire(i < 4 ? 1 : 2, i >> 1 & 1, i % 2 == 0 ? 0 : 0x83).error == EIO)
+                struck.push_back(i);
+        EXPECT_EQ(struck, expected);
+        hxasim::clear_faults();
+    }
+}
+
+TEST_F(Scsi_Faults, set_the_status_and_overwrite_the_data)
+{
+    hxasim::inject({.times = 1, .scsi_status = 8});
+    const auto busy = inquire();
+    EXPECT_EQ(std::tuple(busy.record.status, busy.record.scsi_status, busy.record.snssz), std::tuple(HXA_STATUS_OK, 8, 0U));
+    EXPECT_THAT(busy.data, testing::Each(0));
+    hxasim::inject({.data = {{4, {0xFF, 0xFE}}, {35, {'Z', 'Z'}}, {1000, {1}}}});
+    const auto patched = inquire().data;
+    EXPECT_EQ(std::string(patched.begin() + 4, patched.begin() + 14), std::string("\xFF\xFE\0\2ZEMLAR", 10));
+    EXPECT_EQ(patched[35], 'Z');
+}
+
+TEST_F(Scsi_Faults, bring_back_garbage)
+{
+    hxasim::inject({.error = EIO, .times = 2, .garbage = 7});
+    const auto failed = inquire();
+    EXPECT_EQ(failed.error, EIO);
+    EXPECT_NE(failed.record.status, HXA_STATUS_OK);
+    EXPECT_NE(failed.data[0], 0);
+    EXPECT_EQ(failed.data, inquire().data) << "the same seed";
+    hxasim::inject({.garbage = 8});
+    const auto answered = inquire();
+    EXPECT_EQ(answered.error, 0);
+    EXPECT_EQ(answered.record.status, HXA_STATUS_OK);
+    EXPECT_NE(answered.record.snssz, 0U);
+    EXPECT_NE(answered.data[0], 0);
+}
+
+TEST_F(Faults, strike_a_recorded_request_when_it_is_sent_again)
+{
+    const auto ask_all = [&]
+    {
+        hxasim::take_requests();
+        instances(Open_File("/dev/hxa"), 'C');
+        for (int instance : {0, 1, 0})
+            outcome(static_cast<std::uint16_t>(instance));
+        return hxasim::take_requests();
+    };
+    const auto recorded = ask_all();
+    for (std::size_t i = 1; i < recorded.size(); ++i)
+    {
+        auto fault = hxasim::fault_at(recorded, i);
+        fault.error = EIO;
+        hxasim::inject(fault);
+        const auto again = ask_all();
+        for (std::size_t at = 0; at < recorded.size(); ++at)
+            EXPECT_EQ(again[at].error, at == i ? EIO : 0) << at;
+    }
+    EXPECT_FALSE(recorded[0].carries_status);
+    EXPECT_TRUE(recorded[1].carries_status);
+}
+
 TEST_F(Faults, that_could_not_do_what_they_say_are_refused)
 {
     const std::pair<Fault, const char*> cases[] = {
         {{.command = "IOCMD_IOC_GET_ATTRS", .error = EIO}, "fault.command: no such command: IOCMD_IOC_GET_ATTRS"},
         {{.node = "/dev/hxx", .error = EIO}, "fault.node: no such node: /dev/hxx"},
-        {{.command = "IOCMD_IOC_GET_INFO"}, "fault: needs an error, a status, an answer or a delay"},
+        {{.command = "IOCMD_IOC_GET_INFO"},
+         "fault: needs an error, a status, a SCSI status, an answer, data, garbage or a delay"},
         {{.command = "IOCMD_IOC_GET_INST", .status = 1}, "fault.status: IOCMD_IOC_GET_INST carries no status"},
         {{.command = "IOCMD_IOC_GET_INST", .answer = {{.offset = 37, .bytes = {1, 2, 3, 4}}}},
          "fault.answer: beyond the 40 bytes of IOCMD_IOC_GET_INST"},
         {{.command = "IOCMD_IOC_GET_INST", .answer = {{.offset = SIZE_MAX, .bytes = {1, 2}}}},
          "fault.answer: beyond the 40 bytes of IOCMD_IOC_GET_INST"},
+        {{.command = "IOCMD_IOC_GET_ATTR", .lun = 0, .error = EIO}, "fault: IOCMD_IOC_GET_ATTR is no SCSI command"},
+        {{.command = "IOCMD_IOC_GET_ATTR", .remote_port = Wwn{}, .error = EIO},
+         "fault.remote_port: IOCMD_IOC_GET_ATTR names no remote port"},
+        {{.command = "IOCMD_IOC_GET_ATTR", .data = {{.bytes = {1}}}}, "fault.data: IOCMD_IOC_GET_ATTR fills no buffer"},
     };
     for (const auto& row : cases)
         EXPECT_EQ(refusal_of([&] { hxasim::inject(row.first); }), row.second);

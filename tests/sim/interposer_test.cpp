@@ -1,8 +1,6 @@
 // Only the two nodes and their descriptors are simulated; every other call reaches the system.
 #include "tests/sim/simulated_host.h"
 
-#include <sys/stat.h>
-#include <sys/syscall.h>
 #include <sys/wait.h>
 
 #include <atomic>
@@ -19,10 +17,10 @@ extern "C"
 namespace
 {
 
-class Interposer : public Simulated_Host
+class Interposer : public Raw_Host
 {
 protected:
-    Interposer() : Simulated_Host("cna") {}
+    Interposer() : Raw_Host("cna") {}
 };
 
 using Opener = int (*)(const char* path);
@@ -55,29 +53,6 @@ TEST_F(Interposer, opens_nodes_by_every_form_of_open)
     EXPECT_EQ(hxasim::open_descriptors(), 0);
 }
 
-TEST_F(Interposer, leaves_other_files_to_the_system)
-{
-    std::string path = testing::TempDir() + "sim_interposer_test";
-    unlink(path.c_str());
-    Open_File file(open(path.c_str(), O_RDWR | O_CREAT | O_EXCL, 0640));
-    ASSERT_GE(*file, 0);
-    struct stat status = {};
-    fstat(*file, &status);
-    EXPECT_EQ(status.st_mode & 0777 & ~0640U, 0U);
-    EXPECT_NE(status.st_mode & 0400, 0U);
-    ASSERT_EQ(write(*file, "12345", 5), 5);
-    lseek(*file, 2, SEEK_SET);
-    int unread = 0;
-    EXPECT_EQ(ioctl(*file, FIONREAD, &unread), 0);
-    EXPECT_EQ(unread, 3);
-    EXPECT_EQ(ioctl(*file, code_of("IOCMD_IOC_GET_INST", 'C'), &unread), -1);
-    EXPECT_EQ(errno, ENOTTY);
-    EXPECT_EQ(close(-1), -1);
-    EXPECT_EQ(errno, EBADF);
-    unlink(path.c_str());
-    EXPECT_TRUE(hxasim::take_requests().empty());
-}
-
 TEST_F(Interposer, forgets_a_descriptor_when_it_is_closed)
 {
     Open_File node(open("/dev/hxa", O_RDWR | O_CLOEXEC));
@@ -100,18 +75,6 @@ TEST_F(Interposer, answers_nothing_on_descriptors_of_an_earlier_host)
     EXPECT_EQ(instances(Open_File("/dev/hxa"), 'C').first, 8U);
     hxasim::unload();
     EXPECT_EQ(send(*old, "IOCMD_IOC_GET_INST", 'C', record), ENODEV);
-}
-
-TEST_F(Interposer, has_no_nodes_without_drivers_or_without_a_scenario)
-{
-    hxasim::load("no-driver");
-    for (const char* path : {"/dev/hxa", "/dev/hxn"})
-    {
-        EXPECT_EQ(open(path, O_RDWR), -1);
-        EXPECT_EQ(errno, ENOENT);
-    }
-    hxasim::unload();
-    EXPECT_EQ(Open_File("/dev/hxa").operator*(), static_cast<int>(syscall(SYS_openat, AT_FDCWD, "/dev/hxa", O_RDWR)));
 }
 
 TEST_F(Interposer, serves_threads_and_a_child_that_is_forked_among_them)

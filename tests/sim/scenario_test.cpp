@@ -6,7 +6,7 @@
 namespace
 {
 
-using Scenarios = Simulated_Host;
+using Scenarios = Raw_Host;
 
 TEST_F(Scenarios, name_the_place_of_every_error)
 {
@@ -46,6 +46,21 @@ TEST_F(Scenarios, name_the_place_of_every_error)
         EXPECT_EQ(load_text(json), message) << json;
     EXPECT_THAT(load_text("{\"adapters\":\n [}"), testing::HasSubstr("line 2, column 3"));
     EXPECT_EQ(instances(Open_File("/dev/hxa"), 'C').first, 2U) << "a refused scenario must not replace the host";
+}
+
+TEST_F(Scenarios, hold_texts_that_are_none_and_counters_that_differ)
+{
+    hxasim::load_text(
+        R"({"adapters": [{"kind": "fc-hba", "serial": {"hex": "41FF00"}, "ports": [{"counters": {"from": 100}}]}]})");
+    Open_File hxa("/dev/hxa");
+    EXPECT_EQ(digits_of(info(hxa, 'C', 0).serialnum).substr(0, 8), "41FF0000");
+    hxa_pport_stats_t counters{};
+    hxa_ioctl_port_stats_t record{};
+    record.buf_size = sizeof(counters);
+    record.buf_ptr = reinterpret_cast<std::uintptr_t>(&counters);
+    EXPECT_EQ(send(*hxa, "IOCMD_PORT_GET_STATS", 'C', record), 0);
+    EXPECT_EQ(counters.fc.tx_frames, 101U);
+    EXPECT_EQ(counters.fc.err_enc, 128U);
 }
 
 TEST_F(Scenarios, are_found_by_name_or_by_path)

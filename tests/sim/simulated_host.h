@@ -1,16 +1,13 @@
-// A test on a simulated host: loads a scenario, opens nodes, sends records, and fails on requests that no driver accepts.
+// A test that talks to the simulated drivers itself: opens nodes and sends records.
 #pragma once
 
-#include "sim/hxasim.h"
+#include "tests/support/simulated_host.h"
 
 #include "hxal/records/commands.h"
 
 #include <fcntl.h>
 #include <sys/ioctl.h>
 #include <unistd.h>
-
-#include <gmock/gmock.h>
-#include <gtest/gtest.h>
 
 #include <cerrno>
 #include <cstring>
@@ -38,6 +35,13 @@ public:
 private:
     int _descriptor;
 };
+
+// The FC node of a host that is loaded first.
+inline int node_on(const char* scenario)
+{
+    hxasim::load_text(scenario);
+    return open("/dev/hxa", O_RDWR);
+}
 
 inline std::uint32_t code_of(std::string_view name, char group)
 {
@@ -85,22 +89,14 @@ template <typename Address> std::string digits_of(const Address& address)
     return digits;
 }
 
-class Simulated_Host : public ::testing::Test
+class Raw_Host : public Simulated_Host
 {
 protected:
-    explicit Simulated_Host(const char* scenario = nullptr)
+    explicit Raw_Host(const char* scenario = nullptr)
     {
         if (scenario)
             hxasim::load(scenario);
     }
-
-    void TearDown() override
-    {
-        EXPECT_THAT(hxasim::violations(), ::testing::ElementsAreArray(_expected_violations));
-        hxasim::unload();
-    }
-
-    void expect_violation(const std::string& text) { _expected_violations.push_back(text); }
 
     // The answer of instance `instance`; the request must succeed.
     template <typename Record> Record ask(const Open_File& node, std::string_view name, char group, std::uint16_t instance)
@@ -115,10 +111,6 @@ protected:
     {
         return ask<hxa_ioctl_ioc_info_t>(node, "IOCMD_IOC_GET_INFO", group, instance);
     }
-    hxa_ioc_attr_t attributes(const Open_File& node, char group, std::uint16_t instance)
-    {
-        return ask<hxa_ioctl_ioc_attr_t>(node, "IOCMD_IOC_GET_ATTR", group, instance).attr;
-    }
     hxa_pport_attr_t port(const Open_File& node, char group, std::uint16_t instance)
     {
         return ask<hxa_ioctl_port_attr_t>(node, "IOCMD_PORT_GET_ATTR", group, instance).attr;
@@ -129,7 +121,4 @@ protected:
         EXPECT_EQ(send(*node, "IOCMD_IOC_GET_INST", group, record), 0);
         return {record.cnt, digits_of(record.bm)};
     }
-
-private:
-    std::vector<std::string> _expected_violations;
 };

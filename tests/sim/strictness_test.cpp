@@ -8,10 +8,10 @@ namespace
 
 using ::testing::IsEmpty;
 
-class Strictness : public Simulated_Host
+class Strictness : public Raw_Host
 {
 protected:
-    Strictness() : Simulated_Host("cna") {}
+    Strictness() : Raw_Host("cna") {}
 
     Open_File hxa{"/dev/hxa"};
     Open_File hxn{"/dev/hxn"};
@@ -51,6 +51,10 @@ const Bad_Request bad_requests[] = {
     // inputs that make no sense
     {"/dev/hxa", 0xC018432E,    8,   1, EINVAL, "/dev/hxa IOCMD_PORT_GET_STATS instance 0: buffer of 1 bytes, must be 304"},
     {"/dev/hxa", 0xC060BA02,   64,   1, EINVAL, "/dev/hxa IOCMD_FCPT instance 0: needs a nexus: 1"},
+    {"/dev/hxa", 0xC060BA02,   40,   0, EINVAL, "/dev/hxa IOCMD_FCPT instance 0: frame without R_CTL"},
+    {"/dev/hxa", 0xC060BA02,   40,   2, EINVAL, "/dev/hxa IOCMD_FCPT instance 0: frame without D_ID"},
+    {"/dev/hxa", 0xC0584329,    8,   2, EINVAL,
+     "/dev/hxa IOCMD_AEN_GET instance 0: application 2 has not synchronised on this descriptor"},
     {"/dev/hxa", 0xC0584329,    7, 128, EINVAL, "/dev/hxa IOCMD_AEN_GET instance 0: room for -2147483648 events"},
     // instances and applications that are not there
     {"/dev/hxa", 0xC178432D,    4,   2, ENODEV, "/dev/hxa IOCMD_PORT_GET_ATTR instance 2: no such instance"},
@@ -85,6 +89,16 @@ TEST_F(Strictness, refuses_bad_requests_and_leaves_the_record_alone)
     }
     EXPECT_EQ(requests[0].name, "");
     EXPECT_EQ(requests[3].name, "IOCMD_IOC_GET_ATTR");
+}
+
+TEST_F(Strictness, opens_a_node_for_reading_and_writing_only)
+{
+    for (int flags : {O_RDONLY, O_WRONLY})
+    {
+        EXPECT_EQ(open("/dev/hxn", flags), -1);
+        EXPECT_EQ(errno, EACCES);
+        expect_violation("/dev/hxn: not opened for reading and writing");
+    }
 }
 
 TEST_F(Strictness, answers_bad_addresses_without_touching_them)

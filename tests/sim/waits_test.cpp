@@ -14,10 +14,10 @@ using namespace std::chrono_literals;
 
 using Clock = std::chrono::steady_clock;
 
-class Waits : public Simulated_Host
+class Waits : public Raw_Host
 {
 protected:
-    Waits() : Simulated_Host("cna") {}
+    Waits() : Raw_Host("cna") {}
     ~Waits() override { hxasim::set_time_scale(1); }
 
     // What the next request tells.
