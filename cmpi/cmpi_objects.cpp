@@ -1,5 +1,7 @@
 #include "cmpi/cmpi_objects.h"
 
+#include "runtime/log.h"
+
 namespace zmlr
 {
 
@@ -13,10 +15,15 @@ const char* chars_of(const CMPIString* string)
 namespace
 {
 
+constexpr const char* log_source = "CMPI_Objects";
+
 String to_string(const CMPIString* string, const CMPIStatus& status)
 {
-    const char* text = okay(status) ? chars_of(string) : nullptr;
-    return text ? String(text) : String();
+    if (const char* text = okay(status) ? chars_of(string) : nullptr)
+        return text;
+    if (string)
+        ZMLR_LOG(LL_WARN, "CMGetCharsPtr() failed");
+    return {};
 }
 
 } // namespace

@@ -36,6 +36,7 @@ MAY_INCLUDE = {
 # The floors inside a big folder: its sub-folder ("." is the folder itself): the sub-folders (or single files) of the same big
 # folder that it may include besides itself. A folder of this table has no sub-folder that stands in no row.
 FLOORS = {
+    "cmpi": {"standard": [], ".": ["standard"]},
     "sim": {
         ".": ["model"],
         "model": [],

@@ -26,11 +26,11 @@ public:
 };
 
 // A thing with a value of each kind that the broker makes an object for: more would only take longer.
-Ref<Test_Thing> small_thing(const char* name)
+Ref<TST_Thing> small_thing(const char* name)
 {
-    Ref<Test_Thing> result = thing(name);
-    result->When.set(Datetime(7));
-    result->Strings.set({"one"});
+    Ref<TST_Thing> result = thing(name);
+    result->DatetimeValue.set(Datetime(7));
+    result->StringValues.set({"one"});
     return result;
 }
 
@@ -68,7 +68,7 @@ protected:
         script.associators.emplace_back(small_thing("far").steal());
         script.on_invoke = [](Instance* parameters)
         {
-            auto& p = *static_cast<Test_Disk_Convert_method*>(parameters);
+            auto& p = *static_cast<TST_Disk_Convert_method*>(parameters);
             p.Numbers.set({1, 2});
             p.Found = thing("found").steal();
             p.return_value.set("done");
@@ -77,7 +77,7 @@ protected:
     ~Endurance() override { log_set_level("DBG"); }
 
     CMPIObjectPath* b() const { return thing_path("b"); }
-    CMPIObjectPath* alert_path() const { return path("Test_Alert"); }
+    CMPIObjectPath* alert_path() const { return path("TST_Alert"); }
     CMPIInstance* new_thing() const
     {
         CMPIInstance* instance = CMNewInstance(broker.face(), b(), nullptr);
@@ -102,7 +102,7 @@ protected:
     CMPIIndicationMI* alert_mi = alerts();
 };
 
-const char* list[] = {"Strings", "When", nullptr};
+const char* list[] = {"StringValues", "DatetimeValue", nullptr};
 
 std::vector<Kind> Endurance::instance_kinds()
 {
@@ -138,14 +138,14 @@ std::vector<Kind> Endurance::other_kinds()
              CMPIObjectPath* partner = b();
              CMAddArg(in, "Partner", &partner, CMPI_ref);
              CMPIArgs* out = CMNewArgs(broker.face(), nullptr);
-             return A::invokeMethod(method_mi, c.context, c.result, thing_path("d", "Test_Disk"), "Convert", in, out).rc;
+             return A::invokeMethod(method_mi, c.context, c.result, thing_path("d", "TST_Disk"), "Convert", in, out).rc;
          }},
         {"associators",
-         [this](Call& c) { return A::associators(link_mi, c.context, c.result, b(), "Test_Link", "", "", "", list).rc; }},
+         [this](Call& c) { return A::associators(link_mi, c.context, c.result, b(), "TST_Pair", "", "", "", list).rc; }},
         {"associatorNames",
-         [this](Call& c) { return A::associatorNames(link_mi, c.context, c.result, b(), "Test_Link", "", "", "").rc; }},
-        {"references", [this](Call& c) { return A::references(link_mi, c.context, c.result, b(), "Test_Link", "", list).rc; }},
-        {"referenceNames", [this](Call& c) { return A::referenceNames(link_mi, c.context, c.result, b(), "Test_Link", "").rc; }},
+         [this](Call& c) { return A::associatorNames(link_mi, c.context, c.result, b(), "TST_Pair", "", "", "").rc; }},
+        {"references", [this](Call& c) { return A::references(link_mi, c.context, c.result, b(), "TST_Pair", "", list).rc; }},
+        {"referenceNames", [this](Call& c) { return A::referenceNames(link_mi, c.context, c.result, b(), "TST_Pair", "").rc; }},
         {"filters",
          [this](Call& c)
          {
@@ -212,7 +212,7 @@ TEST_F(Endurance, interfaces_come_and_go_in_many_threads)
                 {
                     Call call(drain);
                     auto* own = things();
-                    EXPECT_EQ(A::enumInstances(own, call.context, call.result, path("Test_Thing"), nullptr).rc, CMPI_RC_OK);
+                    EXPECT_EQ(A::enumInstances(own, call.context, call.result, path("TST_Thing"), nullptr).rc, CMPI_RC_OK);
                     EXPECT_EQ(A::instanceCleanup(own, call.context, 0).rc, CMPI_RC_OK);
                 }
             });

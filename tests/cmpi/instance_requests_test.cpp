@@ -38,7 +38,7 @@ protected:
     }
 
     CMPIInstanceMI* mi = things();
-    const CMPIObjectPath* things_path = path("Test_Thing");
+    const CMPIObjectPath* things_path = path("TST_Thing");
     Recorded_Result result;
 };
 
@@ -46,10 +46,10 @@ TEST_F(Instance_Requests, enumerate_names_in_the_requests_name_space)
 {
     offer("a", "b");
     script.instances[1]->__name_space = "root/other";
-    EXPECT_EQ(enumerate_names(path("test_thing")), CMPI_RC_OK);
+    EXPECT_EQ(enumerate_names(path("tst_thing")), CMPI_RC_OK);
     ASSERT_THAT(result.paths, SizeIs(2));
     EXPECT_EQ(result.paths[1].name_space, name_space);
-    EXPECT_EQ(result.paths[1].class_name, "Test_Thing");
+    EXPECT_EQ(result.paths[1].class_name, "TST_Thing");
     EXPECT_THAT(result.paths[1].keys, SizeIs(1));
     EXPECT_EQ(name_in(result.paths[1]), "b");
     EXPECT_EQ(script.model->__name_space, name_space);
@@ -65,12 +65,12 @@ TEST_F(Instance_Requests, enumerate_whole_instances_or_what_a_list_names)
     EXPECT_THAT(asked_for(), IsEmpty());
     ASSERT_THAT(result.instances, SizeIs(2));
     EXPECT_EQ(name_in(result.instances[1].path), "b");
-    EXPECT_EQ(text(result.instances[1].properties, "When"), "00000000013000.000007:000");
+    EXPECT_EQ(text(result.instances[1].properties, "DatetimeValue"), "00000000013000.000007:000");
 
-    const char* list[] = {"uint8", "Unknown", nullptr};
+    const char* list[] = {"uint8value", "Unknown", nullptr};
     EXPECT_EQ(enumerate(things_path, list), CMPI_RC_OK);
-    EXPECT_THAT(asked_for(), ElementsAre("Name", "Uint8")) << "the key too";
-    EXPECT_THAT(names_of(result.instances.at(1).properties), ElementsAre("Name", "Uint8"));
+    EXPECT_THAT(asked_for(), ElementsAre("Name", "Uint8Value")) << "the key too";
+    EXPECT_THAT(names_of(result.instances.at(1).properties), ElementsAre("Name", "Uint8Value"));
 
     const char* empty[] = {nullptr};
     EXPECT_EQ(enumerate(things_path, empty), CMPI_RC_OK);
@@ -102,50 +102,49 @@ TEST_F(Instance_Requests, answer_each_enumeration_status)
 
 TEST_F(Instance_Requests, get_what_the_provider_finds_or_enumerates)
 {
-    offer("a", "b");
-    EXPECT_EQ(get(thing_path("b")), CMPI_RC_OK);
-    EXPECT_THAT(asked_for(), SizeIs(20));
+    offer("a", "b", "c", "b");
+    static_cast<TST_Thing*>(script.instances[3].ptr())->Uint8Value.set(1);
+    for (const bool deaf : {true, false})
+    {
+        script.deaf = deaf; // goes on when the search is over
+        script.delivered = 0;
+        EXPECT_EQ(get(thing_path("b")), CMPI_RC_OK);
+        EXPECT_EQ(script.delivered, deaf ? 4 : 2);
+        EXPECT_EQ(content<std::uint64_t>(result.instances.at(0).properties, "Uint8Value"), 0xFFU) << "the first one";
+    }
+    EXPECT_THAT(asked_for(), SizeIs(21));
     ASSERT_THAT(result.instances, SizeIs(1));
     EXPECT_EQ(text(result.instances[0].properties, "Name"), "b");
 
-    const char* list[] = {"Strings", nullptr};
+    const char* list[] = {"StringValues", nullptr};
     EXPECT_EQ(get(thing_path("b"), list), CMPI_RC_OK);
-    EXPECT_THAT(asked_for(), ElementsAre("Name", "Strings"));
-    EXPECT_THAT(names_of(result.instances.at(0).properties), ElementsAre("Name", "Strings"));
+    EXPECT_THAT(asked_for(), ElementsAre("Name", "StringValues"));
+    EXPECT_THAT(names_of(result.instances.at(0).properties), ElementsAre("Name", "StringValues"));
 
-    EXPECT_EQ(get(thing_path("c")), CMPI_RC_ERR_NOT_FOUND);
+    EXPECT_EQ(get(thing_path("d")), CMPI_RC_ERR_NOT_FOUND);
     EXPECT_THAT(result.instances, IsEmpty());
+    script.enum_instances = ENUM_INSTANCES_FAILED;
+    EXPECT_EQ(get(thing_path("b")), CMPI_RC_ERR_NOT_FOUND);
 }
 
-TEST_F(Instance_Requests, answer_each_get_status)
+// Every status that a provider may answer is sent through a client elsewhere; here, what is none of its operation's.
+TEST_F(Instance_Requests, a_retrieval_without_an_instance_is_no_success)
 {
-    const std::pair<Get_Instance_Status, CMPIrc> rows[] = {
-        {GET_INSTANCE_OK, CMPI_RC_OK},
-        {GET_INSTANCE_NOT_FOUND, CMPI_RC_ERR_NOT_FOUND},
-        {GET_INSTANCE_INVALID_PARAMETER, CMPI_RC_ERR_INVALID_PARAMETER},
-        {GET_INSTANCE_ACCESS_DENIED, CMPI_RC_ERR_ACCESS_DENIED},
-        {GET_INSTANCE_FAILED, CMPI_RC_ERR_FAILED},
-        {static_cast<Get_Instance_Status>(-1), CMPI_RC_ERR_FAILED},
-    };
-    offer("a");
-    for (const auto& [status, rc] : rows)
+    for (const int status : {0, -1})
     {
-        script.get_instance = status;
-        EXPECT_EQ(get(thing_path("a")), rc);
-        EXPECT_EQ(result.done, rc == CMPI_RC_OK ? 1 : 0) << status;
+        script.get_instance = static_cast<Get_Instance_Status>(status);
+        EXPECT_EQ(get(thing_path("a")), CMPI_RC_ERR_FAILED);
+        EXPECT_EQ(result.done, 0);
     }
     EXPECT_EQ(script.enumerations, 0);
-    script.instances.clear();
-    script.get_instance = GET_INSTANCE_OK;
-    EXPECT_EQ(get(thing_path("a")), CMPI_RC_ERR_FAILED) << "a success without an instance is none";
 }
 
 TEST_F(Instance_Requests, create_modify_and_delete)
 {
-    auto& object = cimserver::make<cimserver::Instance_Object>(classes.find("Test_Thing")->layout, cimserver::Object_Path{});
+    auto& object = cimserver::make<cimserver::Instance_Object>(classes.find("TST_Thing")->layout, cimserver::Object_Path{});
     object.set("Name", string("new"));
-    object.set("Uint8", {CMPI_uint8, std::uint64_t{7}});
-    const char* list[] = {"Uint8", nullptr};
+    object.set("Uint8Value", {CMPI_uint8, std::uint64_t{7}});
+    const char* list[] = {"Uint8Value", nullptr};
     const CMPIObjectPath* object_path = thing_path("new");
     const CMPIContext* context = request.context();
 
@@ -158,38 +157,23 @@ TEST_F(Instance_Requests, create_modify_and_delete)
     script.create_instance = CREATE_INSTANCE_OK;
     EXPECT_EQ(create_it(object.face()), CMPI_RC_OK);
     EXPECT_EQ(name_in(result.paths.at(0)), "new");
-    EXPECT_EQ(cast<Test_Thing>(script.instance.ptr())->Uint8.value, 7);
+    EXPECT_EQ(cast<TST_Thing>(script.instance.ptr())->Uint8Value.value, 7);
     EXPECT_EQ(script.instance->__name_space, name_space);
 
     script.modify_instance = MODIFY_INSTANCE_OK;
     EXPECT_EQ(modify(list), CMPI_RC_OK);
-    EXPECT_THAT(asked_for(), ElementsAre("Name", "Uint8"));
+    EXPECT_THAT(asked_for(), ElementsAre("Name", "Uint8Value"));
     EXPECT_EQ(name_in(result.paths.at(1)), "new");
 
     script.delete_instance = DELETE_INSTANCE_OK;
     EXPECT_EQ(remove(), CMPI_RC_OK);
-    EXPECT_EQ(cast<Test_Thing>(script.instance.ptr())->Name.value, "new");
+    EXPECT_EQ(cast<TST_Thing>(script.instance.ptr())->Name.value, "new");
     EXPECT_EQ(result.done, 3);
 
-    // clang-format off
-    const std::pair<Create_Instance_Status, CMPIrc> creations[] = {
-        {CREATE_INSTANCE_DUPLICATE, CMPI_RC_ERR_ALREADY_EXISTS}, {CREATE_INSTANCE_INVALID_PARAMETER, CMPI_RC_ERR_INVALID_PARAMETER},
-        {CREATE_INSTANCE_UNSUPPORTED, CMPI_RC_ERR_NOT_SUPPORTED}, {CREATE_INSTANCE_ACCESS_DENIED, CMPI_RC_ERR_ACCESS_DENIED},
-        {CREATE_INSTANCE_FAILED, CMPI_RC_ERR_FAILED}, {static_cast<Create_Instance_Status>(-1), CMPI_RC_OK}};
-    const std::pair<Modify_Instance_Status, CMPIrc> modifications[] = {
-        {MODIFY_INSTANCE_NOT_FOUND, CMPI_RC_ERR_NOT_FOUND}, {MODIFY_INSTANCE_INVALID_PARAMETER, CMPI_RC_ERR_INVALID_PARAMETER},
-        {MODIFY_INSTANCE_UNSUPPORTED, CMPI_RC_ERR_NOT_SUPPORTED}, {MODIFY_INSTANCE_ACCESS_DENIED, CMPI_RC_ERR_ACCESS_DENIED},
-        {MODIFY_INSTANCE_FAILED, CMPI_RC_ERR_FAILED}, {static_cast<Modify_Instance_Status>(-1), CMPI_RC_OK}};
-    const std::pair<Delete_Instance_Status, CMPIrc> deletions[] = {
-        {DELETE_INSTANCE_NOT_FOUND, CMPI_RC_ERR_NOT_FOUND}, {DELETE_INSTANCE_UNSUPPORTED, CMPI_RC_ERR_NOT_SUPPORTED},
-        {DELETE_INSTANCE_ACCESS_DENIED, CMPI_RC_ERR_ACCESS_DENIED}, {DELETE_INSTANCE_FAILED, CMPI_RC_ERR_FAILED}};
-    // clang-format on
-    for (const auto& [status, rc] : creations)
-        EXPECT_EQ((script.create_instance = status, create_it(object.face())), rc) << status;
-    for (const auto& [status, rc] : modifications)
-        EXPECT_EQ((script.modify_instance = status, modify(nullptr)), rc) << status;
-    for (const auto& [status, rc] : deletions)
-        EXPECT_EQ((script.delete_instance = status, remove()), rc) << status;
+    script.create_instance = static_cast<Create_Instance_Status>(-1);
+    script.modify_instance = static_cast<Modify_Instance_Status>(-1);
+    EXPECT_EQ(create_it(object.face()), CMPI_RC_OK);
+    EXPECT_EQ(modify(nullptr), CMPI_RC_OK);
     EXPECT_THAT(result.paths, SizeIs(2));
     EXPECT_EQ(result.done, 3) << "statuses of no kind answer nothing";
     EXPECT_EQ(create_it(nullptr), CMPI_RC_ERR_FAILED);
@@ -197,8 +181,7 @@ TEST_F(Instance_Requests, create_modify_and_delete)
 
 TEST_F(Instance_Requests, fail_for_a_class_that_the_provider_does_not_serve)
 {
-    for (const CMPIObjectPath* object :
-         {path("Test_Unknown"), path("Test_Link"), path(""), static_cast<CMPIObjectPath*>(nullptr)})
+    for (const CMPIObjectPath* object : {path("TST_Unknown"), path("TST_Pair"), path(""), static_cast<CMPIObjectPath*>(nullptr)})
     {
         EXPECT_EQ(enumerate_names(object), CMPI_RC_ERR_FAILED);
         EXPECT_EQ(enumerate(object), CMPI_RC_ERR_FAILED);
@@ -210,8 +193,8 @@ TEST_F(Instance_Requests, fail_for_a_class_that_the_provider_does_not_serve)
 TEST_F(Instance_Requests, take_a_superclass_for_the_served_class)
 {
     mi = interface<CMPIInstanceMI>('I', disk_data, disk_registration);
-    EXPECT_EQ(enumerate(thing_path("a", "Test_Thing")), CMPI_RC_OK);
-    EXPECT_EQ(script.model->meta_class, &Test_Disk::static_meta_class);
+    EXPECT_EQ(enumerate(thing_path("a", "TST_Thing")), CMPI_RC_OK);
+    EXPECT_EQ(script.model->meta_class, &TST_Disk::static_meta_class);
 }
 
 TEST_F(Instance_Requests, are_over_after_an_exception)
@@ -269,12 +252,9 @@ TEST_F(Instance_Requests, may_come_back_from_within_a_request)
     EXPECT_THAT(result.instances, SizeIs(1));
 }
 
-TEST_F(Instance_Requests, are_traced_and_do_not_serve_queries)
+TEST_F(Instance_Requests, do_not_serve_queries)
 {
-    const auto query = [&]
-    { EXPECT_EQ(CMPI_Adapter::execQuery(mi, request.context(), nullptr, things_path, "", "WQL").rc, CMPI_RC_ERR_NOT_SUPPORTED); };
-    EXPECT_THAT(logged(query, "DBG"),
-                ElementsAre("CMPI_Adapter: enter: execQuery()", "CMPI_Adapter: return: execQuery(): CMPI_RC_ERR_NOT_SUPPORTED"));
+    EXPECT_EQ(CMPI_Adapter::execQuery(mi, request.context(), nullptr, things_path, "", "WQL").rc, CMPI_RC_ERR_NOT_SUPPORTED);
 }
 
 } // namespace

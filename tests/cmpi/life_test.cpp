@@ -48,7 +48,7 @@ TEST_F(Life, all_interfaces_share_one_adapter_and_one_loaded_provider)
     const auto [instances, methods, associations, indications] = all_kinds();
     ASSERT_TRUE(link_data.adapter);
     EXPECT_EQ(link_data.adapter->load_count, 4U);
-    EXPECT_EQ(link_data.adapter->mc, &Test_Link::static_meta_class);
+    EXPECT_EQ(link_data.adapter->mc, &TST_Pair::static_meta_class);
     EXPECT_EQ(script.loads, 1);
     EXPECT_EQ(script.providers, 1);
     for (void* hdl : {instances->hdl, methods->hdl, associations->hdl, indications->hdl})
@@ -92,19 +92,28 @@ TEST_F(Life, an_adapter_that_may_not_unload_stays_until_the_server_ends)
     EXPECT_EQ(script.unloads, 1);
 }
 
-TEST_F(Life, coming_and_going_are_traced_in_order)
+TEST_F(Life, every_entry_and_exit_is_traced)
 {
-    EXPECT_THAT(logged([&] { links(); }, "DBG"),
-                ElementsAre("CMPI_Adapter: enter: CMPI_Adapter()", "CMPI_Adapter: return: CMPI_Adapter()",
-                            "CMPI_Adapter: enter: cimple_cmpi_adapter()", "CMPI_Adapter: return: cimple_cmpi_adapter()"));
-    const Kinds kinds = all_kinds();
-    std::vector<std::string> lines;
-    for (const char* kind : {"instance", "method", "association", "indication"})
+    const std::string factory = "cimple_cmpi_adapter";
+    const auto kinds = all_kinds();
+    const auto* filter_path = path("TST_Alert");
+    const CMPIContext* context = request.context();
+    const std::pair<std::string, std::function<void()>> rows[] = {
+        {factory, [&] { links(); }},
+        {"execQuery", [&] { CMPI_Adapter::execQuery(kinds.instances, context, nullptr, nullptr, "", ""); }},
+        {"authorizeFilter", [&] { CMPI_Adapter::authorizeFilter(kinds.indications, nullptr, nullptr, "", filter_path, ""); }},
+        {"mustPoll", [&] { CMPI_Adapter::mustPoll(kinds.indications, nullptr, nullptr, "", filter_path); }},
+        {"instanceCleanup", [&] { clean_up(kinds.instances); }},
+        {"methodCleanup", [&] { clean_up(kinds.methods); }},
+        {"associationCleanup", [&] { clean_up(kinds.associations); }},
+        {"indicationCleanup", [&] { clean_up(kinds.indications); }},
+    };
+    for (const auto& [name, work] : rows)
     {
-        lines.push_back(std::string("CMPI_Adapter: enter: ") + kind + "Cleanup()");
-        lines.push_back(std::string("CMPI_Adapter: return: ") + kind + "Cleanup(): CMPI_RC_OK");
+        const std::string code = name == factory ? "" : name == "execQuery" ? ": CMPI_RC_ERR_NOT_SUPPORTED" : ": CMPI_RC_OK";
+        EXPECT_THAT(logged(work, "DBG"),
+                    ElementsAre("CMPI_Adapter: enter: " + name + "()", "CMPI_Adapter: return: " + name + "()" + code));
     }
-    EXPECT_EQ(logged([&] { clean_up_all(kinds, false); }, "DBG"), lines);
 }
 
 TEST_F(Life, a_provider_loads_and_unloads_in_a_thread_context_of_its_server)
@@ -152,7 +161,7 @@ TEST_F(Life, a_cleanup_waits_for_the_requests_that_run_and_refuses_new_ones)
             std::this_thread::yield();
         cimserver::Request own;
         Recorded_Result refused;
-        EXPECT_EQ(CMPI_Adapter::enumInstances(mi, own.context(), refused.face(), path("Test_Thing"), nullptr).rc,
+        EXPECT_EQ(CMPI_Adapter::enumInstances(mi, own.context(), refused.face(), path("TST_Thing"), nullptr).rc,
                   CMPI_RC_ERR_FAILED);
     };
     std::thread client(
@@ -160,7 +169,7 @@ TEST_F(Life, a_cleanup_waits_for_the_requests_that_run_and_refuses_new_ones)
         {
             cimserver::Request own;
             Recorded_Result result;
-            EXPECT_EQ(CMPI_Adapter::enumInstances(mi, own.context(), result.face(), path("Test_Thing"), nullptr).rc, CMPI_RC_OK);
+            EXPECT_EQ(CMPI_Adapter::enumInstances(mi, own.context(), result.face(), path("TST_Thing"), nullptr).rc, CMPI_RC_OK);
             answered = true;
         });
     while (!entered)

@@ -40,7 +40,7 @@ private:
     CMPIResult _face;
 };
 
-// The adapter of a provider while it exists. Each test has a broker and a request around it, and no instance may be left
+// The adapter of a provider while it exists. Each test has a broker and a request around it, and no provider may be left
 // over at its end.
 class Served_Provider : public testing::Test
 {
@@ -62,7 +62,7 @@ protected:
 
     // Objects of the broker, which the request owns.
     CMPIObjectPath* path(const char* class_name) const;
-    CMPIObjectPath* thing_path(const char* name, const char* class_name = "Test_Thing") const;
+    CMPIObjectPath* thing_path(const char* name, const char* class_name = "TST_Thing") const;
 
     // The value of an item of a recorded path or instance; a failure when there is none.
     using Items = std::vector<cimserver::Named_Value>;

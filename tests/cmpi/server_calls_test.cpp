@@ -1,13 +1,13 @@
 // The calls of providers into the server: the facade, and what reaches the server's operations.
-#include "cimserver/operations.h"
+#include "cimserver/broker/objects.h"
 #include "cmpi/cimom.h"
 #include "cmpi/thread_context.h"
 #include "tests/cmpi/served_provider.h"
 
+#include <cmpimacs.h>
 #include <gmock/gmock.h>
 
 using namespace test;
-using cimserver::Cim_Error;
 using testing::Each;
 using testing::ElementsAre;
 using testing::IsEmpty;
@@ -15,72 +15,86 @@ using testing::IsEmpty;
 namespace
 {
 
-// The server's side: answers what the test offers and keeps what it is given.
-class Server : public cimserver::Operations
+// The server's side: writes down what it is asked, and answers what the test offers.
+struct Server
 {
-public:
-    const zmlr::Meta_Class* get_class(const std::string&, const std::string&) override { return nullptr; }
-    std::vector<const zmlr::Meta_Class*> enumerate_classes(const std::string&, const std::string&, bool) override { return {}; }
-    std::vector<cimserver::Object_Path> enumerate_instance_names(const std::string&, const std::string&) override { return {}; }
-    std::vector<cimserver::Instance> enumerate_instances(const std::string& name_space, const std::string& class_name, bool,
-                                                         const cimserver::Property_List& properties) override
-    {
-        EXPECT_FALSE(properties);
-        answer("enumerate " + name_space + ":" + class_name);
-        return instances;
-    }
-    cimserver::Instance get_instance(const cimserver::Object_Path& path, const cimserver::Property_List&) override
-    {
-        answer("get " + text_of(path));
-        return instances.at(0);
-    }
-    cimserver::Object_Path create_instance(const cimserver::Instance& instance) override
-    {
-        answer("create " + text_of(instance.path));
-        return instance.path;
-    }
-    void modify_instance(const cimserver::Instance& instance, const cimserver::Property_List& properties) override
-    {
-        EXPECT_FALSE(properties);
-        answer("modify " + text_of(instance.path));
-    }
-    void delete_instance(const cimserver::Object_Path& path) override { answer("delete " + text_of(path)); }
-    cimserver::Method_Result invoke_method(const cimserver::Object_Path& path, const std::string& method,
-                                           const std::vector<cimserver::Named_Value>& in) override
-    {
-        answer("invoke " + text_of(path) + " " + method);
-        arguments = in;
-        return {string("done"), {{"Count", {CMPI_sint64, std::int64_t{9}}}, {"Answer", string("yes")}}};
-    }
-
     std::vector<cimserver::Instance> instances;
     std::vector<cimserver::Named_Value> arguments;
     std::vector<std::string> calls;
-    bool fails = false;
+    CMPIrc rc = CMPI_RC_OK;
 
-private:
-    static std::string text_of(const cimserver::Object_Path& path)
+    CMPIrc asked(const std::string& call, const CMPIObjectPath* to)
     {
-        return path.name_space + ":" + path.class_name + "." + std::get<std::string>(path.keys.at(0).value.content);
-    }
-    void answer(const std::string& call)
-    {
-        calls.push_back(call);
-        if (fails)
-            throw Cim_Error(cimserver::CIM_ERR_ACCESS_DENIED, "no");
+        const auto& path = cimserver::object<cimserver::Path_Object>(to).path;
+        calls.push_back(call + " " + path.name_space + ":" + path.class_name + "." +
+                        std::get<std::string>(path.keys.at(0).value.content));
+        return rc;
     }
 };
+Server server;
+
+using B = const CMPIBroker*;
+using C = const CMPIContext*;
+using O = const CMPIObjectPath*;
+using I = const CMPIInstance*;
+using L = const char**;
+
+CMPIInstance* face_of(const cimserver::Instance& instance)
+{
+    return cimserver::make<cimserver::Instance_Object>(instance).face();
+}
+
+CMPIEnumeration* enumerate(B, C, O path, L, CMPIStatus* status)
+{
+    status->rc = server.asked("enumerate", path);
+    std::vector<cimserver::Value> elements;
+    for (const auto& instance : server.instances)
+        elements.push_back({CMPI_instance, std::make_shared<const cimserver::Instance>(instance)});
+    return cimserver::make<cimserver::Enumeration_Object>(CMPIType{CMPI_instance}, elements).face();
+}
+CMPIInstance* get(B, C, O path, L, CMPIStatus* status)
+{
+    status->rc = server.asked("get", path);
+    return server.instances.empty() ? nullptr : face_of(server.instances[0]);
+}
+CMPIObjectPath* create_instance(B, C, O path, I, CMPIStatus* status)
+{
+    status->rc = server.asked("create", path);
+    return CMClone(path, nullptr);
+}
+CMPIData invoke(B, C, O path, const char* method, const CMPIArgs* in, CMPIArgs* out, CMPIStatus* status)
+{
+    status->rc = server.asked(method, path);
+    server.arguments = cimserver::object<cimserver::Args_Object>(in).args;
+    cimserver::object<cimserver::Args_Object>(out).args = {{"Count", {CMPI_sint64, std::int64_t{9}}}, {"Answer", string("yes")}};
+    return {CMPI_string, CMPI_goodValue, {.string = cimserver::make<cimserver::String_Object>("done").face()}};
+}
+
+CMPIBrokerFT operations(CMPIBrokerFT table)
+{
+    table.enumerateInstances = enumerate;
+    table.getInstance = get;
+    table.createInstance = create_instance;
+    table.modifyInstance = [](B, C, O path, I, L) { return CMPIStatus{server.asked("modify", path), nullptr}; };
+    table.deleteInstance = [](B, C, O path) { return CMPIStatus{server.asked("delete", path), nullptr}; };
+    table.invokeMethod = invoke;
+    return table;
+}
 
 cimserver::Instance instance_of(const char* class_name, const char* name)
 {
     const cimserver::Named_Value key = {"Name", string(name)};
-    return {{"", "root/there", class_name, {key}}, {key, {"Uint8", {CMPI_uint8, std::uint64_t{3}}}}};
+    return {{"", "root/there", class_name, {key}}, {key, {"Uint8Value", {CMPI_uint8, std::uint64_t{3}}}}};
 }
 
 class Server_Calls : public Served_Provider
 {
 protected:
-    Server_Calls() { broker.set_operations(&server); }
+    Server_Calls()
+    {
+        server = {};
+        odd.bft = &table;
+    }
 
     void TearDown() override
     {
@@ -90,10 +104,9 @@ protected:
     }
 
     // Runs work() as a provider does in a request to a broker.
-    template <class Work> void in_request(Work work) { in_request(*broker.face(), work); }
-    template <class Work> void in_request(const CMPIBroker& to, Work work)
+    template <class Work> void in_request(Work work)
     {
-        const CMPI_Thread_Context_Pusher pusher(&to, request.context(), thing_data.adapter);
+        const CMPI_Thread_Context_Pusher pusher(&odd, request.context(), thing_data.adapter);
         work();
     }
 
@@ -110,16 +123,17 @@ protected:
                 cimom::enum_instances(there, model.ptr(), e)};
     }
 
-    Server server;
+    CMPIBrokerFT table = operations(*broker.face()->bft);
+    CMPIBroker odd = *broker.face();
     CMPIInstanceMI* mi = things();
-    Ref<Test_Thing> model = thing("a");
-    Ref<Test_Disk_Convert_method> method{
-        static_cast<Test_Disk_Convert_method*>(create(&Test_Disk_Convert_method::static_meta_class))};
+    Ref<TST_Thing> model = thing("a");
+    Ref<TST_Disk_Convert_method> method{
+        static_cast<TST_Disk_Convert_method*>(create(&TST_Disk_Convert_method::static_meta_class))};
 };
 
 TEST_F(Server_Calls, enumerate_as_instances_of_the_models_class)
 {
-    server.instances = {instance_of("Test_Thing", "x"), instance_of("Test_Disk", "y")};
+    server.instances = {instance_of("TST_Thing", "x"), instance_of("TST_Disk", "y")};
     const auto work = [&]
     {
         Instance_Enumerator e;
@@ -131,10 +145,10 @@ TEST_F(Server_Calls, enumerate_as_instances_of_the_models_class)
             for (; e; ++e)
             {
                 const Ref<Instance> found = e();
-                EXPECT_EQ(found->meta_class, &Test_Thing::static_meta_class);
+                EXPECT_EQ(found->meta_class, &TST_Thing::static_meta_class);
                 EXPECT_EQ(found->__name_space, "root/there");
-                EXPECT_EQ(cast<Test_Thing>(found.ptr())->Uint8.value, 3);
-                names.emplace_back(cast<Test_Thing>(found.ptr())->Name.value.c_str());
+                EXPECT_EQ(cast<TST_Thing>(found.ptr())->Uint8Value.value, 3);
+                names.emplace_back(cast<TST_Thing>(found.ptr())->Name.value.c_str());
             }
             EXPECT_THAT(names, ElementsAre("x", "y"));
         }
@@ -147,35 +161,31 @@ TEST_F(Server_Calls, enumerate_as_instances_of_the_models_class)
 
 TEST_F(Server_Calls, end_an_enumeration_at_what_is_no_instance)
 {
-    CMPIBrokerFT calls = *broker.face()->bft;
-    calls.enumerateInstances = [](const CMPIBroker*, const CMPIContext*, const CMPIObjectPath*, const char**, CMPIStatus* status)
+    table.enumerateInstances = [](B, C, O, L, CMPIStatus*)
     {
-        *status = {CMPI_RC_OK, nullptr};
         const std::vector<cimserver::Value> elements = {string("no instance")};
         return cimserver::make<cimserver::Enumeration_Object>(CMPIType{CMPI_string}, elements).face();
     };
-    CMPIBroker odd = *broker.face();
-    odd.bft = &calls;
     const auto work = [&]
     {
         Instance_Enumerator e;
         EXPECT_EQ(cimom::enum_instances("root/there", model.ptr(), e), 0);
         EXPECT_FALSE(e);
     };
-    in_request(odd, work);
+    in_request(work);
 }
 
 TEST_F(Server_Calls, reach_each_operation)
 {
-    server.instances = {instance_of("Test_Thing", "x")};
+    server.instances = {instance_of("TST_Thing", "x")};
     nullify_properties(method.ptr());
     method->Level.set(7);
     method->Count.set(1);
     method->Numbers.set({1});
     in_request([&] { EXPECT_THAT(call_all(), Each(0)); });
-    EXPECT_THAT(server.calls, ElementsAre("get root/there:Test_Thing.a", "create root/there:Test_Thing.a",
-                                          "modify root/there:Test_Thing.a", "delete root/there:Test_Thing.a",
-                                          "invoke root/there:Test_Thing.a Convert", "enumerate root/there:Test_Thing"));
+    EXPECT_THAT(server.calls, ElementsAre("get root/there:TST_Thing.a", "create root/there:TST_Thing.a",
+                                          "modify root/there:TST_Thing.a", "delete root/there:TST_Thing.a",
+                                          "Convert root/there:TST_Thing.a", "enumerate root/there:TST_Thing.a"));
     EXPECT_THAT(names_of(server.arguments), ElementsAre("Level", "Count")) << "the inputs that are set";
     EXPECT_EQ(method->Level.value, 7);
     EXPECT_EQ(method->Count.value, 9);
@@ -186,9 +196,9 @@ TEST_F(Server_Calls, reach_each_operation)
 
 TEST_F(Server_Calls, fail_when_the_server_refuses_and_without_a_context)
 {
-    server.fails = true;
+    server.rc = CMPI_RC_ERR_ACCESS_DENIED;
     in_request([&] { EXPECT_THAT(call_all(), Each(-1)); });
-    server.fails = false;
+    server.rc = CMPI_RC_OK;
     server.calls.clear();
     String user;
     EXPECT_THAT(call_all(), Each(-1));

@@ -110,13 +110,13 @@ public:
     }
 };
 
-using Thing_Provider = Scripted_Provider<Test_Thing, Instance_Provider>;
+using Thing_Provider = Scripted_Provider<TST_Thing, Instance_Provider>;
 
-class Disk_Provider : public Scripted_Provider<Test_Disk, Instance_Provider>
+class Disk_Provider : public Scripted_Provider<TST_Disk, Instance_Provider>
 {
 public:
     static Disk_Provider* create() { return new Disk_Provider; }
-    static int invoke(Disk_Provider&, const Test_Disk* self, Instance* parameters)
+    static int invoke(Disk_Provider&, const TST_Disk* self, Instance* parameters)
     {
         const Turn script;
         script->instance = copy_of(self);
@@ -127,7 +127,7 @@ public:
 };
 
 // Delivers associators only when it says that it does.
-class Link_Provider : public Scripted_Provider<Test_Link, Association_Provider>
+class Link_Provider : public Scripted_Provider<TST_Pair, Association_Provider>
 {
 public:
     static Link_Provider* create() { return new Link_Provider; }
@@ -150,21 +150,21 @@ public:
         return script->enum_associator_names;
     }
 
-    Enum_References_Status enum_references(const Instance*, const Test_Link*, const String&,
-                                           Enum_References_Handler<Test_Link>&) override
+    Enum_References_Status enum_references(const Instance*, const TST_Pair*, const String&,
+                                           Enum_References_Handler<TST_Pair>&) override
     {
         return Script::get().enum_references;
     }
 };
 
-class Alert_Provider : public Counted_Provider<Indication_Provider<Test_Alert>>
+class Alert_Provider : public Counted_Provider<Indication_Provider<TST_Alert>>
 {
 public:
     static Alert_Provider* create() { return new Alert_Provider; }
 
-    Enable_Indications_Status enable_indications(Indication_Handler<Test_Alert>* handler) override
+    Enable_Indications_Status enable_indications(Indication_Handler<TST_Alert>* handler) override
     {
-        std::unique_ptr<Indication_Handler<Test_Alert>> own(handler);
+        std::unique_ptr<Indication_Handler<TST_Alert>> own(handler);
         const Turn script;
         ++script->enables;
         if (script->enable_indications == ENABLE_INDICATIONS_OK)
@@ -209,13 +209,13 @@ Script& Script::fresh() { return the_script = Script(); }
 
 // clang-format off
 constinit const Registration thing_registration = {"Test_Module", "Test_Thing_Provider",
-    proc<Thing_Provider, instance_provider_proc<Thing_Provider>>, &Test_Thing::static_meta_class, nullptr};
+    proc<Thing_Provider, instance_provider_proc<Thing_Provider>>, &TST_Thing::static_meta_class, nullptr};
 constinit const Registration disk_registration = {"Test_Module", "Test_Disk_Provider",
-    proc<Disk_Provider, instance_provider_proc<Disk_Provider>>, &Test_Disk::static_meta_class, &thing_registration};
+    proc<Disk_Provider, instance_provider_proc<Disk_Provider>>, &TST_Disk::static_meta_class, &thing_registration};
 constinit const Registration link_registration = {"Test_Module", "Test_Link_Provider",
-    proc<Link_Provider, association_provider_proc<Link_Provider>>, &Test_Link::static_meta_class, &disk_registration};
+    proc<Link_Provider, association_provider_proc<Link_Provider>>, &TST_Pair::static_meta_class, &disk_registration};
 constinit const Registration alert_registration = {"Test_Module", "Test_Alert_Provider",
-    proc<Alert_Provider, indication_provider_proc<Alert_Provider>>, &Test_Alert::static_meta_class, &link_registration};
+    proc<Alert_Provider, indication_provider_proc<Alert_Provider>>, &TST_Alert::static_meta_class, &link_registration};
 // clang-format on
 
 } // namespace test

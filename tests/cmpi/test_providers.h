@@ -3,7 +3,7 @@
 
 #include "cmpi/provider_handle.h"
 #include "cmpi/static_data.h"
-#include "tests/cmpi/test_classes.h"
+#include "tests/cmpi/things.h"
 
 #include <functional>
 #include <memory>
@@ -48,14 +48,14 @@ struct Script
     Ref<Instance> instance;
     int enables = 0;
     int disables = 0;
-    std::unique_ptr<Indication_Handler<Test_Alert>> handler; // while indications are enabled
+    std::unique_ptr<Indication_Handler<TST_Alert>> handler; // while indications are enabled
 
     static Script& get();
     static Script& fresh(); // emptied
     static std::recursive_mutex& turn();
 };
 
-// The records of the providers; Test_Alert's is the head of their list.
+// The records of the providers; TST_Alert's is the head of their list.
 extern const Registration thing_registration;
 extern const Registration disk_registration;
 extern const Registration link_registration;

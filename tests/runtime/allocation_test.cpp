@@ -72,24 +72,23 @@ long fail_each_allocation_of(const std::function<void()>& work)
 
 TEST(Memory, runs_out_without_a_leak)
 {
-    const auto source = linked(element("a"), disk("d"));
-    source->Others.value.append(element("o").steal());
-    const auto other = linked(element("x"), disk("y"));
-    other->Others.value.append(element("z").steal());
+    const auto source = linked(element("a"), disk("d")), other = linked(element("x"), disk("y"));
+    const auto record = reset_of(element("r"), {element("o").steal()});
+    const Meta_Feature* others = find_reference(&Sample_Element_Reset_method::static_meta_class, "Others");
 
     fail_each_allocation_of(
         [&]
         {
             const Ref<Sample_Link> made(clone(source.ptr())), dest(clone(other.ptr())), bare(create<Sample_Link>());
-            const Ref<Instance> keys(key_clone(source.ptr()));
+            const Ref<Instance> keys(key_clone(source.ptr())), parameters(clone(static_cast<const Instance*>(record.ptr())));
             copy(dest.ptr(), source.ptr());
             __create_refs(bare.ptr());
             __set_name_space_recursive(bare.ptr(), "root/zemlar", true);
 
             Value value;
-            value.set(source.ptr(), find_reference(source->meta_class, "Others"));
+            value.set(record.ptr(), others);
             const Value copied = value;
-            copied.get(bare.ptr(), find_reference(source->meta_class, "Others"));
+            copied.get(parameters.ptr(), others);
 
             String path;
             EXPECT_EQ(instance_to_model_path(source.ptr(), path), 0);

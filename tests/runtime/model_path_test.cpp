@@ -1,5 +1,6 @@
 #include "runtime/model_path.h"
 
+#include "tests/runtime/rows.h"
 #include "tests/runtime/sample_classes.h"
 
 #include <gtest/gtest.h>
@@ -47,40 +48,17 @@ struct Keyed
 
 TEST(Model_Path, values_of_every_type)
 {
-    const struct
+    for (const auto& row : rows_of("model_paths.txt"))
     {
-        Type type;
-        const char* text;
-        const char* written;
-        std::vector<const char*> refused;
-    } rows[] = {
-        {BOOLEAN, "False", "false", {"1", ""}},
-        {UINT8, "0x1F", "31", {"256", "-1", "", " 1"}},
-        {SINT8, "-128", "-128", {"128"}},
-        {UINT16, "65535", "65535", {"65536"}},
-        {SINT16, "-0x10", "-16", {"32768"}},
-        {UINT32, "4294967295", "4294967295", {"4294967296"}},
-        {SINT32, "+5", "5", {"2147483648"}},
-        {UINT64, "18446744073709551615", "18446744073709551615", {"18446744073709551616"}},
-        {SINT64, "-9223372036854775808", "-9223372036854775808", {"9223372036854775808"}},
-        {REAL32, "1.5", "1.500000", {"1"}},
-        {REAL64, "-1.5e3", "-1500.000000", {"1", "nan"}},
-        {CHAR16, "','", "','", {"'ab'", "'", "'a", "a", "''"}},
-        {CHAR16, "'''", "'''", {}},
-        {STRING, R"("a, b.c=d")", R"("a, b.c=d")", {R"("a\nb")", R"("a\)", R"("a)", "a", R"("a"b)"}},
-        {STRING, R"("")", R"("")", {}},
-        {DATETIME,
-         "00000001023000.000000:000",
-         "00000001023000.000000:000",
-         {"00000001023000.000000:00", R"("00000001023000.000000:000")"}},
-    };
-    for (const auto& row : rows)
-    {
-        const Keyed keyed(row.type);
-        const std::string name = "keyed.k=";
-        EXPECT_EQ(rewritten(&keyed.meta_class, name + row.text), std::string("Keyed.K=") + row.written);
-        for (const char* text : row.refused)
-            EXPECT_EQ(rewritten(&keyed.meta_class, name + text), "-") << row.type << text;
+        Type type = UINT8;
+        if (type_name_to_type(row[0].c_str(), type) != 0)
+        {
+            EXPECT_EQ(model_path_to_instance(&Sample_Element::static_meta_class, row.at(1).c_str()), nullptr) << row[1];
+            continue;
+        }
+        const Keyed keyed(type);
+        const std::string written = row.at(2) == "refused" ? "-" : "Keyed.K=" + row[2];
+        EXPECT_EQ(rewritten(&keyed.meta_class, "keyed.k=" + row[1]), written) << row[0] << " " << row[1];
     }
 
     const std::string largest = "Keyed.K=-179769313486231570" + std::string(291, '0') + ".000000";
@@ -121,25 +99,13 @@ TEST(Model_Path, references_are_quoted_paths)
     EXPECT_EQ(instance_to_model_path(Ref<Sample_Setting>(create<Sample_Setting>()).ptr(), path), -1);
 }
 
-TEST(Model_Path, what_is_no_path_is_refused)
+TEST(Model_Path, no_length_and_no_depth_harms)
 {
     const std::string quotes(10000, '"');
     std::string nested;
     for (int i = 0; i < 10000; ++i)
         nested += R"(Sample_Link.Antecedent=\")";
-    // clang-format off
     const std::string rows[] = {
-        "", ".", "Sample_Element", "Sample_Element.", "Sample_Element.=", "Sample_Element.Name", "Sample_Element.Name=",
-        R"(Sample_Element.Name="a",)", R"(Sample_Element.Name="a" )", R"( Sample_Element.Name="a")", R"(Sample_Element Name="a")",
-        R"(Sample_Element.Name="a",Name="a")", R"(Sample_Element.Name="a",Reset=1)", R"(Sample_Element.Nam="a")",
-        R"(Sample_Element.Name="a",Size=1)", // no key
-        R"(Sample_Gone.Name="a")", R"(1Sample_Element.Name="a")",
-        R"(Sample_Link.Antecedent=Sample_Element.Name="a")",
-        R"(Sample_Link.Antecedent="Sample_Person.Name=\"a\"")", // of another class
-        R"(Sample_Link.Dependent="Sample_Element.Name=\"a\"")", // of a superclass only
-        R"(Sample_Link.Antecedent="Sample_Element.Name=\"a\"",Antecedent="Sample_Element.Name=\"a\"")",
-        R"(Sample_Link.Antecedent="Sample_Element.Name=\"a")",
-        R"(Sample_Link.Antecedent="Instance.Name=\"a\"")",
         "Sample_Element.Name=" + quotes,
         "Sample_Link.Antecedent=\"" + nested,
         "Sample_Link.Antecedent=\"" + nested + "\"",
@@ -147,7 +113,6 @@ TEST(Model_Path, what_is_no_path_is_refused)
         std::string(1 << 20, '\\'),
         "Sample_Element.Name=\"" + std::string(1 << 20, '\xFF'),
     };
-    // clang-format on
     for (const std::string& row : rows)
         EXPECT_EQ(model_path_to_instance(&Sample_Element::static_meta_class, row.c_str()), nullptr) << row.substr(0, 100);
 

@@ -1,6 +1,4 @@
-#include "runtime/instance.h"
 #include "runtime/mutex.h"
-#include "tests/runtime/sample_classes.h"
 
 #include <gtest/gtest.h>
 
@@ -73,27 +71,6 @@ TEST(MutexDeathTest, is_neither_given_back_by_strangers_nor_taken_twice)
         mutex.lock();
     };
     EXPECT_DEATH(lock_twice(), report("lock"));
-}
-
-TEST(Counts, threads_share_values_and_instances)
-{
-    const auto shared = sample::element("shared");
-    const String text("text");
-    const Datetime time(5, 60);
-    in_threads(
-        [&]
-        {
-            const Ref<sample::Sample_Element> held = shared;
-            const Ref<sample::Sample_Element> copied(clone(held.ptr()));
-            String own = text;
-            own.append('!');
-            Datetime later = time;
-            later.usec(6);
-            EXPECT_EQ(copied->Name.value, "shared");
-        });
-    EXPECT_EQ(Atomic_get(&shared->__refs), 1U);
-    EXPECT_EQ(text, "text");
-    EXPECT_TRUE(time == Datetime(5, 60));
 }
 
 } // namespace

@@ -47,18 +47,17 @@ TEST(Print, scalars_and_arrays)
 
 TEST(Print, an_instance_is_a_block_and_so_is_what_it_refers_to)
 {
-    const auto association = linked(element("a\"b"), {});
-    association->__name_space = "root/zemlar";
-    association->Antecedent->Labels.value.clear();
     const Ref<Sample_Setting> setting(create<Sample_Setting>(false));
-    association->Others.value.append(Ref<Sample_Setting>(setting).steal());
-    association->Others.value.append(nullptr);
-    association->Others.null = 0;
-    EXPECT_EQ(printed([&](std::FILE* stream) { fprint(stream, association.ptr()); }),
-              R"(Sample_Link
+    const auto record = reset_of(element("a\"b"), {Ref<Sample_Setting>(setting).steal(), nullptr});
+    record->__name_space = "root/zemlar";
+    record->Peer->Labels.value.clear();
+    record->Delay.null = 1;
+    EXPECT_EQ(printed([&](std::FILE* stream) { fprint(stream, record.ptr()); }),
+              R"(Reset
 {
     string __name_space = "root/zemlar";
-    Sample_Element Antecedent =
+    uint32 Delay = NULL;
+    Sample_Element Peer =
     {
         string Name = "a\"b";
         boolean Online = NULL;
@@ -66,7 +65,7 @@ TEST(Print, an_instance_is_a_block_and_so_is_what_it_refers_to)
         uint32 Size = 1;
         sint64 Delta = NULL;
         real64 Load = NULL;
-        char16 Letter = 'x';
+        char16 Letter = NULL;
         datetime Since = "00000001000000.000000:000";
         string Caption = "new element";
         string Labels[] = { };
@@ -74,7 +73,6 @@ TEST(Print, an_instance_is_a_block_and_so_is_what_it_refers_to)
         datetime Intervals[] = { "00000000000000.000000:000" };
         real64 Samples[] = NULL;
     }
-    Sample_Disk Dependent = NULL;
     Sample_Element Others[] =
     {
         Sample_Setting Others =
@@ -83,9 +81,11 @@ TEST(Print, an_instance_is_a_block_and_so_is_what_it_refers_to)
         }
         NULL
     };
-    string Note = NULL;
+    uint32 return_value = 0;
 }
 )");
+    EXPECT_NE(printed([&](std::FILE* stream) { fprint(stream, linked({}, {}).ptr()); }).find("Sample_Disk Dependent = NULL;\n"),
+              std::string::npos);
 
     testing::internal::CaptureStdout();
     print(setting.ptr());

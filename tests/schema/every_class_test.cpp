@@ -1,10 +1,8 @@
 // Every class of the repository, and every parameter record, through every generic operation: laws that hold whatever the
 // features are.
 #include "runtime/features.h"
-#include "runtime/instance_print.h"
 #include "runtime/model_path.h"
 #include "schema/repository.h"
-#include "tests/runtime/printed.h"
 
 #include <gtest/gtest.h>
 
@@ -326,22 +324,6 @@ void expect_path_and_back(const Meta_Class* meta_class)
 }
 
 TEST(Every_Class, a_path_reads_back_to_the_keys) { for_each_class(expect_path_and_back); }
-
-void expect_printed(const Meta_Record* record)
-{
-    const Ref<Instance> instance = filled(record, 1);
-    const std::string text = printed([&](std::FILE* stream) { fprint(stream, instance.ptr()); });
-    EXPECT_TRUE(text.starts_with(record->name + std::string("\n{\n    string __name_space = \"root/zemlar\";\n"))) << text;
-    EXPECT_TRUE(text.ends_with("\n}\n")) << text;
-    std::size_t at = 0;
-    for (const Meta_Feature* feature : features_of(record))
-    {
-        at = is_method(feature) ? at : text.find(std::string(" ") + feature->name, at);
-        ASSERT_NE(at, std::string::npos) << feature->name;
-    }
-}
-
-TEST(Every_Class, prints_every_feature) { for_each_record(expect_printed); }
 
 } // namespace
 } // namespace zmlr

@@ -5,6 +5,7 @@
 #include "schema/ZEMLAR_AlarmDevice.h"
 #include "schema/repository.h"
 #include "tests/runtime/printed.h"
+#include "tests/runtime/rows.h"
 
 #include <gtest/gtest.h>
 
@@ -99,37 +100,14 @@ TEST(Meta_Data, defaults)
 
 TEST(Meta_Data, flag_words)
 {
-    constexpr struct
+    for (const auto& row : rows_of("flags.txt"))
     {
-        const char *class_name, *feature, *parameter; // of a feature itself: no parameter
-        uint32 flags;
-    } rows[] = {
-        // clang-format off
-        {"ZEMLAR_FCPort",               "DeviceID",           nullptr, 0x02200001},
-        {"ZEMLAR_ComputerSystem",       "Roles",              nullptr, 0x42000001}, // a writable array
-        {"ZEMLAR_ConcreteJob",          "InstanceID",         nullptr, 0x02200001}, // an override that makes a key
-        {"ZEMLAR_SCSIProtocolEndpoint", "Name",               nullptr, 0x02200001}, // an override of a key
-        {"ZEMLAR_FCPortStatistics",     "LIPCount",           nullptr, 0x02000201}, // a counter
-        {"ZEMLAR_TapeDrive",            "UnitsUsed",          nullptr, 0x02010001}, // a gauge
-        {"ZEMLAR_RegisteredProfile",    "RegisteredName",     nullptr, 0x06000001}, // required
-        {"ZEMLAR_FCPort",               "AllocationState",    nullptr, 0x82008001}, // an experimental embedded instance
-        {"ZEMLAR_ControlledBy",         "Antecedent",         nullptr, 0x00200002},
-        {"ZEMLAR_FCPortSystemDevice",   "GroupComponent",     nullptr, 0x00200022},
-        {"ZEMLAR_FCPortSystemDevice",   "PartComponent",      nullptr, 0x20200002},
-        {"ZEMLAR_FCPort",               "RequestStateChange", nullptr, 0x00000004},
-        {"ZEMLAR_AlarmDevice",          "SetAlarmState",      "State", 0x00040001},
-        {"CIM_Service", "ChangeAffectedElementsAssignedSequence", "ManagedElements",  0x04040002}, // required
-        {"CIM_Service", "ChangeAffectedElementsAssignedSequence", "Job",              0x01000002}, // only goes out
-        {"CIM_DiagnosticService", "RunDiagnosticService",         "DiagnosticSettings", 0x80040001}, // an embedded instance
-        // clang-format on
-    };
-    for (const auto& row : rows)
-    {
-        const Meta_Feature* feature = &feature_named(row.class_name, row.feature);
-        if (row.parameter)
-            feature = find_parameter(as_method(feature), row.parameter);
-        ASSERT_NE(feature, nullptr) << row.parameter;
-        EXPECT_EQ(feature->flags, row.flags) << std::hex << row.class_name << "." << feature->name << " is " << feature->flags;
+        const auto dot = row.at(1).find('.');
+        const Meta_Feature* feature = &feature_named(row[0].c_str(), row[1].substr(0, dot).c_str());
+        if (dot != std::string::npos)
+            feature = find_parameter(as_method(feature), row[1].c_str() + dot + 1);
+        ASSERT_NE(feature, nullptr) << row[1];
+        EXPECT_EQ(feature->flags, std::stoul(row.at(2), nullptr, 16)) << row[0] << "." << row[1];
     }
 
     const auto* change = as_method(&feature_named("CIM_Service", "ChangeAffectedElementsAssignedSequence"));
