@@ -191,7 +191,7 @@ hxa_boolean_t hxal_adapter_is_cna_capable(int ad)
 void hxal_adapter_get_serial_num(const hxal_adapter_t* ad, char* serial)
 {
     if (ad)
-        hxal::copy_out(serial, ad->serial_num);
+        hxal::copy_serial_out(serial, ad->serial_num);
 }
 
 void hxal_adapter_get_model(const hxal_adapter_t* ad, char* model)

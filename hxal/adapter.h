@@ -14,7 +14,7 @@ extern "C"
     // One adapter. Every text is terminated.
     typedef struct hxal_adapter_s
     {
-        char serial_num[12]; // of the first IOC seen
+        char serial_num[13]; // of the first IOC seen: 12 characters and the terminator
         char name[64];       // as the driver keeps it
         char model_descr[128];
         char adapter_hwpath[32];
@@ -77,7 +77,8 @@ extern "C"
     const char* hxal_adapter_get_serial_num_by_idx(uint16_t ad);
     hxa_boolean_t hxal_adapter_is_cna_capable(int ad);
 
-    // Copy a text out, terminated; the buffers hold 12, 128 and 32 bytes. Without an adapter nothing is written.
+    // Copy a text out; the buffers hold 12, 128 and 32 bytes. Each is terminated, but for a serial number of 12 characters, which
+    // fills its buffer. Without an adapter nothing is written.
     void hxal_adapter_get_serial_num(const hxal_adapter_t* ad, char* serial);
     void hxal_adapter_get_model(const hxal_adapter_t* ad, char* model);
     void hxal_adapter_get_hw_path(const hxal_adapter_t* ad, char* hwpath);

@@ -21,10 +21,7 @@ bool is_for_adapter(const Registration& registration, const Event& event)
 {
     if (registration.filter.any_added)
         return event.aen_type == HXA_ADAPTER_AEN_ADD;
-    const hxa_adapter_aen_data_t& data = event.aen_data.adapter;
-    char serial[sizeof data.serial_num + 1];
-    hxal::copy_text(serial, data.serial_num);
-    return hxal::same_text(serial, registration.filter.serial_num);
+    return hxal::same_serial(registration.filter.serial_num, event.aen_data.adapter.serial_num);
 }
 
 bool is_for_ioc(const Registration& registration, const Event& event)

@@ -17,8 +17,8 @@
 // Ownership. The library owns every handle, adapter record and text it returns. They stay valid until the next scan.
 // Look-ups.  A null or out-of-range argument finds nothing; each look-up names its answer for "none". Texts are compared
 //            byte by byte: "Blue" is not "blue".
-// Texts.     A driver's text that fills its field loses its last character to the terminator (a serial number of 12 keeps
-//            11). Looked up is what the field holds: the driver's whole text finds it, and so does the cut one.
+// Texts.     A driver's text that fills its field loses its last character to the terminator, but for a serial number, which
+//            keeps all 12. Looked up is what the field holds: the driver's whole text finds it, and so does the cut one.
 //            In what a request copies out (attributes, names), a text is as the driver left it: it may fill its field without
 //            a terminator.
 // Threads.   No list is locked. Requests and look-ups may run on any number of threads, but the calls that store what

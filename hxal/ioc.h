@@ -20,7 +20,7 @@ extern "C"
         char devpath[256];       // "/dev/hxa" or "/dev/hxn"
         char ioc_hwpath[32];     // PCI path of the IOC
         char adapter_hwpath[32]; // PCI path of the card
-        char serialnum[12];      // of the card
+        char serialnum[13];      // of the card: 12 characters and the terminator
         char name[64];           // of the card, as the driver keeps it
         char port_name[64];      // as the driver keeps it
         char eth_name[64];       // network interface of an Ethernet IOC

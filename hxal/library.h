@@ -16,7 +16,7 @@ extern "C"
     void hxal_libexit(void);
 
     // The drivers' configuration file, "/etc/hxa.conf": reads it into the model (hxal/config/model.h), writes it from there,
-    // ends the use of the model. A client loads before it changes settings, best after its first scan, and syncs afterwards;
+    // ends the use of the model. A client scans, then loads, then changes settings and syncs;
     // whoever never syncs changes the drivers only. Loading answers HXA_STATUS_OK, also where there is no file. How writing went
     // is not told here: hxal_config_sync() does. Ending keeps the model: a later client of the process finds it.
     hxa_status_t hxal_libload(void);

@@ -43,7 +43,7 @@ hxal_config_t& Locked_Model::operator*() const { return the_model; }
 int ad_lookup(const hxal_config_t& model, const char* serial)
 {
     return first_index(model.adapters, [=](const hxal_ad_config_t& entry)
-                       { return has(entry.flags, HXAL_CONFIG_AD_SERIAL) && same_text(serial, entry.id); });
+                       { return has(entry.flags, HXAL_CONFIG_AD_SERIAL) && same_serial(serial, entry.id); });
 }
 
 int ioc_lookup(const hxal_config_t& model, wwn_t pwwn)

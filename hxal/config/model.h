@@ -7,7 +7,7 @@
 // An adapter entry belongs to a serial number, an IOC entry to the instance N that the file names in its keys: the FC port of
 // the keys "hxaN-..." and the Ethernet port of the keys "hxnN-..." share entry N. A value counts only while the bit of its
 // setting is in the entry's `flags`. A key without instance gives the setting to the existing entries and sets its bit in
-// `config_all`.
+// `config_all`. Entries that come later get it when a setter touches the setting, which then may be no longer that of all.
 //
 // Every function here may be called on any number of threads, except that what hxal_config_get() returns is read without lock.
 #pragma once
@@ -55,6 +55,7 @@ extern "C"
         HXAL_CONFIG_DELAY = 31,
         HXAL_CONFIG_LATENCY = 32,
         HXAL_CONFIG_PERSISTENT_BINDING = 33,
+        HXAL_CONFIG_CODES = 34, // how many
     } hxal_config_code_t;
 
     // Authentication of FC-SP (DH-CHAP).
@@ -164,11 +165,19 @@ extern "C"
         int pcie_max_read_reqsz;
     } hxal_config_tuning_t;
 
+    // What a key without instance gave. It counts only while the setting's bit is in `config_all`.
+    typedef struct
+    {
+        char text[512]; // the value as it was read
+        int reached;    // it was given to the entries before this one
+    } hxal_config_for_all_t;
+
     typedef struct
     {
         hxal_ad_config_t adapters[HXAL_CONFIG_ENTRIES];
         hxal_ioc_config_t iocs[HXAL_CONFIG_ENTRIES];
         uint32_t config_all[4]; // settings that the file gave without instance
+        hxal_config_for_all_t for_all[HXAL_CONFIG_CODES];
         hxal_config_tuning_t tuning;
         int adapter_lines; // entry that the next adapter line fills; 0 again after each write
     } hxal_config_t;
@@ -181,7 +190,7 @@ extern "C"
     int hxal_config_ioc_get_num(void);
 
     // The index of the first entry that belongs to the serial number, WWN or MAC; none: -1. A serial number is compared over
-    // the 11 characters that an adapter record keeps of it. A WWN is compared with what the entry's text converts to, a MAC
+    // its 12 characters. A WWN is compared with what the entry's text converts to, a MAC
     // with the entry's text.
     int hxal_config_ad_lookup(const char* serial);
     int hxal_config_ioc_lookup(wwn_t pwwn);

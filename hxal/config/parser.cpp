@@ -68,7 +68,7 @@ void parse_adapter(hxal_config_t& model, std::string_view line)
 
 void parse_instance(hxal_config_t& model, std::string_view prefix, std::string_view line)
 {
-    const int idx = number(filtered(line.substr(0, line.find('-'))));
+    const int idx = number(line.substr(0, line.find('-'))); // not filtered: "hxa1 -" ends in no number
     if (!is_entry(idx))
         return;
     const auto [key, value] = assignment('-', line);
@@ -85,19 +85,9 @@ void parse_for_all(hxal_config_t& model, std::string_view line)
         if (tuning.key == key)
             model.tuning.*tuning.value = number(value);
     if (key == "power")
-    {
-        set(model.config_all, HXAL_CONFIG_AD_POWER, true);
-        for (int idx = 0, count = ad_get_num(model); idx < count; ++idx)
-            store(model, HXAL_CONFIG_AD_POWER, idx, value);
-    }
-    const Setting* setting = setting_for_all(key);
-    if (!setting)
-        return;
-    // A word that is none makes the setting absent, with and without entries.
-    Ioc_Entry scratch{};
-    set(model.config_all, setting->code, setting->form.store(scratch, value));
-    for (int idx = 0, count = ioc_get_num(model); idx < count; ++idx)
-        store(model, *setting, idx, value);
+        store_for_all(model, HXAL_CONFIG_AD_POWER, value);
+    if (const Setting* setting = setting_for_all(key))
+        store_for_all(model, setting->code, value);
 }
 
 } // namespace

@@ -9,8 +9,10 @@
 //     # anything                          a comment
 //
 // What a line is decides the first that fits: it contains "adapter" and "-", "hxa" and "-", "hxn" and "-", none of them. A
-// line that is none of these, an unknown key and an instance beyond 127 are ignored. A number that does not parse, or that its
-// field cannot hold, is 0; a word that is none of the setting's makes the setting absent.
+// line that is none of these, an unknown key and an instance beyond 127 are ignored. The instance is the number that stands right
+// before the first "-": "hxa1 -" has none there, which is 0. A number that does not parse, or that its
+// field cannot hold, is 0; a word that is none of the setting's makes the setting absent: given for all instances it takes the
+// setting from the entries that it reaches, and is written back as it was read. "port-name" for all is that of the FC ports.
 #pragma once
 
 #include "hxal/config/model.h"
@@ -20,6 +22,10 @@ extern "C"
 {
 #endif
 
+    // Scan first (hxal_adapter_scan()): a key without instance reaches the entries that exist when it is read, which are those of
+    // the scanned cards and FC ports and of the lines before it. What is loaded before a scan is kept as it was read, and reaches
+    // the ports when a setter touches the setting.
+    //
     // Reads a file into the model, in lines of at most 511 characters; what is longer counts as further lines. Returns
     // HXA_STATUS_OK always: what cannot be opened, or is no regular file, leaves the model as it was. Of a file that grows
     // meanwhile only what was there at first is read, and no more than 16 MiB of any.

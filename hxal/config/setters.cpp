@@ -1,7 +1,7 @@
 #include "hxal/config/setters.h"
 
 #include "hxal/adapter.h"
-#include "hxal/config/internal/state.h"
+#include "hxal/config/internal/settings.h"
 #include "hxal/config/internal/syntax.h"
 #include "hxal/config/internal/vports.h"
 #include "hxal/internal/addresses.h"
@@ -20,6 +20,7 @@ using Ioc = Ioc_Entry;
 template <typename Value>
 void put(hxal_config_t& model, Presence& flags, int code, Value& field, std::type_identity_t<Value> value, bool present)
 {
+    spread_for_all(model, code);
     if (field != value)
         set(model.config_all, code, false);
     field = value;
@@ -30,6 +31,7 @@ template <std::size_t Size> void put_text(hxal_config_t& model, Presence& flags,
 {
     char cut[Size];
     copy(cut, value);
+    spread_for_all(model, code);
     if (std::strcmp(field, cut) != 0)
         set(model.config_all, code, false);
     copy(field, cut);

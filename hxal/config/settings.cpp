@@ -118,7 +118,7 @@ using Ioc = Ioc_Entry;
 constexpr Setting settings[] = {
     {HXAL_CONFIG_PORT_WWN,           "hxa", "port-wwn",           For_All::read,    text<&Ioc::pwwn>},
     {HXAL_CONFIG_PORT_MAC,           "hxn", "port-mac",           For_All::unknown, text<&Ioc::mac>},
-    {HXAL_CONFIG_PORT_NAME,          "hxa", "port-name",          For_All::unknown, text<&Ioc::name>},
+    {HXAL_CONFIG_PORT_NAME,          "hxa", "port-name",          For_All::read,    text<&Ioc::name>},
     {HXAL_CONFIG_ETH_NAME,           "hxn", "port-name",          For_All::unknown, text<&Ioc::ethname>},
     {HXAL_CONFIG_PORT_SPEED,         "hxa", "port-speed",         For_All::written, decimal<&Ioc::speed>},
     {HXAL_CONFIG_PORT_TOPOLOGY,      "hxa", "port-topology",      For_All::written, word<&Ioc::topology, topologies>},
@@ -209,6 +209,34 @@ bool store(hxal_config_t& model, int code, int idx, std::string_view value)
         return is_entry(idx) && store_adapter(model.adapters[idx], code, value);
     const Setting* setting = setting_of(code);
     return setting && store(model, *setting, idx, value);
+}
+
+void store_for_all(hxal_config_t& model, int code, std::string_view text)
+{
+    const int count = code == HXAL_CONFIG_AD_POWER ? ad_get_num(model) : ioc_get_num(model);
+    set(model.config_all, code, true);
+    copy(model.for_all[code].text, text);
+    model.for_all[code].reached = count;
+    for (int idx = 0; idx < count; ++idx)
+        store(model, code, idx, text);
+}
+
+void spread_for_all(hxal_config_t& model, int code)
+{
+    if (!is_for_all(model, code))
+        return;
+    hxal_config_for_all_t& given = model.for_all[code];
+    const bool is_power = code == HXAL_CONFIG_AD_POWER;
+    Ioc_Entry scratch{};
+    if (!is_power && !setting_of(code)->form.store(scratch, given.text))
+        return set(model.config_all, code, false);
+    for (int idx = given.reached; idx < HXAL_CONFIG_ENTRIES; ++idx)
+    {
+        const Presence& flags = is_power ? model.adapters[idx].flags : model.iocs[idx].flags;
+        if (has(flags, is_power ? HXAL_CONFIG_AD_SERIAL : HXAL_CONFIG_PORT_WWN) && !has(flags, code))
+            store(model, code, idx, given.text);
+    }
+    given.reached = HXAL_CONFIG_ENTRIES;
 }
 
 void write_text(std::FILE* file, const char* text, std::size_t size)

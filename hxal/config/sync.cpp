@@ -1,6 +1,7 @@
 // Replacing the file, so that at every moment either the old or the new one is there, whole.
 #include "hxal/config/writer.h"
 
+#include "hxal/internal/memory.h"
 #include "hxal/internal/size_limit.h"
 
 #include <cerrno>
@@ -9,7 +10,10 @@
 #include <cstdlib>
 #include <cstring>
 #include <fcntl.h>
+#include <filesystem>
+#include <linux/magic.h>
 #include <sys/stat.h>
+#include <sys/vfs.h>
 #include <unistd.h>
 #include <utility>
 
@@ -39,6 +43,26 @@ bool resolve(const char* path, char (&target)[PATH_MAX])
     if (!reaches_nothing(path) || length >= sizeof target)
         return false;
     std::memcpy(target, path, length + 1);
+    return true;
+}
+
+// Whether a path is, or leads by links to, one of the kernel's links to what processes have open: "/dev/stdout", for one. What
+// lies behind it is somebody's terminal or log.
+bool names_an_open_file(std::filesystem::path link)
+{
+    constexpr int most_links = 40; // as the kernel follows
+    for (int links = 0; links < most_links; ++links)
+    {
+        std::error_code error;
+        const std::filesystem::path target = std::filesystem::read_symlink(link, error);
+        if (error)
+            return false;
+        const std::filesystem::path directory = link.has_parent_path() ? link.parent_path() : ".";
+        struct statfs system = {};
+        if (::statfs(directory.c_str(), &system) == 0 && system.f_type == PROC_SUPER_MAGIC)
+            return true;
+        link = directory / target;
+    }
     return true;
 }
 
@@ -119,12 +143,10 @@ void flush_directory_of(char (&target)[PATH_MAX])
 
 bool is_full(int error) { return error == ENOSPC || error == EDQUOT; }
 
-} // namespace
-
-hxa_status_t hxal_config_sync(const char* path)
+hxa_status_t replace_file(const char* path)
 {
     char target[PATH_MAX];
-    if (!path || !*path || !resolve(path, target))
+    if (!path || !*path || names_an_open_file(path) || !resolve(path, target))
         return HXA_STATUS_EFOPEN;
     const Old_File old = look_at(target);
     if (!old.can_be_replaced)
@@ -142,4 +164,11 @@ hxa_status_t hxal_config_sync(const char* path)
         return HXA_STATUS_FAILED;
     flush_directory_of(target);
     return HXA_STATUS_OK;
+}
+
+} // namespace
+
+hxa_status_t hxal_config_sync(const char* path)
+{
+    return hxal::within_memory([=] { return replace_file(path); });
 }

@@ -1,6 +1,7 @@
 #include "hxal/config/writer.h"
 
 #include "hxal/config/internal/settings.h"
+#include "hxal/config/internal/syntax.h"
 
 #include <cstring>
 
@@ -65,21 +66,35 @@ void write_vports(std::FILE* file, const hxal_config_t& model, int idx)
     }
 }
 
-bool is_for_all(const hxal_config_t& model, const Setting& setting)
+// A value that no entry shows, as it was read; a text that is none of the setting's words as it is.
+void write_as_read(std::FILE* file, const Setting& setting, const hxal_config_for_all_t& given)
 {
-    return setting.for_all == For_All::written && has(model.config_all, setting.code);
+    Ioc_Entry scratch{};
+    if (setting.form.store(scratch, given.text))
+        return setting.form.write(file, setting.key, scratch);
+    std::fprintf(file, "%s = \"", setting.key);
+    write_text(file, given.text, sizeof given.text);
+    std::fputs("\";\n", file);
 }
 
 void write_for_all(std::FILE* file, const hxal_config_t& model, int code)
 {
     const Setting* setting = setting_of(code);
-    if (setting && is_for_all(model, *setting))
+    if (!setting || !is_for_all(model, code))
+        return;
+    const bool reached = has_reached(model, code);
+    if (reached && setting->for_all == For_All::read)
+        return;
+    if (reached && has(model.iocs[0].flags, code))
         setting->form.write(file, setting->key, model.iocs[0]);
+    else
+        write_as_read(file, *setting, model.for_all[code]);
 }
 
 void write_setting(std::FILE* file, const hxal_config_t& model, const Setting& setting)
 {
-    if (is_for_all(model, setting))
+    // Lines of instances beside a value that reached none of them are their own.
+    if (is_for_all(model, setting.code) && has_reached(model, setting.code) && setting.for_all == For_All::written)
         return;
     for (int idx = 0; idx < HXAL_CONFIG_ENTRIES; ++idx)
     {
@@ -129,11 +144,16 @@ void write_names(std::FILE* file, const hxal_config_t& model)
 
 void write_powers(std::FILE* file, const hxal_config_t& model)
 {
-    if (has(model.config_all, HXAL_CONFIG_AD_POWER))
+    const bool for_all = is_for_all(model, HXAL_CONFIG_AD_POWER), reached = has_reached(model, HXAL_CONFIG_AD_POWER);
+    if (for_all)
     {
-        std::fprintf(file, "power = %u;\n", model.adapters[0].power);
-        return;
+        const hxal_ad_config_t& first = model.adapters[0];
+        const int given = number(model.for_all[HXAL_CONFIG_AD_POWER].text);
+        const bool is_shown = reached && has(first.flags, HXAL_CONFIG_AD_POWER);
+        std::fprintf(file, "power = %u;\n", is_shown ? first.power : static_cast<unsigned>(given));
     }
+    if (for_all && reached)
+        return;
     for (const hxal_ad_config_t& entry : model.adapters)
     {
         if (!has(entry.flags, HXAL_CONFIG_AD_POWER))

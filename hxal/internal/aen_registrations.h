@@ -25,7 +25,7 @@ struct Filter
     wwn_t wwn = 0;            // of the port or the logical port
     wwn_t rpwwn = 0;          // of the remote port; 0: any
     mac_t mac = {};           // of the port
-    char serial_num[12] = {}; // of the card
+    char serial_num[13] = {}; // of the card
     bool any_added = false;   // cards that are added, whichever
 };
 

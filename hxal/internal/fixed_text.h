@@ -34,6 +34,21 @@ template <std::size_t Size> bool same_text(const char* wanted, const char (&fiel
     return wanted && std::strncmp(wanted, field, Size - 1) == 0;
 }
 
+// A serial number has 12 characters at most. Handles and adapters keep it terminated; a record, an entry of the configuration and
+// a caller's buffer have room for the characters alone.
+constexpr std::size_t serial_size = 12;
+
+inline bool same_serial(const char* wanted, const char (&field)[serial_size])
+{
+    return wanted && std::strncmp(wanted, field, serial_size) == 0;
+}
+
+inline void copy_serial_out(char* buffer, const char (&serial)[serial_size + 1])
+{
+    if (buffer)
+        std::memcpy(buffer, serial, std::min(std::strlen(serial) + 1, serial_size));
+}
+
 // Copies a terminated text into a caller's buffer, which may be missing.
 inline void copy_out(char* buffer, const char* field)
 {

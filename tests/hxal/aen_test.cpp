@@ -116,6 +116,16 @@ TEST_F(Aen, reaches_the_registrations_that_match)
     }
 }
 
+TEST_F(Aen, tells_cards_apart_by_the_last_character_of_their_serial_numbers)
+{
+    scan(R"({"adapters": [{"kind": "fc-hba", "serial": "A23456789012"}]})");
+    Listener listener(heard, "it");
+    listener.listen(hxal_adapter_open_idx(1));
+    for (const char* serial : {"A23456789012", "A23456789019", "A2345678901"})
+        hxal::dispatch_event(event(HXA_AEN_CAT_ADAPTER, HXA_ADAPTER_AEN_REMOVE, 0, of_adapter(serial)));
+    EXPECT_THAT(heard.take(), ElementsAre("it 2"));
+}
+
 TEST_F(Aen, hands_over_the_drivers_data_and_time)
 {
     struct Told

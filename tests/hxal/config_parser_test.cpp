@@ -18,6 +18,7 @@ TEST_F(Config_Parser, takes_values_in_every_form_and_drops_those_that_are_none)
         {"hxn3-port-mac=00:05:1e:20:00:00", "hxn3-port-mac = \"00:05:1e:20:00:00\";"},
         {"hxa3-port-name = \t\"uplink A\" ;", "hxa3-port-name = \"uplink A\";"},
         {"hxa3-port-speed = fast", "hxa3-port-speed = 0;"},
+        {"hxa3 -port-speed = 8", "hxa0-port-speed = 8;"},
         {"hxa3-port-topology = ring", nullptr},
         {"hxa3-port-hardalpa = 1F;", "hxa3-port-hardalpa = 0x1f;"},
         {"hxa3-port-hardalpa = 0x100;", "hxa3-port-hardalpa = 0x0;"},
@@ -56,7 +57,7 @@ TEST_F(Config_Parser, ignores_what_does_not_fit)
     // clang-format off
     parse({"", " ", "=", "-", "hxa", "hxa-", "hxa3-port-speed", "hxa3-=8", "hxa3-port-speeds = 8", "hxa128-port-speed = 8",
            "hxa200-port-name = x;", "hxa2147483648-port-speed = 8", "hxa4294967296-port-speed = 8", "hxn3-port-speed = 8",
-           "hxn3-vport-1 = a,b,c,d,1", "hxa3-port-mac = 00:05", "port-mac = 00:05", "port-name = x", "vport-1 = a,b,c,d,1",
+           "hxn3-vport-1 = a,b,c,d,1", "hxa3-port-mac = 00:05", "port-mac = 00:05", "vport-1 = a,b,c,d,1",
            "adapter-SN1", "adapter = x", "name = x", "num-ioses = 5", nullptr});
     // clang-format on
     EXPECT_THAT(settings(), IsEmpty());
@@ -77,7 +78,7 @@ TEST_F(Config_Parser, makes_an_entry_of_every_adapter_line)
     parse({"adapter-SN0123456789-name = \"Blue\";", "adapter-SN2-power = 2;", "adapter-SN0123456789-power = 3;"});
     EXPECT_EQ(hxal_config_ad_get_num(), 3);
     EXPECT_EQ(hxal_config_ad_lookup("SN0123456789"), 0);
-    EXPECT_EQ(hxal_config_ad_lookup("SN012345678"), 0) << "as an adapter record keeps it";
+    EXPECT_EQ(hxal_config_ad_lookup("SN012345678"), -1);
     EXPECT_EQ(hxal_config_ad_lookup("SN2"), 1);
     EXPECT_EQ(hxal_config_ad_lookup("SN3"), -1);
     EXPECT_EQ(hxal_config_ad_lookup(nullptr), -1);
@@ -113,9 +114,11 @@ TEST_F(Config_Parser, gives_a_key_without_instance_to_the_entries_so_far)
     EXPECT_EQ(ioc(2).speed + ioc(5).speed, 0u);
     EXPECT_EQ(adapter(0).power, 2u);
     EXPECT_EQ(adapter(1).power, 0u);
-    parse({"port-topology = ring"});
-    EXPECT_FALSE(has(hxal_config_get()->config_all, HXAL_CONFIG_PORT_TOPOLOGY));
+    parse({"port-topology = ring", "port-name = x"});
+    EXPECT_TRUE(has(hxal_config_get()->config_all, HXAL_CONFIG_PORT_TOPOLOGY));
     EXPECT_FALSE(has(ioc(0).flags, HXAL_CONFIG_PORT_TOPOLOGY));
+    EXPECT_STREQ(ioc(1).name, "x");
+    EXPECT_STREQ(ioc(1).ethname, "");
 }
 
 TEST_F(Config_Parser, reads_the_tuning_numbers)

@@ -31,6 +31,11 @@ protected:
     void start_anew() const
     {
         empty_model();
+        add_entries();
+    }
+
+    void add_entries() const
+    {
         for (int port : {0, 1})
         {
             hxal_config_ioc_add(fc[port].pwwn);
@@ -168,6 +173,40 @@ TEST_F(Config_Setters, turn_a_setting_of_all_instances_into_one_of_each)
         row.set(&fc[1]);
         EXPECT_EQ(lines(), row.lines) << &row - rows;
     }
+}
+
+TEST_F(Config_Setters, turn_a_setting_that_reached_no_instance_into_one_of_each)
+{
+    struct Row
+    {
+        const char* for_all;
+        Set set;
+        Lines lines;
+    };
+    const Row rows[] = {
+        {"port-enable = TRUE",
+         with(hxal_config_enable, HXA_FALSE),
+         {"hxa0-port-enable = \"TRUE\";", "hxa1-port-enable = \"FALSE\";"}},
+        {"port-enable = TRUE", with(hxal_config_enable, HXA_TRUE), {"port-enable = \"TRUE\";"}},
+        {"port-enable = maybe", with(hxal_config_enable, HXA_FALSE), {"hxa1-port-enable = \"FALSE\";"}},
+        {"port-speed = 4;", with(hxal_config_speed, HXA_PPORT_SPEED_8GBPS), {"hxa0-port-speed = 4;", "hxa1-port-speed = 8;"}},
+        {"port-name = x", with(hxal_config_ioc_name, "y"), {"hxa0-port-name = \"x\";", "hxa1-port-name = \"y\";"}},
+        {"auth-encrypt = 1", with(hxal_config_auth_secretstring, nullptr, 0), {"hxa0-auth-encrypt = \"1\";"}},
+    };
+    for (const Row& row : rows)
+    {
+        empty_model();
+        parse({row.for_all});
+        add_entries();
+        row.set(&fc[1]);
+        EXPECT_EQ(lines(), row.lines) << row.for_all;
+    }
+    empty_model();
+    parse({"power = 2"});
+    hxal_config_ad_add("SN0");
+    hxal_config_ad_add("SN1");
+    hxal_config_ad_ps(1, HXA_PM_DS_D0);
+    EXPECT_THAT(lines(), ElementsAre("adapter-SN0-power = 2;"));
 }
 
 TEST_F(Config_Setters, write_the_secret_in_whole_numbers)

@@ -1,6 +1,7 @@
 // Replacing the file: the new one whole, or the old one untouched.
 #include "config_fixture.h"
 
+#include <fcntl.h>
 #include <sys/resource.h>
 #include <sys/stat.h>
 #include <sys/wait.h>
@@ -94,6 +95,19 @@ TEST_F(Config_Sync, answers_45_where_no_file_can_be_opened)
         EXPECT_EQ(hxal_config_sync(what.c_str()), HXA_STATUS_EFOPEN) << what;
     EXPECT_EQ(hxal_config_sync(nullptr), HXA_STATUS_EFOPEN);
     EXPECT_THAT(names(), UnorderedElementsAre("fifo", "link", "directory"));
+}
+
+TEST_F(Config_Sync, leaves_alone_what_a_process_has_open)
+{
+    const std::string log = file("log", "mine");
+    const int descriptor = ::open(log.c_str(), O_RDWR | O_CLOEXEC);
+    std::filesystem::create_symlink("/dev/fd/" + std::to_string(descriptor), path("link"));
+    std::filesystem::create_symlink("link", path("stdout"));
+    for (const std::string& what : {path("link"), path("stdout"), "/proc/self/fd/" + std::to_string(descriptor)})
+        EXPECT_EQ(hxal_config_sync(what.c_str()), HXA_STATUS_EFOPEN) << what;
+    ::close(descriptor);
+    EXPECT_EQ(content(log), "mine");
+    EXPECT_THAT(names(), UnorderedElementsAre("log", "link", "stdout"));
 }
 
 TEST_F(Config_Sync, asks_for_the_permission_to_write)

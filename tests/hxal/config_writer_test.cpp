@@ -32,10 +32,37 @@ TEST_F(Config_Writer, writes_per_instance_what_has_no_line_for_all)
                                         "hxa1-port-hardalpa = 0x1;"));
 }
 
-TEST_F(Config_Writer, leaves_out_a_value_without_word)
+TEST_F(Config_Writer, writes_a_value_for_all_that_reached_no_entry_as_it_was_read)
 {
-    parse({"auth-algo = md5", "auth-secretsource = LOCAL", "log-level = Error", "port-topology = loop"}); // reach no entry
-    EXPECT_THAT(settings(), ElementsAre("port-topology = \"none\";", "log-level = \"None\";"));
+    const std::vector<std::string> lines = {
+        "power = 2;",
+        "port-name = \"x\";",
+        "port-topology = \"ring\";",
+        "port-hardalpa = 0x1f;",
+        "port-trunk = 0, 3;",
+        "port-enable = \"TRUE\";",
+        "hxa1-port-enable = \"FALSE\";",
+        "log-level = \"None\";",
+        "vf-enable = \"TRUE\"",
+        "auth-algo = \"sha1\";",
+        "auth-secretsource = \"LOCAL\";",
+        "auth-encrypt = \"1,2\";",
+        "pathtov = 30;",
+        "persistent-binding = \"TRUE\";",
+        "coalesce = \"off\";",
+    };
+    for (int again = 0; again < 2; ++again)
+    {
+        for (const std::string& line : lines)
+            hxal_config_parse(line.c_str());
+        EXPECT_EQ(settings(), lines);
+        hxal_config_ioc_add(1); // as a scan does
+        hxal_config_ad_add("SN1");
+        std::vector<std::string> after = settings();
+        std::erase(after, "hxa0-port-wwn = \"01:00:00:00:00:00:00:00\";");
+        EXPECT_EQ(after, lines);
+        empty_model();
+    }
 }
 
 TEST_F(Config_Writer, keeps_a_text_on_its_line)

@@ -211,6 +211,25 @@ TEST_F(Control, of_a_name_reaches_the_fc_driver_from_an_adapter_whose_first_ioc_
     EXPECT_THAT(changes(), ElementsAre("IOCMD_IOC_SET_ADAPTER_NAME /dev/hxa 0", "IOCMD_IOC_SET_ADAPTER_NAME /dev/hxn 0"));
 }
 
+TEST_F(Control, of_cards_whose_serial_numbers_fill_their_field_keeps_them_apart)
+{
+    scan(R"({"adapters": [{"kind": "fc-hba", "serial": "A23456789012"}, {"kind": "fc-hba", "serial": "A23456789019"},
+                          {"kind": "fc-hba", "serial": "A2345678901"}]})");
+    for (const int ad : {1, 2, 3})
+        hxal_adapter_set_name(static_cast<unsigned>(ad), std::to_string(ad).c_str());
+    hxal_adapter_set_power(hxal_adapter_lookup("A23456789019"), HXA_PM_DS_D2);
+    const auto lines = settings();
+    EXPECT_THAT(std::vector(lines.begin(), lines.begin() + 4),
+                ElementsAre(R"(adapter-A23456789012-name = "1";)", R"(adapter-A23456789019-name = "2";)",
+                            R"(adapter-A2345678901-name = "3";)", "adapter-A23456789019-power = 2;"));
+    EXPECT_TRUE(hxal_config_get_ad_name_exists(1, "1", "A23456789019"));
+
+    char serials[2][12];
+    hxal_adapter_get_serial_num(hxal_adapter_open_idx(1), serials[0]);
+    hxal_adapter_get_serial_num(hxal_adapter_open_idx(3), serials[1]);
+    EXPECT_EQ(std::string(serials[0], 12) + serials[1], "A23456789012A2345678901");
+}
+
 TEST_F(Control, begins_with_a_scan_that_lists_each_card_and_ioc_in_the_configuration_once)
 {
     plug_cna();

@@ -23,8 +23,8 @@ struct Form
 enum class For_All
 {
     unknown,
-    read,    // stored into the entries, and written per instance
-    written, // and written as it was
+    read,    // stored into the entries and written per instance; as it was read where it reached none
+    written, // and written for all
 };
 
 struct Setting
@@ -46,6 +46,14 @@ const Setting* setting_for_all(std::string_view key);
 // setting's words. False then, and when there is no such setting or entry.
 bool store(hxal_config_t& model, const Setting& setting, int idx, std::string_view text);
 bool store(hxal_config_t& model, int code, int idx, std::string_view text);
+
+// Gives a setting, or the power state, to all entries so far and remembers it. What is none of the setting's words is absent
+// there.
+void store_for_all(hxal_config_t& model, int code, std::string_view text);
+
+// Before a setter looks at a setting that was given for all: gives it to the entries that have come since and have none of their
+// own. What no entry can have is given up.
+void spread_for_all(hxal_config_t& model, int code);
 
 // Writes a text of at most `size` characters. A control character other than a tab would end the line or hide in it.
 void write_text(std::FILE* file, const char* text, std::size_t size);

@@ -19,6 +19,10 @@ inline void set(Presence& flags, int code, bool present)
     flags[code / 32] = present ? flags[code / 32] | bit : flags[code / 32] & ~bit;
 }
 
+// Whether a setting was given without instance, and whether that reached any entry.
+inline bool is_for_all(const hxal_config_t& model, int code) { return has(model.config_all, code); }
+inline bool has_reached(const hxal_config_t& model, int code) { return model.for_all[code].reached > 0; }
+
 inline bool is_entry(int idx) { return idx >= 0 && idx < HXAL_CONFIG_ENTRIES; }
 
 // The model, locked for as long as this lives. One thread must not hold two.
