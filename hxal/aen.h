@@ -12,7 +12,9 @@
 // callbacks that were registered for the object concerned: each matching one once for an event, the newest registration
 // first, one callback at a time. A callback may use the whole library, register and unregister included, and what it
 // registers is considered for the same event. The thread holds no lock meanwhile and blocks all signals. Events are fetched
-// only from drivers that a registration was made on, and from the IOCs of the last scan: do not scan while the thread runs.
+// only from drivers that a registration was made on, and from the IOCs of the last scan: do not scan while the thread runs. A
+// scan ends what registrations hear: they wait on the node as it was open before. After it, unregister them and register anew,
+// with the handles that the scan has made.
 //
 // A callback gets the `userData` of its registration, the event (an hxa_..._aen_event_t, or a number this library does not
 // know), the driver's data, which is valid during the call, and the driver's time stamp. When unregister returns no new call

@@ -3,12 +3,20 @@
 //
 //     hxal_libinit(hxa_aen_app_cim);
 //     int count = hxal_adapter_scan();
+//     if (count == 0)
+//         fprintf(stderr, "no adapters: %s\n", hxal_status_to_string((int)hxal_get_last_error()));
 //     for (int ad = 1; ad <= count; ++ad)
 //         puts(hxal_adapter_open_idx(ad)->model_descr);
+//     hxal_libexit();
 //
 // A client calls hxal_libinit() once, then hxal_adapter_scan(), which also scans the I/O controllers (IOCs), and at the
 // end hxal_libexit(). When the scan answers 0, hxal_get_last_error() tells why: HXA_STATUS_NO_DRIVER (no driver node could
-// be opened), HXA_STATUS_VERSION_FAIL (the driver refused this library), anything else: a general failure.
+// be opened), HXA_STATUS_VERSION_FAIL (the driver refused this library), anything else: a general failure. A scan clears no
+// earlier error; set HXA_STATUS_OK before it. When that is still there, the drivers answer and serve nothing, or one of them
+// counts an IOC that its bitmap of instances lacks: then hxal_ioc_get_num() is more than the handles of hxal_ioc_get_list(),
+// which can be used all the same.
+//
+// README.md beside this file tells how to compile and link a client, and how to try it without hardware.
 //
 // Statuses.  A request returns HXA_STATUS_OK or says what failed: the call to the driver (a status mapped from errno; the
 //            caller's buffer is untouched, but for hxal_ioc_get_info()'s) or the driver itself (its own status, unchanged;

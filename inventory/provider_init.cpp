@@ -25,6 +25,8 @@ Driver_Status status_without_adapters(hxa_status_t error)
         return DRIVER_VERSION_FAIL;
     default:
         log_library_status(error);
+        if (error == HXA_STATUS_OK && hxal_ioc_get_num() > 0) // a hole among the instances ends the scan without an error
+            ZMLR_LOG(LL_WARN, "WARNING: A driver answers, but there are no adapters: it counts more IOCs than it has");
         return DRIVER_FAILURE;
     }
 }

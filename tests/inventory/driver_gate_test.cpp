@@ -30,6 +30,9 @@ struct Probe
 const std::map<std::string, Probe> probes = {
     {"mixed", {DRIVER_GOOD, 4, "INFO ProviderInit: hxal_get_last_error returns Success  "}},
     {"no-adapter", {DRIVER_FAILURE, 0, "INFO ProviderInit: hxal_get_last_error returns Success  "}},
+    {"hole",
+     {DRIVER_FAILURE, 0,
+      "WARN ProviderInit: WARNING: A driver answers, but there are no adapters: it counts more IOCs than it has"}},
     {"no-driver", {DRIVER_MISSING, 0, "ERR ProviderInit: ERROR: No driver found"}},
     {"version-refused", {DRIVER_VERSION_FAIL, 0, "ERR ProviderInit: ERROR: HXAL version mismatch"}},
 };
