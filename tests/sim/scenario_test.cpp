@@ -2,6 +2,7 @@
 #include "tests/sim/simulated_host.h"
 
 #include <fstream>
+#include <numeric>
 
 namespace
 {
@@ -61,6 +62,15 @@ TEST_F(Scenarios, hold_texts_that_are_none_and_counters_that_differ)
     EXPECT_EQ(send(*hxa, "IOCMD_PORT_GET_STATS", 'C', record), 0);
     EXPECT_EQ(counters.fc.tx_frames, 101U);
     EXPECT_EQ(counters.fc.err_enc, 128U);
+}
+
+TEST_F(Scenarios, carry_vital_product_data_that_holds_together)
+{
+    hxasim::load_text(R"({"adapters": [{"kind": "fc-hba", "fru_number": "FRU1234567890ABC"}]})");
+    const auto vpd = ask<hxa_ioctl_ioc_attr_t>(Open_File("/dev/hxa"), "IOCMD_IOC_GET_ATTR", 'C', 0).attr.adapter_attr.vpd;
+    const std::string data(std::begin(vpd.data), std::end(vpd.data));
+    EXPECT_THAT(data.substr(175), testing::StartsWith("FRU1234567890ABC"));
+    EXPECT_EQ(std::accumulate(vpd.data, vpd.data + data.find("RV") + 4, 0) % 256, 0);
 }
 
 TEST_F(Scenarios, are_found_by_name_or_by_path)
