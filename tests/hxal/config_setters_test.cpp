@@ -152,54 +152,41 @@ TEST_F(Config_Setters, turn_a_setting_of_all_instances_into_one_of_each)
         const char* for_all;
         Set set;
         Lines lines;
+        bool comes_first = false; // before there is any entry
     };
     const uint32_t same[] = {1, 2}, other[] = {1, 3};
+    const Lines speeds = {"hxa0-port-speed = 4;", "hxa1-port-speed = 8;"};
+    // clang-format off
     const Row rows[] = {
-        {"port-speed = 4;", with(hxal_config_speed, HXA_PPORT_SPEED_4GBPS), {"port-speed = 4;"}},
-        {"port-speed = 4;", with(hxal_config_speed, HXA_PPORT_SPEED_8GBPS), {"hxa0-port-speed = 4;", "hxa1-port-speed = 8;"}},
-        {"port-speed = 4;", with(hxal_config_speed, HXA_PPORT_SPEED_AUTO), {"hxa0-port-speed = 4;"}},
-        {"qos = \"TRUE\";", with(hxal_config_qos, HXA_FALSE), {"hxa0-qos = \"TRUE\";"}},
-        {"vf-list = 1, 2;", with(hxal_config_vf_list, 2, HXA_FALSE), {"hxa0-vf-list = 1, 2;", "hxa1-vf-list = 1;"}},
-        {"auth-encrypt = \"1,2\";", with(hxal_config_auth_secretstring, same, 2), {"auth-encrypt = \"1,2\";"}},
-        {"auth-encrypt = \"1,2\";",
-         with(hxal_config_auth_secretstring, other, 2),
+        {"port-speed = 4;",         with(hxal_config_speed, HXA_PPORT_SPEED_4GBPS), {"port-speed = 4;"}},
+        {"port-speed = 4;",         with(hxal_config_speed, HXA_PPORT_SPEED_8GBPS), speeds},
+        {"port-speed = 4;",         with(hxal_config_speed, HXA_PPORT_SPEED_8GBPS), speeds, true},
+        {"port-speed = 4;",         with(hxal_config_speed, HXA_PPORT_SPEED_AUTO),  {"hxa0-port-speed = 4;"}},
+        {"qos = \"TRUE\";",         with(hxal_config_qos, HXA_FALSE),               {"hxa0-qos = \"TRUE\";"}},
+        {"vf-list = 1, 2;",         with(hxal_config_vf_list, 2, HXA_FALSE), {"hxa0-vf-list = 1, 2;", "hxa1-vf-list = 1;"}},
+        {"auth-encrypt = \"1,2\";", with(hxal_config_auth_secretstring, same, 2),   {"auth-encrypt = \"1,2\";"}},
+        {"auth-encrypt = \"1,2\";", with(hxal_config_auth_secretstring, other, 2),
          {"hxa0-auth-encrypt = \"1,2\";", "hxa1-auth-encrypt = \"1,3\";"}},
-        {"delay = 7;", with(hxal_config_iocfc_intr, HXA_FALSE, 9, 0), {"delay = 7;", "hxa1-coalesce = \"off\";"}},
+        {"auth-encrypt = 1",        with(hxal_config_auth_secretstring, nullptr, 0), {"hxa0-auth-encrypt = \"1\";"}, true},
+        {"delay = 7;",              with(hxal_config_iocfc_intr, HXA_FALSE, 9, 0),  {"delay = 7;", "hxa1-coalesce = \"off\";"}},
+        {"port-enable = TRUE",      with(hxal_config_enable, HXA_FALSE),
+         {"hxa0-port-enable = \"TRUE\";", "hxa1-port-enable = \"FALSE\";"}, true},
+        {"port-enable = TRUE",      with(hxal_config_enable, HXA_TRUE),  {"port-enable = \"TRUE\";"}, true},
+        {"port-enable = maybe",     with(hxal_config_enable, HXA_FALSE), {"hxa1-port-enable = \"FALSE\";"}, true},
+        {"port-name = x",           with(hxal_config_ioc_name, "y"),
+         {"hxa0-port-name = \"x\";", "hxa1-port-name = \"y\";"}, true},
     };
-    for (const Row& row : rows)
-    {
-        start_anew();
-        parse({row.for_all});
-        row.set(&fc[1]);
-        EXPECT_EQ(lines(), row.lines) << &row - rows;
-    }
-}
-
-TEST_F(Config_Setters, turn_a_setting_that_reached_no_instance_into_one_of_each)
-{
-    struct Row
-    {
-        const char* for_all;
-        Set set;
-        Lines lines;
-    };
-    const Row rows[] = {
-        {"port-enable = TRUE",
-         with(hxal_config_enable, HXA_FALSE),
-         {"hxa0-port-enable = \"TRUE\";", "hxa1-port-enable = \"FALSE\";"}},
-        {"port-enable = TRUE", with(hxal_config_enable, HXA_TRUE), {"port-enable = \"TRUE\";"}},
-        {"port-enable = maybe", with(hxal_config_enable, HXA_FALSE), {"hxa1-port-enable = \"FALSE\";"}},
-        {"port-speed = 4;", with(hxal_config_speed, HXA_PPORT_SPEED_8GBPS), {"hxa0-port-speed = 4;", "hxa1-port-speed = 8;"}},
-        {"port-name = x", with(hxal_config_ioc_name, "y"), {"hxa0-port-name = \"x\";", "hxa1-port-name = \"y\";"}},
-        {"auth-encrypt = 1", with(hxal_config_auth_secretstring, nullptr, 0), {"hxa0-auth-encrypt = \"1\";"}},
-    };
+    // clang-format on
     for (const Row& row : rows)
     {
         empty_model();
-        parse({row.for_all});
+        if (row.comes_first)
+            parse({row.for_all});
         add_entries();
+        if (!row.comes_first)
+            parse({row.for_all});
         row.set(&fc[1]);
-        EXPECT_EQ(lines(), row.lines) << row.for_all;
+        EXPECT_EQ(lines(), row.lines) << &row - rows;
     }
     empty_model();
     parse({"power = 2"});
