@@ -46,22 +46,6 @@ bool parse_wwn(const String& text, wwn_t& wwn)
     return ProviderUtil::getRawWWNFromStr(text.c_str(), reinterpret_cast<unsigned char*>(&wwn));
 }
 
-bool has_wwn(hxal_t* fc, const String& address)
-{
-    char text[ProviderUtil::wwn_text_size];
-    const wwn_t wwn = hxal_ioc_get_pwwn(fc);
-    ProviderUtil::WWN2str(text, &wwn);
-    return address.equali(text);
-}
-
-bool has_mac(hxal_t* ethernet, const String& address)
-{
-    char text[ProviderUtil::mac_text_size];
-    const mac_t mac = hxal_ioc_get_mac(ethernet);
-    ProviderUtil::MAC2str(text, &mac);
-    return address.equali(text);
-}
-
 bool read_attributes(hxal_t* ioc, hxa_ioc_attr_t& attributes)
 {
     attributes = {};
@@ -77,6 +61,22 @@ String version_in(const hxa_ioc_attr_t& attributes)
 }
 
 } // namespace
+
+bool ProviderUtil::has_wwn(const hxal_t* fc, const String& address)
+{
+    char text[wwn_text_size];
+    const wwn_t wwn = hxal_ioc_get_pwwn(fc);
+    WWN2str(text, &wwn);
+    return address.equali(text);
+}
+
+bool ProviderUtil::has_mac(const hxal_t* ethernet, const String& address)
+{
+    char text[mac_text_size];
+    const mac_t mac = hxal_ioc_get_mac(ethernet);
+    MAC2str(text, &mac);
+    return address.equali(text);
+}
 
 int ProviderUtil::getAdapterIdByNWWN(const String& wwn)
 {

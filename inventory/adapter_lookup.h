@@ -26,6 +26,10 @@ hxal_t* getHxalHandlerByPortAddress(const String& address, bool is_wwn);
 inline hxal_t* getHxalHandlerByPortWWN(const String& wwn) { return getHxalHandlerByPortAddress(wwn, true); }
 inline hxal_t* getHxalHandlerByPortMAC(const String& mac) { return getHxalHandlerByPortAddress(mac, false); }
 
+// True when the FC IOC has this port WWN, the Ethernet IOC this MAC address, as the scan found them.
+bool has_wwn(const hxal_t* fc, const String& address);
+bool has_mac(const hxal_t* ethernet, const String& address);
+
 // The host's network interface of the IOC with this MAC address; empty when there is none.
 String getEthDeviceNameByMAC(const String& mac);
 

@@ -1,5 +1,6 @@
 #include "inventory/address_text.h"
 
+#include "inventory/property_text.h"
 #include "runtime/log.h"
 #include "runtime/trace.h"
 
@@ -125,6 +126,12 @@ void ProviderUtil::trimString(const char* in, char* out)
     out[length] = '\0';
 
     ZMLR_LOG(LL_INFO, "Output String (buf) = %s", out);
+}
+
+void ProviderUtil::copy_trimmed(char* out, std::size_t out_size, const char* field, std::size_t size)
+{
+    copy_text(out, out_size, field, size);
+    trimString(out, out);
 }
 
 } // namespace zmlr

@@ -29,4 +29,15 @@ String getNodeMACOrWWNFromTag(const String& tag, const String& model);
 // Copies a text without leading and trailing blanks; `out` has as much room as `in` takes.
 void trimString(const char* in, char* out);
 
+// Copies the text of a field as copy_text() does, without leading and trailing blanks.
+void copy_trimmed(char* out, std::size_t out_size, const char* field, std::size_t size);
+template <std::size_t N, std::size_t M> void copy_trimmed(char (&out)[N], const char (&field)[M])
+{
+    copy_trimmed(out, N, field, M);
+}
+template <std::size_t N, std::size_t M> void copy_trimmed(char (&out)[N], const unsigned char (&field)[M])
+{
+    copy_trimmed(out, N, reinterpret_cast<const char*>(field), M);
+}
+
 } // namespace zmlr::ProviderUtil

@@ -38,6 +38,13 @@ enum FC_Port_Type : uint16
     FC_PORT_TYPE_NL = 11
 };
 
+// CIM_AlarmDevice.AlarmState
+enum Alarm_State : uint16
+{
+    ALARM_STATE_OFF = 1,
+    ALARM_STATE_ALTERNATING = 3
+};
+
 // CIM_PortController.ControllerType
 enum Controller_Type : uint16
 {

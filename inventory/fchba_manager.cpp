@@ -3,6 +3,8 @@
 #include "inventory/adapter_helper.h"
 #include "inventory/common_helper.h"
 #include "inventory/dispatch.h"
+#include "inventory/ethernet_port_helper.h"
+#include "inventory/physical_asset_helper.h"
 #include "inventory/port_helper.h"
 #include "inventory/served_above.h"
 #include "runtime/log.h"
@@ -31,22 +33,32 @@ Instance_Array port(classId_t id, const Inventory_Request& request)
     return PortHelper::getPortHelperObject().getInstancesByClass(id, request);
 }
 
+Instance_Array ethernet_port(classId_t id, const Inventory_Request& request)
+{
+    return EthernetPortHelper::getEthernetPortHelperObject().getInstancesByClass(id, request);
+}
+
+Instance_Array physical_asset(classId_t id, const Inventory_Request& request)
+{
+    return PhysicalAssetHelper::getPhysicalAssetHelperObject().getInstancesByClass(id, request);
+}
+
 // clang-format off
 constexpr Route routes[] = {
     {CLASSID_ComputerSystem,                  CLASSID_ComputerSystem,                              Driver::not_needed, common},
     {CLASSID_PortController,                  CLASSID_PortController,                              Driver::needed,     adapter},
     {CLASSID_FCPort,                          CLASSID_FCPort,                                      Driver::needed,     port},
-    {CLASSID_SCSIProtocolEndpoint,            CLASSID_FCPortStatistics,                            Driver::needed,     nullptr},
-    {CLASSID_PhysicalPackage,                 CLASSID_AdapterSoftwareIdentity,                     Driver::needed,     nullptr},
+    {CLASSID_SCSIProtocolEndpoint,            CLASSID_FCPortStatistics,                            Driver::needed,     port},
+    {CLASSID_PhysicalPackage,                 CLASSID_AdapterSoftwareIdentity,                     Driver::needed,     adapter},
     {CLASSID_RemoteServiceAccessPoint,        CLASSID_RemoteServiceAccessPoint,                    Driver::not_needed, nullptr},
     {CLASSID_HBASoftwareInstallationService,  CLASSID_HBASoftwareInstallationServiceCapabilities,  Driver::needed,     nullptr},
-    {CLASSID_EthernetPort,                    CLASSID_EthernetPort,                                Driver::needed,     nullptr},
+    {CLASSID_EthernetPort,                    CLASSID_EthernetPort,                                Driver::needed,     ethernet_port},
     {CLASSID_MemoryDiagnosticTest,            CLASSID_DiagnosticCompletionRecord,                  Driver::needed,     diagnostic_instances},
-    {CLASSID_LogicalPortGroup,                CLASSID_LogicalPortGroup,                            Driver::needed,     nullptr},
+    {CLASSID_LogicalPortGroup,                CLASSID_LogicalPortGroup,                            Driver::needed,     port},
     {CLASSID_AffectedJobElement,              CLASSID_CompletionRecordAppliesToElement,            Driver::needed,     diagnostic_instances},
-    {CLASSID_LANEndpoint,                     CLASSID_LANEndpoint,                                 Driver::needed,     nullptr},
-    {CLASSID_PhysicalConnector,               CLASSID_PhysicalConnector,                           Driver::needed,     nullptr},
-    {CLASSID_AlarmDevice,                     CLASSID_AlarmDevice,                                 Driver::needed,     nullptr},
+    {CLASSID_LANEndpoint,                     CLASSID_LANEndpoint,                                 Driver::needed,     ethernet_port},
+    {CLASSID_PhysicalConnector,               CLASSID_PhysicalConnector,                           Driver::needed,     physical_asset},
+    {CLASSID_AlarmDevice,                     CLASSID_AlarmDevice,                                 Driver::needed,     port},
 };
 // clang-format on
 

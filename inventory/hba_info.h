@@ -21,7 +21,9 @@ struct _hbaInfo
     char fc_driver_version[64] = {};
     char eth_driver_name[16] = {};
     char eth_driver_version[64] = {};
+    char fru_number[17] = {};
     char firmware_version[64] = {};
+    char boot_code_version[64] = {}; // only when it was asked for
     bool is_cna = false;
 
     // The key by which the adapter's instances are matched: a CNA's MAC address, an FC HBA's node WWN.
@@ -34,5 +36,9 @@ struct _hbaInfo
 void fill_ethernet_driver(_hbaInfo& info, const hxa_ioc_attr_t& attributes);
 void fill_fc_driver(_hbaInfo& info, const hxa_ioc_attr_t& attributes);
 void fill_card(_hbaInfo& info, const hxa_ioc_attr_t& attributes);
+
+// Fill what only the FC side tells.
+void fill_fru_number(_hbaInfo& info, const hxa_ioc_attr_t& fc_attributes);
+void fill_boot_code(_hbaInfo& info, const hxa_ioc_attr_t& fc_attributes);
 
 } // namespace zmlr

@@ -23,6 +23,7 @@ void take_ethernet(Hba_Reading& reading)
     {
         fill_ethernet_driver(reading.info, reading.ethernet.value);
         fill_card(reading.info, reading.ethernet.value);
+        fill_fru_number(reading.info, reading.fc.value);
         return;
     }
     ZMLR_LOG(LL_ERR, "hxal_ioc_get_attr call to fill eth attributes failed for Adapter id %d", reading.port.adapter);
@@ -44,7 +45,10 @@ void take_fc(Hba_Reading& reading)
     {
         fill_fc_driver(reading.info, reading.fc.value);
         if (!reading.ethernet.are_read)
+        {
             fill_card(reading.info, reading.fc.value);
+            fill_fru_number(reading.info, reading.fc.value);
+        }
         return;
     }
     ZMLR_LOG(LL_ERR, "hxal_ioc_get_attr call to fill fc attributes failed for Adapter id %d", reading.port.adapter);

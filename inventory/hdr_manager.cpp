@@ -1,6 +1,7 @@
 #include "inventory/hdr_manager.h"
 
 #include "inventory/dispatch.h"
+#include "inventory/port_helper.h"
 #include "runtime/log.h"
 
 namespace zmlr
@@ -11,9 +12,14 @@ namespace
 
 constexpr const char* log_source = "HDRManager";
 
+Instance_Array port(classId_t id, const Inventory_Request& request)
+{
+    return PortHelper::getPortHelperObject().getInstancesByClass(id, request);
+}
+
 constexpr Route routes[] = {
-    {CLASSID_StorageExtent, CLASSID_StorageExtent, Driver::needed, nullptr},
-    {CLASSID_TapeDrive, CLASSID_TapeDrive, Driver::needed, nullptr},
+    {CLASSID_StorageExtent, CLASSID_StorageExtent, Driver::needed, port},
+    {CLASSID_TapeDrive, CLASSID_TapeDrive, Driver::needed, port},
 };
 
 } // namespace

@@ -2,6 +2,7 @@
 #pragma once
 
 #include "inventory/host_text.h"
+#include "inventory/wanted.h"
 
 namespace zmlr
 {
@@ -9,6 +10,7 @@ namespace zmlr
 struct Inventory_Request
 {
     Host_Text host;
+    Wanted wanted;
 };
 
 } // namespace zmlr

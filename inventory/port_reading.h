@@ -14,6 +14,7 @@ struct Port_Reading
 {
     const Open_Adapter& adapter;
     const Open_Port& port; // with its FC IOC
+    const Inventory_Request& request;
     hxa_pport_attr_t attributes = {};
     _hbaPortInfo info = {};
 };

@@ -21,10 +21,10 @@ public:
     explicit Enumerating_Provider(const char* name) : _name(name) {}
 
     // Always a success.
-    Enum_Instances_Status enum_instances(const Class*, Enum_Instances_Handler<Class>& handler) override
+    Enum_Instances_Status enum_instances(const Class* model, Enum_Instances_Handler<Class>& handler) override
     {
         const Scope_Trace trace(_name, "enum_instances");
-        Instance_Array instances = instances_of(_row, _name);
+        Instance_Array instances = instances_of(_row, model, _name);
         deliver(instances, handler);
         return ENUM_INSTANCES_OK;
     }

@@ -3,6 +3,8 @@
 #include "inventory/fchba_manager.h"
 #include "inventory/hdr_manager.h"
 
+#include <algorithm>
+
 namespace zmlr
 {
 
@@ -16,9 +18,34 @@ Instance_Array hdr_manager(classId_t id, const Inventory_Request& request)
     return HDRManager::getHDRManager().getInstances(id, request);
 }
 
-Instance_Array instances_of(const Enumeration& row, const char* log_source)
+namespace
 {
-    Instance_Array instances = row.get_instances(row.id, Inventory_Request());
+
+bool has(const Instance_Array& instances, const Instance* model)
+{
+    return std::ranges::any_of(instances, [model](const Instance* instance) { return key_eq(instance, model); });
+}
+
+Instance_Array read(const Enumeration& row, const Instance* model)
+{
+    Inventory_Request request;
+    if (model)
+        request.wanted = Wanted(model);
+    if (!request.wanted.is_all())
+    {
+        Instance_Array instances = row.get_instances(row.id, request);
+        if (has(instances, model))
+            return instances;
+        request.wanted = Wanted();
+    }
+    return row.get_instances(row.id, request);
+}
+
+} // namespace
+
+Instance_Array instances_of(const Enumeration& row, const Instance* model, const char* log_source)
+{
+    Instance_Array instances = read(row, model);
     if (!instances.empty())
     {
         ZMLR_LOG(LL_DBG, "Returning instances");

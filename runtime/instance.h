@@ -139,11 +139,20 @@ public:
             unref(instance);
     }
 
-    // Appends an instance and takes over its reference.
-    void adopt(Ref<Instance> instance)
+    // Appends an instance, or all of another array, and takes over the references.
+    template <class T> void adopt(Ref<T> instance)
     {
         append(instance.ptr());
         instance.steal();
+    }
+    void adopt(Instance_Array&& more)
+    {
+        reserve(size() + more.size());
+        for (Instance*& place : more)
+        {
+            append(place);
+            place = nullptr;
+        }
     }
 };
 

@@ -20,6 +20,7 @@ STATUSES = {
     11: "In Service",
     13: "Lost Communication",
 }
+ALARM_STATES = {1: "off", 3: "blinking"}
 
 
 class Clients:
@@ -68,51 +69,145 @@ def show(title, columns, rows):
         print("  " + "  ".join(cell.ljust(width) for cell, width in zip(row, widths)).rstrip())
 
 
+def status(codes):
+    return STATUSES[codes[0]]
+
+
+def enabled(code):
+    return ENABLED_STATES[code]
+
+
 def speed(bits_per_second):
     return f"{bits_per_second // 1_000_000_000} Gbit/s" if bits_per_second else "-"
 
 
-def kind(controller_type, other):
-    return other if controller_type == 1 else "FC"
+def kind(other_type):
+    return other_type or "FC"
 
 
-def demonstrate(server):
-    clients = Clients(server)
-    print(f"The embedded CIM server runs on {server.url}, its host has the simulated adapters of scenario 'mixed'.")
-    print("Every table below was fetched twice, by wbemcli and by pywbem, and is the same for both.")
+def target(other_identifying_info):
+    """The target's WWN, of a unit's "<port WWN>_<target WWN>_..."."""
+    return other_identifying_info[0].split("_")[1]
 
-    hosts = clients.instances("ZEMLAR_ComputerSystem", ["Name", "ElementName", "StatusDescriptions"])
-    show("The host", ["Name", "What", "Status"], [[name, what, status[0]] for name, what, status in hosts])
 
-    adapters = clients.instances(
-        "ZEMLAR_PortController",
-        ["DeviceID", "Name", "ControllerType", "OtherControllerType", "EnabledState", "StatusDescriptions"],
-    )
-    show(
+UNIT = [
+    ("Target WWN", "OtherIdentifyingInfo", target),
+    ("Unit", "ElementName", str),
+    ("Name", "Name", str),
+    ("Status", "OperationalStatus", status),
+]
+
+# What is shown: a title, a class, and for each column its heading, its property and how a value is told.
+TABLES = [
+    ("The host", "ZEMLAR_ComputerSystem", [("Name", "Name", str), ("What", "ElementName", str), ("Status", "OperationalStatus", status)]),
+    (
         "Its adapters",
-        ["Address", "Serial number", "Kind", "State", "Status"],
+        "ZEMLAR_PortController",
         [
-            [address, serial, kind(type_, other), ENABLED_STATES[state], status[0]]
-            for address, serial, type_, other, state, status in adapters
+            ("Address", "DeviceID", str),
+            ("Serial number", "Name", str),
+            ("Kind", "OtherControllerType", kind),
+            ("State", "EnabledState", enabled),
+            ("Status", "OperationalStatus", status),
         ],
-    )
-
-    ports = clients.instances("ZEMLAR_FCPort", ["DeviceID", "PortNumber", "OperationalStatus", "EnabledState", "Speed", "Caption"])
-    show(
+    ),
+    (
+        "Their cards",
+        "ZEMLAR_PhysicalPackage",
+        [("Tag", "Tag", str), ("Model", "Model", str), ("Serial number", "SerialNumber", str), ("FRU", "FRUNumber", str)],
+    ),
+    (
+        "Their products",
+        "ZEMLAR_Product",
+        [("Serial number", "IdentifyingNumber", str), ("What", "ElementName", str), ("Vendor", "Vendor", str), ("Version", "Version", str)],
+    ),
+    (
+        "Their software",
+        "ZEMLAR_AdapterSoftwareIdentity",
+        [("Identity", "InstanceID", str), ("What", "ElementName", str), ("Version", "VersionString", str)],
+    ),
+    (
         "Their FC ports",
-        ["Port WWN", "Port", "Status", "State", "Speed", "Symbolic name"],
+        "ZEMLAR_FCPort",
         [
-            [wwn, number, STATUSES[status[0]], ENABLED_STATES[state], speed(bits), caption]
-            for wwn, number, status, state, bits, caption in ports
+            ("Port WWN", "DeviceID", str),
+            ("Port", "PortNumber", str),
+            ("Status", "OperationalStatus", status),
+            ("State", "EnabledState", enabled),
+            ("Speed", "Speed", speed),
+            ("Symbolic name", "Caption", str),
         ],
+    ),
+    (
+        "What the FC ports count",
+        "ZEMLAR_FCPortStatistics",
+        [
+            ("Port WWN", "InstanceID", str),
+            ("Bytes sent", "BytesTransmitted", str),
+            ("Bytes received", "BytesReceived", str),
+            ("Error frames", "ErrorFrames", str),
+            ("CRC errors", "CRCErrors", str),
+            ("Link failures", "LinkFailures", str),
+        ],
+    ),
+    ("Their beacons", "ZEMLAR_AlarmDevice", [("Port WWN", "DeviceID", str), ("Beacon", "AlarmState", ALARM_STATES.get)]),
+    (
+        "The Ethernet ports",
+        "ZEMLAR_EthernetPort",
+        [("MAC", "DeviceID", str), ("Interface", "ElementName", str), ("Port", "PortNumber", str), ("Status", "OperationalStatus", status)],
+    ),
+    (
+        "The modules in the ports",
+        "ZEMLAR_PhysicalConnector",
+        [
+            ("Tag", "Tag", str),
+            ("Kind", "Model", str),
+            ("Manufacturer", "Manufacturer", str),
+            ("Part number", "PartNumber", str),
+            ("Made for", "Description", str),
+        ],
+    ),
+    ("Disks behind the ports", "ZEMLAR_StorageExtent", UNIT),
+    ("Tapes behind the ports", "ZEMLAR_TapeDrive", UNIT),
+]
+
+
+def show_class(clients, title, class_name, columns):
+    rows = clients.instances(class_name, [property_name for _, property_name, _ in columns])
+    show(
+        title,
+        [heading for heading, _, _ in columns],
+        [[tell(value) for value, (_, _, tell) in zip(row, columns)] for row in rows],
     )
 
+
+def show_one_port(clients):
     path = clients.pywbem.EnumerateInstanceNames("ZEMLAR_FCPort")[0]
     show(
         f"One port by its path, three properties\n  {path.to_wbem_uri(format='historical')}",
         ["Property", "Value"],
         clients.instance(path, ["ElementName", "MaxSpeed", "SupportedMaximumTransmissionUnit"]),
     )
+
+
+def switch_a_beacon(clients):
+    path = clients.pywbem.EnumerateInstanceNames("ZEMLAR_AlarmDevice")[0]
+    for state in (3, 1):
+        code, _ = clients.pywbem.InvokeMethod("SetAlarmState", path, State=pywbem.Uint16(state))
+        seen = clients.pywbem.GetInstance(path)["AlarmState"]
+        if (code, seen) != (0, state):
+            raise SystemExit(f"demo: SetAlarmState {state} gave {code}, and the beacon shows {seen}")
+        print(f"\nThe beacon of {path['DeviceID']} is {ALARM_STATES[seen]}.")
+
+
+def demonstrate(server):
+    clients = Clients(server)
+    print(f"The embedded CIM server runs on {server.url}, its host has the simulated adapters of scenario 'mixed'.")
+    print("Every table below was fetched twice, by wbemcli and by pywbem, and is the same for both.")
+    for title, class_name, columns in TABLES:
+        show_class(clients, title, class_name, columns)
+    show_one_port(clients)
+    switch_a_beacon(clients)
 
 
 def main():

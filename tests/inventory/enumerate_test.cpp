@@ -44,7 +44,7 @@ Instances taken_from(Get_Instances manager)
         return static_cast<Instances*>(data)->size() < 2;
     };
     Enum_Instances_Handler<ZEMLAR_FCPort> handler(take, &taken);
-    Instance_Array instances = instances_of(row, "Test_Provider");
+    Instance_Array instances = instances_of(row, nullptr, "Test_Provider");
     deliver(instances, handler);
     return taken;
 }

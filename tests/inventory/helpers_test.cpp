@@ -1,11 +1,13 @@
 // What the helpers make of whole hosts: every instance, the requests it costs, and what is left of it when something fails.
 #include "inventory/adapter_lookup.h"
 #include "inventory/fchba_manager.h"
+#include "inventory/hdr_manager.h"
 #include "inventory/port_helper.h"
 #include "tests/inventory/inventory_fixture.h"
 
 #include <cerrno>
 #include <cstdlib>
+#include <cstring>
 #include <fstream>
 #include <sstream>
 
@@ -21,7 +23,19 @@ namespace
 class Helpers : public Inventory_Test
 {
 protected:
-    static Instance_Array all(classId_t id) { return FCHBAManager::getFCHBAManager().getInstances(id); }
+    static Instance_Array all(classId_t id)
+    {
+        const bool is_storage = id == CLASSID_StorageExtent || id == CLASSID_TapeDrive;
+        return is_storage ? HDRManager::getHDRManager().getInstances(id) : FCHBAManager::getFCHBAManager().getInstances(id);
+    }
+
+    std::vector<std::string> commands()
+    {
+        std::vector<std::string> names;
+        for (const hxasim::Request& request : hxasim::take_requests())
+            names.push_back(request.name);
+        return names;
+    }
 };
 
 } // namespace
@@ -38,28 +52,54 @@ TEST_F(Helpers, make_the_instances_of_the_golden_text)
     EXPECT_EQ(text, golden.str());
 }
 
+// What one CNA costs, with a disk behind its first port; sixteen cost sixteen times as much.
 TEST_F(Helpers, cost_the_prescribed_requests_and_one_look_up_of_the_host)
 {
-    plug_text(R"({"adapters": [{"kind": "cna"}, {"kind": "fc-hba"}]})");
+    const std::string card = R"({"kind": "cna", "ports": [
+        {"remote_ports": [{"pwwn": "2100000F00000001", "luns": {"count": 1}}, {"pwwn": "2100000F00000002", "function": "initiator"}]}, {}]})";
+    const std::vector<std::string> attributes = {"IOC_GET_ATTR", "IOC_GET_ATTR", "IOC_GET_INFO"};
     const struct
     {
         classId_t id;
-        std::vector<std::string> requests;
-    } cases[] = {
-        {CLASSID_ComputerSystem, {}},
-        {CLASSID_PortController,
-         {"IOCMD_IOC_GET_ATTR /dev/hxn 0", "IOCMD_IOC_GET_ATTR /dev/hxa 0", "IOCMD_IOC_GET_INFO /dev/hxa 0",
-          "IOCMD_IOC_GET_ATTR /dev/hxa 0", "IOCMD_IOC_GET_ATTR /dev/hxa 2", "IOCMD_IOC_GET_ATTR /dev/hxa 2"}},
-        {CLASSID_FCPort,
-         {"IOCMD_PORT_GET_ATTR /dev/hxa 0", "IOCMD_PORT_GET_ATTR /dev/hxa 1", "IOCMD_PORT_GET_ATTR /dev/hxa 2",
-          "IOCMD_PORT_GET_ATTR /dev/hxa 3"}},
+        std::vector<std::string> commands;
+    } rows[] = {
+        // clang-format off
+        {CLASSID_PortController,          {"IOC_GET_ATTR", "IOC_GET_ATTR", "IOC_GET_INFO", "IOC_GET_ATTR"}},
+        {CLASSID_PhysicalPackage,         attributes},
+        {CLASSID_Product,                 attributes},
+        {CLASSID_AdapterSoftwareIdentity, {"IOC_GET_ATTR", "IOC_GET_ATTR", "IOC_GET_INFO", "FLASH_GET_ATTR"}},
+        {CLASSID_FCPort,                  {"PORT_GET_ATTR", "PORT_GET_ATTR"}},
+        {CLASSID_FCPortStatistics,        {"PORT_GET_ATTR", "PORT_GET_STATS", "PORT_GET_ATTR", "PORT_GET_STATS"}},
+        {CLASSID_LogicalPortGroup,        {"PORT_GET_ATTR", "PORT_GET_ATTR"}},
+        {CLASSID_AlarmDevice,             {"PORT_GET_ATTR", "IOC_GET_ATTR", "PORT_GET_ATTR", "IOC_GET_ATTR"}},
+        {CLASSID_SCSIProtocolEndpoint,    {"PORT_GET_ATTR", "LPORT_GET_RPORTS", "RPORT_GET_ATTR", "RPORT_GET_ATTR",
+                                           "PORT_GET_ATTR", "LPORT_GET_RPORTS"}},
+        {CLASSID_EthernetPort,            {"ETHPORT_GET_ATTR", "DIAG_SFP", "ETHPORT_GET_ATTR", "DIAG_SFP"}},
+        {CLASSID_LANEndpoint,             {"ETHPORT_GET_ATTR", "ETHPORT_GET_ATTR"}},
+        {CLASSID_PhysicalConnector,       {"DIAG_SFP", "DIAG_SFP"}},
+        {CLASSID_StorageExtent,           {"PORT_GET_ATTR", "LPORT_GET_RPORTS", "RPORT_GET_ATTR", "SCSI_CMND", "SCSI_CMND",
+                                           "SCSI_CMND", "SCSI_CMND", "RPORT_GET_ATTR", "PORT_GET_ATTR", "LPORT_GET_RPORTS"}},
+        {CLASSID_TapeDrive,               {"PORT_GET_ATTR", "LPORT_GET_RPORTS", "RPORT_GET_ATTR", "SCSI_CMND", "RPORT_GET_ATTR",
+                                           "PORT_GET_ATTR", "LPORT_GET_RPORTS"}},
+        // clang-format on
     };
-    for (const auto& c : cases)
+    for (const int cards : {1, 16})
     {
-        fake_host.lookups = 0;
-        EXPECT_FALSE(all(c.id).empty());
-        EXPECT_THAT(requests(), ElementsAreArray(c.requests)) << c.id;
-        EXPECT_EQ(fake_host.lookups, 1) << c.id;
+        std::string adapters = card;
+        for (int i = 1; i < cards; i++)
+            adapters += ", " + card;
+        plug_text(R"({"adapters": [)" + adapters + "]}");
+        for (const auto& row : rows)
+        {
+            std::vector<std::string> expected;
+            for (int i = 0; i < cards; i++)
+                for (const std::string& command : row.commands)
+                    expected.push_back("IOCMD_" + command);
+            fake_host.lookups = 0;
+            all(row.id);
+            EXPECT_EQ(commands(), expected) << row.id;
+            EXPECT_LE(fake_host.lookups, 1) << row.id;
+        }
     }
 }
 
@@ -145,4 +185,19 @@ TEST_F(Helpers, skip_what_fails_and_say_so)
         EXPECT_EQ(values_of(all(row.id), row.property), row.left);
         EXPECT_THAT(log(), IsSupersetOf(row.log));
     }
+}
+
+// However many units a target tells of, it is asked twice at most, and not for more than there can be.
+TEST_F(Helpers, believe_no_number_of_units)
+{
+    plug_text(R"({"adapters": [{"kind": "fc-hba", "ports": [{"remote_ports": [
+        {"pwwn": "2100000F00000001", "report_luns": "FFFFFFF8"}]}]}]})");
+    hxasim::inject({.cdb = {0xA0}, .error = EIO, .skip = 1}); // the second answer ends it
+    EXPECT_TRUE(all(CLASSID_StorageExtent).empty());
+    const std::vector<hxasim::Request> sent = hxasim::take_requests();
+    hxa_ioctl_scsi_t last;
+    std::memcpy(&last, sent.back().sent.data(), sizeof last);
+    EXPECT_EQ(last.iosz, 65536U * 8 + 8);
+    EXPECT_THAT(log(), IsSupersetOf({"ERR TargetHelper: hxal_scsi_reportluns returned error -  42",
+                                     "INFO TargetHelper: Continue with next rport. Reportlun had issue. "}));
 }

@@ -1,0 +1,122 @@
+#include "inventory/storage_instances.h"
+
+#include "inventory/address_text.h"
+#include "inventory/cim_values.h"
+#include "inventory/class_id.h"
+#include "inventory/property_text.h"
+#include "inventory/provider_util.h"
+#include "runtime/log.h"
+#include "runtime/trace.h"
+
+#include <algorithm>
+#include <cstdio>
+
+namespace zmlr
+{
+
+namespace
+{
+
+constexpr const char* log_source = "TargetHelper";
+
+// How a name is told by its source: CIM_StorageExtent.NameFormat and NameNamespace.
+struct Name_Kind
+{
+    std::uint32_t identifier_type;
+    uint16 format;
+    uint16 name_space;
+};
+
+// clang-format off
+constexpr Name_Kind name_kinds[] = {
+    {IDENTIFIER_SERIAL_NUMBER,  7, 7}, // SNVM, SNVM
+    {IDENTIFIER_T10_VENDOR_ID, 11, 4}, // T10VID, VPD83Type1
+    {IDENTIFIER_EUI_64,        10, 3}, // EUI64, VPD83Type2
+    {IDENTIFIER_NAA,            9, 2}, // NAA, VPD83Type3
+    {IDENTIFIER_SCSI_NAME,      1, 1}, // Other, Other
+    {IDENTIFIER_UNAVAILABLE,    0, 0}, // Unknown, Unknown
+};
+// clang-format on
+
+const Name_Kind* kind_of(const _hbaLunInfo& lun)
+{
+    const auto* found = std::ranges::find(name_kinds, lun.identifier_type, &Name_Kind::identifier_type);
+    return found == std::end(name_kinds) ? nullptr : found;
+}
+
+template <std::size_t N> String trimmed(const char (&field)[N])
+{
+    char text[N];
+    ProviderUtil::trimString(field, text);
+    return property_text(text);
+}
+
+String name_of(const _hbaLunInfo& lun)
+{
+    if (lun.identifier_type == IDENTIFIER_SERIAL_NUMBER)
+        return trimmed(lun.vendor) + "+" + trimmed(lun.product) + "+" + trimmed(lun.serial_number);
+    if (lun.identifier_type == IDENTIFIER_UNAVAILABLE)
+        return "Unable To Fetch";
+    return kind_of(lun) ? property_text(lun.identifier) : String();
+}
+
+String device_id(const _hbaPortInfo& port, const _hbaLunInfo& lun)
+{
+    return String(port.port_wwn) + "_" + lun.target_wwn + "_" + trimmed(lun.vendor) + "_" + trimmed(lun.product) + "_" +
+           lun_text(lun);
+}
+
+// What disks and tapes have in common.
+template <class T> Ref<T> unit_instance(classId_t id, const _hbaPortInfo& port, const _hbaLunInfo& lun, const char* description)
+{
+    const String device = device_id(port, lun);
+    Ref<T> unit(T::create());
+    unit->SystemCreationClassName.set(ProviderUtil::getClassName(CLASSID_ComputerSystem));
+    unit->SystemName.set(property_text(port.host));
+    unit->CreationClassName.set(ProviderUtil::getClassName(id));
+    unit->DeviceID.set(device);
+    unit->ElementName.set(lun_text(lun));
+    unit->Name.set(name_of(lun));
+    unit->OtherIdentifyingInfo.set({device});
+    unit->IdentifyingDescriptions.set({String(description)});
+    unit->OperationalStatus.set({OPERATIONAL_STATUS_OK});
+    return unit;
+}
+
+} // namespace
+
+String lun_text(const _hbaLunInfo& lun)
+{
+    char text[24];
+    std::snprintf(text, sizeof text, "LUN_%d", lun.lun_number());
+    return text;
+}
+
+Ref<ZEMLAR_StorageExtent> getStorageExtentInstance(const _hbaPortInfo& port, const _hbaLunInfo& lun)
+{
+    const Scope_Trace trace(log_source);
+    Ref<ZEMLAR_StorageExtent> extent = unit_instance<ZEMLAR_StorageExtent>(CLASSID_StorageExtent, port, lun,
+                                                                           "It is a unique identification for a Storage Extent");
+    if (const Name_Kind* kind = kind_of(lun))
+    {
+        extent->NameFormat.set(kind->format);
+        extent->NameNamespace.set(kind->name_space);
+    }
+    else
+        ZMLR_LOG(LL_WARN, "Default idType. Should not have reached here. ");
+    ZMLR_LOG(LL_DBG, "returned Instance of StorageExtent. port WWN= %s", port.port_wwn);
+    return extent;
+}
+
+Ref<ZEMLAR_TapeDrive> getTapeDriveInstance(const _hbaPortInfo& port, const _hbaLunInfo& lun)
+{
+    const Scope_Trace trace(log_source);
+    Ref<ZEMLAR_TapeDrive> tape =
+        unit_instance<ZEMLAR_TapeDrive>(CLASSID_TapeDrive, port, lun, "It is a unique identification for a Tape Drive");
+    if (!kind_of(lun))
+        ZMLR_LOG(LL_WARN, "Default case for lunInfo.idType. Should not have reached here. ");
+    ZMLR_LOG(LL_DBG, "returned Instance of TapeDrive. port WWN= %s", port.port_wwn);
+    return tape;
+}
+
+} // namespace zmlr

@@ -1,0 +1,266 @@
+#include "inventory/target_helper.h"
+
+#include "inventory/address_text.h"
+#include "inventory/remote_ports.h"
+#include "inventory/scsi_pages.h"
+#include "inventory/storage_instances.h"
+#include "runtime/log.h"
+#include "runtime/trace.h"
+
+#include <algorithm>
+#include <array>
+#include <cstring>
+#include <memory>
+#include <new>
+#include <optional>
+#include <span>
+
+namespace zmlr
+{
+
+namespace
+{
+
+constexpr const char* log_source = "TargetHelper";
+
+constexpr std::size_t first_list_size = 816; // REPORT LUNS: room for 101 units
+constexpr std::size_t max_units = 65536;     // more than a target can have
+constexpr std::uint32_t sense_size = 18;
+constexpr std::uint8_t identification_page = 0x83;
+constexpr std::uint8_t serial_page = 0x80;
+
+// The way to one remote port.
+struct Nexus
+{
+    const hxal_t* ioc;
+    wwn_t port;
+    wwn_t remote_port;
+};
+
+String text_of(wwn_t wwn)
+{
+    char text[ProviderUtil::wwn_text_size];
+    ProviderUtil::WWN2str(text, &wwn);
+    return text;
+}
+
+lun_t lun_of(const _hbaLunInfo& info)
+{
+    lun_t lun;
+    std::memcpy(&lun, info.lun.data(), sizeof lun);
+    return lun;
+}
+
+// One INQUIRY: empty, with a log line made of `failure` and the status, unless the unit answered with GOOD. Without a page it
+// asks for the standard data.
+template <class Data>
+std::optional<Data> inquire(const Nexus& nexus, lun_t lun, std::optional<std::uint8_t> page, const char* failure)
+{
+    Data data{};
+    auto size = static_cast<std::uint32_t>(data.size());
+    std::array<std::uint8_t, sense_size> sense{};
+    std::uint32_t sense_room = sense_size;
+    std::uint8_t scsi_status = 0;
+    const hxa_status_t status = TargetHelper::getTargetHelperObject().sendSCSIInquiry(
+        nexus.ioc, nexus.port, nexus.remote_port, base_fabric, lun, page.has_value(), page.value_or(0), data.data(), &size,
+        &scsi_status, sense.data(), &sense_room);
+    if (status == HXA_STATUS_OK && scsi_status == 0)
+        return data;
+    ZMLR_LOG(LL_ERR, failure, static_cast<int>(status));
+    return std::nullopt;
+}
+
+// The answer to one REPORT LUNS with room for `size` bytes; null, with log lines, when there is none.
+std::unique_ptr<std::uint8_t[]> report_luns(const Nexus& nexus, std::size_t size)
+{
+    std::unique_ptr<std::uint8_t[]> list(new (std::nothrow) std::uint8_t[size]());
+    if (!list)
+    {
+        ZMLR_LOG(LL_ERR, "Memory allocation failed for %u bytes.", static_cast<unsigned>(size));
+        return nullptr;
+    }
+
+    scsi_cdb_t cdb{};
+    std::array<std::uint8_t, sense_size> sense{};
+    std::uint32_t sense_room = sense_size;
+    std::uint8_t scsi_status = 0;
+    const hxa_status_t status =
+        hxal_scsi_reportluns(nexus.ioc, base_fabric, nexus.port, nexus.remote_port, lun_t{0}, &cdb, 0, list.get(),
+                             static_cast<std::uint32_t>(size), &scsi_status, sense.data(), &sense_room);
+    if (status == HXA_STATUS_OK && scsi_status == 0)
+        return list;
+    if (status != HXA_STATUS_OK)
+        ZMLR_LOG(LL_ERR, "hxal_scsi_reportluns returned error -  %d", static_cast<int>(status));
+    else
+        ZMLR_LOG(LL_ERR, "scsistatus is %x.", scsi_status);
+    return nullptr;
+}
+
+struct Lun_List
+{
+    std::unique_ptr<std::uint8_t[]> bytes; // null when the target does not tell
+    std::size_t count = 0;                 // entries that are there
+
+    std::span<const std::uint8_t, lun_entry_size> entry(std::size_t i) const
+    {
+        return std::span<const std::uint8_t, lun_entry_size>(bytes.get() + lun_list_head + i * lun_entry_size, lun_entry_size);
+    }
+};
+
+// The units of a target. A target that tells of more than its answer had room for is asked once more; what then does not fit is
+// not there.
+Lun_List list_luns(const Nexus& nexus, int index)
+{
+    std::size_t size = first_list_size;
+    for (bool again = true;; again = false)
+    {
+        ZMLR_LOG(LL_INFO, "lunInvSize = %u. rPortWwns[%d]=%llx", static_cast<unsigned>(size), index,
+                 static_cast<unsigned long long>(nexus.remote_port));
+        Lun_List list{report_luns(nexus, size)};
+        if (!list.bytes)
+        {
+            ZMLR_LOG(LL_INFO, "Continue with next rport. Reportlun had issue. ");
+            return list;
+        }
+        const std::size_t count = lun_count({list.bytes.get(), size});
+        if (!again || count <= lun_room(size))
+        {
+            list.count = std::min(count, lun_room(size));
+            ZMLR_LOG(LL_INFO, "Number of Luns = %d.", static_cast<int>(list.count));
+            return list;
+        }
+        ZMLR_LOG(LL_INFO, "More luns reported than initially expected. need to reportLun with more space allocated.");
+        size = std::min(count, max_units) * lun_entry_size + lun_list_head;
+    }
+}
+
+void identify_by_serial_number(const Nexus& nexus, _hbaLunInfo& info)
+{
+    ZMLR_LOG(LL_INFO, "scsiInquiry for Unit serial number.");
+    const auto page = inquire<Serial_Page>(nexus, lun_of(info), serial_page,
+                                           "sendSCSIInquiry for EVPD(Unit serial number page) returned error -  %d");
+    if (page)
+        fill_serial_number(info, *page);
+    else
+        info.identifier_type = IDENTIFIER_UNAVAILABLE;
+}
+
+// Asks one unit what it is; false when it does not say.
+bool read_unit(const Nexus& nexus, _hbaLunInfo& info)
+{
+    ZMLR_LOG(LL_INFO, "scsiInquiry for VendorId and Product Id ");
+    const auto inquiry = inquire<Inquiry_Data>(nexus, lun_of(info), std::nullopt, "sendSCSIInquiry for lun returned error -  %d");
+    if (!inquiry)
+    {
+        ZMLR_LOG(LL_INFO, "Continue with next lun as inquiry data is necessary. ");
+        return false;
+    }
+    fill_inquiry(info, *inquiry);
+
+    ZMLR_LOG(LL_INFO, "scsiInquiry for Device Identification Page.");
+    const auto page = inquire<Identification_Page>(nexus, lun_of(info), identification_page,
+                                                   "sendSCSIInquiry for DeviceIdentificationPage DIP. 83 -  %d");
+    if (!page || !fill_identifier(info, *page))
+        identify_by_serial_number(nexus, info);
+    return true;
+}
+
+// True when the remote port is a target whose LUN 0 is a device of the wanted kind.
+bool is_target_of_kind(const Nexus& nexus, classId_t id)
+{
+    hxa_rport_attr_t attributes{};
+    const hxa_status_t status = hxal_rport_get_attr(nexus.ioc, base_fabric, nexus.port, nexus.remote_port, &attributes);
+    if (status != HXA_STATUS_OK)
+    {
+        ZMLR_LOG(LL_ERR, "hxal_rport_get_attr returned error -  %d", static_cast<int>(status));
+        return false;
+    }
+    if (attributes.scsi_function != HXA_RPORT_TARGET)
+    {
+        ZMLR_LOG(LL_INFO, "Nothing to do since the its not a Target Rport.");
+        return false;
+    }
+
+    ZMLR_LOG(LL_INFO, "ScsiInquiry invoked for general details");
+    const auto inquiry = inquire<Inquiry_Data>(nexus, lun_t{0}, std::nullopt, "hba_SendSCSIInquiry returned error -  %d");
+    if (!inquiry)
+        return false;
+    ZMLR_LOG(LL_INFO, "Device type  =   %d", (*inquiry)[0] & 0x1F);
+    if (is_tape_device(*inquiry) == (id == CLASSID_TapeDrive))
+        return true;
+    ZMLR_LOG(LL_INFO, "Continue with next rport. Looking for another device type ");
+    return false;
+}
+
+void append_unit(Instance_Array& instances, const _hbaPortInfo& port, const _hbaLunInfo& lun, classId_t id)
+{
+    if (id == CLASSID_TapeDrive)
+        instances.adopt(getTapeDriveInstance(port, lun));
+    else
+        instances.adopt(getStorageExtentInstance(port, lun));
+}
+
+void append_units(Instance_Array& instances, const Nexus& nexus, int index, const _hbaPortInfo& port, classId_t id,
+                  const Wanted& wanted)
+{
+    const Lun_List luns = list_luns(nexus, index);
+    for (std::size_t i = 0; i < luns.count; i++)
+    {
+        _hbaLunInfo info;
+        std::ranges::copy(luns.entry(i), info.lun.begin());
+        ProviderUtil::WWN2str(info.target_wwn, &nexus.remote_port);
+        if (wanted.may_end_with(lun_text(info).c_str()) && read_unit(nexus, info))
+            append_unit(instances, port, info, id);
+    }
+}
+
+} // namespace
+
+const TargetHelper& TargetHelper::getTargetHelperObject()
+{
+    static constinit const TargetHelper helper;
+    return helper;
+}
+
+Instance_Array TargetHelper::getTargetInstances(const hxal_t* ioc, const _hbaPortInfo& port, classId_t id,
+                                                const Inventory_Request& request) const
+{
+    const Scope_Trace trace(log_source);
+    Instance_Array instances;
+    Nexus nexus = {.ioc = ioc, .port = 0, .remote_port = 0};
+    ProviderUtil::getRawWWNFromStr(port.port_wwn, reinterpret_cast<unsigned char*>(&nexus.port));
+
+    const Remote_Ports remote_ports(ioc, nexus.port, log_source);
+    int index = 0;
+    for (const wwn_t remote_port : remote_ports.wwns())
+    {
+        ZMLR_LOG(LL_INFO, "Loop for the rport index =   %d", index);
+        nexus.remote_port = remote_port;
+        if (request.wanted.may_hold(text_of(remote_port).c_str()) && is_target_of_kind(nexus, id))
+            append_units(instances, nexus, index, port, id, request.wanted);
+        index++;
+    }
+    return instances;
+}
+
+hxa_status_t TargetHelper::sendSCSIInquiry(const hxal_t* ioc, wwn_t lpwwn, wwn_t rpwwn, uint16_t vf_id, lun_t lun, bool evpd,
+                                           std::uint8_t page, void* data, std::uint32_t* size, std::uint8_t* scsi_status,
+                                           void* sense, std::uint32_t* sense_size) const
+{
+    // SPC-3, 6.4: operation code, EVPD, page code, allocation length in two bytes.
+    scsi_cdb_t cdb{};
+    cdb.scsi_cdb[0] = 0x12;
+    cdb.scsi_cdb[1] = evpd ? 1 : 0;
+    cdb.scsi_cdb[2] = page;
+    cdb.scsi_cdb[3] = static_cast<std::uint8_t>(*size >> 8);
+    cdb.scsi_cdb[4] = static_cast<std::uint8_t>(*size);
+
+    ZMLR_LOG(LL_INFO, "Invoking hxal_scsi_cmnd with SCSI_OP_INQUIRY ");
+    const hxa_status_t status =
+        hxal_scsi_cmnd(ioc, vf_id, lpwwn, rpwwn, lun, &cdb, 0, data, *size, scsi_status, sense, sense_size);
+    ZMLR_LOG(LL_INFO, "completed  hxal_scsi_cmnd(SCSI_OP_INQUIRY) status = %d, pScsiStatus = %x", static_cast<int>(status),
+             *scsi_status);
+    return status;
+}
+
+} // namespace zmlr

@@ -1,0 +1,70 @@
+"""Everything that a server on a simulated host serves, as text for a person to read: `python -m tools.inventory_text SCENARIO`.
+
+One paragraph a class, in the order of registration. The first instance is told whole; of the others only what differs from the one
+before. What depends on the machine that runs the simulation is put into angle brackets.
+"""
+
+import re
+import sys
+
+import pywbem
+
+from tools.simulated_server import ROOT, SimulatedServer
+
+NAME_SPACE = "root/zemlar"
+OF_THE_MACHINE = {"NameFormat", "IdentifyingDescriptions"}  # of ZEMLAR_ComputerSystem: what kind of text names it
+
+
+def served_classes():
+    rows = (ROOT / "providers/providers.def").read_text(encoding="utf-8")
+    return re.findall(r"^ZMLR_PROVIDER\((\w+), +(?:INSTANCE|ASSOCIATION)", rows, re.MULTILINE)
+
+
+class Inventory:
+    """Reads one server through pywbem."""
+
+    def __init__(self, url):
+        self._client = pywbem.WBEMConnection(url, default_namespace=NAME_SPACE, timeout=120)
+        self._host = self._client.EnumerateInstances("ZEMLAR_ComputerSystem")[0]["Name"]
+
+    def lines(self):
+        for class_name in served_classes():
+            yield from self._of_class(class_name)
+
+    def _of_class(self, class_name):
+        instances = self._client.EnumerateInstances(class_name)
+        yield f"{class_name}: {len(instances) or 'none'}"
+        before = {}
+        for number, instance in enumerate(instances, 1):
+            properties = {name: self._text(class_name, name, instance[name]) for name in instance.keys()}
+            yield f"  {number}" + (", as the one before but for" if before else "")
+            yield from (f"    {name} = {text}" for name, text in properties.items() if before.get(name) != text)
+            before = properties
+        yield ""
+
+    def _text(self, class_name, name, value):
+        if class_name == "ZEMLAR_ComputerSystem" and name in OF_THE_MACHINE:
+            return f"<{'a list' if isinstance(value, list) else 'a text'}>"
+        return value_text(value).replace(self._host, "<host>")
+
+
+def value_text(value):
+    if value is None:
+        return "-"
+    if isinstance(value, list):
+        return "[" + ", ".join(value_text(element) for element in value) + "]"
+    if isinstance(value, pywbem.CIMInstanceName):
+        keys = ", ".join(f"{key}={value_text(value[key])}" for key in sorted(value.keys()))
+        return f"{value.classname}({keys})"
+    if isinstance(value, str):
+        return '"' + value.replace("\\", "\\\\").replace("\n", "\\n").replace("\t", "\\t").replace("\r", "\\r") + '"'
+    return str(value)
+
+
+def inventory_text(url):
+    return "\n".join(Inventory(url).lines())
+
+
+if __name__ == "__main__":
+    with SimulatedServer(sys.argv[1]) as running:
+        print(inventory_text(running.url))
