@@ -94,10 +94,12 @@ TEST_F(Requests, every_class_answers_on_every_host)
         for (const auto* meta_class : operations().enumerate_classes(name_space, "", true))
         {
             const std::string name = meta_class->name;
-            const std::size_t count = expected.contains(name) ? expected.at(name) : 0;
-            if (name.starts_with("ZEMLAR_"))
+            if (!name.starts_with("ZEMLAR_"))
+                continue;
+            const std::size_t count = enumerate(name).size();
+            if (expected.contains(name))
             {
-                EXPECT_EQ(enumerate(name).size(), count) << name << ' ' << host.scenario;
+                EXPECT_EQ(count, expected.at(name)) << name << ' ' << host.scenario;
             }
         }
         EXPECT_THAT(hxasim::violations(), IsEmpty());
