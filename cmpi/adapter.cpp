@@ -8,6 +8,7 @@
 
 #include <cstdio>
 #include <memory>
+#include <new>
 
 namespace zmlr
 {
@@ -18,9 +19,6 @@ namespace
 // Versions that a server reads from each function table.
 constexpr int FT_VERSION = 100;
 constexpr int MI_VERSION = 100;
-
-static_assert(sizeof(CMPIInstanceMIFT) == 80 && sizeof(CMPIAssociationMIFT) == 56);
-static_assert(sizeof(CMPIMethodMIFT) == 32 && sizeof(CMPIIndicationMIFT) == 72);
 
 void set_mi_name(char (&name)[MI_NAME_SIZE], const char* kind, const char* provider_name)
 {
@@ -58,8 +56,10 @@ CMPI_Adapter::~CMPI_Adapter()
     detach();
 }
 
-// The tables are filled by position: the names of some members differ between editions of the interface headers, their
-// order does not.
+// The tables are filled by position: between editions of the interface headers the names of some members differ, some members
+// are constant and more stand at the end, but their order does not change. What stands at the end is not ours to serve.
+#pragma GCC diagnostic push
+#pragma GCC diagnostic ignored "-Wmissing-field-initializers"
 void CMPI_Adapter::attach(const char* provider_name)
 {
     set_mi_name(sd->inst_mi_name, "instance", provider_name);
@@ -68,16 +68,16 @@ void CMPI_Adapter::attach(const char* provider_name)
     set_mi_name(sd->assoc_mi_name, "association", provider_name);
 
     // clang-format off
-    sd->instance_ft = {
+    new (&sd->instance_ft) CMPIInstanceMIFT{
         FT_VERSION, MI_VERSION, sd->inst_mi_name, instanceCleanup,
         enumInstanceNames, enumInstances, getInstance, createInstance, modifyInstance, deleteInstance, execQuery};
-    sd->method_ft = {
+    new (&sd->method_ft) CMPIMethodMIFT{
         FT_VERSION, MI_VERSION, sd->meth_mi_name, methodCleanup,
         invokeMethod};
-    sd->indication_ft = {
+    new (&sd->indication_ft) CMPIIndicationMIFT{
         FT_VERSION, MI_VERSION, sd->indic_mi_name, indicationCleanup,
         authorizeFilter, mustPoll, activateFilter, deactivateFilter, enableIndications, disableIndications};
-    sd->association_ft = {
+    new (&sd->association_ft) CMPIAssociationMIFT{
         FT_VERSION, MI_VERSION, sd->assoc_mi_name, associationCleanup,
         associators, associatorNames, references, referenceNames};
     // clang-format on
@@ -85,6 +85,7 @@ void CMPI_Adapter::attach(const char* provider_name)
     sd->adapter = this;
     sd->magic = STATIC_DATA_MAGIC;
 }
+#pragma GCC diagnostic pop
 
 void CMPI_Adapter::detach()
 {

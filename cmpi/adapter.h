@@ -3,6 +3,19 @@
 // One adapter exists per loaded provider. Its static functions are what the server calls through the function tables: each
 // finds the adapter of its interface, works under the adapter's lock with a thread context pushed, and answers a return
 // code without a message. No exception leaves them.
+//
+// What guards a request, in the order in which it is taken. Whoever holds one takes none that stands before it.
+//
+//   life_lock          (entry.h, the process's) while adapters are looked up, made and deleted; nobody waits for a thread
+//                      under it
+//   requests           entered by every request from its look-up to its end; a cleanup shuts it and waits until all have left
+//   indication_switch  while indications are switched on or off
+//   lock               for the work of a request and for a delivery
+//   broker_gate        entered by provider threads for each use of the broker; a cleanup shuts it when the provider is unloaded
+//
+// Let go on the way: `lock` by a request that switches indications, before it takes the switch: enabling takes it again for the
+// provider's call, disabling does not, because the provider joins its delivery thread meanwhile. A cleanup takes neither `lock`
+// nor the switch: it waits for the requests instead, and for the threads that the provider joins when it unloads.
 #pragma once
 
 #include "cmpi/gate.h"
@@ -85,8 +98,8 @@ public:
     static CMPIStatus indicationCleanup(CMPIIndicationMI* mi, const CMPIContext* context, CMPIBoolean terminating) noexcept;
     static CMPIStatus authorizeFilter(CMPIIndicationMI* mi, const CMPIContext* context, const CMPISelectExp* filter,
                                       const char* class_name, const CMPIObjectPath* path, const char* owner) noexcept;
-    static CMPIStatus mustPoll(CMPIIndicationMI* mi, const CMPIContext* context, const CMPISelectExp* filter,
-                               const char* class_name, const CMPIObjectPath* path) noexcept;
+    // Later editions of the interface headers declare one parameter more: whatever they are, they are not looked at.
+    template <class... Arguments> static CMPIStatus mustPoll(CMPIIndicationMI* mi, Arguments...) { return never_poll(mi); }
     static CMPIStatus activateFilter(CMPIIndicationMI* mi, const CMPIContext* context, const CMPISelectExp* filter,
                                      const char* class_name, const CMPIObjectPath* path, CMPIBoolean first) noexcept;
     static CMPIStatus deactivateFilter(CMPIIndicationMI* mi, const CMPIContext* context, const CMPISelectExp* filter,
@@ -102,12 +115,13 @@ public:
     std::vector<Name_Space_Entry> name_spaces; // in the order of their first filters
     const Meta_Class* mc = nullptr;
     bool indications_enabled = false;
-    Gate requests;                                                // every request is inside
-    std::shared_ptr<Gate> broker_gate = std::make_shared<Gate>(); // provider threads are inside while they use the broker
-    Mutex lock{true};                                             // held for the whole of a request
-    Mutex indication_switch{true}; // held while indications are enabled or disabled; comes before `lock`
+    Gate requests;
+    Mutex indication_switch{true};
+    Mutex lock{true};
+    std::shared_ptr<Gate> broker_gate = std::make_shared<Gate>(); // provider threads may outlive the adapter
 
 private:
+    static CMPIStatus never_poll(CMPIIndicationMI* mi) noexcept;
     void attach(const char* provider_name);
     void detach();
 };
@@ -115,7 +129,7 @@ private:
 template <class MI> CMPI_Adapter* CMPI_Adapter::of(MI* mi)
 {
     check(mi != nullptr, "mi != 0");
-    auto* sd = static_cast<CMPI_Static_Data*>(mi->hdl);
+    auto* sd = static_cast<CMPI_Static_Data*>(const_cast<void*>(static_cast<const void*>(mi->hdl)));
     check(sd != nullptr, "sd != 0");
     check(sd->magic == STATIC_DATA_MAGIC, "sd->magic == STATIC_DATA_MAGIC");
     check(sd->adapter != nullptr, "sd->adapter");

@@ -1,7 +1,7 @@
 // Answer: what a request answers, object by object, as its provider hands them over.
 #pragma once
 
-#include "cmpi/cmpi_objects.h"
+#include "cmpi/converter.h"
 #include "runtime/instance.h"
 
 #include <cmpift.h>
@@ -15,7 +15,7 @@ struct Answer
     const CMPIContext* context;
     const CMPIResult* result;
     String name_space; // of the request's path
-    const char** properties;
+    Property_Filter properties = {};
     CMPIrc rc = CMPI_RC_OK; // of the first object that could not be answered
 };
 

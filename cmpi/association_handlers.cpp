@@ -74,7 +74,8 @@ CMPIrc send_named_instance(const Answer& answer, Instance* object)
     if (make_name(answer, object, path) != CMPI_RC_OK)
         return CMPI_RC_ERR_FAILED;
     CMPIStatus status = {CMPI_RC_OK, nullptr};
-    const CMPI_Ptr<CMPIInstance> found(CBGetInstance(answer.broker, answer.context, path.get(), answer.properties, &status));
+    const CMPI_Ptr<CMPIInstance> found(
+        CBGetInstance(answer.broker, answer.context, path.get(), answer.properties.names(), &status));
     if (!found || !okay(status))
         return CMPI_RC_ERR_FAILED;
     CMReturnInstance(answer.result, found.get());
@@ -105,7 +106,7 @@ CMPIrc send_reference(const Answer& answer, Instance* association)
     CMPIrc rc = make_cmpi_object_path(answer.broker, association, answer.name_space.c_str(), path);
     if (rc != CMPI_RC_OK)
         return rc;
-    keep_listed(association, answer.properties); // after the path, which needs the keys
+    keep_listed(association, answer.properties.names()); // after the path, which needs the keys
 
     CMPI_Ptr<CMPIInstance> cmpi_instance;
     rc = make_cmpi_instance(answer.broker, association, answer.name_space.c_str(), path.get(), answer.properties, cmpi_instance);
@@ -138,7 +139,14 @@ struct Association_Request
     String result_role = {};
     const char** properties = nullptr;
 
-    Answer answer() const { return {adapter.broker, context, result, name_space_of(path), properties}; }
+    Answer answer() const
+    {
+        return {.broker = adapter.broker,
+                .context = context,
+                .result = result,
+                .name_space = name_space_of(path),
+                .properties = properties};
+    }
     const Meta_Class* source_class() const { return known_class(adapter, class_name_of(path).c_str()); }
 };
 
@@ -244,7 +252,14 @@ CMPIStatus CMPI_Adapter::references(CMPIAssociationMI* mi, const CMPIContext* co
     const auto work = [&](CMPI_Adapter& adapter)
     {
         const auto whole = [](Instance*) {};
-        return answer_references<send_reference>({adapter, context, result, path, result_class, {}, role, {}, properties}, whole);
+        return answer_references<send_reference>({.adapter = adapter,
+                                                  .context = context,
+                                                  .result = result,
+                                                  .path = path,
+                                                  .association_class = result_class,
+                                                  .role = role,
+                                                  .properties = properties},
+                                                 whole);
     };
     return serve("references", mi, context, work);
 }
@@ -252,8 +267,15 @@ CMPIStatus CMPI_Adapter::references(CMPIAssociationMI* mi, const CMPIContext* co
 CMPIStatus CMPI_Adapter::referenceNames(CMPIAssociationMI* mi, const CMPIContext* context, const CMPIResult* result,
                                         const CMPIObjectPath* path, const char* result_class, const char* role) noexcept
 {
-    const auto work = [&](CMPI_Adapter& adapter) {
-        return answer_references<send_reference_name>({adapter, context, result, path, result_class, {}, role}, nullify_non_keys);
+    const auto work = [&](CMPI_Adapter& adapter)
+    {
+        return answer_references<send_reference_name>({.adapter = adapter,
+                                                       .context = context,
+                                                       .result = result,
+                                                       .path = path,
+                                                       .association_class = result_class,
+                                                       .role = role},
+                                                      nullify_non_keys);
     };
     return serve("referenceNames", mi, context, work);
 }

@@ -4,6 +4,7 @@
 #include "cmpi/converter.h"
 #include "runtime/log.h"
 
+#include <algorithm>
 #include <utility>
 
 namespace zmlr
@@ -14,24 +15,6 @@ namespace
 
 constexpr const char* log_source = "CMPI_Containers";
 
-bool in_bounds(uint32 index, uint32 size)
-{
-    if (index < size)
-        return true;
-    ZMLR_LOG(LL_WARN, "bounds error");
-    return false;
-}
-
-// The name that came with an item; false when there is none.
-bool take_name(const CMPIString* cmpi_name, String& name)
-{
-    const char* text = chars_of(cmpi_name);
-    if (!text)
-        return false;
-    name = text;
-    return true;
-}
-
 } // namespace
 
 CMPI_Container::CMPI_Container(const Meta_Repository* repository, const CMPIBroker* broker, const char* name_space)
@@ -41,26 +24,54 @@ CMPI_Container::CMPI_Container(const Meta_Repository* repository, const CMPIBrok
 {
 }
 
-int CMPI_Container::get_name(uint32 index, String& name)
+int CMPI_Container::get_size(uint32& size)
 {
-    CMPIData data;
-    return fetch(index, data, name);
+    CMPIStatus status = {CMPI_RC_OK, nullptr};
+    _size = count(status);
+    size = _size;
+    if (okay(status))
+        return 0;
+    ZMLR_LOG(LL_WARN, "%s() failed", count_call());
+    return -1;
 }
 
-int CMPI_Container::get_value(uint32 index, Value::Type expected, Value& value)
+int CMPI_Container::get_name(uint32 index, const char*& name)
 {
-    CMPIData data;
-    String name;
-    if (fetch(index, data, name) != 0)
+    if (index >= _size)
+    {
+        ZMLR_LOG(LL_WARN, "bounds error");
         return -1;
-    if (cmpi_to_cimple_value(repository(), _broker, _name_space.c_str(), data, value) != 0)
+    }
+    try
+    {
+        CMPIStatus status = {CMPI_RC_OK, nullptr};
+        CMPIString* cmpi_name = nullptr;
+        _item = fetch(index, cmpi_name, status);
+        _item_name = okay(status) ? chars_of(cmpi_name) : nullptr;
+    }
+    catch (...)
+    {
+        _item_name = nullptr;
+        ZMLR_LOG(LL_WARN, "%s() threw exception: index=%u size=%u", fetch_call(), index, _size);
+        return -1;
+    }
+    name = _item_name;
+    if (name)
+        return 0;
+    ZMLR_LOG(LL_WARN, "%s() failed", fetch_call());
+    return -1;
+}
+
+int CMPI_Container::get_value(uint32, Value::Type expected, Value& value)
+{
+    if (cmpi_to_cimple_value(repository(), _broker, _name_space, _item, value) != 0)
     {
         ZMLR_LOG(LL_WARN, "cmpi_to_cimple_value() failed");
         return -1;
     }
     if (value.type() != expected && !stands_for(value, expected))
     {
-        ZMLR_LOG(LL_WARN, "type mismatch on %s: %s/%s", name.c_str(), name_of(expected), name_of(value.type()));
+        ZMLR_LOG(LL_WARN, "type mismatch on %s: %s/%s", _item_name, name_of(expected), name_of(value.type()));
         return -1;
     }
     return 0;
@@ -69,7 +80,7 @@ int CMPI_Container::get_value(uint32 index, Value::Type expected, Value& value)
 int CMPI_Container::set_value(const char* name, const Value& value, uint32 flags)
 {
     CMPI_Data data;
-    if (_to_cmpi_data(repository(), _broker, _name_space.c_str(), value, flags, data) == 0)
+    if (_to_cmpi_data(repository(), _broker, _name_space, value, flags, data) == 0)
         return put(name, data);
     ZMLR_LOG(LL_WARN, "_to_cmpi_data() failed: feature=%s", name);
     return -1;
@@ -78,33 +89,29 @@ int CMPI_Container::set_value(const char* name, const Value& value, uint32 flags
 // ---- instances ----
 
 CMPIInstance_Container::CMPIInstance_Container(const Meta_Repository* repository, const CMPIBroker* broker,
-                                               const char* name_space, const CMPIInstance* instance)
+                                               const char* name_space, const CMPIInstance* instance, Kept_Keys* keys)
     : CMPI_Container(repository, broker, name_space)
     , _instance(instance)
+    , _keys(keys)
 {
 }
 
-uint32 CMPIInstance_Container::get_size() { return CMGetPropertyCount(_instance, nullptr); }
-
-int CMPIInstance_Container::fetch(uint32 index, CMPIData& data, String& name)
+int CMPIInstance_Container::set_value(const char* name, const Value& value, uint32 flags)
 {
-    const uint32 size = get_size();
-    if (!in_bounds(index, size))
-        return -1;
-    try
+    if ((flags & Flag_Key) && _keys)
     {
-        CMPIStatus status = {CMPI_RC_OK, nullptr};
-        CMPIString* cmpi_name = nullptr;
-        data = CMGetPropertyAt(_instance, index, &cmpi_name, &status);
-        if (okay(status) && take_name(cmpi_name, name))
-            return 0;
-        ZMLR_LOG(LL_WARN, "CMGetPropertyAt() failed");
+        const auto kept = std::ranges::find(*_keys, name, &Kept_Key::name);
+        if (kept != _keys->end())
+            return put(name, kept->data);
     }
-    catch (...)
-    {
-        ZMLR_LOG(LL_WARN, "CMGetPropertyAt() threw exception: index=%u size=%u", index, size);
-    }
-    return -1;
+    return CMPI_Container::set_value(name, value, flags);
+}
+
+CMPICount CMPIInstance_Container::count(CMPIStatus& status) { return CMGetPropertyCount(_instance, &status); }
+
+CMPIData CMPIInstance_Container::fetch(CMPICount index, CMPIString*& name, CMPIStatus& status)
+{
+    return CMGetPropertyAt(_instance, index, &name, &status);
 }
 
 int CMPIInstance_Container::put(const char* name, CMPI_Data& data)
@@ -118,34 +125,31 @@ int CMPIInstance_Container::put(const char* name, CMPI_Data& data)
 // ---- object paths ----
 
 CMPIObjectPath_Container::CMPIObjectPath_Container(const Meta_Repository* repository, const CMPIBroker* broker,
-                                                   const char* name_space, const CMPIObjectPath* path)
+                                                   const char* name_space, const CMPIObjectPath* path, Kept_Keys* keys)
     : CMPI_Container(repository, broker, name_space)
     , _path(path)
+    , _keys(keys)
 {
 }
 
-uint32 CMPIObjectPath_Container::get_size() { return CMGetKeyCount(_path, nullptr); }
+CMPICount CMPIObjectPath_Container::count(CMPIStatus& status) { return CMGetKeyCount(_path, &status); }
 
-int CMPIObjectPath_Container::fetch(uint32 index, CMPIData& data, String& name)
+CMPIData CMPIObjectPath_Container::fetch(CMPICount index, CMPIString*& name, CMPIStatus& status)
 {
-    if (!in_bounds(index, get_size()))
-        return -1;
-    CMPIStatus status = {CMPI_RC_OK, nullptr};
-    CMPIString* cmpi_name = nullptr;
-    data = CMGetKeyAt(_path, index, &cmpi_name, &status);
-    if (okay(status) && take_name(cmpi_name, name))
-        return 0;
-    ZMLR_LOG(LL_WARN, "CMGetKeyAt() failed");
-    return -1;
+    return CMGetKeyAt(_path, index, &name, &status);
 }
 
 int CMPIObjectPath_Container::put(const char* name, CMPI_Data& data)
 {
     // Only paths that we made, which are not constant, are written.
-    if (okay(CMAddKey(const_cast<CMPIObjectPath*>(_path), name, data.value(), data.type())))
-        return 0;
-    ZMLR_LOG(LL_WARN, "CMAddKey() failed");
-    return -1;
+    if (!okay(CMAddKey(const_cast<CMPIObjectPath*>(_path), name, data.value(), data.type())))
+    {
+        ZMLR_LOG(LL_WARN, "CMAddKey() failed");
+        return -1;
+    }
+    if (_keys)
+        _keys->push_back({name, std::move(data)});
+    return 0;
 }
 
 // ---- arguments ----
@@ -157,19 +161,11 @@ CMPIArgs_Container::CMPIArgs_Container(const Meta_Repository* repository, const 
 {
 }
 
-uint32 CMPIArgs_Container::get_size() { return _args ? CMGetArgCount(_args, nullptr) : 0; }
+CMPICount CMPIArgs_Container::count(CMPIStatus& status) { return _args ? CMGetArgCount(_args, &status) : 0; }
 
-int CMPIArgs_Container::fetch(uint32 index, CMPIData& data, String& name)
+CMPIData CMPIArgs_Container::fetch(CMPICount index, CMPIString*& name, CMPIStatus& status)
 {
-    if (!in_bounds(index, get_size()))
-        return -1;
-    CMPIStatus status = {CMPI_RC_OK, nullptr};
-    CMPIString* cmpi_name = nullptr;
-    data = CMGetArgAt(_args, index, &cmpi_name, &status);
-    if (okay(status) && take_name(cmpi_name, name))
-        return 0;
-    ZMLR_LOG(LL_WARN, "CMGetArgAt() failed");
-    return -1;
+    return CMGetArgAt(_args, index, &name, &status);
 }
 
 int CMPIArgs_Container::put(const char* name, CMPI_Data& data)

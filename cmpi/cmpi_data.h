@@ -5,6 +5,8 @@
 
 #include <cmpimacs.h>
 
+#include <cstring>
+#include <utility>
 #include <vector>
 
 namespace zmlr
@@ -25,23 +27,35 @@ public:
     void set(CMPIType type, const CMPIValue& value);
     void set_null(CMPIType type);
 
-    // Takes over an object; false when there is none (the broker could not make it).
-    bool adopt(CMPIString* string);
-    bool adopt(CMPIDateTime* datetime);
-    bool adopt(CMPIObjectPath* path);
-    bool adopt(CMPIInstance* instance);
-    bool adopt(CMPIArray* array, CMPIType element_type, std::vector<CMPI_Data> elements);
+    // Takes over an object, an array with the elements that it points to; false when there is none (the broker could not make
+    // it).
+    template <class Object> bool adopt(CMPIType type, Object* object, std::vector<CMPI_Data> elements = {})
+    {
+        if (!object)
+            return false;
+        CMPIValue value = {};
+        std::memcpy(&value, &object, sizeof(object)); // every pointer lies at the union's start
+        set(type, value);
+        _release = [](const CMPIValue& owned)
+        {
+            Object* last = nullptr;
+            std::memcpy(&last, &owned, sizeof(last));
+            CMPI_Release()(last);
+        };
+        _elements = std::move(elements);
+        return true;
+    }
 
     CMPIType type() const { return _data.type; }
     const CMPIValue* value() const { return CMIsNullValue(_data) ? nullptr : &_data.value; }
+    bool owns() const { return _release != nullptr; }
 
 private:
-    void own(CMPIType type, const CMPIValue& value);
     void release();
 
     CMPIData _data = {CMPI_null, CMPI_nullValue, {.uint64 = 0}};
-    bool _owner = false;
-    std::vector<CMPI_Data> _elements; // of the array
+    void (*_release)(const CMPIValue& owned) = nullptr; // of the object, when there is one
+    std::vector<CMPI_Data> _elements;                   // of the array
 };
 
 } // namespace zmlr

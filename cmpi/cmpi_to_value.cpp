@@ -5,6 +5,7 @@
 #include "runtime/log.h"
 
 #include <cstring>
+#include <utility>
 
 namespace zmlr
 {
@@ -167,10 +168,15 @@ template <class F> int for_each_element(const CMPIData& data, const char* mismat
         return -1;
     }
     const auto element_type = static_cast<CMPIType>(data.type & ~CMPI_ARRAY);
-    const CMPICount size = CMGetArrayCount(array, nullptr);
+    CMPIStatus status = {CMPI_RC_OK, nullptr};
+    const CMPICount size = CMGetArrayCount(array, &status);
+    if (!okay(status))
+    {
+        ZMLR_LOG(LL_WARN, "CMGetArrayCount() failed");
+        return -1;
+    }
     for (CMPICount i = 0; i < size; ++i)
     {
-        CMPIStatus status = {CMPI_RC_OK, nullptr};
         const CMPIData element = CMGetArrayElementAt(array, i, &status);
         if (!okay(status) || element.type != element_type)
         {
@@ -204,7 +210,7 @@ template <class T> int array_from_cmpi(const CMPIData& data, Value& value)
     };
     if (for_each_element(data, "type mismatch", "encountered null array element", append) != 0)
         return -1;
-    value.set_value(array);
+    value.set_value(std::move(array));
     return 0;
 }
 
@@ -221,8 +227,7 @@ int instance_array_from_cmpi(const Source& source, const CMPIData& data, Value& 
     };
     if (for_each_element(data, "array element type mismatch", "encountered null instance element", append) != 0)
         return -1;
-    value.set_value(static_cast<const Array<Instance*>&>(array)); // takes over the references
-    array.clear();
+    value.set_value(static_cast<Array<Instance*>&&>(array)); // takes over the references
     return 0;
 }
 

@@ -4,7 +4,6 @@
 #pragma once
 
 #include "runtime/instance.h"
-#include "runtime/string.h"
 #include "runtime/value.h"
 
 namespace zmlr
@@ -18,14 +17,16 @@ public:
     Container(const Container&) = delete;
     Container& operator=(const Container&) = delete;
 
-    // Each of these answers 0, or -1 and a log line.
-    virtual uint32 get_size() = 0;
-    virtual int get_name(uint32 index, String& name) = 0;
-    virtual int get_value(uint32 index, Value::Type expected, Value& value) = 0;
+    // Each of these answers 0, or -1 and a log line. How many items there are is asked once, before the first of them. An item is
+    // fetched with its name, once; its value is that of the fetched one, its name the server's, good until the next is fetched.
+    virtual int get_size(uint32& size) = 0;
+    virtual int get_name(uint32 index, const char*& name) = 0;
+    virtual int get_value(uint32 index, Value::Type expected, Value& value) = 0;   // index: of the name that was got last
     virtual int set_value(const char* name, const Value& value, uint32 flags) = 0; // flags: of the feature
 
     // Carries the items into `instance`, which is made of meta_class when it is empty: every property that no item names is
-    // null. With a mask only features with one of its flags are set. Returns 0.
+    // null. With a mask only features with one of its flags are set. Returns 0, or -1 and `instance` as it was when the server
+    // cannot tell how many items there are.
     int convert(const Meta_Class* meta_class, uint32 mask, Ref<Instance>& instance);
 
     // Carries the non-null properties and references into the container; with a mask only features with one of its flags.

@@ -14,62 +14,79 @@ namespace
 
 constexpr const char* log_source = "Converter";
 
-CMPIrc set_property_filter(CMPIInstance* cmpi_instance, const Meta_Class* meta_class, const char** properties)
-{
-    std::vector<const char*> keys;
-    keys.reserve(meta_class->num_keys + 1);
-    for (uint32 i = 0; i < meta_class->num_meta_features; ++i)
-    {
-        if (is_key(meta_class->meta_features[i]))
-            keys.push_back(meta_class->meta_features[i]->name);
-    }
-    keys.push_back(nullptr);
-    return CMSetPropertyFilter(cmpi_instance, properties, keys.data()).rc;
-}
-
-} // namespace
-
-CMPIrc make_cmpi_object_path(const CMPIBroker* broker, const Instance* instance, const char* name_space,
-                             CMPI_Ptr<CMPIObjectPath>& path)
+CMPIrc fill_path(const CMPIBroker* broker, const Instance* instance, const char* name_space, CMPI_Ptr<CMPIObjectPath>& path,
+                 Kept_Keys* keys)
 {
     CMPIStatus status = {CMPI_RC_OK, nullptr};
     CMPI_Ptr<CMPIObjectPath> made(CMNewObjectPath(broker, name_space, instance->meta_class->name, &status));
     if (!made || !okay(status))
         return CMPI_RC_ERR_FAILED;
-    CMPIObjectPath_Container container(instance->meta_class->meta_repository, broker, name_space, made.get());
+    CMPIObjectPath_Container container(instance->meta_class->meta_repository, broker, name_space, made.get(), keys);
     if (container.convert(instance, Flag_Key) != 0)
         return CMPI_RC_ERR_FAILED;
     path = std::move(made);
     return CMPI_RC_OK;
 }
 
-CMPIrc make_cmpi_instance(const CMPIBroker* broker, const Instance* instance, const char* name_space, const CMPIObjectPath* path,
-                          const char** properties, CMPI_Ptr<CMPIInstance>& cmpi_instance)
+CMPIrc fill_instance(const CMPIBroker* broker, const Instance* instance, const char* name_space, const CMPIObjectPath* path,
+                     const Property_Filter& filter, Kept_Keys* keys, CMPI_Ptr<CMPIInstance>& cmpi_instance)
 {
-    CMPI_Ptr<CMPIObjectPath> own_path;
-    if (!path)
-    {
-        ZMLR_LOG(LL_WARN, "No ObjectPath built before call to make_CMPI_instance");
-        if (make_cmpi_object_path(broker, instance, name_space, own_path) != CMPI_RC_OK)
-            return CMPI_RC_ERR_FAILED;
-        path = own_path.get();
-    }
-
     CMPIStatus status = {CMPI_RC_OK, nullptr};
     CMPI_Ptr<CMPIInstance> made(CMNewInstance(broker, path, &status));
     if (!made || !okay(status))
         return CMPI_RC_ERR_FAILED;
-    if (properties)
-    {
-        const CMPIrc rc = set_property_filter(made.get(), instance->meta_class, properties);
-        if (rc != CMPI_RC_OK)
-            return rc;
-    }
-    CMPIInstance_Container container(instance->meta_class->meta_repository, broker, name_space, made.get());
+    const CMPIrc rc = filter ? filter.install(made.get(), instance->meta_class) : CMPI_RC_OK;
+    if (rc != CMPI_RC_OK)
+        return rc;
+    CMPIInstance_Container container(instance->meta_class->meta_repository, broker, name_space, made.get(), keys);
     if (container.convert(instance, 0) != 0)
         return CMPI_RC_ERR_FAILED;
     cmpi_instance = std::move(made);
     return CMPI_RC_OK;
+}
+
+} // namespace
+
+CMPIrc Property_Filter::install(CMPIInstance* instance, const Meta_Class* meta_class) const
+{
+    if (_class != meta_class)
+    {
+        _class = nullptr; // until the keys are complete
+        _keys.clear();
+        for (uint32 i = 0; i < meta_class->num_meta_features; ++i)
+        {
+            if (is_key(meta_class->meta_features[i]))
+                _keys.push_back(meta_class->meta_features[i]->name);
+        }
+        _keys.push_back(nullptr);
+        _class = meta_class;
+    }
+    return CMSetPropertyFilter(instance, _names, _keys.data()).rc;
+}
+
+CMPIrc make_cmpi_object_path(const CMPIBroker* broker, const Instance* instance, const char* name_space,
+                             CMPI_Ptr<CMPIObjectPath>& path)
+{
+    return fill_path(broker, instance, name_space, path, nullptr);
+}
+
+CMPIrc make_cmpi_object(const CMPIBroker* broker, const Instance* instance, const char* name_space, const Property_Filter& filter,
+                        CMPI_Ptr<CMPIObjectPath>& path, CMPI_Ptr<CMPIInstance>& cmpi_instance)
+{
+    Kept_Keys keys;
+    keys.reserve(instance->meta_class->num_keys);
+    const CMPIrc rc = fill_path(broker, instance, name_space, path, &keys);
+    return rc == CMPI_RC_OK ? fill_instance(broker, instance, name_space, path.get(), filter, &keys, cmpi_instance) : rc;
+}
+
+CMPIrc make_cmpi_instance(const CMPIBroker* broker, const Instance* instance, const char* name_space, const CMPIObjectPath* path,
+                          const Property_Filter& filter, CMPI_Ptr<CMPIInstance>& cmpi_instance)
+{
+    if (path)
+        return fill_instance(broker, instance, name_space, path, filter, nullptr, cmpi_instance);
+    ZMLR_LOG(LL_WARN, "No ObjectPath built before call to make_CMPI_instance");
+    CMPI_Ptr<CMPIObjectPath> own_path;
+    return make_cmpi_object(broker, instance, name_space, filter, own_path, cmpi_instance);
 }
 
 namespace

@@ -11,8 +11,28 @@
 
 #include <cmpidt.h>
 
+#include <vector>
+
 namespace zmlr
 {
+
+// A property list as a server takes it: the names that a caller asks for (null: everything), and beside them the keys of the
+// class, which are asked for once per class and not per object.
+class Property_Filter
+{
+public:
+    Property_Filter(const char** names = nullptr) : _names(names) {} // borrowed
+    explicit operator bool() const { return _names != nullptr; }
+    const char** names() const { return _names; }
+
+    // Installs it on an instance of the class: the server's answer.
+    CMPIrc install(CMPIInstance* instance, const Meta_Class* meta_class) const;
+
+private:
+    const char** _names;
+    mutable const Meta_Class* _class = nullptr; // of the keys
+    mutable std::vector<const char*> _keys;
+};
 
 // The path with the instance's keys.
 CMPIrc make_cmpi_object_path(const CMPIBroker* broker, const Instance* instance, const char* name_space,
@@ -21,7 +41,11 @@ CMPIrc make_cmpi_object_path(const CMPIBroker* broker, const Instance* instance,
 // The whole instance under a path (null: the one of its keys, which is logged). A property list is installed as the
 // instance's property filter; the code of a failing filter call is answered as it is.
 CMPIrc make_cmpi_instance(const CMPIBroker* broker, const Instance* instance, const char* name_space, const CMPIObjectPath* path,
-                          const char** properties, CMPI_Ptr<CMPIInstance>& cmpi_instance);
+                          const Property_Filter& filter, CMPI_Ptr<CMPIInstance>& cmpi_instance);
+
+// Both, the instance under the path: its keys are converted once.
+CMPIrc make_cmpi_object(const CMPIBroker* broker, const Instance* instance, const char* name_space, const Property_Filter& filter,
+                        CMPI_Ptr<CMPIObjectPath>& path, CMPI_Ptr<CMPIInstance>& cmpi_instance);
 
 // An instance of meta_class with the properties of a CMPI instance. It and what it references get the path's name space
 // where they have none.

@@ -28,7 +28,18 @@ template <class MI, class FT> MI* hand_out(MI& mi, FT& ft, CMPI_Static_Data* sd)
     return &mi;
 }
 
-// Takes the lock when no adapter, or one that stays, is attached to the static data.
+// Factory calls under way on this thread: each holds the lock while it makes an adapter.
+constinit thread_local unsigned factories = 0;
+struct Factory_Call
+{
+    Factory_Call() { ++factories; }
+    ~Factory_Call() { --factories; }
+    Factory_Call(const Factory_Call&) = delete;
+    Factory_Call& operator=(const Factory_Call&) = delete;
+};
+
+// Takes the lock when no adapter, or one that stays, is attached to the static data. Waits for one that is going, unless somebody
+// waits for this thread meanwhile, who may be the one that goes: then there is no lock.
 std::unique_lock<std::recursive_mutex> lock_settled(const CMPI_Static_Data* sd)
 {
     for (;;)
@@ -36,6 +47,8 @@ std::unique_lock<std::recursive_mutex> lock_settled(const CMPI_Static_Data* sd)
         std::unique_lock lock(life_lock);
         if (!sd->adapter || !sd->adapter->requests.is_shut())
             return lock;
+        if (factories != 0 || works_for_a_leaving(Thread_Context::top()))
+            return {};
         const unsigned seen = departures;
         lock.unlock();
         departures.wait(seen);
@@ -72,7 +85,7 @@ CMPIrc cleanup(CMPI_Adapter* adapter, bool terminating, const Thread_Context* ca
             --adapter->load_count;
             return CMPI_RC_OK;
         }
-        if (works_for(caller, adapter))
+        if (works_for(caller, adapter) || factories != 0)
         {
             ZMLR_LOG(LL_ERR, "cleanup refused: it came from within the provider");
             return CMPI_RC_DO_NOT_UNLOAD;
@@ -106,6 +119,12 @@ int cimple_cmpi_adapter(char, zmlr::CMPI_Static_Data* sd, const zmlr::Registrati
     const auto attach = [&]
     {
         const auto lock = lock_settled(sd);
+        if (!lock)
+        {
+            ZMLR_LOG(LL_ERR, "no interface of %s: it is going, and waits for the caller", provider_name);
+            return CMPI_RC_ERR_FAILED;
+        }
+        const Factory_Call call;
         if (sd->adapter)
             ++sd->adapter->load_count;
         else

@@ -19,8 +19,9 @@ extern constinit std::recursive_mutex life_lock;
 // What a cleanup function of any interface does: keeps everything and answers CMPI_RC_DO_NOT_UNLOAD while unloading is not
 // allowed (a terminating server is not asked), else gives up one interface. With the last one the provider goes: requests
 // that still run are waited for and new ones refused, the provider is unloaded, its threads leave the broker for good, and
-// the adapter is destroyed. A thread that works for the provider cannot wait for itself: its last cleanup keeps everything and
-// answers CMPI_RC_DO_NOT_UNLOAD too. `caller` is that thread's context before the cleanup's own (null: none).
+// the adapter is destroyed. A thread that works for the provider cannot wait for itself, nor can one that is making an adapter:
+// its last cleanup keeps everything and answers CMPI_RC_DO_NOT_UNLOAD too. `caller` is that thread's context before the cleanup's
+// own (null: none).
 CMPIrc cleanup(CMPI_Adapter* adapter, bool terminating, const Thread_Context* caller);
 
 // A request's hold on the adapter of its interface, which stays for this long.
@@ -52,7 +53,9 @@ private:
 
 // Answers in *mi the management interface of a provider: `kind` is 'I' instance, 'M' method, 'A' association or 'N'
 // indication; any other one answers null. All interfaces of a provider share one adapter, which the first call makes with its
-// broker and context. `language` is always 'C'. Returns 0; -1 and a null interface when no adapter could be made.
+// broker and context. `language` is always 'C'. Returns 0; -1 and a null interface when no adapter could be made. A call that
+// finds the provider's adapter on its way out waits until it is gone, and makes a new one; it fails where waiting would be for
+// ever: within a request or a thread of a provider that goes, and within another factory call.
 extern "C" [[gnu::visibility("default")]] int cimple_cmpi_adapter(char language, zmlr::CMPI_Static_Data* sd,
                                                                   const zmlr::Registration* registration,
                                                                   const CMPIBroker* broker, const CMPIContext* context,

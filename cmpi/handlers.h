@@ -1,7 +1,7 @@
 // The handlers through which a provider hands over what it produces.
 //
 // Every object handed over is a new instance (typically a clone) whose one reference passes to the receiver. handle()
-// answers whether the provider shall go on. The end mark (a null object) is the provider procedure's business.
+// answers whether the provider shall go on. A provider never hands over null.
 #pragma once
 
 #include "cmpi/status.h"
@@ -10,7 +10,10 @@
 namespace zmlr
 {
 
-// Receives one enumerated object (null: the end mark), the status and the client data; false stops the enumeration.
+// Receives one enumerated object, the status and the client data; false stops the enumeration. The last call is the one for a
+// null object: the provider procedure makes it with the provider's status when the provider is done, also when it failed or was
+// told to stop. Of a provider that answers *_UNSUPPORTED the caller makes it, after its own enumeration. An Indication_Proc is
+// told null by a provider that will raise no more, if it says so at all.
 using Enum_Instances_Proc = bool (*)(Instance* instance, Enum_Instances_Status status, void* client_data);
 using Enum_Associators_Proc = bool (*)(Instance* instance, Enum_Associators_Status status, void* client_data);
 using Enum_Associator_Names_Proc = bool (*)(Instance* instance, Enum_Associator_Names_Status status, void* client_data);

@@ -106,19 +106,15 @@ template <class Work> CMPIrc switch_indications(CMPI_Adapter& adapter, Work work
     return work();
 }
 
+// A failed attempt leaves nothing enabled: the next one must not take it for done.
 CMPIrc enable(CMPI_Adapter& adapter)
 {
     if (adapter.indications_enabled)
         return CMPI_RC_OK;
-    adapter.indications_enabled = true;
-    const auto call = [&]
-    {
-        const Auto_Mutex guard(adapter.lock);
-        return to_rc(adapter.enable_indications(_indication_proc, &adapter));
-    };
+    const Auto_Mutex guard(adapter.lock);
+    const auto call = [&] { return to_rc(adapter.enable_indications(_indication_proc, &adapter)); };
     const CMPIrc rc = shielded("enable_indications", call);
-    if (rc != CMPI_RC_OK)
-        adapter.indications_enabled = false; // the next attempt must not take this one for done
+    adapter.indications_enabled = rc == CMPI_RC_OK;
     return rc;
 }
 
@@ -126,7 +122,8 @@ CMPIrc disable(CMPI_Adapter& adapter)
 {
     if (!adapter.indications_enabled)
         return CMPI_RC_OK;
-    const CMPIrc rc = shielded("disable_indications", [&] { return to_rc(adapter.disable_indications()); });
+    const auto call = [&] { return to_rc(adapter.disable_indications()); };
+    const CMPIrc rc = shielded("disable_indications", call);
     adapter.indications_enabled = false;
     return rc;
 }
@@ -146,8 +143,7 @@ CMPIStatus CMPI_Adapter::authorizeFilter(CMPIIndicationMI* mi, const CMPIContext
     return serve_alone("authorizeFilter", mi, [](CMPI_Adapter&) { return CMPI_RC_OK; });
 }
 
-CMPIStatus CMPI_Adapter::mustPoll(CMPIIndicationMI* mi, const CMPIContext*, const CMPISelectExp*, const char*,
-                                  const CMPIObjectPath*) noexcept
+CMPIStatus CMPI_Adapter::never_poll(CMPIIndicationMI* mi) noexcept
 {
     return serve_alone("mustPoll", mi, [](CMPI_Adapter&) { return CMPI_RC_OK; });
 }

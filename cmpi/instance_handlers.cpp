@@ -24,9 +24,7 @@ CMPIrc send_instance(const Answer& answer, Instance* object)
 {
     CMPI_Ptr<CMPIObjectPath> path;
     CMPI_Ptr<CMPIInstance> cmpi_instance;
-    CMPIrc rc = make_cmpi_object_path(answer.broker, object, answer.name_space.c_str(), path);
-    if (rc == CMPI_RC_OK)
-        rc = make_cmpi_instance(answer.broker, object, answer.name_space.c_str(), path.get(), answer.properties, cmpi_instance);
+    const CMPIrc rc = make_cmpi_object(answer.broker, object, answer.name_space.c_str(), answer.properties, path, cmpi_instance);
     if (rc == CMPI_RC_OK)
         CMReturnInstance(answer.result, cmpi_instance.get());
     return rc;
@@ -55,7 +53,7 @@ CMPIrc enumerate_names(CMPI_Adapter& adapter, const CMPIContext* context, const 
     if (rc != CMPI_RC_OK)
         return rc;
 
-    Answer answer{adapter.broker, context, result, name_space_of(path), nullptr};
+    Answer answer{.broker = adapter.broker, .context = context, .result = result, .name_space = name_space_of(path)};
     const auto status = adapter.enum_instances(model.ptr(), answer_with<send_path>, &answer);
     rc = to_rc(status);
     if (rc == CMPI_RC_OK)
@@ -78,7 +76,11 @@ CMPIrc enumerate(CMPI_Adapter& adapter, const CMPIContext* context, const CMPIRe
         filter_properties(model.ptr(), properties, true);
     }
 
-    Answer answer{adapter.broker, context, result, name_space_of(path), properties};
+    Answer answer{.broker = adapter.broker,
+                  .context = context,
+                  .result = result,
+                  .name_space = name_space_of(path),
+                  .properties = properties};
     rc = to_rc(adapter.enum_instances(model.ptr(), answer_with<send_instance>, &answer));
     if (rc == CMPI_RC_OK)
         rc = answer.rc;

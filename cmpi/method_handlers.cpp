@@ -9,6 +9,12 @@ namespace zmlr
 namespace
 {
 
+bool is_class_path(const CMPIObjectPath* path)
+{
+    CMPIStatus status = {CMPI_RC_OK, nullptr};
+    return CMGetKeyCount(path, &status) == 0 && okay(status);
+}
+
 CMPIrc invoke(CMPI_Adapter& adapter, const CMPIResult* result, const CMPIObjectPath* path, const char* name, const CMPIArgs* in,
               CMPIArgs* out)
 {
@@ -18,7 +24,7 @@ CMPIrc invoke(CMPI_Adapter& adapter, const CMPIResult* result, const CMPIObjectP
     const Meta_Method* method = name ? find_method(meta_class, name) : nullptr;
     if (!method)
         return CMPI_RC_ERR_METHOD_NOT_FOUND;
-    if ((method->flags & Flag_Static) && CMGetKeyCount(path, nullptr) != 0)
+    if ((method->flags & Flag_Static) && !is_class_path(path))
         return CMPI_RC_ERR_FAILED; // a static method is called on the class
 
     Ref<Instance> target;

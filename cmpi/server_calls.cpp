@@ -46,7 +46,7 @@ void copy_outputs(Instance* dest, const Instance* src)
     {
         const Meta_Feature* feature = record->meta_features[i];
         Value value;
-        if ((feature->flags & Flag_Out) && value.set(src, feature) == 0)
+        if ((feature->flags & Flag_Out) && value.borrow(src, feature) == 0)
             value.get(dest, feature);
     }
 }
@@ -167,7 +167,8 @@ int CMPI_Thread_Context::invoke_method(const char* name_space, const Instance* i
         return -1;
 
     Ref<Instance> answer(clone(method)); // the conversion begins with nulls: the inputs stay out of its way
-    CMPIArgs_Container(repository, _cmpi_broker, name_space, out.get()).convert(nullptr, Flag_Out, answer);
+    if (CMPIArgs_Container(repository, _cmpi_broker, name_space, out.get()).convert(nullptr, Flag_Out, answer) != 0)
+        return -1;
     const Meta_Feature* return_value = record_of(method)->meta_features[record_of(method)->num_meta_features - 1];
     Value value;
     if (cmpi_to_cimple_value(repository, _cmpi_broker, name_space, data, value) == 0)

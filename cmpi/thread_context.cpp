@@ -119,6 +119,18 @@ bool works_for(const Thread_Context* context, const CMPI_Adapter* adapter)
     return context != nullptr;
 }
 
+bool works_for_a_leaving(const Thread_Context* context)
+{
+    for (; context; context = context->below())
+    {
+        const auto* cmpi_context = static_cast<const CMPI_Thread_Context*>(context);
+        const Gate_Pass pass(cmpi_context->gate()); // a provider thread's adapter may be gone
+        if (pass && cmpi_context->cmpi_adapter()->requests.is_shut())
+            return true;
+    }
+    return false;
+}
+
 CMPI_Thread_Context_Pusher::CMPI_Thread_Context_Pusher(const CMPIBroker* cmpi_broker, const CMPIContext* cmpi_context,
                                                        CMPI_Adapter* cmpi_adapter)
 {

@@ -67,6 +67,9 @@ private:
 // way on this thread, or the thread is the provider's own.
 bool works_for(const Thread_Context* context, const CMPI_Adapter* adapter);
 
+// Whether a context or one below it works for an adapter that is on its way out, and is waited for there.
+bool works_for_a_leaving(const Thread_Context* context);
+
 // Puts a context on the calling thread's stack for a scope. None of the arguments may be null, and contexts pushed
 // meanwhile must be gone at its end: anything else is an internal-consistency failure.
 class CMPI_Thread_Context_Pusher

@@ -53,14 +53,14 @@ int to_cmpi_scalar(const Target&, CMPIType type, char16 x, CMPI_Data& data)
 
 int to_cmpi_scalar(const Target& target, CMPIType, const String& x, CMPI_Data& data)
 {
-    return data.adopt(CMNewString(target.broker, x.c_str(), nullptr)) ? 0 : failed("CMNewString() failed");
+    return data.adopt(CMPI_string, CMNewString(target.broker, x.c_str(), nullptr)) ? 0 : failed("CMNewString() failed");
 }
 
 int to_cmpi_scalar(const Target& target, CMPIType, const Datetime& x, CMPI_Data& data)
 {
     char text[Datetime::text_size];
     x.ascii(text);
-    const bool made = data.adopt(CMNewDateTimeFromChars(target.broker, text, nullptr));
+    const bool made = data.adopt(CMPI_dateTime, CMNewDateTimeFromChars(target.broker, text, nullptr));
     return made ? 0 : failed("CMNewDateTimeFromChars() failed");
 }
 
@@ -81,7 +81,7 @@ int to_cmpi_scalar(const Target& target, CMPIType type, const Instance* instance
     if (CMPIObjectPath_Container(target.repository, target.broker, name_space, path.get()).convert(instance, Flag_Key) != 0)
         return failed("Container::convert() failed");
     if (type == CMPI_ref)
-        return data.adopt(path.release()) ? 0 : -1;
+        return data.adopt(CMPI_ref, path.release()) ? 0 : -1;
     if (type != CMPI_instance)
         return failed("unexpected type");
 
@@ -90,7 +90,7 @@ int to_cmpi_scalar(const Target& target, CMPIType type, const Instance* instance
         return failed("CMNewInstance() failed");
     if (CMPIInstance_Container(target.repository, target.broker, name_space, embedded.get()).convert(instance, 0) != 0)
         return failed("Container::convert() failed");
-    return data.adopt(embedded.release()) ? 0 : -1;
+    return data.adopt(CMPI_instance, embedded.release()) ? 0 : -1;
 }
 
 // ---- arrays ----
@@ -100,16 +100,18 @@ template <class T> int to_cmpi_array(const Target& target, CMPIType element_type
     CMPI_Ptr<CMPIArray> array(CMNewArray(target.broker, elements.size(), element_type, nullptr));
     if (!array)
         return failed("CMNewArray() failed");
-    std::vector<CMPI_Data> made(elements.size());
+    std::vector<CMPI_Data> made; // what the elements point to
     for (uint32 i = 0; i < elements.size(); ++i)
     {
-        CMPI_Data& element = made[i];
+        CMPI_Data element;
         if (to_cmpi_scalar(target, element_type, elements[i], element) != 0)
             return failed("element conversion failed");
         if (!okay(CMSetArrayElementAt(array.get(), i, element.value(), element.type())))
             return failed("CMSetArrayElementAt() failed");
+        if (element.owns())
+            made.push_back(std::move(element));
     }
-    return data.adopt(array.release(), element_type, std::move(made)) ? 0 : -1;
+    return data.adopt(static_cast<CMPIType>(element_type | CMPI_ARRAY), array.release(), std::move(made)) ? 0 : -1;
 }
 
 template <class T> int to_cmpi(const Target& target, CMPIType element_type, const Value& value, CMPI_Data& data)

@@ -1,8 +1,8 @@
 // Array<T>: a growable sequence held by value (one handle of pointer size; copies copy every element).
 //
 // An empty array takes no memory of its own until something is put into it. Elements given to an operation may be the
-// array's own. A position past the end is an internal-consistency failure; more than 2^31 elements are
-// std::bad_array_new_length. When memory runs out the array keeps what it had.
+// array's own. Where something is inserted or removed a position past the end is an internal-consistency failure; [] does not
+// look. More than 2^31 elements are std::bad_array_new_length. When memory runs out the array keeps what it had.
 #pragma once
 
 #include "runtime/datetime.h"

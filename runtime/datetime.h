@@ -55,8 +55,8 @@ public:
     // Reads the 25-character form; false (and no change) when the text is not one.
     bool set(const char* text);
 
-    // Writes the 25-character form to a buffer of text_size bytes, or the prettified form to one of pretty_text_size. What
-    // does not fit (a year of five digits) is cut.
+    // Writes the 25-character form to a buffer of text_size bytes, or the prettified form to one of pretty_text_size. What no
+    // such text can tell (days of nine digits, a year of five) is written as the nearest that one can.
     void ascii(char* buffer, bool prettify = false) const;
     String ascii(bool prettify = false) const;
     void print(std::FILE* stream, bool prettify = false) const; // the text and a newline

@@ -2,6 +2,7 @@
 #include "runtime/datetime.h"
 
 #include <algorithm>
+#include <cstdlib>
 #include <cstring>
 #include <ctime>
 
@@ -120,25 +121,96 @@ bool Datetime::set(const char* text)
     }
 }
 
+namespace
+{
+
+// Writes fields of fixed width one after the other, each with its separator where the text is for people.
+class Field_Writer
+{
+public:
+    Field_Writer(char* buffer, bool prettify) : _next(buffer), _prettify(prettify) {}
+
+    void number(uint32 value, int width)
+    {
+        for (int i = width; i-- > 0; value /= 10)
+            _next[i] = static_cast<char>('0' + value % 10);
+        _next += width;
+    }
+    void number_and(char separator, uint32 value, int width)
+    {
+        number(value, width);
+        if (_prettify)
+            character(separator);
+    }
+    void character(char c) { *_next++ = c; }
+
+private:
+    char* _next;
+    bool _prettify;
+};
+
+// The nearest time that four digits of a year can tell.
+Calendar_Time to_writable_calendar(uint64 usec)
+{
+    const Calendar_Time time = to_calendar(usec);
+    const int year = time.fields.tm_year + 1900;
+    if (year >= 0 && year <= 9999)
+        return time;
+
+    Calendar_Time nearest{};
+    std::tm& fields = nearest.fields;
+    fields.tm_year = -1900;
+    fields.tm_mday = 1;
+    if (year > 0)
+    {
+        fields.tm_year = 9999 - 1900;
+        fields.tm_mon = 11;
+        fields.tm_mday = 31;
+        fields.tm_hour = 23;
+        fields.tm_min = fields.tm_sec = 59;
+        nearest.microseconds = 999'999;
+    }
+    return nearest;
+}
+
+void write_interval(Field_Writer& out, const Datetime& interval)
+{
+    constexpr uint64 longest = 100'000'000 * Datetime::DAY - 1; // in eight digits of days
+    const uint64 length = std::min(interval.usec(), longest);
+    const auto field = [](uint64 value) { return static_cast<uint32>(value); };
+    out.number_and(' ', field(length / Datetime::DAY), 8);
+    out.number_and(' ', field(length / Datetime::HOUR % 24), 2);
+    out.number_and(' ', field(length / Datetime::MIN % 60), 2);
+    out.number(field(length / Datetime::SEC % 60), 2);
+    out.character('.');
+    out.number(field(length % Datetime::SEC), 6);
+    out.character(':');
+    out.number(0, 3);
+}
+
+void write_timestamp(Field_Writer& out, const Datetime& timestamp)
+{
+    const Calendar_Time time = to_writable_calendar(timestamp.usec());
+    const auto field = [](int value) { return static_cast<uint32>(value); };
+    out.number_and('/', field(time.fields.tm_year + 1900), 4);
+    out.number_and('/', field(time.fields.tm_mon + 1), 2);
+    out.number_and(' ', field(time.fields.tm_mday), 2);
+    out.number_and(':', field(time.fields.tm_hour), 2);
+    out.number_and(':', field(time.fields.tm_min), 2);
+    out.number(field(time.fields.tm_sec), 2);
+    out.character('.');
+    out.number(time.microseconds, 6);
+    out.character(timestamp.offset() < 0 ? '-' : '+');
+    out.number(field(std::abs(std::clamp(timestamp.offset(), -999, 999))), 3);
+}
+
+} // namespace
+
 void Datetime::ascii(char* buffer, bool prettify) const
 {
-    const std::size_t size = prettify ? pretty_text_size : text_size;
-    if (is_interval())
-    {
-        uint32 days, hours, minutes, seconds, microseconds;
-        get_interval(days, hours, minutes, seconds, microseconds);
-        const char* format = prettify ? "%08u %02u %02u %02u.%06u:000" : "%08u%02u%02u%02u.%06u:000";
-        std::snprintf(buffer, size, format, days, hours, minutes, seconds, microseconds);
-        return;
-    }
-
-    const Calendar_Time time = to_calendar(usec());
-    const std::tm& fields = time.fields;
-    const char* format = prettify ? "%04d/%02d/%02d %02d:%02d:%02d.%06u%c%03u" : "%04d%02d%02d%02d%02d%02d.%06u%c%03u";
-    const char sign = offset() < 0 ? '-' : '+';
-    const uint32 magnitude = offset() < 0 ? 0U - static_cast<uint32>(offset()) : static_cast<uint32>(offset());
-    std::snprintf(buffer, size, format, fields.tm_year + 1900, fields.tm_mon + 1, fields.tm_mday, fields.tm_hour, fields.tm_min,
-                  fields.tm_sec, time.microseconds, sign, magnitude);
+    Field_Writer out(buffer, prettify);
+    is_interval() ? write_interval(out, *this) : write_timestamp(out, *this);
+    out.character('\0');
 }
 
 String Datetime::ascii(bool prettify) const

@@ -1,4 +1,5 @@
-// How the runtime itself walks the features of a record and checks the instances it is given.
+// How generic code walks the features of a record and checks the instances it is given: for the sources of runtime/, for the
+// conversion of cmpi/ and for tests; whoever knows the class of an instance reads its fields.
 #pragma once
 
 #include "runtime/assert.h"

@@ -67,7 +67,8 @@ template <class T> T* cast(Instance* instance)
 }
 template <class T> const T* cast(const Instance* instance) { return cast<T>(const_cast<Instance*>(instance)); }
 
-// Copies between instances of one class: null flags and values; a reference is replaced by a clone of the source's.
+// Copies between instances of one class: null flags and values; a reference is replaced by a clone of the source's. When memory
+// runs out on the way (std::bad_alloc), the features before are copied already and the others are as they were.
 void copy(Instance* dest, const Instance* src);
 void copy(Instance* dest, const Instance* src, const Instance* model); // only what is non-null in the model
 void copy_keys(Instance* dest, const Instance* src);

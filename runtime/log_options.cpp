@@ -16,7 +16,7 @@ namespace zmlr
 namespace
 {
 
-constexpr int max_lines = 1024; // a file of any length ends here
+constexpr long max_size = 16L << 20; // bytes: no file of options is longer, and a sparse one of terabytes ends here
 
 using File = std::unique_ptr<std::FILE, int (*)(std::FILE*)>;
 
@@ -61,7 +61,7 @@ bool _get_opt_value(const char* path, const char* name, char (&value)[option_lin
 {
     const File file = open_options(path);
     char line[option_line_size];
-    for (int i = 0; i < max_lines && file && std::fgets(line, sizeof(line), file.get()); ++i)
+    while (file && std::fgets(line, sizeof(line), file.get()) && std::ftell(file.get()) <= max_size)
     {
         trim_end(line);
         if (const char* found = value_in(line, name))

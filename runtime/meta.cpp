@@ -1,7 +1,6 @@
 #include "runtime/meta.h"
 
 #include "runtime/features.h"
-#include "runtime/name_index.h"
 #include "runtime/string.h"
 
 #include <span>
@@ -13,19 +12,6 @@ namespace
 {
 
 template <class T> bool is_named(const T* meta, const char* name) { return eqi(meta->name, name); }
-
-const Meta_Feature* find_in(const Meta_Record* record, const char* name, uint32 kind_mask)
-{
-    if (const Record_Entry* entry = find_entry(record))
-    {
-        const Meta_Feature* feature = find_feature(*entry, name);
-        return feature && (feature->flags & kind_mask) != 0 ? feature : nullptr;
-    }
-    for (const Meta_Feature* feature : features_of(record))
-        if ((feature->flags & kind_mask) != 0 && is_named(feature, name))
-            return feature;
-    return nullptr;
-}
 
 } // namespace
 
@@ -48,9 +34,6 @@ const Meta_Class* find_meta_class(const Meta_Repository* repository, const char*
 {
     if (!repository)
         return nullptr;
-    const Repository_Index* index = &own_repository_index;
-    if (index && index->repository == repository)
-        return find_meta_class(*index, name);
     for (const Meta_Class* meta_class : std::span(repository->meta_classes, repository->num_meta_classes))
         if (is_named(meta_class, name))
             return meta_class;
@@ -59,11 +42,9 @@ const Meta_Class* find_meta_class(const Meta_Repository* repository, const char*
 
 const Meta_Class* find_meta_class(const Meta_Class* meta_class, const char* name)
 {
-    // The ancestors of an indexed class are indexed too, and no two classes there share a name.
-    if (!find_entry(meta_class))
-        for (const Meta_Class* c = meta_class; c; c = c->super_meta_class)
-            if (is_named(c, name))
-                return c;
+    for (const Meta_Class* c = meta_class; c; c = c->super_meta_class)
+        if (is_named(c, name))
+            return c;
     return find_meta_class(meta_class->meta_repository, name);
 }
 
@@ -79,34 +60,37 @@ bool is_subclass(const Meta_Class* ancestor, const Meta_Class* descendant)
     return false;
 }
 
-const Meta_Feature* find_feature(const Meta_Class* meta_class, const char* name, uint32 kind_mask)
+const Meta_Feature* find_feature(const Meta_Record* record, const char* name, uint32 kind_mask)
 {
-    return find_in(meta_class, name, kind_mask);
+    for (const Meta_Feature* feature : features_of(record))
+        if ((feature->flags & kind_mask) != 0 && is_named(feature, name))
+            return feature;
+    return nullptr;
 }
 
 const Meta_Property* find_property(const Meta_Class* meta_class, const char* name)
 {
-    return as_property(find_in(meta_class, name, Flag_Property));
+    return as_property(find_feature(meta_class, name, Flag_Property));
 }
 
 const Meta_Reference* find_reference(const Meta_Class* meta_class, const char* name)
 {
-    return as_reference(find_in(meta_class, name, Flag_Reference));
+    return as_reference(find_feature(meta_class, name, Flag_Reference));
 }
 
 const Meta_Method* find_method(const Meta_Class* meta_class, const char* name)
 {
-    return as_method(find_in(meta_class, name, Flag_Method));
+    return as_method(find_feature(meta_class, name, Flag_Method));
 }
 
 const Meta_Feature* find_parameter(const Meta_Method* meta_method, const char* name, uint32 kind_mask)
 {
-    return find_in(meta_method, name, kind_mask);
+    return find_feature(meta_method, name, kind_mask);
 }
 
 const Meta_Reference* find_reference(const Meta_Method* meta_method, const char* name)
 {
-    return as_reference(find_in(meta_method, name, Flag_Reference));
+    return as_reference(find_feature(meta_method, name, Flag_Reference));
 }
 
 bool has_feature(const Meta_Class* meta_class, uint32 kind_mask)

@@ -139,12 +139,11 @@ inline const Meta_Property* as_property(const Meta_Feature* feature) { return st
 inline const Meta_Reference* as_reference(const Meta_Feature* feature) { return static_cast<const Meta_Reference*>(feature); }
 inline const Meta_Method* as_method(const Meta_Feature* feature) { return static_cast<const Meta_Method*>(feature); }
 
-// Look-up; names are compared without regard to case. Each returns null (or the stated value) when nothing matches. In the
-// module's own repository one full comparison of names decides (name_index.h).
+// Look-up; names are compared without regard to case. Each returns null (or the stated value) when nothing matches.
 const Meta_Class* find_meta_class(const Meta_Repository* repository, const char* name);
 const Meta_Class* find_meta_class(const Meta_Class* meta_class, const char* name); // itself, an ancestor, or its repository
 bool is_subclass(const Meta_Class* ancestor, const Meta_Class* descendant);
-const Meta_Feature* find_feature(const Meta_Class* meta_class, const char* name,
+const Meta_Feature* find_feature(const Meta_Record* record, const char* name,
                                  uint32 kind_mask = Flag_Property | Flag_Reference | Flag_Method);
 const Meta_Property* find_property(const Meta_Class* meta_class, const char* name);
 const Meta_Reference* find_reference(const Meta_Class* meta_class, const char* name);

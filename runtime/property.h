@@ -18,12 +18,6 @@ template <class T> struct Property
         value = x;
         null = 0;
     }
-
-    void clear()
-    {
-        value = T();
-        null = 1;
-    }
 };
 
 } // namespace zmlr

@@ -3,87 +3,11 @@
 #include "runtime/features.h"
 #include "runtime/log.h"
 
-#include <array>
-#include <type_traits>
+#include <cstring>
+#include <utility>
 
 namespace zmlr
 {
-
-// The view of a content by the type code, through tables that are indexed as its alternatives are.
-struct Value_Access
-{
-    using Content = Value::Content;
-
-    static constexpr std::size_t num_scalars = num_types + 1; // with INSTANCE
-    static_assert(std::variant_size_v<Content> == 1 + 2 * num_scalars);
-
-    static Value::Type type_at(std::size_t index)
-    {
-        const std::size_t code = index <= num_scalars ? index - 1 : index - 1 - num_scalars + Value::BOOLEAN_ARRAY;
-        return index == 0 ? Value::NONE : static_cast<Value::Type>(code);
-    }
-
-    // The index of a type's alternative; 0 for NONE and for what is no type.
-    static std::size_t index_of(Value::Type type)
-    {
-        const auto code = static_cast<std::size_t>(type);
-        if (code < num_scalars)
-            return 1 + code;
-        const std::size_t element = code - Value::BOOLEAN_ARRAY;
-        return element < num_scalars ? 1 + num_scalars + element : 0;
-    }
-
-    template <class T> static Content load(const void* data)
-    {
-        if constexpr (std::is_same_v<T, std::monostate>)
-            return {};
-        else
-            return data ? Content(std::in_place_type<T>, *static_cast<const T*>(data)) : Content(std::in_place_type<T>);
-    }
-
-    template <class T> static void store(const Content& content, void* data)
-    {
-        if constexpr (!std::is_same_v<T, std::monostate>)
-            *static_cast<T*>(data) = *std::get_if<T>(&content);
-    }
-
-    template <std::size_t... I> static Content load(std::size_t index, const void* data, std::index_sequence<I...>)
-    {
-        static constexpr std::array table = {&load<std::variant_alternative_t<I, Content>>...};
-        return table[index](data);
-    }
-
-    template <std::size_t... I> static void store(const Content& content, void* data, std::index_sequence<I...>)
-    {
-        static constexpr std::array table = {&store<std::variant_alternative_t<I, Content>>...};
-        table[content.index()](content, data);
-    }
-
-    using All = std::make_index_sequence<std::variant_size_v<Content>>;
-
-    // The value of a type that lies at the address, or the type's zero value when there is none.
-    static Content content_at(Value::Type type, const void* data) { return load(index_of(type), data, All()); }
-    static void store_at(const Content& content, void* data) { store(content, data, All()); }
-
-    template <class Action> static void for_each_instance(const Content& content, Action action)
-    {
-        if (Instance* const* instance = std::get_if<Instance*>(&content))
-            action(*instance);
-        else if (const auto* instances = std::get_if<Array<Instance*>>(&content))
-            for (const Instance* element : *instances)
-                action(element);
-    }
-
-    static void ref_all(const Content& content)
-    {
-        for_each_instance(content, [](const Instance* instance) { ref(instance); });
-    }
-
-    static void unref_all(const Content& content)
-    {
-        for_each_instance(content, [](const Instance* instance) { unref(instance); });
-    }
-};
 
 namespace
 {
@@ -91,6 +15,34 @@ namespace
 constexpr const char* log_source = "Value";
 
 Log_Call_Frame warning(int line = __builtin_LINE()) { return {LL_WARN, log_source, line}; }
+
+bool is_array(Value::Type type) { return type >= Value::BOOLEAN_ARRAY; }
+
+Value::Type element_of(Value::Type type) { return is_array(type) ? static_cast<Value::Type>(type - Value::BOOLEAN_ARRAY) : type; }
+
+// How a scalar, or an array's element, is made and destroyed.
+const __Array_Traits& traits_of(Value::Type type)
+{
+    const Value::Type element = element_of(type);
+    return element == Value::INSTANCE ? __pointer_array_traits : __cim_array_traits[element];
+}
+
+template <class Action> void for_each_instance(const Value& value, Action action)
+{
+    if (Instance* const* instance = value.get_if<Instance*>())
+        action(*instance);
+    else if (const auto* instances = value.get_if<Array<Instance*>>())
+        for (const Instance* element : *instances)
+            action(element);
+}
+
+void ref_all(const Value& value)
+{
+    for_each_instance(value, [](const Instance* instance) { ref(instance); });
+}
+
+// Bytes that a value of the type takes in an instance.
+std::size_t size_of(Value::Type type) { return is_array(type) ? sizeof(__Array_Rep*) : traits_of(type).elem_size; }
 
 } // namespace
 
@@ -106,78 +58,128 @@ Value::Type type_of(const Meta_Feature* feature)
     return Value::NONE;
 }
 
-Value::Value(const Value& x) : _type(x._type), _null(x._null), _content(x._content) { Value_Access::ref_all(_content); }
-
-Value::Value(Value&& x) noexcept : _type(x._type), _null(x._null), _content(std::move(x._content))
+Value::Value(const Value& x) : _null(x._null)
 {
-    // What was moved out must not be released twice.
-    x._content = std::monostate();
-    x.clear();
+    construct(x._type, x.content());
+    ref_all(*this);
 }
+
+Value::Value(Value&& x) noexcept { swap(x); }
 
 Value& Value::operator=(Value x) noexcept
 {
+    swap(x);
+    return *this;
+}
+
+// Handles hold no pointer to themselves: their bytes may move.
+void Value::swap(Value& x) noexcept
+{
     std::swap(_type, x._type);
     std::swap(_null, x._null);
-    std::swap(_content, x._content);
-    return *this;
+    std::swap(_owned, x._owned);
+    std::swap(_elsewhere, x._elsewhere);
+    std::swap(_held, x._held);
 }
 
 void Value::clear() noexcept
 {
-    Value_Access::unref_all(_content);
-    _content = std::monostate();
+    if (_owned && _type != NONE)
+    {
+        for_each_instance(*this, [](const Instance* instance) { unref(instance); });
+        if (is_array(_type))
+            __destruct(reinterpret_cast<__Array_Rep*&>(_held));
+        else if (traits_of(_type).destruct)
+            traits_of(_type).destruct(_held, 1);
+    }
     _type = NONE;
     _null = true;
+    _owned = true;
+    _elsewhere = nullptr;
 }
 
-void Value::adopt(Content&& content) noexcept
+// Of an empty value. Nothing is held when it throws.
+void Value::construct(Type type, const void* x)
 {
-    clear();
-    _content = std::move(content);
-    _type = Value_Access::type_at(_content.index());
-    _null = false;
+    if (is_array(type))
+    {
+        auto& rep = reinterpret_cast<__Array_Rep*&>(_held);
+        if (x)
+            __construct(rep, *static_cast<const __Array_Rep* const*>(x));
+        else
+            __construct(rep, &traits_of(type));
+    }
+    else if (type != NONE)
+    {
+        const __Array_Traits& traits = traits_of(type);
+        if (traits.construct)
+            traits.construct(_held, x, 1);
+        else if (x)
+            std::memcpy(_held, x, traits.elem_size);
+        else
+            std::memset(_held, 0, sizeof(_held));
+    }
+    _type = type;
+}
+
+// The copy is made before anything is released: x may be a part of what is held.
+void Value::hold(Type type, const void* x)
+{
+    Value made;
+    made.construct(type, x);
+    made._null = false;
+    swap(made);
+}
+
+void Value::hold_moved(Type type, void* array)
+{
+    Value made;
+    made.construct(type, nullptr);
+    made._null = false;
+    std::swap(reinterpret_cast<__Array_Rep*&>(made._held), *static_cast<__Array_Rep**>(array));
+    swap(made);
 }
 
 void Value::set_null(Type type)
 {
-    adopt(Value_Access::content_at(type, nullptr));
+    hold(type, nullptr);
     _null = true;
 }
 
-int Value::set(const Instance* instance, const Meta_Feature* feature)
+int Value::borrow(const Instance* instance, const Meta_Feature* feature)
 {
     check_inst(instance);
-    const Type type = type_of(feature);
-    if (type == NONE)
-    {
-        clear();
-        return -1;
-    }
-
-    // Everything is read and referenced before adopt() may release the instance it is read from.
-    bool null = false;
-    Content content;
+    Value made;
+    made._owned = false;
+    made._type = type_of(feature);
     if (const Meta_Property* property = to_property(feature))
     {
-        content = Value_Access::content_at(type, address_of(instance, property->offset));
-        null = null_of(instance, property) != 0;
+        made._elsewhere = address_of(instance, property->offset);
+        made._null = null_of(instance, property) != 0;
     }
     else if (const Meta_Reference* array = to_array_reference(feature))
     {
-        content = references_of(instance, array);
-        null = null_of(instance, array) != 0;
+        made._elsewhere = address_of(instance, array->offset);
+        made._null = null_of(instance, array) != 0;
     }
-    else
+    else if (const Meta_Reference* single = to_single_reference(feature))
     {
-        auto* referenced = const_cast<Instance*>(reference_of(instance, as_reference(feature)));
-        content = referenced;
-        null = !referenced;
+        // The record's field is a pointer to its own class: only its value is taken.
+        const Instance* referenced = reference_of(instance, single);
+        std::memcpy(made._held, &referenced, sizeof(referenced));
+        made._null = !referenced;
     }
-    Value_Access::ref_all(content);
-    adopt(std::move(content));
-    _null = null;
-    return 0;
+    swap(made);
+    return _type == NONE ? -1 : 0;
+}
+
+// Everything is copied and referenced before the instance it is read from may be released.
+int Value::set(const Instance* instance, const Meta_Feature* feature)
+{
+    Value borrowed;
+    const int result = borrowed.borrow(instance, feature);
+    *this = Value(std::as_const(borrowed));
+    return result;
 }
 
 namespace
@@ -192,60 +194,55 @@ bool check_class(const Instance* referenced, const Instance* instance, const Met
     return false;
 }
 
-int store_reference(Instance* referenced, Instance* instance, const Meta_Reference* reference)
+// Whether the value may be stored into the feature.
+bool fits(const Value& value, const Instance* instance, const Meta_Feature* feature)
 {
-    if (!check_class(referenced, instance, reference))
-        return -1;
-    ref(referenced);
-    unref(std::exchange(reference_of(instance, reference), referenced));
-    return 0;
-}
-
-int store_references(const Array<Instance*>& referenced, Instance* instance, const Meta_Reference* reference)
-{
-    for (const Instance* element : referenced)
-        if (!check_class(element, instance, reference))
-            return -1;
-
-    Instance_Array stored;
-    for (Instance* element : referenced)
+    if (!instance)
     {
-        ref(element);
-        stored.adopt(Ref<Instance>(element));
+        warning().invoke("null instance argument");
+        return false;
     }
-    std::swap(references_of(instance, reference), static_cast<Array<Instance*>&>(stored));
-    return 0;
+    check_inst(instance);
+    if (value.type() == Value::NONE || value.type() != type_of(feature))
+    {
+        warning().invoke("type mismatch: %s.%s", record_of(instance)->name, feature->name);
+        return false;
+    }
+    bool good = true;
+    if (is_reference(feature))
+        for_each_instance(value, [&](const Instance* referenced)
+                          { good = good && check_class(referenced, instance, as_reference(feature)); });
+    return good;
 }
 
 } // namespace
 
 int Value::get(Instance* instance, const Meta_Feature* feature) const
 {
-    if (!instance)
-    {
-        warning().invoke("null instance argument");
-        return -1;
-    }
-    check_inst(instance);
-    if (_type == NONE || _type != type_of(feature))
-    {
-        warning().invoke("type mismatch: %s.%s", record_of(instance)->name, feature->name);
-        return -1;
-    }
+    return fits(*this, instance, feature) ? Value(*this).give(instance, feature) : -1;
+}
 
-    if (const Meta_Property* property = to_property(feature))
-    {
-        Value_Access::store_at(_content, address_of(instance, property->offset));
+int Value::give(Instance* instance, const Meta_Feature* feature)
+{
+    if (!fits(*this, instance, feature))
+        return -1;
+    if (!_owned)
+        *this = Value(std::as_const(*this));
+    if (_null && _type == INSTANCE)
+        set_null(INSTANCE); // unsets the reference
+
+    const Meta_Property* property = to_property(feature);
+    const Meta_Reference* reference = property ? nullptr : as_reference(feature);
+    void* place = address_of(instance, property ? property->offset : reference->offset);
+    unsigned char before[sizeof(_held)];
+    const std::size_t size = size_of(_type);
+    std::memcpy(before, place, size);
+    std::memcpy(place, _held, size);
+    std::memcpy(_held, before, size);
+    if (property)
         null_of(instance, property) = _null ? 1 : 0;
-        return 0;
-    }
-    if (const Meta_Reference* single = to_single_reference(feature))
-        return store_reference(_null ? nullptr : *get_if<Instance*>(), instance, single);
-
-    const Meta_Reference* array = as_reference(feature);
-    if (store_references(*get_if<Array<Instance*>>(), instance, array) != 0)
-        return -1;
-    null_of(instance, array) = _null ? 1 : 0;
+    else if (is_array(reference))
+        null_of(instance, reference) = _null ? 1 : 0;
     return 0;
 }
 

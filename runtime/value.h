@@ -7,8 +7,6 @@
 
 #include <concepts>
 #include <cstdio>
-#include <utility>
-#include <variant>
 
 namespace zmlr
 {
@@ -55,8 +53,8 @@ public:
     };
 #pragma GCC diagnostic pop
 
-    Value() = default; // NONE and null
-    Value(const Value& x);
+    Value() = default;     // NONE and null
+    Value(const Value& x); // holds a copy, also of what x only borrows
     Value(Value&& x) noexcept;
     Value& operator=(Value x) noexcept;
     ~Value() { clear(); }
@@ -71,9 +69,10 @@ public:
     // clang-format off
     template <class T>
         requires(!(std::convertible_to<T, const Instance*> || std::convertible_to<T, const char*>))
-    void set_value(const T& x) { adopt(Content(std::in_place_type<T>, x)); }
+    void set_value(const T& x) { hold(code_of<T>, &x); }
     // clang-format on
-    void set_value(Instance* x) { adopt(Content(x)); }
+    template <class T> void set_value(Array<T>&& x) { hold_moved(code_of<Array<T>>, &x); } // the elements move in
+    void set_value(Instance* x) { hold(INSTANCE, &x); }
     void set_value(const char* text) { set_value(String(text)); }
 
     // Copies the content out: 0, or -1 when x's type is not exactly the value's type. Instances are borrowed: they get no
@@ -88,7 +87,7 @@ public:
     }
 
     // The content (borrowed), or null when T is not exactly the value's type.
-    template <class T> const T* get_if() const { return std::get_if<T>(&_content); }
+    template <class T> const T* get_if() const { return _type == code_of<T> ? static_cast<const T*>(content()) : nullptr; }
 
     // A null value of the given type (NONE: as clear()).
     void set_null(Type type);
@@ -96,9 +95,15 @@ public:
     // Loads a property or reference of an instance (one more reference to each instance loaded): 0, or -1 for a method.
     int set(const Instance* instance, const Meta_Feature* feature);
 
+    // The same without a copy: the value reads the instance's own, and is good for as long as that one stays as it is.
+    int borrow(const Instance* instance, const Meta_Feature* feature);
+
     // Stores the value into a property or reference; -1 and a warning when instance, type or referenced class do not fit. An
     // instance stored gets one more reference; a null value unsets a reference.
     int get(Instance* instance, const Meta_Feature* feature) const;
+
+    // The same, but the content moves into the instance, and what was there before into the value.
+    int give(Instance* instance, const Meta_Feature* feature);
 
     // Writes the debug text: type, null flag and what is held, as a block.
     void fprint(std::FILE* stream) const;
@@ -107,18 +112,34 @@ public:
     static constexpr Type array_of(Type scalar) { return static_cast<Type>(scalar + 128); }
 
 private:
-    // The alternatives stand in the order of the type codes, scalars first.
-    using Content = std::variant<std::monostate, boolean, uint8, sint8, uint16, sint16, uint32, sint32, uint64, sint64, real32,
-                                 real64, char16, String, Datetime, Instance*, Array<boolean>, Array<uint8>, Array<sint8>,
-                                 Array<uint16>, Array<sint16>, Array<uint32>, Array<sint32>, Array<uint64>, Array<sint64>,
-                                 Array<real32>, Array<real64>, Array<char16>, Array<String>, Array<Datetime>, Array<Instance*>>;
-    friend struct Value_Access;
+    // The code of the type that a C++ type holds.
+    template <class T> struct Code
+    {
+        static constexpr Type value = static_cast<Type>(type_code<T>::value);
+    };
+    template <class T> static constexpr Type code_of = Code<T>::value;
 
-    void adopt(Content&& content) noexcept;
+    const void* content() const { return _elsewhere ? _elsewhere : _held; }
+    void hold(Type type, const void* x); // a copy of what lies there (null: the type's zero)
+    void hold_moved(Type type, void* array);
+    void construct(Type type, const void* x);
+    void swap(Value& x) noexcept;
 
     Type _type = NONE;
     bool _null = true;
-    Content _content;
+    bool _owned = true;                         // the content is to be released
+    const void* _elsewhere = nullptr;           // where the content lies when it is not held
+    alignas(void*) unsigned char _held[8] = {}; // every scalar, and the one handle of everything else
+};
+
+template <> struct Value::Code<Instance*>
+{
+    static constexpr Type value = INSTANCE;
+};
+
+template <class T> struct Value::Code<Array<T>>
+{
+    static constexpr Type value = array_of(Code<T>::value);
 };
 
 Value::Type type_of(const Meta_Feature* feature); // NONE for a method

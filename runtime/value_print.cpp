@@ -3,7 +3,6 @@
 #include "runtime/value.h"
 
 #include <cstdio>
-#include <variant>
 
 namespace zmlr
 {
@@ -11,9 +10,7 @@ namespace zmlr
 namespace
 {
 
-void print_content(std::FILE*, std::monostate) {}
-
-void print_content(std::FILE* stream, Instance* instance)
+void print_instance(std::FILE* stream, const Instance* instance)
 {
     if (instance)
         fprint(stream, instance);
@@ -21,32 +18,26 @@ void print_content(std::FILE* stream, Instance* instance)
         std::fputs("NULL\n", stream);
 }
 
-void print_content(std::FILE* stream, const Array<Instance*>& instances)
-{
-    for (Instance* instance : instances)
-        print_content(stream, instance);
-}
-
-template <class T> void print_content(std::FILE* stream, const Array<T>& array)
-{
-    print_indent(stream, 1);
-    print_array(stream, type_code<T>::value, &array);
-    std::fputc('\n', stream);
-}
-
-template <class T> void print_content(std::FILE* stream, const T& scalar)
-{
-    print_indent(stream, 1);
-    print_scalar(stream, type_code<T>::value, &scalar);
-    std::fputc('\n', stream);
-}
-
 } // namespace
 
 void Value::fprint(std::FILE* stream) const
 {
     std::fprintf(stream, "Value\n{\n    type=%s\n    null=%s\n", _type_name(_type), _null ? "true" : "false");
-    std::visit([stream](const auto& content) { print_content(stream, content); }, _content);
+    if (Instance* const* instance = get_if<Instance*>())
+        print_instance(stream, *instance);
+    else if (const auto* instances = get_if<Array<Instance*>>())
+        for (const Instance* element : *instances)
+            print_instance(stream, element);
+    else if (_type != NONE)
+    {
+        const bool array = _type >= BOOLEAN_ARRAY;
+        print_indent(stream, 1);
+        if (array)
+            print_array(stream, static_cast<zmlr::Type>(_type - BOOLEAN_ARRAY), content());
+        else
+            print_scalar(stream, static_cast<zmlr::Type>(_type), content());
+        std::fputc('\n', stream);
+    }
     std::fputs("}\n", stream);
 }
 

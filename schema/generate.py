@@ -1,8 +1,8 @@
 """Generates the C++ side of the classes: records, meta-data, provider skeletons and the server's qualifier table.
 
-usage: generate.py --output DIRECTORY --providers FILE MOF...
+usage: generate.py --output DIRECTORY --providers FILE [--omit CLASS]... MOF...
 
-The MOF files are compiled in the given order. Below the output directory:
+The MOF files are compiled in the given order. Omitted classes are read and not written. Below the output directory:
 
     schema/<Class>.h                          the record of a class and of its methods' parameters
     schema/meta_data.cpp, repository.h        the meta-data of all classes
@@ -32,7 +32,7 @@ import write_skeletons
 def main(arguments):
     options = _parse(arguments)
     try:
-        files = generate(options.mof, options.providers)
+        files = generate(options.mof, options.providers, options.omit)
         update(options.output, files)
     except (mof_model.Model_Error, pywbem.MOFCompileError, OSError) as error:
         print(f"generate.py: {error}", file=sys.stderr)
@@ -44,13 +44,14 @@ def _parse(arguments):
     parser = argparse.ArgumentParser(description="Generates C++ from MOF.")
     parser.add_argument("--output", type=pathlib.Path, required=True, help="directory of the generated files")
     parser.add_argument("--providers", type=pathlib.Path, required=True, help="the table of served classes")
+    parser.add_argument("--omit", action="append", default=[], metavar="CLASS", help="declared for servers only")
     parser.add_argument("mof", type=pathlib.Path, nargs="+", help="MOF files, in the order of compilation")
     return parser.parse_args(arguments)
 
 
-def generate(mof, providers_file):
+def generate(mof, providers_file, omitted=()):
     """All generated files: relative path -> content."""
-    classes = mof_model.load(mof)
+    classes = mof_model.load(mof, omitted)
     providers = write_skeletons.load_providers(providers_file, classes)
     files = {f"schema/{cls.name}.h": write_records.record_header(cls) for cls in classes}
     files["schema/repository.h"] = write_meta_data.repository_header(classes)

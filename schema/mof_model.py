@@ -110,8 +110,8 @@ class _Repository(pywbem.MOFWBEMConnection):
         self.compiled.append(NewClass)
 
 
-def load(files):
-    """The classes of the files, in their order. Raises Model_Error, OSError or pywbem.MOFCompileError."""
+def load(files, omitted=()):
+    """The classes of the files, in their order, but those that are omitted. Raises Model_Error, OSError or pywbem.MOFCompileError."""
     repository = _Repository()
     compiler = pywbem.MOFCompiler(repository, log_func=None)
     for file in files:
@@ -119,7 +119,8 @@ def load(files):
 
     classes = {}
     for compiled in repository.compiled:
-        classes[compiled.classname.lower()] = _resolve(compiled, classes)
+        if compiled.classname not in omitted:
+            classes[compiled.classname.lower()] = _resolve(compiled, classes)
     result = list(classes.values())
     _check_references(result)
     return result

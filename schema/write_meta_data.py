@@ -27,11 +27,10 @@ def repository_header(classes):
 
 def meta_data_source(classes):
     repository = repository_name(classes)
-    includes = ["runtime/name_index.h", "schema/repository.h"] + [f"schema/{cls.name}.h" for cls in classes]
+    includes = ["schema/repository.h"] + [f"schema/{cls.name}.h" for cls in classes]
     sections = [_layout_assertions()]
     sections += [_class_section(cls, repository) for cls in classes]
     sections.append(_repository(classes, repository))
-    sections.append(_repository_index(classes, repository))
     return (
         BANNER
         + "".join(f'#include "{include}"\n' for include in sorted(includes))
@@ -53,7 +52,6 @@ def _class_section(cls, repository):
             parts.append(_method(feature) if feature.is_method else _field(feature, _feature_object(feature), cls.name))
     parts.append(_inherited_offsets(cls))
     parts.append(_feature_array(f"_{cls.name}_MFA", [_feature_object(feature) for feature in cls.features]))
-    parts.append(_feature_index(f"_{cls.name}_MFA_index", cls.features))
     parts.append(_meta_class(cls, repository))
     return "\n".join(part for part in parts if part)
 
@@ -106,11 +104,6 @@ def _feature_array(name, objects):
     return f"constinit const Meta_Feature* const {name}[] = {{\n{rows}}};"
 
 
-def _feature_index(name, features):
-    rows = "".join(f"    {{name_hash({string_literal(feature.name)}), {i}}},\n" for i, feature in enumerate(features))
-    return f"constinit const auto {name} = by_distinct_hash<Feature_Entry>({{\n{rows}}});"
-
-
 def _method(method):
     """The parameter objects of a method and its Meta_Method."""
     record = method_record(method)
@@ -118,7 +111,6 @@ def _method(method):
     names = [f"{prefix}_{parameter.name}" for parameter in method.parameters]
     parts = [_field(parameter, name, record) for parameter, name in zip(method.parameters, names)]
     parts.append(_feature_array(f"{prefix}_MFA", names))
-    parts.append(_feature_index(f"{prefix}_MFA_index", method.parameters))
     parts.append(
         f"constinit const Meta_Method {record}::static_meta_class ="
         f" {{{{{{{_head(method.flags, method.name)}}}, {prefix}_MFA, {len(names)}, sizeof({record})}},"
@@ -154,27 +146,3 @@ def _repository(classes, repository):
         f"constinit const Meta_Class* const _meta_classes[] = {{\n{rows}}};\n"
         f"constinit const Meta_Repository {repository} = {{_meta_classes, {len(classes)}}};"
     )
-
-
-def _repository_index(classes, repository):
-    """Beside the repository, because its records have no field for it."""
-    methods = [method for cls in classes for method in cls.methods if cls.is_local(method)]
-    return (
-        "// How its classes and their features are found by name\n"
-        + _record_index("_class_index", "by_distinct_hash", [(cls.name, cls.name, cls.name) for cls in classes])
-        + _record_index(
-            "_method_index",
-            "by_hash",
-            [(method.name, method_record(method), f"{method.owner}_{method.name}") for method in methods],
-        )
-        + f"constinit const Repository_Index own_repository_index = {{&{repository}, _class_index, _method_index}};"
-    )
-
-
-def _record_index(name, order, records):
-    """Records are given by their name, the type that has their static_meta_class, and the prefix of their feature index."""
-    rows = "".join(
-        f"    {{name_hash({string_literal(record_name)}), &{record}::static_meta_class, _{prefix}_MFA_index.data()}},\n"
-        for record_name, record, prefix in records
-    )
-    return f"constinit const auto {name} = {order}<Record_Entry>({{\n{rows}}});\n"

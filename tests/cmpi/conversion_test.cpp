@@ -166,6 +166,45 @@ TEST_F(Conversion, leaves_no_object_with_the_broker_in_a_long_request)
 
 // ---- what cannot be converted ----
 
+// Counts of a server that cannot count; and how often it is asked for an item.
+int fetched;
+constexpr auto no_count = [](auto, CMPIStatus* status) -> CMPICount
+{
+    *status = {CMPI_RC_ERR_FAILED, nullptr};
+    return 0xFFFFFFFF;
+};
+
+TEST_F(Conversion, fails_when_the_server_cannot_count_and_fetches_each_item_once)
+{
+    const Meta_Class* meta_class = &TST_Disk::static_meta_class;
+    Ref<Instance> made;
+    CMPIInstanceFT properties = Instance_Object::table;
+    CMPIObjectPathFT keys = Path_Object::table;
+    CMPIArgsFT arguments = cimserver::Args_Object::table;
+    const CMPIInstance instance = {&properties, &properties};
+    const CMPIObjectPath object_path = {&keys, &keys};
+    const CMPIArgs args = {&arguments, &arguments};
+    properties.getPropertyCount = no_count;
+    keys.getKeyCount = no_count;
+    arguments.getArgCount = no_count;
+    const auto convert = [&] { return make_cimple_instance(broker.face(), meta_class, path("TST_Disk"), &instance, made); };
+    EXPECT_EQ(convert(), CMPI_RC_ERR_FAILED);
+    EXPECT_EQ(make_cimple_reference(broker.face(), meta_class, &object_path, made), CMPI_RC_ERR_FAILED);
+    EXPECT_EQ(make_cimple_method(broker.face(), meta_class, find_method(meta_class, "Convert"), path("TST_Disk"), &args, made),
+              CMPI_RC_ERR_FAILED);
+
+    fetched = 0;
+    properties.getPropertyCount = [](auto...) { return CMPICount{3}; };
+    properties.getPropertyAt = [](const CMPIInstance*, CMPICount, CMPIString** name, CMPIStatus*)
+    {
+        ++fetched;
+        *name = make<cimserver::String_Object>("Uint8Value").face();
+        return CMPIData{CMPI_uint8, CMPI_goodValue, {.uint8 = 7}};
+    };
+    EXPECT_EQ(convert(), CMPI_RC_OK);
+    EXPECT_EQ(fetched, 3);
+}
+
 TEST_F(Conversion, refuses_data_that_are_no_value)
 {
     const auto of_array = [](CMPIType declared, CMPIType type, Values elements) -> CMPIData
@@ -270,10 +309,11 @@ TEST_F(Conversion, tells_of_every_call_that_fails)
     calls_until_failure = -1;
     let_fail<&E::newInstance, &E::newObjectPath, &E::newArgs, &E::newString, &E::newArray, &E::newDateTimeFromChars>(
         *broker.face()->eft);
-    let_fail<&I::setProperty, &I::setPropertyFilter, &I::getPropertyAt, &I::getObjectPath>(Instance_Object::table);
-    let_fail<&P::addKey, &P::getKeyAt, &P::getClassName>(Path_Object::table);
+    let_fail<&I::setProperty, &I::setPropertyFilter, &I::getPropertyCount, &I::getPropertyAt, &I::getObjectPath>(
+        Instance_Object::table);
+    let_fail<&P::addKey, &P::getKeyCount, &P::getKeyAt, &P::getClassName>(Path_Object::table);
     let_fail<&CMPIArgsFT::addArg, &CMPIArgsFT::getArgAt>(cimserver::Args_Object::table);
-    let_fail<&CMPIArrayFT::setElementAt, &CMPIArrayFT::getElementAt>(Array_Object::table);
+    let_fail<&CMPIArrayFT::setElementAt, &CMPIArrayFT::getSize, &CMPIArrayFT::getElementAt>(Array_Object::table);
     let_fail<&CMPIStringFT::getCharPtr>(cimserver::String_Object::table);
     let_fail<&CMPIDateTimeFT::getStringFormat>(cimserver::Datetime_Object::table);
 

@@ -3,6 +3,7 @@
 #include "runtime/thread_context.h"
 #include "tests/cmpi/served_provider.h"
 
+#include <cmpimacs.h>
 #include <gmock/gmock.h>
 
 #include <stdexcept>
@@ -188,6 +189,39 @@ TEST_F(Instance_Requests, fail_for_a_class_that_the_provider_does_not_serve)
         EXPECT_EQ(get(object), CMPI_RC_ERR_FAILED);
     }
     EXPECT_EQ(script.enumerations, 0);
+}
+
+// Real servers pass on what a client gives, keys that the class does not have, too few, and those of other classes.
+TEST_F(Instance_Requests, live_with_whatever_keys_there_are)
+{
+    const struct
+    {
+        std::vector<cimserver::Named_Value> keys;
+        CMPIrc found;
+    } rows[] = {
+        {{{"Name", string("a")}, {"Colour", string("red")}}, CMPI_RC_OK},
+        {{{"Name", string("a")}, {"Caption", string("no key")}}, CMPI_RC_OK},
+        {{{"NAME", string("a")}, {"Name", string("a")}}, CMPI_RC_OK},
+        {{}, CMPI_RC_ERR_NOT_FOUND},
+        {{{"Colour", string("red")}}, CMPI_RC_ERR_NOT_FOUND},
+        {{{"Name", {CMPI_uint64, std::uint64_t{7}}}}, CMPI_RC_ERR_NOT_FOUND},
+        {{{"Name", {CMPI_string, {}}}}, CMPI_RC_ERR_NOT_FOUND},
+        {{{"Name", reference("TST_Nobody", "a")}}, CMPI_RC_ERR_NOT_FOUND},
+        {{{"Antecedent", reference("TST_Thing", "a")}, {"Dependent", reference("TST_Thing", "b")}}, CMPI_RC_ERR_NOT_FOUND},
+    };
+    offer("a", "b");
+    const CMPIContext* context = request.context();
+    for (const auto& row : rows)
+    {
+        const cimserver::Object_Path keys = {{}, name_space, "TST_Thing", row.keys};
+        const CMPIObjectPath* object = cimserver::make<cimserver::Path_Object>(keys).face();
+        const CMPIInstance* changed = CMNewInstance(broker.face(), things_path, nullptr);
+        EXPECT_EQ(get(object), row.found) << &row - rows;
+        EXPECT_EQ(enumerate_names(object), CMPI_RC_OK) << &row - rows;
+        EXPECT_EQ(CMPI_Adapter::modifyInstance(mi, context, result.face(), object, changed, nullptr).rc,
+                  CMPI_RC_ERR_NOT_SUPPORTED);
+        EXPECT_EQ(CMPI_Adapter::deleteInstance(mi, context, result.face(), object).rc, CMPI_RC_ERR_NOT_SUPPORTED);
+    }
 }
 
 TEST_F(Instance_Requests, take_a_superclass_for_the_served_class)

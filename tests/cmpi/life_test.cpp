@@ -163,6 +163,7 @@ TEST_F(Life, a_cleanup_waits_for_the_requests_that_run_and_refuses_new_ones)
         Recorded_Result refused;
         EXPECT_EQ(CMPI_Adapter::enumInstances(mi, own.context(), refused.face(), path("TST_Thing"), nullptr).rc,
                   CMPI_RC_ERR_FAILED);
+        EXPECT_EQ(things(), nullptr) << "an interface of a provider that waits for this very request";
     };
     std::thread client(
         [&]

@@ -46,12 +46,13 @@ void log_to_no_avail()
 
 TEST(Log, option_file_decides_what_is_written)
 {
-    const std::pair<const char*, std::size_t> rows[] = {
+    const std::pair<std::string, std::size_t> rows[] = {
         {"LOG_LEVEL=FATAL\n", 1},
         {"LOG_LEVEL = warn", 3},
         {"# LOG_LEVEL=DBG\n\n   \nLOG_LEVEL\t=\t Info \r\n", 4},
         {"OTHER=1\nLOG_LEVEL=DBG\nLOG_LEVEL=ERR\n", 5},
         {"LOG_LEVEL_OLD=DBG\nLOG_LEVEL=ERR\n", 2},
+        {std::string(100'000, '\n') + "LOG_LEVEL=ERR\n", 2},
         {"LOG_LEVEL DBG\nlog_level=DBG\n LOG_LEVEL=DBG\nLOG_LEVEL=err\n", 2},
     };
     for (const auto& [options, written] : rows)

@@ -125,6 +125,32 @@ TEST(Value, carries_references)
     EXPECT_EQ(*self.get_if<Instance*>(), target.ptr());
 }
 
+TEST(Value, borrows_what_is_only_read)
+{
+    const auto held = element("held");
+    const auto from = reset_of(held, {Ref<Sample_Element>(held).steal()});
+    const auto to = reset_of({}, {});
+    for (const Meta_Feature* feature : features_of(from.ptr()))
+    {
+        Value value;
+        ASSERT_EQ(value.borrow(from.ptr(), feature), 0);
+        EXPECT_EQ(value.type(), type_of(feature));
+        const Value copied = value;
+        EXPECT_EQ(value.give(to.ptr(), feature), 0) << "a copy: it is not the value's to give";
+    }
+    EXPECT_TRUE(identical(from.ptr(), to.ptr()));
+    EXPECT_EQ(Atomic_get(&held->__refs), 5U);
+
+    Value labels;
+    labels.borrow(held.ptr(), property<Sample_Element>("Labels"));
+    EXPECT_EQ(labels.get_if<Array<String>>(), &held->Labels.value);
+    EXPECT_EQ(labels.borrow(held.ptr(), find_method(held->meta_class, "Reset")), -1);
+    labels.set_value(Array<String>{"moved"});
+    const String* moved = labels.get_if<Array<String>>()->data();
+    EXPECT_EQ(labels.give(held.ptr(), property<Sample_Element>("Labels")), 0);
+    EXPECT_EQ(held->Labels.value.data(), moved) << "the very elements";
+}
+
 TEST(Value, refuses_what_does_not_fit_and_changes_nothing)
 {
     const auto to = linked(element("a"), disk("d"));

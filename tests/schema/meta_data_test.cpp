@@ -1,8 +1,6 @@
 // The meta-data as generic code relies on it, for all classes at once, and by example.
 #include "runtime/features.h"
-#include "runtime/name_index.h"
 #include "runtime/print.h"
-#include "schema/ZEMLAR_AlarmDevice.h"
 #include "schema/repository.h"
 #include "tests/runtime/printed.h"
 #include "tests/runtime/rows.h"
@@ -113,64 +111,6 @@ TEST(Meta_Data, flag_words)
     const auto* change = as_method(&feature_named("CIM_Service", "ChangeAffectedElementsAssignedSequence"));
     EXPECT_EQ(as_reference(find_parameter(change, "ManagedElements"))->subscript, 1);
     EXPECT_EQ(as_property(find_parameter(change, "AssignedSequence"))->subscript, -1);
-}
-
-std::string upper_case(std::string name)
-{
-    std::ranges::transform(name, name.begin(),
-                           [](char c) { return c >= 'a' && c <= 'z' ? static_cast<char>(c - 'a' + 'A') : c; });
-    return name;
-}
-
-// Every feature is found in any case, under its own kind only, and nothing else is.
-void expect_features_found(const Meta_Record& record)
-{
-    ASSERT_NE(find_entry(&record), nullptr) << record.name;
-    const auto find = [&record](const std::string& name, uint32 mask)
-    { return find_feature(reinterpret_cast<const Meta_Class*>(&record), name.c_str(), mask); };
-    for (const Meta_Feature* feature : features_of(&record))
-    {
-        const uint32 kind = feature->flags & (Flag_Property | Flag_Reference | Flag_Method);
-        const std::string name = feature->name;
-        EXPECT_EQ(find(upper_case(name), kind), feature) << record.name << "." << name;
-        EXPECT_EQ(find(name, ~kind & (Flag_Property | Flag_Reference | Flag_Method)), nullptr) << record.name << "." << name;
-        EXPECT_EQ(find(name + "_", ~0U), nullptr) << record.name << "." << name;
-    }
-    EXPECT_EQ(find("", ~0U), nullptr);
-}
-
-TEST(Meta_Data, the_index_knows_every_class_feature_and_parameter)
-{
-    ASSERT_EQ(own_repository_index.repository, &meta_repository());
-    for (const Meta_Class* meta_class : all_classes())
-    {
-        EXPECT_EQ(find_meta_class(&meta_repository(), upper_case(meta_class->name).c_str()), meta_class);
-        EXPECT_EQ(find_meta_class(&meta_repository(), (std::string(meta_class->name) + "2").c_str()), nullptr);
-        for (const Meta_Class* c = meta_class; c; c = c->super_meta_class)
-            EXPECT_EQ(find_meta_class(meta_class, c->name), c);
-        expect_features_found(*meta_class);
-        for_each_method(*meta_class, expect_features_found);
-    }
-    EXPECT_EQ(find_meta_class(&ZEMLAR_AlarmDevice::static_meta_class, "zemlar_product"), &class_named("ZEMLAR_Product"));
-    EXPECT_EQ(find_meta_class(&ZEMLAR_AlarmDevice::static_meta_class, "Instance"), nullptr);
-    EXPECT_EQ(find_meta_class(&meta_repository(), ""), nullptr);
-}
-
-// A class that somebody made from one of ours is another record: the index must not answer for it.
-TEST(Meta_Data, the_index_is_only_for_its_own_records)
-{
-    const Meta_Feature* const features[] = {&feature_named("ZEMLAR_Product", "Vendor")};
-    Meta_Class made = ZEMLAR_AlarmDevice::static_meta_class;
-    made.meta_features = features;
-    made.num_meta_features = 1;
-    EXPECT_EQ(find_feature(&made, "vendor"), features[0]);
-    EXPECT_EQ(find_feature(&made, "DeviceID"), nullptr);
-    EXPECT_EQ(find_meta_class(&made, "ZEMLAR_AlarmDevice"), &made);
-
-    const Meta_Class* const classes[] = {&made};
-    const Meta_Repository other = {classes, 1};
-    EXPECT_EQ(find_meta_class(&other, "zemlar_alarmdevice"), &made);
-    EXPECT_EQ(find_meta_class(&other, "ZEMLAR_Product"), nullptr);
 }
 
 TEST(Meta_Data, an_overriding_method_replaces_the_parameters)

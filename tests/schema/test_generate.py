@@ -7,6 +7,7 @@ import subprocess
 import sys
 
 import pytest
+import pywbem
 
 SCHEMA = pathlib.Path(__file__).resolve().parents[2] / "schema"
 sys.path.insert(0, str(SCHEMA))
@@ -77,6 +78,32 @@ def test_a_failed_run_stops_a_build(project):
     assert result.returncode == 1
     assert result.stderr.startswith("generate.py: MOF parsing error")
     assert "Traceback" not in result.stderr
+
+
+class EmptyServer(pywbem.MOFWBEMConnection):
+    """Takes a class when everything that it names is there: superclass, referenced and embedded classes, qualifiers."""
+
+    def __init__(self):
+        super().__init__()
+        self.known = []
+
+    def CreateClass(self, NewClass, namespace=None):
+        elements = [*NewClass.properties.values(), *NewClass.methods.values()]
+        elements += [parameter for method in NewClass.methods.values() for parameter in method.parameters.values()]
+        named = [NewClass.superclass, *(getattr(element, "reference_class", None) for element in elements)]
+        named += [element.qualifiers["EmbeddedInstance"].value for element in elements if "EmbeddedInstance" in element.qualifiers]
+        missing = {name for name in named if name} - {*self.known, NewClass.classname}
+        if missing:
+            raise pywbem.CIMError(pywbem.CIM_ERR_INVALID_PARAMETER, f"{NewClass.classname} names {missing}")
+        self.known.append(NewClass.classname)
+
+
+def test_a_strict_server_takes_the_files_into_an_empty_name_space():
+    server = EmptyServer()
+    compiler = pywbem.MOFCompiler(server, log_func=None)
+    for name in ("qualifiers.mof", "cim.mof", "zemlar.mof"):
+        compiler.compile_file(str(SCHEMA / name), None)
+    assert server.known[-1].startswith("ZEMLAR_")
 
 
 def test_output_is_deterministic_and_touched_only_where_it_changes(project):
