@@ -1,17 +1,19 @@
 """Everything that a server on a simulated host serves, as text for a person to read: `python -m tools.inventory_text SCENARIO`.
 
-One paragraph a class, in the order of registration. The first instance is told whole; of the others only what differs from the one
+One paragraph a class, in the order of registration. The first instance is told whole, its nulls last; of the others only what differs from the one
 before. What depends on the machine that runs the simulation is put into angle brackets.
 """
 
 import re
 import sys
+import textwrap
 
 import pywbem
 
 from tools.simulated_server import ROOT, SimulatedServer
 
 NAME_SPACE = "root/zemlar"
+NULL = "-"
 OF_THE_MACHINE = {"NameFormat", "IdentifyingDescriptions"}  # of ZEMLAR_ComputerSystem: what kind of text names it
 
 
@@ -37,8 +39,11 @@ class Inventory:
         before = {}
         for number, instance in enumerate(instances, 1):
             properties = {name: self._text(class_name, name, instance[name]) for name in instance.keys()}
-            yield f"  {number}" + (", as the one before but for" if before else "")
-            yield from (f"    {name} = {text}" for name, text in properties.items() if before.get(name) != text)
+            yield f"  {number}" + (", as the one before" if before else "") + (" but for" if before and properties != before else "")
+            nulls = [name for name, text in properties.items() if text == NULL and name not in before]
+            told = (name for name, text in properties.items() if before.get(name) != text and name not in nulls)
+            yield from (f"    {name} = {properties[name]}" for name in told)
+            yield from textwrap.wrap("null: " + ", ".join(nulls), 120, initial_indent="    ", subsequent_indent="      ") if nulls else []
             before = properties
         yield ""
 
@@ -50,7 +55,7 @@ class Inventory:
 
 def value_text(value):
     if value is None:
-        return "-"
+        return NULL
     if isinstance(value, list):
         return "[" + ", ".join(value_text(element) for element in value) + "]"
     if isinstance(value, pywbem.CIMInstanceName):

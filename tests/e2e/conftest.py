@@ -85,6 +85,20 @@ def identity(tmp_path_factory):
     return certificate, key
 
 
+@pytest.fixture(scope="module")
+def module_start():
+    """module_start(scenario): a server that the tests of one module share."""
+    servers = []
+
+    def start_server(scenario):
+        servers.append(SimulatedServer(scenario))
+        return Host(servers[-1])
+
+    yield start_server
+    for server in servers:
+        server.stop()
+
+
 @pytest.fixture
 def start(tmp_path):
     """start(scenario): a server of the test's own; a dict is written to a scenario file first. Options replace --no-auth."""

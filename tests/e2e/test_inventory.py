@@ -1,0 +1,75 @@
+"""The inventory as clients see it. Golden inventories hold all that is served on a scenario; script/golden rewrites them."""
+
+import difflib
+from pathlib import Path
+
+import pytest
+import pywbem
+
+from tools.inventory_text import inventory_text, served_classes
+
+FILES = sorted((Path(__file__).parent / "golden").glob("*.txt"))
+
+
+@pytest.fixture(scope="module", params=FILES, ids=lambda file: file.stem)
+def scenario(request, module_start):
+    return module_start(request.param.stem), request.param
+
+
+def test_all_that_is_served(scenario):
+    host, file = scenario
+    served = (inventory_text(host.server.url) + "\n").splitlines()
+    golden = file.read_text(encoding="utf-8").splitlines()
+    difference = list(difflib.unified_diff(golden, served, "golden", "served", lineterm="", n=4))
+    assert not difference, "\n".join(difference)
+
+
+def sample(instances):
+    return instances[:4] + instances[4::37]
+
+
+def test_each_instance_is_fetched_again_by_its_path(scenario):
+    host, _ = scenario
+    for class_name in served_classes():
+        instances = host.pywbem.EnumerateInstances(class_name)
+        names = host.pywbem.EnumerateInstanceNames(class_name)
+        assert [instance.path for instance in instances] == names
+        # A key may hold a line feed, where wbemcli begins a new line too.
+        told_by_wbemcli = [name for name in host.wbemcli.enumerate_instance_names(class_name) if f":{class_name}." in name]
+        assert len(told_by_wbemcli) == len(names)
+        first_of = {}
+        for instance in instances:
+            first_of.setdefault(instance.path, instance)
+        for name in sample(names):
+            whole = host.pywbem.GetInstance(name)
+            assert whole == first_of[name]
+            asked = list(whole.keys())[::7] + ["NoSuchProperty"]
+            some = host.pywbem.GetInstance(name, PropertyList=asked)
+            assert {key: some[key] for key in some.keys()} == {key: whole[key] for key in asked if key in whole}
+        plain = [name for name in told_by_wbemcli if not set(name) & set("<&")]  # wbemcli sends these as they are
+        if plain:
+            assert len(host.wbemcli.get_instance(plain[0])) > 1
+
+
+def test_the_beacon_does_what_it_is_told(start):
+    host = start("cna")
+    path = host.pywbem.EnumerateInstanceNames("ZEMLAR_AlarmDevice")[0]
+
+    def set_state(state, of=path):
+        arguments = {} if state is None else {"State": pywbem.Uint16(state)}
+        return host.pywbem.InvokeMethod("SetAlarmState", of, **arguments)[0]
+
+    seen = []
+    for state in (3, 3, 1, 1, 2, 0, None):
+        seen.append((set_state(state), host.pywbem.GetInstance(path)["AlarmState"]))
+    assert seen == [(0, 3), (2, 3), (0, 1), (2, 1), (2, 1), (2, 1), (2, 1)]
+
+    nobody = path.copy()
+    nobody["DeviceID"] = "1000000000000000"
+    assert set_state(3, nobody) == 2
+
+
+def test_the_beacon_of_a_mezzanine_card_is_not_supported(mixed):
+    path = mixed.pywbem.EnumerateInstanceNames("ZEMLAR_AlarmDevice")[0]
+    path["DeviceID"] = "100000051E100200"
+    assert mixed.pywbem.InvokeMethod("SetAlarmState", path, State=pywbem.Uint16(3))[0] == 1
