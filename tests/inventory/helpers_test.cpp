@@ -6,10 +6,7 @@
 #include "tests/inventory/inventory_fixture.h"
 
 #include <cerrno>
-#include <cstdlib>
 #include <cstring>
-#include <fstream>
-#include <sstream>
 
 using namespace zmlr;
 using testing::Contains;
@@ -39,18 +36,6 @@ protected:
 };
 
 } // namespace
-
-TEST_F(Helpers, make_the_instances_of_the_golden_text)
-{
-    std::string text;
-    for (const classId_t id : {CLASSID_ComputerSystem, CLASSID_PortController, CLASSID_FCPort})
-        text += describe(all(id));
-    if (std::getenv("ZMLR_WRITE_GOLDEN"))
-        std::ofstream(GOLDEN "/mixed.txt") << text;
-    std::ostringstream golden;
-    golden << std::ifstream(GOLDEN "/mixed.txt").rdbuf();
-    EXPECT_EQ(text, golden.str());
-}
 
 // What one CNA costs, with a disk behind its first port; sixteen cost sixteen times as much.
 TEST_F(Helpers, cost_the_prescribed_requests_and_one_look_up_of_the_host)
