@@ -27,7 +27,7 @@ public:
     Port()
     {
         bench::Simulated_Host host(1);
-        wire = host.operations().enumerate_instances(name_space, "ZEMLAR_FCPort", true, std::nullopt).at(0);
+        wire = host.operations().enumerate_instances("ZEMLAR_FCPort", true, std::nullopt).at(0);
         auto& object = cimserver::make<cimserver::Instance_Object>(wire);
         zmlr::make_cimple_instance(broker(), &zmlr::ZEMLAR_FCPort::static_meta_class,
                                    cimserver::make<cimserver::Path_Object>(wire.path).face(), object.face(), instance);

@@ -13,7 +13,7 @@ namespace
 
 std::size_t enumerate(cimserver::Operations& operations)
 {
-    return operations.enumerate_instances("root/zemlar", "ZEMLAR_FCPort", true, std::nullopt).size();
+    return operations.enumerate_instances("ZEMLAR_FCPort", true, std::nullopt).size();
 }
 
 void enumerate_fc_ports(benchmark::State& state)

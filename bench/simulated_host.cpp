@@ -18,7 +18,7 @@ Simulated_Host::Simulated_Host(int adapters)
 {
     simulate(adapters);
     _module = std::make_unique<cimserver::Module>(module_path);
-    _operations = std::make_unique<cimserver::Name_Spaces>(*_module);
+    _name_spaces = std::make_unique<cimserver::Server_Name_Spaces>(*_module);
 }
 
 } // namespace bench

@@ -2,7 +2,7 @@
 #pragma once
 
 #include "cimserver/broker/module.h"
-#include "cimserver/name_spaces.h"
+#include "cimserver/interop/name_spaces.h"
 
 #include <memory>
 
@@ -21,11 +21,11 @@ class Simulated_Host
 public:
     explicit Simulated_Host(int adapters);
 
-    cimserver::Operations& operations() { return *_operations; }
+    cimserver::Operations& operations() { return _name_spaces->at("root/zemlar", ""); }
 
 private:
     std::unique_ptr<cimserver::Module> _module;
-    std::unique_ptr<cimserver::Name_Spaces> _operations;
+    std::unique_ptr<cimserver::Server_Name_Spaces> _name_spaces;
 };
 
 } // namespace bench

@@ -1,22 +1,20 @@
 // zmlr-cimserver: serves a CIM provider module to CIM-XML clients.
 //
-// Exit status: 0 after a clean stop, 1 when it cannot serve or a request did not end in time, 2 for a wrong command line.
+// Exit status: 0 after a stop, 1 when it cannot serve, 2 for a wrong command line.
 #include "cimserver/broker/module.h"
-#include "cimserver/broker/principal.h"
 #include "cimserver/cimxml/http_server.h"
 #include "cimserver/cimxml/listener.h"
 #include "cimserver/cimxml/service.h"
-#include "cimserver/indications/subscription_classes.h"
-#include "cimserver/name_spaces.h"
+#include "cimserver/indications/subscriptions.h"
+#include "cimserver/interop/name_spaces.h"
+#include "cimserver/model/principal.h"
 #include "cimserver/options.h"
+#include "cimserver/process.h"
 #include "cimserver/security/credentials.h"
 #include "cimserver/security/password_prompt.h"
 #include "cimserver/security/tls_identity.h"
 
-#include <semaphore.h>
-
 #include <chrono>
-#include <csignal>
 #include <cstdio>
 #include <cstdlib>
 #include <exception>
@@ -36,32 +34,36 @@ constexpr std::chrono::seconds delivery_grace{3}; // and for the listeners
 constexpr std::uint16_t http_port = 5988; // as registered for WBEM
 constexpr std::uint16_t https_port = 5989;
 
-sem_t stop_asked;
-
-void ask_to_stop(int) { sem_post(&stop_asked); }
-
-// Handles the signals: what is blocked or ignored stays so in every program that the module starts.
-void handle_signals()
+void show_identity_of(const Options& options)
 {
-    sem_init(&stop_asked, 0, 0);
-    std::signal(SIGTERM, ask_to_stop);
-    std::signal(SIGINT, ask_to_stop);
-    std::signal(SIGPIPE, [](int) {});
+    Tls_Identity identity = read_tls_identity(options.certificate, options.key);
+    for (const std::string& weakness : weaknesses_of(identity))
+        std::fprintf(stderr, "zmlr-cimserver: clients may refuse %s: %s\n", options.certificate.c_str(), weakness.c_str());
+    show_identity(std::move(identity));
 }
 
-void wait_for_stop()
+// What is wrong with new files is told, and the old ones count on.
+void reload(const Options& options, Credentials* credentials)
+try
 {
-    while (sem_wait(&stop_asked) != 0)
-    {
-    }
+    if (credentials)
+        credentials->reload();
+    if (!options.certificate.empty())
+        show_identity_of(options);
+    std::fprintf(stderr, "zmlr-cimserver: reloaded\n");
+}
+catch (const std::exception& error)
+{
+    std::fprintf(stderr, "zmlr-cimserver: not reloaded: %s\n", error.what());
 }
 
 Http_Endpoint endpoint_of(const Options& options)
 {
-    Http_Endpoint endpoint{options.address, http_port, std::nullopt};
+    Http_Endpoint endpoint{options.address, http_port, false};
     if (!options.certificate.empty())
     {
-        endpoint.tls = read_tls_identity(options.certificate, options.key);
+        show_identity_of(options);
+        endpoint.tls = true;
         endpoint.port = https_port;
     }
     endpoint.port = options.port.value_or(endpoint.port);
@@ -80,41 +82,55 @@ catch (const std::runtime_error& error)
 }
 
 // From now on clients can subscribe, and the module's indications go to their listeners.
-void offer(Subscriptions& subscriptions, Name_Spaces& operations, Module& module)
+void offer(Subscriptions& subscriptions, Server_Name_Spaces& name_spaces, Module& module)
 {
-    using enum Subscription_Kind;
-    for (const Subscription_Kind kind : {filter, destination, subscription})
-        operations.interop().serve(make_subscription_class(kind, subscriptions));
+    for (const Subscription_Kind kind :
+         {Subscription_Kind::filter, Subscription_Kind::destination, Subscription_Kind::subscription})
+        name_spaces.own().serve({class_of(kind), [&subscriptions, kind] { return subscriptions.list(kind); },
+                                 [&subscriptions, kind](const Instance& instance)
+                                 { return subscriptions.create(kind, instance); },
+                                 [&subscriptions, kind](const Object_Path& path) { subscriptions.remove(kind, path); }});
     module.broker().set_indication_sink(&subscriptions);
+}
+
+// The rest of the work is done for the user who asked.
+Http_Work for_user(const std::string& user, Http_Work work)
+{
+    if (!work.rest)
+        return work;
+    return {{},
+            [user, rest = std::move(work.rest)]
+            {
+                const Principal_Scope principal(user);
+                return rest();
+            }};
 }
 
 void serve(const Options& options)
 {
     handle_signals();
+    reserve_descriptors(options.limits.connections);
     const Http_Endpoint endpoint = endpoint_of(options);
     const auto credentials = credentials_of(options);
     const auto store = options.state.empty() ? nullptr : std::make_unique<const Subscription_Store>(options.state);
     Module module(options.module);
     Delivery delivery(options.delivery);
     Subscriptions subscriptions(module, delivery, options.indication_order, store.get());
-    Name_Spaces operations(module);
-    offer(subscriptions, operations, module);
+    Server_Name_Spaces name_spaces(module);
+    offer(subscriptions, name_spaces, module);
     subscriptions.restore();
-    Service service(operations);
+    Service service(name_spaces);
     Http_Server server(endpoint, options.limits, credentials.get(),
-                       [&](const Http_Request& request)
-                       {
-                           const Principal_Scope principal(request.user);
-                           return service.answer(request);
-                       });
+                       [&](const Http_Request& request) { return for_user(request.user, service.handle(request)); });
     std::fprintf(stderr, "zmlr-cimserver: listening on %s%s\n", endpoint_text(endpoint.address, server.port()).c_str(),
                  endpoint.tls ? " (TLS)" : "");
 
-    wait_for_stop();
+    while (next_wish() == Wish::reload)
+        reload(options, credentials.get());
     if (!server.stop(stop_grace))
     {
-        std::fprintf(stderr, "zmlr-cimserver: a request did not finish in time\n");
-        std::_Exit(EXIT_FAILURE); // it still uses the module
+        std::fprintf(stderr, "zmlr-cimserver: stopped while a provider does not answer a request\n");
+        std::_Exit(EXIT_SUCCESS); // it still uses the module
     }
     subscriptions.stop();
     delivery.stop(delivery_grace);
@@ -125,6 +141,7 @@ void serve(const Options& options)
 int main(int argc, char** argv)
 try
 {
+    open_standard_descriptors();
     const auto options = read_options(argc, argv);
     if (const int* status = std::get_if<int>(&options))
         return *status;

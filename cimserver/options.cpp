@@ -1,7 +1,7 @@
 #include "cimserver/options.h"
 
 #include "cimserver/cimxml/listener.h"
-#include "cimserver/cimxml/version.h"
+#include "cimserver/model/version.h"
 
 #include <CLI/CLI.hpp>
 
@@ -16,31 +16,49 @@ constexpr int exit_usage = 2;
 
 std::string check_address(const std::string& text) { return is_address(text) ? "" : text + " is no IPv4 or IPv6 address"; }
 
+// What help shows of a range: the numbers, not the type that holds them.
+template <class T> CLI::Range range(T least, T most)
+{
+    CLI::Range result(least, most);
+    result.description(std::to_string(least) + " to " + std::to_string(most));
+    return result;
+}
+
 void declare_access(CLI::App& app, Options& options)
 {
-    app.add_option("--users", options.users, "the file of users and their password hashes")->capture_default_str();
-    app.add_option("--add-user", options.add_user, "add a user to that file, or give one a new password, and end");
+    app.add_option("--users", options.users, "the file of users and their password hashes")
+        ->type_name("FILE")
+        ->capture_default_str();
+    app.add_option("--add-user", options.add_user, "add a user to that file, or give one a new password, and end")
+        ->type_name("NAME");
     app.add_flag("--no-auth", options.no_auth, "ask for no credentials (loopback addresses only)");
     app.add_option("--address", options.address, "the address to listen on; any but loopback needs TLS")
+        ->type_name("ADDRESS")
         ->check(check_address)
         ->capture_default_str();
-    app.add_option("--port", options.port, "TCP port; 0 picks a free one [5988, with TLS 5989]");
-    app.add_option("--certificate", options.certificate, "serve TLS with this certificate (PEM)");
-    app.add_option("--key", options.key, "the private key of the certificate (PEM)");
+    app.add_option("--port", options.port, "TCP port; 0 picks a free one [5988, with TLS 5989]")->type_name("PORT");
+    app.add_option("--certificate", options.certificate, "serve TLS with this certificate (PEM)")->type_name("FILE");
+    app.add_option("--key", options.key, "the private key of the certificate (PEM)")->type_name("FILE");
 }
 
 void declare_limits(CLI::App& app, Http_Limits& limits)
 {
-    app.add_option("--max-request", limits.request_bytes, "largest request, in bytes")
-        ->check(CLI::Range(std::size_t{1024}, std::size_t{1} << 30))
+    app.add_option("--max-request", limits.request_bytes, "largest request")
+        ->type_name("BYTES")
+        ->check(range(std::size_t{1024}, std::size_t{1} << 30))
         ->capture_default_str();
     app.add_option("--max-connections", limits.connections, "connections served at once")
-        ->check(CLI::Range(1, 10000))
+        ->type_name("NUMBER")
+        ->check(range(1, 10000))
         ->capture_default_str();
     app.add_option("--max-waiting", limits.waiting_requests, "requests that may wait for a worker")
-        ->check(CLI::Range(1, 100000))
+        ->type_name("NUMBER")
+        ->check(range(1, 100000))
         ->capture_default_str();
-    app.add_option("--workers", limits.workers, "requests answered at once")->check(CLI::Range(1, 256))->capture_default_str();
+    app.add_option("--workers", limits.workers, "requests answered at once")
+        ->type_name("NUMBER")
+        ->check(range(1, 256))
+        ->capture_default_str();
 }
 
 // Options hold milliseconds, people give seconds.
@@ -49,7 +67,8 @@ void add_seconds(CLI::App& app, const std::string& name, std::chrono::millisecon
     const std::string preset = std::to_string(std::chrono::duration_cast<std::chrono::seconds>(value).count());
     app.add_option_function<double>(
            name, [&value](double seconds) { value = std::chrono::milliseconds(static_cast<long long>(seconds * 1000)); }, text)
-        ->check(CLI::Range(least, 3600.0))
+        ->type_name("SECONDS")
+        ->check(CLI::Range(least, 3600.0).description(least > 0 ? "0.1 to 3600" : "0 to 3600"))
         ->default_str(preset);
 }
 
@@ -57,19 +76,23 @@ void declare_indications(CLI::App& app, Options& options)
 {
     const std::map<std::string, Indication_Order> orders{{"open-pegasus", Indication_Order::open_pegasus},
                                                          {"sfcb", Indication_Order::sfcb}};
-    app.add_option("--state", options.state, "a folder that keeps subscriptions over a restart (made if missing)");
+    app.add_option("--state", options.state, "keeps subscriptions over a restart (made if missing)")->type_name("FOLDER");
     app.add_option("--indication-order", options.indication_order, "call indication providers in the order of this server")
-        ->transform(CLI::CheckedTransformer(orders))
+        ->type_name("NAME")
+        ->transform(CLI::CheckedTransformer(orders).description("open-pegasus or sfcb"))
         ->default_str("open-pegasus");
     app.add_option("--listener-ca", options.delivery.ca_file, "certificates that vouch for HTTPS listeners [the system's]")
-        ->check(CLI::ExistingFile);
+        ->type_name("FILE")
+        ->check(CLI::Validator(CLI::ExistingFile).description(""));
     app.add_option("--delivery-attempts", options.delivery.attempts, "how often an indication is tried")
-        ->check(CLI::Range(1, 100))
+        ->type_name("NUMBER")
+        ->check(range(1, 100))
         ->capture_default_str();
-    add_seconds(app, "--delivery-pause", options.delivery.pause, 0, "seconds between attempts");
-    add_seconds(app, "--delivery-timeout", options.delivery.timeout, 0.1, "seconds that one attempt may take");
+    add_seconds(app, "--delivery-pause", options.delivery.pause, 0, "between attempts");
+    add_seconds(app, "--delivery-timeout", options.delivery.timeout, 0.1, "that one attempt may take");
     app.add_option("--max-indications", options.delivery.waiting, "indications that may wait for a listener")
-        ->check(CLI::Range(1, 100000))
+        ->type_name("NUMBER")
+        ->check(range(1, 100000))
         ->capture_default_str();
 }
 
@@ -96,7 +119,7 @@ std::variant<Options, int> read_options(int argc, char** argv)
     CLI::App app("Serves a CIM provider module to CIM-XML clients.", "zmlr-cimserver");
     Options options;
     app.set_version_flag("--version", std::string("zmlr-cimserver ") + version());
-    app.add_option("--module", options.module, "the provider module to serve (a shared library)");
+    app.add_option("--module", options.module, "the provider module to serve (a shared library)")->type_name("FILE");
     declare_access(app, options);
     declare_limits(app, options.limits);
     declare_indications(app, options);

@@ -20,22 +20,20 @@ constexpr zmlr::Meta_Feature_Local locals[] = {{1}};
 constexpr zmlr::Meta_Class some_class{
     {{{0}, zmlr::Flag_Class, "TST_Box", nullptr, 0}, features, std::size(features), 0}, locals, nullptr, 1, nullptr};
 
-class Echo : public Operations
+class Echo : public Operations, public Name_Spaces
 {
 public:
-    const zmlr::Meta_Class* get_class(const std::string&, const std::string&) override { return &some_class; }
-    std::vector<const zmlr::Meta_Class*> enumerate_classes(const std::string&, const std::string&, bool) override
+    Operations& at(const std::string&, const std::string&) override { return *this; }
+
+    const zmlr::Meta_Class* get_class(const std::string&) override { return &some_class; }
+    std::vector<const zmlr::Meta_Class*> enumerate_classes(const std::string&, bool) override { return {&some_class}; }
+    std::vector<Object_Path> enumerate_instance_names(const std::string& class_name) override
     {
-        return {&some_class};
+        return {{"", "root/test", class_name, {}}};
     }
-    std::vector<Object_Path> enumerate_instance_names(const std::string& name_space, const std::string& class_name) override
+    std::vector<Instance> enumerate_instances(const std::string& class_name, bool, const Property_List&) override
     {
-        return {{"", name_space, class_name, {}}};
-    }
-    std::vector<Instance> enumerate_instances(const std::string& name_space, const std::string& class_name, bool,
-                                              const Property_List&) override
-    {
-        return {{{"", name_space, class_name, {}}, {}}};
+        return {{{"", "root/test", class_name, {}}, {}}};
     }
     Instance get_instance(const Object_Path& path, const Property_List&) override { return {path, path.keys}; }
     Object_Path create_instance(const Instance& instance) override
@@ -75,7 +73,9 @@ catch (const Http_Refusal& refusal)
 extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, size_t size)
 {
     Echo operations;
-    const Http_Answer answer = Service(operations).answer({"", std::string(reinterpret_cast<const char*>(data), size)});
+    const Http_Request request{"MethodCall", std::string(reinterpret_cast<const char*>(data), size)};
+    const Http_Work work = Service(operations).handle(request);
+    const Http_Answer answer = work.rest ? work.rest() : work.answer;
     if (answer.status == 200)
         check_answer(answer.body);
     else if (answer.cim_error.empty() || !answer.body.empty())

@@ -1,5 +1,5 @@
 // The queries of indication filters: any text is read or refused, and one that is read lets an indication through or not.
-#include "cimserver/indications/event_query.h"
+#include "cimserver/model/event_query.h"
 
 #include <cstdint>
 

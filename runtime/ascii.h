@@ -4,7 +4,6 @@
 #include "runtime/types.h"
 
 #include <array>
-#include <string_view>
 
 namespace zmlr::ascii
 {
@@ -17,20 +16,9 @@ constexpr std::array<unsigned char, 256> make_lower_table()
     return table;
 }
 
-constexpr std::array<signed char, 256> make_digit_table()
-{
-    std::array<signed char, 256> table{};
-    table.fill(-1);
-    for (signed char value = 0; const char digit : std::string_view("0123456789ABCDEF"))
-        table[static_cast<unsigned char>(digit)] = value++;
-    return table;
-}
-
 inline constexpr std::array<unsigned char, 256> lower_table = make_lower_table();
-inline constexpr std::array<signed char, 256> digit_table = make_digit_table();
 
 constexpr unsigned char to_lower(char c) { return lower_table[static_cast<unsigned char>(c)]; }
-constexpr int digit_value(char c) { return digit_table[static_cast<unsigned char>(c)]; } // -1: none; A-F in upper case only
 constexpr bool is_digit(char c) { return c >= '0' && c <= '9'; }
 constexpr bool is_space(char c) { return c == ' ' || (c >= '\t' && c <= '\r'); }
 

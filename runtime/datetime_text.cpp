@@ -1,8 +1,7 @@
-#include "runtime/ascii.h"
 #include "runtime/datetime.h"
+#include "text/datetime.h"
 
 #include <algorithm>
-#include <cstdlib>
 #include <cstring>
 #include <ctime>
 
@@ -11,8 +10,6 @@ namespace zmlr
 
 namespace
 {
-
-constexpr std::size_t text_length = Datetime::text_size - 1;
 
 struct Calendar_Time
 {
@@ -34,120 +31,23 @@ Calendar_Time to_calendar(uint64 usec)
     return time;
 }
 
-// Reads fixed-width decimal fields one after the other; a non-digit makes the whole reading fail.
-class Field_Reader
-{
-public:
-    explicit Field_Reader(const char* text) : _next(text) {}
-
-    uint32 number(int width)
-    {
-        uint32 value = 0;
-        for (int i = 0; i < width; ++i, ++_next)
-        {
-            _good = _good && ascii::is_digit(*_next);
-            value = value * 10 + static_cast<uint32>(*_next - '0');
-        }
-        return value;
-    }
-
-    void literal(char c)
-    {
-        _good = _good && *_next == c;
-        ++_next;
-    }
-    void skip() { ++_next; }
-    bool good() const { return _good; }
-
-private:
-    const char* _next;
-    bool _good = true;
-};
-
-bool read_interval(const char* text, Datetime& out)
-{
-    Field_Reader reader(text);
-    const uint32 days = reader.number(8);
-    const uint32 hours = reader.number(2);
-    const uint32 minutes = reader.number(2);
-    const uint32 seconds = reader.number(2);
-    reader.literal('.');
-    const uint32 microseconds = reader.number(6);
-    reader.skip();
-    reader.literal('0');
-    reader.literal('0');
-    reader.literal('0');
-    if (!reader.good())
-        return false;
-    out.set_interval(days, hours, minutes, seconds, microseconds);
-    return true;
-}
-
-bool read_timestamp(const char* text, Datetime& out)
-{
-    Field_Reader reader(text);
-    const uint32 year = reader.number(4);
-    const uint32 month = reader.number(2);
-    const uint32 day = reader.number(2);
-    const uint32 hour = reader.number(2);
-    const uint32 minute = reader.number(2);
-    const uint32 second = reader.number(2);
-    reader.literal('.');
-    const uint32 microseconds = reader.number(6);
-    reader.skip();
-    const auto offset = static_cast<sint32>(reader.number(3));
-    if (!reader.good())
-        return false;
-    out.set_timestamp(year, month, day, hour, minute, second, microseconds, text[21] == '-' ? -offset : offset);
-    return true;
-}
-
 } // namespace
 
 bool Datetime::set(const char* text)
 {
-    if (!text || strnlen(text, text_size) != text_length)
+    const auto fields = text ? text::read_datetime({text, strnlen(text, text_size)}) : std::nullopt;
+    if (!fields)
         return false;
-
-    switch (text[21])
-    {
-    case ':':
-        return read_interval(text, *this);
-    case '+':
-    case '-':
-        return read_timestamp(text, *this);
-    default:
-        return false;
-    }
+    if (fields->interval)
+        set_interval(fields->day, fields->hour, fields->minute, fields->second, fields->microsecond);
+    else
+        set_timestamp(fields->year, fields->month, fields->day, fields->hour, fields->minute, fields->second, fields->microsecond,
+                      fields->offset);
+    return true;
 }
 
 namespace
 {
-
-// Writes fields of fixed width one after the other, each with its separator where the text is for people.
-class Field_Writer
-{
-public:
-    Field_Writer(char* buffer, bool prettify) : _next(buffer), _prettify(prettify) {}
-
-    void number(uint32 value, int width)
-    {
-        for (int i = width; i-- > 0; value /= 10)
-            _next[i] = static_cast<char>('0' + value % 10);
-        _next += width;
-    }
-    void number_and(char separator, uint32 value, int width)
-    {
-        number(value, width);
-        if (_prettify)
-            character(separator);
-    }
-    void character(char c) { *_next++ = c; }
-
-private:
-    char* _next;
-    bool _prettify;
-};
 
 // The nearest time that four digits of a year can tell.
 Calendar_Time to_writable_calendar(uint64 usec)
@@ -173,44 +73,43 @@ Calendar_Time to_writable_calendar(uint64 usec)
     return nearest;
 }
 
-void write_interval(Field_Writer& out, const Datetime& interval)
+text::Datetime_Fields interval_fields(uint64 usec)
 {
     constexpr uint64 longest = 100'000'000 * Datetime::DAY - 1; // in eight digits of days
-    const uint64 length = std::min(interval.usec(), longest);
+    const uint64 length = std::min(usec, longest);
     const auto field = [](uint64 value) { return static_cast<uint32>(value); };
-    out.number_and(' ', field(length / Datetime::DAY), 8);
-    out.number_and(' ', field(length / Datetime::HOUR % 24), 2);
-    out.number_and(' ', field(length / Datetime::MIN % 60), 2);
-    out.number(field(length / Datetime::SEC % 60), 2);
-    out.character('.');
-    out.number(field(length % Datetime::SEC), 6);
-    out.character(':');
-    out.number(0, 3);
+    text::Datetime_Fields fields;
+    fields.interval = true;
+    fields.day = field(length / Datetime::DAY);
+    fields.hour = field(length / Datetime::HOUR % 24);
+    fields.minute = field(length / Datetime::MIN % 60);
+    fields.second = field(length / Datetime::SEC % 60);
+    fields.microsecond = field(length % Datetime::SEC);
+    return fields;
 }
 
-void write_timestamp(Field_Writer& out, const Datetime& timestamp)
+text::Datetime_Fields timestamp_fields(uint64 usec, sint32 offset)
 {
-    const Calendar_Time time = to_writable_calendar(timestamp.usec());
+    const Calendar_Time time = to_writable_calendar(usec);
     const auto field = [](int value) { return static_cast<uint32>(value); };
-    out.number_and('/', field(time.fields.tm_year + 1900), 4);
-    out.number_and('/', field(time.fields.tm_mon + 1), 2);
-    out.number_and(' ', field(time.fields.tm_mday), 2);
-    out.number_and(':', field(time.fields.tm_hour), 2);
-    out.number_and(':', field(time.fields.tm_min), 2);
-    out.number(field(time.fields.tm_sec), 2);
-    out.character('.');
-    out.number(time.microseconds, 6);
-    out.character(timestamp.offset() < 0 ? '-' : '+');
-    out.number(field(std::abs(std::clamp(timestamp.offset(), -999, 999))), 3);
+    text::Datetime_Fields fields;
+    fields.year = field(time.fields.tm_year + 1900);
+    fields.month = field(time.fields.tm_mon + 1);
+    fields.day = field(time.fields.tm_mday);
+    fields.hour = field(time.fields.tm_hour);
+    fields.minute = field(time.fields.tm_min);
+    fields.second = field(time.fields.tm_sec);
+    fields.microsecond = time.microseconds;
+    fields.offset = std::clamp(offset, -999, 999);
+    return fields;
 }
 
 } // namespace
 
 void Datetime::ascii(char* buffer, bool prettify) const
 {
-    Field_Writer out(buffer, prettify);
-    is_interval() ? write_interval(out, *this) : write_timestamp(out, *this);
-    out.character('\0');
+    const auto fields = is_interval() ? interval_fields(usec()) : timestamp_fields(usec(), offset());
+    *text::write_datetime(fields, buffer, prettify) = '\0';
 }
 
 String Datetime::ascii(bool prettify) const

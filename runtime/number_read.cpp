@@ -1,8 +1,10 @@
 #include "runtime/ascii.h"
 #include "runtime/number.h"
 #include "runtime/string.h"
+#include "text/integers.h"
 
 #include <cstdlib>
+#include <cstring>
 #include <limits>
 #include <locale.h>
 
@@ -12,21 +14,14 @@ namespace zmlr
 namespace
 {
 
-// Reads digits of a base up to the text's end: 1 to `most` of them, below 2^64.
-int read_digits(const char* text, uint64 base, int most, uint64& x)
+// Digits up to the text's end: 1 to `most` of them, below 2^64; letters in upper case only.
+int read_digits(const char* text, int base, std::size_t most, uint64& x)
 {
-    uint64 value = 0;
-    int count = 0;
-    for (; *text; ++text, ++count)
-    {
-        const int digit = ascii::digit_value(*text);
-        if (digit < 0 || static_cast<uint64>(digit) >= base || count == most || __builtin_mul_overflow(value, base, &value) ||
-            __builtin_add_overflow(value, static_cast<uint64>(digit), &value))
-            return -1;
-    }
-    if (count == 0)
+    const std::string_view digits(text, strnlen(text, most + 1));
+    const auto value = digits.size() <= most ? text::read_digits(digits, base) : std::nullopt;
+    if (!value || digits.find_first_of("abcdef") != std::string_view::npos)
         return -1;
-    x = value;
+    x = *value;
     return 0;
 }
 

@@ -61,7 +61,8 @@ def generate(mof, providers_file, omitted=()):
     files["providers/skeletons.h"] = write_skeletons.all_skeletons_header(providers)
     files["providers/skeletons.cpp"] = write_skeletons.skeleton_source(providers)
     files["providers/row_providers.cpp"] = write_skeletons.row_providers_source(providers)
-    files["cimserver/qualifier_table.cpp"] = write_qualifiers.qualifier_table_source(classes)
+    declarations = mof_model.load_qualifiers(mof)
+    files["cimserver/qualifier_table.cpp"] = write_qualifiers.qualifier_table_source(classes, declarations)
     return files
 
 

@@ -112,11 +112,7 @@ class _Repository(pywbem.MOFWBEMConnection):
 
 def load(files, omitted=()):
     """The classes of the files, in their order, but those that are omitted. Raises Model_Error, OSError or pywbem.MOFCompileError."""
-    repository = _Repository()
-    compiler = pywbem.MOFCompiler(repository, log_func=None)
-    for file in files:
-        _compile(compiler, str(file))
-
+    repository = _compiled(files)
     classes = {}
     for compiled in repository.compiled:
         if compiled.classname not in omitted:
@@ -124,6 +120,19 @@ def load(files, omitted=()):
     result = list(classes.values())
     _check_references(result)
     return result
+
+
+def load_qualifiers(files):
+    """The declarations of qualifiers, as pywbem.CIMQualifierDeclaration, by their names. Raises what load() raises."""
+    return sorted(_compiled(files).EnumerateQualifiers(), key=lambda declaration: declaration.name.lower())
+
+
+def _compiled(files):
+    repository = _Repository()
+    compiler = pywbem.MOFCompiler(repository, log_func=None)
+    for file in files:
+        _compile(compiler, str(file))
+    return repository
 
 
 def _compile(compiler, file):

@@ -51,7 +51,7 @@ def _class_section(cls, repository):
         if cls.is_local(feature):
             parts.append(_method(feature) if feature.is_method else _field(feature, _feature_object(feature), cls.name))
     parts.append(_inherited_offsets(cls))
-    parts.append(_feature_array(f"_{cls.name}_MFA", [_feature_object(feature) for feature in cls.features]))
+    parts.append(feature_array(f"_{cls.name}_MFA", [_feature_object(feature) for feature in cls.features]))
     parts.append(_meta_class(cls, repository))
     return "\n".join(part for part in parts if part)
 
@@ -62,7 +62,7 @@ def _feature_object(feature):
     return f"_{feature.owner}_{feature.name}"
 
 
-def _head(flags, name):
+def head(flags, name):
     return f"{{0}}, {flags:#010x}, {string_literal(name)}, nullptr, 0"
 
 
@@ -73,16 +73,16 @@ def _field(feature, name, record):
         array = 1 if feature.array else 0
         return (
             f"constinit const Meta_Reference {name} ="
-            f" {{{{{_head(feature.flags, feature.name)}}}, {array}, &{feature.type}::static_meta_class, {offset}}};"
+            f" {{{{{head(feature.flags, feature.name)}}}, {array}, &{feature.type}::static_meta_class, {offset}}};"
         )
-    default, pointer = _default(feature, name)
+    default, pointer = default_value(feature, name)
     return default + (
         f"constinit const Meta_Property {name} ="
-        f" {{{{{_head(feature.flags, feature.name)}}}, {type_code(feature.type)}, {feature.array}, {offset}, {pointer}}};"
+        f" {{{{{head(feature.flags, feature.name)}}}, {type_code(feature.type)}, {feature.array}, {offset}, {pointer}}};"
     )
 
 
-def _default(feature, name):
+def default_value(feature, name):
     """The Meta_Value of a default and how to point at it."""
     if feature.default is None:
         return "", "nullptr"
@@ -99,7 +99,7 @@ def _default(feature, name):
     return f"{storage}\n{meta_value}\n", f"&{name}_value"
 
 
-def _feature_array(name, objects):
+def feature_array(name, objects):
     rows = "".join(f"    &{name},\n" for name in objects)
     return f"constinit const Meta_Feature* const {name}[] = {{\n{rows}}};"
 
@@ -110,10 +110,10 @@ def _method(method):
     prefix = f"_{method.owner}_{method.name}"
     names = [f"{prefix}_{parameter.name}" for parameter in method.parameters]
     parts = [_field(parameter, name, record) for parameter, name in zip(method.parameters, names)]
-    parts.append(_feature_array(f"{prefix}_MFA", names))
+    parts.append(feature_array(f"{prefix}_MFA", names))
     parts.append(
         f"constinit const Meta_Method {record}::static_meta_class ="
-        f" {{{{{{{_head(method.flags, method.name)}}}, {prefix}_MFA, {len(names)}, sizeof({record})}},"
+        f" {{{{{{{head(method.flags, method.name)}}}, {prefix}_MFA, {len(names)}, sizeof({record})}},"
         f" {type_code(method.return_type)}}};"
     )
     return "\n".join(parts)
@@ -134,7 +134,7 @@ def _meta_class(cls, repository):
     return (
         f"constinit const Meta_Feature_Local _{cls.name}_locals[] = {{{local}}};\n"
         f"constinit const Meta_Class {cls.name}::static_meta_class ="
-        f" {{{{{{{_head(cls.flags, cls.name)}}}, _{cls.name}_MFA, {len(cls.features)}, sizeof({cls.name})}},"
+        f" {{{{{{{head(cls.flags, cls.name)}}}, _{cls.name}_MFA, {len(cls.features)}, sizeof({cls.name})}},"
         f" _{cls.name}_locals, {superclass}, {keys}, &{repository}}};"
     )
 

@@ -63,6 +63,9 @@ class SimulatedServer:
         """The server's own command line, as the system knows it."""
         return Path(f"/proc/{self.pid}/cmdline").read_text(encoding="utf-8").split("\0")[:-1]
 
+    def send_signal(self, number):
+        self._process.send_signal(number)
+
     def stop(self, with_signal=signal.SIGTERM):
         """Stops the server and returns its exit code."""
         if self._process.poll() is None:

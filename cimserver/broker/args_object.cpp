@@ -1,4 +1,5 @@
 #include "cimserver/broker/conversion.h"
+#include "cimserver/broker/not_offered.h"
 #include "cimserver/broker/objects.h"
 
 namespace cimserver
@@ -8,12 +9,7 @@ namespace
 
 CMPIStatus add_arg(const CMPIArgs* self, const char* name, const CMPIValue* value, CMPIType type) noexcept
 {
-    return answer([&] { put(object<Args_Object>(self).args, name, from_cmpi(value, type)); });
-}
-
-CMPIData get_arg(const CMPIArgs* self, const char* name, CMPIStatus* status) noexcept
-{
-    return answer(status, no_data(), [&] { return data_named(object<Args_Object>(self).args, name); });
+    return answer([&] { put(object<Args_Object>(self).args, required(name), from_cmpi(value, type)); });
 }
 
 CMPIData get_arg_at(const CMPIArgs* self, CMPICount index, CMPIString** name, CMPIStatus* status) noexcept
@@ -33,7 +29,7 @@ const CMPIArgsFT Args_Object::table = {
     .release = release<Args_Object>,
     .clone = clone<Args_Object>,
     .addArg = add_arg,
-    .getArg = get_arg,
+    .getArg = not_offered,
     .getArgAt = get_arg_at,
     .getArgCount = get_arg_count,
 };

@@ -1,4 +1,5 @@
 #include "cimserver/broker/conversion.h"
+#include "cimserver/broker/not_offered.h"
 #include "cimserver/broker/objects.h"
 
 namespace cimserver
@@ -32,11 +33,6 @@ Value& element(Array_Object& array, CMPICount index)
 CMPICount get_size(const CMPIArray* self, CMPIStatus* status) noexcept
 {
     return answer<CMPICount>(status, 0, [&] { return static_cast<CMPICount>(object<Array_Object>(self).elements.size()); });
-}
-
-CMPIType get_simple_type(const CMPIArray* self, CMPIStatus* status) noexcept
-{
-    return answer<CMPIType>(status, CMPI_null, [&] { return object<Array_Object>(self).element_type; });
 }
 
 CMPIData get_element_at(const CMPIArray* self, CMPICount index, CMPIStatus* status) noexcept
@@ -78,7 +74,7 @@ const CMPIArrayFT Array_Object::table = {
     .release = release<Array_Object>,
     .clone = clone<Array_Object>,
     .getSize = get_size,
-    .getSimpleType = get_simple_type,
+    .getSimpleType = not_offered,
     .getElementAt = get_element_at,
     .setElementAt = set_element_at,
 };

@@ -23,7 +23,7 @@ template <class T> T& named(T* whoever)
 
 } // namespace
 
-Operations& Broker::operations() const { return named(_operations.load()); }
+Name_Spaces& Broker::name_spaces() const { return named(_name_spaces.load()); }
 
 Indication_Sink& Broker::indication_sink() const { return named(_indication_sink.load()); }
 

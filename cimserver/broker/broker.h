@@ -4,8 +4,8 @@
 // on any thread and from within a request. What this server does not offer answers CMPI_RC_ERR_NOT_SUPPORTED.
 #pragma once
 
-#include "cimserver/broker/model.h"
-#include "cimserver/broker/repository.h"
+#include "cimserver/model/repository.h"
+#include "cimserver/model/values.h"
 
 #include <cmpift.h>
 
@@ -14,7 +14,7 @@
 namespace cimserver
 {
 
-class Operations;
+class Name_Spaces;
 
 // Takes the indications that providers raise.
 class Indication_Sink
@@ -42,8 +42,8 @@ public:
     const Repository& repository() const { return _repository; }
 
     // Who answers up-calls; null (as at first): nobody. Whoever is named must stay until the module is closed.
-    void set_operations(Operations* operations) { _operations = operations; }
-    Operations& operations() const; // throws Failure NOT_SUPPORTED when nobody is named
+    void set_name_spaces(Name_Spaces* name_spaces) { _name_spaces = name_spaces; }
+    Name_Spaces& name_spaces() const; // throws Failure NOT_SUPPORTED when nobody is named
 
     // Who takes indications; null (as at first): nobody. Whoever is named must stay until the module is closed.
     void set_indication_sink(Indication_Sink* sink) { _indication_sink = sink; }
@@ -52,7 +52,7 @@ public:
 private:
     CMPIBroker _face;
     const Repository& _repository;
-    std::atomic<Operations*> _operations = nullptr;
+    std::atomic<Name_Spaces*> _name_spaces = nullptr;
     std::atomic<Indication_Sink*> _indication_sink = nullptr;
 };
 

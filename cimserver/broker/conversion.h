@@ -1,8 +1,9 @@
 // Between CMPI data and the server's model.
 #pragma once
 
-#include "cimserver/broker/model.h"
 #include "cimserver/broker/objects.h"
+#include "cimserver/model/cim_types.h"
+#include "cimserver/model/values.h"
 
 #include <string>
 
@@ -22,12 +23,5 @@ CMPIData to_cmpi(const Value& value);
 // The value of an element of a named list, as getKey, getArg and getEntry answer it: NOT_FOUND when there is none.
 CMPIData data_named(const std::vector<Named_Value>& list, const char* name);
 CMPIData data_at(const std::vector<Named_Value>& list, CMPICount index, CMPIString** name);
-
-// Adds a value to such a list, in the place of one of the same name.
-void put(std::vector<Named_Value>& list, const char* name, Value value);
-
-// The path as one line: "root/zemlar:Class.Key=value,...", texts and referenced paths between double quotes. Each level of
-// references doubles the escapes below it: not for paths whose depth nobody has checked.
-std::string path_text(const Object_Path& path);
 
 } // namespace cimserver

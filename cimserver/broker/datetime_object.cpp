@@ -1,45 +1,36 @@
+#include "cimserver/broker/not_offered.h"
 #include "cimserver/broker/objects.h"
+#include "text/datetime.h"
 
 namespace cimserver
 {
 namespace
 {
 
-template <class T> T valid(std::optional<T> result)
+// Any numbers in the form: a timestamp of all zeros is what many agents answer for an unset clock.
+std::string checked(std::string text)
 {
-    if (!result)
+    if (!text::read_datetime(text))
         throw Failure{CMPI_RC_ERR_INVALID_PARAMETER};
-    return *std::move(result);
-}
-
-CMPIUint64 get_binary_format(const CMPIDateTime* self, CMPIStatus* status) noexcept
-{
-    return answer<CMPIUint64>(status, 0, [&] { return object<Datetime_Object>(self).value.microseconds; });
+    return text;
 }
 
 CMPIString* get_string_format(const CMPIDateTime* self, CMPIStatus* status) noexcept
 {
-    return answer<CMPIString*>(status, nullptr, [&] { return make<String_Object>(object<Datetime_Object>(self).text).face(); });
-}
-
-CMPIBoolean is_interval(const CMPIDateTime* self, CMPIStatus* status) noexcept
-{
-    return answer<CMPIBoolean>(status, 0, [&] { return object<Datetime_Object>(self).value.interval; });
+    return answer_new<String_Object>(status, [&] { return object<Datetime_Object>(self).text; });
 }
 
 } // namespace
 
-Datetime_Object::Datetime_Object(std::string text_) : text(std::move(text_)), value(valid(parse_datetime(text))) {}
-
-Datetime_Object::Datetime_Object(const Datetime_Value& value_) : text(valid(format_datetime(value_))), value(value_) {}
+Datetime_Object::Datetime_Object(std::string text_) : text(checked(std::move(text_))) {}
 
 const CMPIDateTimeFT Datetime_Object::table = {
     .ftVersion = 100,
     .release = release<Datetime_Object>,
     .clone = clone<Datetime_Object>,
-    .getBinaryFormat = get_binary_format,
+    .getBinaryFormat = not_offered,
     .getStringFormat = get_string_format,
-    .isInterval = is_interval,
+    .isInterval = not_offered,
 };
 
 } // namespace cimserver

@@ -1,4 +1,5 @@
 #include "cimserver/broker/conversion.h"
+#include "cimserver/broker/not_offered.h"
 #include "cimserver/broker/objects.h"
 
 namespace cimserver
@@ -28,16 +29,6 @@ CMPIBoolean has_next(const CMPIEnumeration* self, CMPIStatus* status) noexcept
                                });
 }
 
-CMPIArray* to_array(const CMPIEnumeration* self, CMPIStatus* status) noexcept
-{
-    return answer<CMPIArray*>(status, nullptr,
-                              [&]
-                              {
-                                  const auto& enumeration = object<Enumeration_Object>(self);
-                                  return make<Array_Object>(enumeration.element_type, enumeration.elements).face();
-                              });
-}
-
 } // namespace
 
 const CMPIEnumerationFT Enumeration_Object::table = {
@@ -46,7 +37,7 @@ const CMPIEnumerationFT Enumeration_Object::table = {
     .clone = clone<Enumeration_Object>,
     .getNext = get_next,
     .hasNext = has_next,
-    .toArray = to_array,
+    .toArray = not_offered,
 };
 
 } // namespace cimserver

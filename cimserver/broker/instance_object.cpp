@@ -1,4 +1,5 @@
 #include "cimserver/broker/conversion.h"
+#include "cimserver/broker/not_offered.h"
 #include "cimserver/broker/objects.h"
 
 namespace cimserver
@@ -66,26 +67,12 @@ CMPIStatus set_property(const CMPIInstance* self, const char* name, const CMPIVa
 
 CMPIObjectPath* get_object_path(const CMPIInstance* self, CMPIStatus* status) noexcept
 {
-    return answer<CMPIObjectPath*>(status, nullptr, [&] { return make<Path_Object>(object<Instance_Object>(self).path).face(); });
+    return answer_new<Path_Object>(status, [&] { return object<Instance_Object>(self).path; });
 }
 
 CMPIStatus set_property_filter(CMPIInstance* self, const char** properties, const char** keys) noexcept
 {
     return answer([&] { object<Instance_Object>(self).filter(properties, keys); });
-}
-
-// The class of an instance stays: its properties are laid out for it.
-CMPIStatus set_object_path(CMPIInstance* self, const CMPIObjectPath* source) noexcept
-{
-    return answer(
-        [&]
-        {
-            auto& instance = object<Instance_Object>(self);
-            const auto& path = object<Path_Object>(source).path;
-            if (!equal_names(path.class_name, instance.path.class_name))
-                throw Failure{CMPI_RC_ERR_INVALID_CLASS};
-            instance.path = path;
-        });
 }
 
 void show_named(const Property_Layout& layout, const char** names, std::vector<bool>& filter)
@@ -163,7 +150,7 @@ const CMPIInstanceFT Instance_Object::table = {
     .setProperty = set_property,
     .getObjectPath = get_object_path,
     .setPropertyFilter = set_property_filter,
-    .setObjectPath = set_object_path,
+    .setObjectPath = not_offered,
 };
 
 } // namespace cimserver

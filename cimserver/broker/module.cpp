@@ -1,8 +1,8 @@
 #include "cimserver/broker/module.h"
 
-#include "cimserver/broker/model.h"
 #include "cimserver/broker/request.h"
 #include "cimserver/broker/return_code.h"
+#include "cimserver/model/values.h"
 
 #include <dlfcn.h>
 #include <stdexcept>
@@ -152,7 +152,7 @@ template <class MI> MI* Module::make_interface(const std::string& provider_name,
     CMPIStatus status{CMPI_RC_OK, nullptr};
     MI* made = factory(_broker.face(), request.context(), &status);
     if (!made || status.rc != CMPI_RC_OK)
-        throw Cim_Error(CIM_ERR_FAILED, provider_name + " cannot be loaded: " + return_code_name(status.rc));
+        throw Cim_Error(CIM_ERR_FAILED, outcome_text(provider_name, "loading it", status.rc));
 
     const std::lock_guard<std::mutex> lock(_cleanup_mutex);
     _cleanups.emplace_back([made](const CMPIContext* context) { return made->ft->cleanup(made, context, 1); });

@@ -6,7 +6,8 @@
 #pragma once
 
 #include "cimserver/broker/broker.h"
-#include "cimserver/broker/repository.h"
+#include "cimserver/broker/provider_turn.h"
+#include "cimserver/model/repository.h"
 
 #include <cmpift.h>
 
@@ -46,6 +47,9 @@ public:
     CMPIMethodMI* method_mi(const Class_Entry& entry);
     CMPIIndicationMI* indication_mi(const Class_Entry& entry);
 
+    // Who may be with the provider of a served class.
+    Provider_Turns& turns(const Class_Entry& entry) { return _providers.at(&entry)->turns; }
+
     // Keeps the module loaded while a request runs. Throws Cim_Error once the module is being closed.
     class Use
     {
@@ -76,6 +80,7 @@ private:
         std::atomic<CMPIMethodMI*> method_mi = nullptr;
         std::atomic<CMPIIndicationMI*> indication_mi = nullptr;
         bool being_made = false;
+        Provider_Turns turns;
     };
 
     static Library open(const std::string& file);

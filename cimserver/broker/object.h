@@ -136,14 +136,10 @@ template <class Result, class Body> Result answer(CMPIStatus* status, Result on_
     return result;
 }
 
-// What a table function answers that this server does not offer.
-inline CMPIStatus not_supported() { return {CMPI_RC_ERR_NOT_SUPPORTED, nullptr}; }
-
-template <class Result> Result not_supported(CMPIStatus* status, Result result)
+// A new object behind the handle that a table function answers; null when a body throws.
+template <class T, class Body> typename T::Face* answer_new(CMPIStatus* status, Body arguments) noexcept
 {
-    if (status)
-        *status = not_supported();
-    return result;
+    return answer<typename T::Face*>(status, nullptr, [&] { return make<T>(arguments()).face(); });
 }
 
 // Data that is not there, which goes with a status other than OK.

@@ -3,10 +3,9 @@
 // The members here work on the model and throw Failure; the function tables behind the handles are shells around them.
 #pragma once
 
-#include "cimserver/broker/datetime_text.h"
-#include "cimserver/broker/model.h"
 #include "cimserver/broker/object.h"
-#include "cimserver/broker/property_layout.h"
+#include "cimserver/model/property_layout.h"
+#include "cimserver/model/values.h"
 
 #include <memory>
 #include <string>
@@ -47,10 +46,8 @@ public:
     static const Table table;
 
     explicit Datetime_Object(std::string text_); // throws INVALID_PARAMETER when the text is no datetime
-    explicit Datetime_Object(const Datetime_Value& value_);
 
     const std::string text;
-    const Datetime_Value value;
 };
 
 class Path_Object : public Handle<CMPIObjectPath, Path_Object>
@@ -151,17 +148,15 @@ public:
     std::size_t next = 0;
 };
 
-// The query of an indication filter, "SELECT properties FROM class ..."; this server does not evaluate it for the provider.
+// The query of an indication filter, which the server evaluates itself.
 class Select_Object : public Handle<CMPISelectExp, Select_Object>
 {
 public:
     static const Table table;
 
-    // Throws INVALID_QUERY when the text selects nothing from anything.
-    explicit Select_Object(std::string query_);
+    explicit Select_Object(std::string query_) : query(std::move(query_)) {}
 
     const std::string query;
-    const std::vector<std::string> projection; // the selected properties; empty: all
 };
 
 } // namespace cimserver

@@ -1,6 +1,6 @@
 #include "cimserver/broker/request.h"
 
-#include "cimserver/broker/principal.h"
+#include "cimserver/model/principal.h"
 
 namespace cimserver
 {

@@ -1,4 +1,5 @@
 #include "cimserver/broker/conversion.h"
+#include "cimserver/broker/not_offered.h"
 #include "cimserver/broker/objects.h"
 
 namespace cimserver
@@ -27,14 +28,12 @@ CMPIStatus return_done(const CMPIResult* self) noexcept
     return answer([&] { object<Result_Object>(self); });
 }
 
-CMPIResult* no_clone(const CMPIResult*, CMPIStatus* status) noexcept { return not_supported<CMPIResult*>(status, nullptr); }
-
 } // namespace
 
 const CMPIResultFT Result_Object::table = {
     .ftVersion = 100,
     .release = release<Result_Object>,
-    .clone = no_clone,
+    .clone = not_offered,
     .returnData = return_data,
     .returnInstance = return_instance,
     .returnObjectPath = return_object_path,

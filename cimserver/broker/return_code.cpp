@@ -1,8 +1,7 @@
 #include "cimserver/broker/return_code.h"
 
-#include "cimserver/broker/model.h"
+#include "cimserver/model/values.h"
 
-#include <algorithm>
 #include <iterator>
 
 namespace cimserver
@@ -10,47 +9,39 @@ namespace cimserver
 namespace
 {
 
-struct Row
-{
-    int code;
-    const char* name;
+// By their code.
+constexpr const char* phrases[] = {
+    "",
+    "",
+    "access denied",
+    "there is no such name space",
+    "a parameter is wrong",
+    "the class is wrong",
+    "not found",
+    "",
+    "the class has subclasses",
+    "the class has instances",
+    "the superclass is wrong",
+    "it exists already",
+    "there is no such property",
+    "a value has the wrong type",
+    "unknown query language",
+    "the query is wrong",
+    "the method is not available",
+    "there is no such method",
 };
 
-constexpr Row rows[] = {
-    {0, "CMPI_RC_OK"},
-    {1, "CMPI_RC_ERR_FAILED"},
-    {2, "CMPI_RC_ERR_ACCESS_DENIED"},
-    {3, "CMPI_RC_ERR_INVALID_NAMESPACE"},
-    {4, "CMPI_RC_ERR_INVALID_PARAMETER"},
-    {5, "CMPI_RC_ERR_INVALID_CLASS"},
-    {6, "CMPI_RC_ERR_NOT_FOUND"},
-    {7, "CMPI_RC_ERR_NOT_SUPPORTED"},
-    {8, "CMPI_RC_ERR_CLASS_HAS_CHILDREN"},
-    {9, "CMPI_RC_ERR_CLASS_HAS_INSTANCES"},
-    {10, "CMPI_RC_ERR_INVALID_SUPERCLASS"},
-    {11, "CMPI_RC_ERR_ALREADY_EXISTS"},
-    {12, "CMPI_RC_ERR_NO_SUCH_PROPERTY"},
-    {13, "CMPI_RC_ERR_TYPE_MISMATCH"},
-    {14, "CMPI_RC_ERR_QUERY_LANGUAGE_NOT_SUPPORTED"},
-    {15, "CMPI_RC_ERR_INVALID_QUERY"},
-    {16, "CMPI_RC_ERR_METHOD_NOT_AVAILABLE"},
-    {17, "CMPI_RC_ERR_METHOD_NOT_FOUND"},
-    {50, "CMPI_RC_DO_NOT_UNLOAD"},
-    {51, "CMPI_RC_NEVER_UNLOAD"},
-    {60, "CMPI_RC_ERR_INVALID_HANDLE"},
-    {61, "CMPI_RC_ERR_INVALID_DATA_TYPE"},
-    {100, "CMPI_RC_ERROR_SYSTEM"},
-    {200, "CMPI_RC_ERROR"},
-};
-
-constexpr bool is_shared(int code) { return code >= 1 && code <= 17; }
+constexpr bool is_shared(int code) { return code >= 1 && code < static_cast<int>(std::size(phrases)); }
 
 } // namespace
 
-std::string return_code_name(CMPIrc rc)
+std::string outcome_text(const std::string& class_name, const std::string& action, CMPIrc rc)
 {
-    const auto found = std::find_if(std::begin(rows), std::end(rows), [rc](const Row& row) { return row.code == rc; });
-    return found == std::end(rows) ? "return code " + std::to_string(rc) : found->name;
+    if (rc == CMPI_RC_ERR_NOT_SUPPORTED)
+        return class_name + " does not support " + action;
+    if (is_shared(rc) && *phrases[rc])
+        return class_name + ": " + action + ": " + phrases[rc];
+    return class_name + ": " + action + " failed" + (rc == CMPI_RC_ERR_FAILED ? "" : " with code " + std::to_string(rc));
 }
 
 int cim_status(CMPIrc rc) { return is_shared(rc) ? rc : CIM_ERR_FAILED; }

@@ -1,4 +1,4 @@
-// CMPI return codes: their names, and the CIM status codes (DSP0200) they stand for.
+// CMPI return codes: what they mean, for people, and the CIM status codes (DSP0200) they stand for.
 #pragma once
 
 #include <cmpidt.h>
@@ -8,7 +8,9 @@
 namespace cimserver
 {
 
-std::string return_code_name(CMPIrc rc); // "CMPI_RC_ERR_NOT_FOUND"; a number for a code outside the standard
+// What became of an action of a class, as a sentence: "ZEMLAR_FCPort does not support RequestStateChange", "ZEMLAR_FCPort:
+// GetInstance failed", "ZEMLAR_FCPort: DeleteInstance: access denied".
+std::string outcome_text(const std::string& class_name, const std::string& action, CMPIrc rc);
 
 int cim_status(CMPIrc rc);          // 1 to 17 are the same in both; everything else is CIM_ERR_FAILED
 CMPIrc return_code(int cim_status); // the reverse, for up-calls

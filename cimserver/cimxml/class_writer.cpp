@@ -1,11 +1,11 @@
 #include "cimserver/cimxml/class_writer.h"
 
-#include "cimserver/broker/names.h"
 #include "cimserver/cimxml/default_value.h"
-#include "cimserver/cimxml/meta_search.h"
 #include "cimserver/cimxml/object_writer.h"
 #include "cimserver/cimxml/qualifier_writer.h"
-#include "cimserver/cimxml/value_text.h"
+#include "cimserver/model/meta_search.h"
+#include "cimserver/model/names.h"
+#include "cimserver/model/value_text.h"
 
 #include <algorithm>
 #include <string>

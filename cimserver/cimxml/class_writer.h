@@ -1,8 +1,8 @@
 // Writes classes from the module's meta-data (DSP0201, DSP0203).
 #pragma once
 
-#include "cimserver/broker/model.h"
 #include "cimserver/cimxml/xml_writer.h"
+#include "cimserver/model/values.h"
 #include "runtime/meta.h"
 
 namespace cimserver

@@ -14,21 +14,12 @@ struct Connection_Watch::Connection
 {
     int socket;
     Phase phase;
+    Clock::time_point since;
     Clock::time_point deadline;
+    std::size_t answer_bytes;
     bool cut;
     std::list<Connection>::iterator self;
 };
-
-namespace
-{
-
-void cut(Connection_Watch::Connection& connection)
-{
-    connection.cut = true;
-    shutdown(connection.socket, SHUT_RDWR);
-}
-
-} // namespace
 
 Connection_Watch::Connection_Watch(const Limits& limits) : _limits(limits), _thread([this] { watch(); }) {}
 
@@ -46,11 +37,12 @@ Connection_Watch::Connection* Connection_Watch::add(int socket) noexcept
 try
 {
     const std::lock_guard lock(_mutex);
-    const Clock::time_point deadline = Clock::now() + _limits.receive;
-    _connections.push_back({socket, Phase::receiving, deadline, false, {}});
+    const Clock::time_point now = Clock::now();
+    _connections.push_back({socket, Phase::receiving, now, now + _limits.receive, 0, false, {}});
     _connections.back().self = std::prev(_connections.end());
     if (_connections.size() > _limits.connections)
-        cut_slowest();
+        if (Connection* one = slowest(false, nullptr))
+            cut(*one);
     _changed.notify_all();
     return &_connections.back();
 }
@@ -60,13 +52,22 @@ catch (const std::bad_alloc&)
     return nullptr;
 }
 
-void Connection_Watch::enter(Connection* connection, Phase phase)
+void Connection_Watch::enter(Connection* connection, Phase phase, std::size_t answer_bytes)
 {
     if (!connection)
         return;
     const std::lock_guard lock(_mutex);
     connection->phase = phase;
-    connection->deadline = Clock::now() + (phase == Phase::sending ? _limits.send : _limits.receive);
+    connection->since = Clock::now();
+    connection->deadline = connection->since + (phase == Phase::sending ? _limits.send : _limits.receive);
+    hold(*connection, answer_bytes);
+    while (_answer_bytes > _limits.answer_bytes)
+    {
+        Connection* one = slowest(true, connection);
+        if (!one)
+            return;
+        cut(*one);
+    }
 }
 
 void Connection_Watch::remove(Connection* connection)
@@ -74,7 +75,23 @@ void Connection_Watch::remove(Connection* connection)
     if (!connection)
         return;
     const std::lock_guard lock(_mutex);
+    hold(*connection, 0);
     _connections.erase(connection->self);
+}
+
+// What a connection that is cut still holds is about to go.
+void Connection_Watch::hold(Connection& connection, std::size_t answer_bytes)
+{
+    _answer_bytes -= connection.answer_bytes;
+    connection.answer_bytes = connection.cut ? 0 : answer_bytes;
+    _answer_bytes += connection.answer_bytes;
+}
+
+void Connection_Watch::cut(Connection& connection)
+{
+    connection.cut = true;
+    hold(connection, 0);
+    shutdown(connection.socket, SHUT_RDWR);
 }
 
 void Connection_Watch::watch()
@@ -98,14 +115,17 @@ void Connection_Watch::cut_expired()
             cut(connection);
 }
 
-void Connection_Watch::cut_slowest()
+// The one for which the server has waited longest; null when it waits for none.
+Connection_Watch::Connection* Connection_Watch::slowest(bool sending_only, const Connection* but_for)
 {
-    Connection* slowest = nullptr;
+    Connection* found = nullptr;
     for (Connection& connection : _connections)
-        if (!connection.cut && connection.phase == Phase::receiving && (!slowest || connection.deadline < slowest->deadline))
-            slowest = &connection;
-    if (slowest)
-        cut(*slowest);
+    {
+        const bool waited_for = connection.phase == Phase::sending || (connection.phase == Phase::receiving && !sending_only);
+        if (waited_for && !connection.cut && &connection != but_for && (!found || connection.since < found->since))
+            found = &connection;
+    }
+    return found;
 }
 
 } // namespace cimserver

@@ -1,8 +1,8 @@
 // Cuts connections that take too long, however they do it: silent ones and those that move a byte now and then.
 //
 // A connection has a deadline while the server waits for the client, and none while the client waits for the server. When
-// there are more connections than the limit, the one that has kept the server waiting longest for a request is cut at once,
-// so that slow clients never keep others out.
+// there are more connections than the limit, the one that has kept the server waiting longest is cut at once, and so is the one
+// that has not taken its answer for longest when the answers that wait hold too much memory: slow clients never keep others out.
 #pragma once
 
 #include <chrono>
@@ -28,6 +28,7 @@ public:
     struct Limits
     {
         std::size_t connections;
+        std::size_t answer_bytes; // of all answers that wait; a single one may be larger
         std::chrono::milliseconds receive;
         std::chrono::milliseconds send;
     };
@@ -43,18 +44,22 @@ public:
     // socket: its owner sees it end and closes it. Deadlines are kept to a second. Null, and the socket cut, when memory is
     // out; the other functions do nothing with a null.
     Connection* add(int socket) noexcept;
-    void enter(Connection* connection, Phase phase); // a new phase, or the same one from now on
+    // A new phase, or the same one from now on; with the size of the answer that waits.
+    void enter(Connection* connection, Phase phase, std::size_t answer_bytes = 0);
     void remove(Connection* connection);
 
 private:
     void watch();
     void cut_expired();
-    void cut_slowest();
+    Connection* slowest(bool sending_only, const Connection* but_for);
+    void cut(Connection& connection);
+    void hold(Connection& connection, std::size_t answer_bytes);
 
     Limits _limits;
     std::mutex _mutex;
     std::condition_variable _changed;
     std::list<Connection> _connections;
+    std::size_t _answer_bytes = 0; // of connections that are not cut
     bool _stopping = false;
     std::thread _thread;
 };

@@ -1,6 +1,6 @@
 #include "cimserver/cimxml/default_value.h"
 
-#include "cimserver/cimxml/value_text.h"
+#include "cimserver/model/value_text.h"
 #include "runtime/types.h"
 
 namespace cimserver

@@ -1,7 +1,7 @@
 // The defaults that the meta-data gives to properties.
 #pragma once
 
-#include "cimserver/broker/model.h"
+#include "cimserver/model/values.h"
 #include "runtime/meta.h"
 
 namespace cimserver

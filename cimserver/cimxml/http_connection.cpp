@@ -1,5 +1,8 @@
 #include "cimserver/cimxml/http_connection.h"
 
+#include "cimserver/cimxml/listener.h"
+#include "cimserver/model/names.h"
+
 #include <netdb.h>
 #include <sys/socket.h>
 
@@ -44,6 +47,19 @@ std::string client_address(MHD_Connection* connection)
     char text[NI_MAXHOST] = "?";
     getnameinfo(address, size, text, sizeof text, nullptr, 0, NI_NUMERICHOST);
     return text;
+}
+
+bool may_be_a_web_page(MHD_Connection* connection)
+{
+    if (MHD_lookup_connection_value(connection, MHD_HEADER_KIND, MHD_HTTP_HEADER_ORIGIN))
+        return true;
+    std::string host = header_of(connection, MHD_HTTP_HEADER_HOST);
+    const std::size_t port = host.rfind(':');
+    if (port != std::string::npos && host.find_first_not_of("0123456789", port + 1) == std::string::npos)
+        host.erase(port);
+    if (host.starts_with('[') && host.ends_with(']'))
+        host = host.substr(1, host.size() - 2);
+    return !host.empty() && !equal_names(host, "localhost") && !is_loopback(host);
 }
 
 bool announces_more_than(MHD_Connection* connection, std::size_t limit)

@@ -17,6 +17,10 @@ std::string header_of(MHD_Connection* connection, const char* name);
 // The client's numeric address.
 std::string client_address(MHD_Connection* connection);
 
+// Whether a web page may be behind a request to a server that knows its clients by their address only: it has an Origin, or a
+// Host that is none of this host's loopback names (a page's own name may lead here). No Host at all is no browser.
+bool may_be_a_web_page(MHD_Connection* connection);
+
 // Whether Content-Length tells of a body beyond the limit.
 bool announces_more_than(MHD_Connection* connection, std::size_t limit);
 

@@ -23,8 +23,17 @@ struct Http_Answer
     std::string body;      // CIM-XML; empty unless the status is 200
 };
 
-// Called on several threads at once. An exception that escapes becomes status 500.
-using Http_Handler = std::function<Http_Answer(const Http_Request&)>;
+// What a handler makes of a request: an answer, or (`rest`) work that may take long, because it waits for somebody else. The
+// rest is done by other threads than those that call handlers, so that these are never all held up.
+struct Http_Work
+{
+    Http_Answer answer;
+    std::function<Http_Answer()> rest; // none: the answer stands
+};
+
+// Called on several threads at once. The request lives until the rest is done. An exception that escapes from either becomes
+// status 500.
+using Http_Handler = std::function<Http_Work(const Http_Request&)>;
 
 // A request that is refused before any operation could be told from it (DSP0200: HTTP status and CIMError header).
 class Http_Refusal : public std::exception

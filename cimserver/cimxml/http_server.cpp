@@ -4,8 +4,9 @@
 #include "cimserver/cimxml/http_connection.h"
 #include "cimserver/cimxml/listener.h"
 #include "cimserver/cimxml/worker_pool.h"
+#include "cimserver/security/bounded_log.h"
 #include "cimserver/security/credentials.h"
-#include "cimserver/security/refusal_log.h"
+#include "cimserver/security/tls_identity.h"
 
 #include <microhttpd.h>
 
@@ -36,13 +37,17 @@ constexpr unsigned spare_connections = 64;
 // A client hears of a refused body only when it has sent all of it. One that goes on beyond this many times the limit is cut.
 constexpr std::size_t max_excess = 4;
 
+constexpr unsigned handlers = 2;
+constexpr unsigned spare_workers = 64; // for those that hang
+
 // One request on its way: filled by the byte mover, answered by a worker while the connection is suspended. One that is
 // answered already, because its login is refused, is only drained.
 struct Exchange
 {
     Http_Request request;
-    bool verifying = false;   // the login, while the connection is suspended
-    std::size_t received = 0; // bytes of the body, kept or not
+    std::function<Http_Answer()> rest; // of the work
+    bool verifying = false;            // the login, while the connection is suspended
+    std::size_t received = 0;          // bytes of the body, kept or not
     bool submitted = false;
     std::optional<Http_Answer> answer;
 
@@ -82,8 +87,11 @@ private:
     MHD_Result receive(Exchange& exchange, std::string_view bytes);
     MHD_Result finish(MHD_Connection* connection, Exchange& exchange);
     void submit(MHD_Connection* connection, Exchange& exchange);
+    void handle(MHD_Connection* connection, Exchange& exchange) noexcept;
     void work(MHD_Connection* connection, Exchange& exchange) noexcept;
-    void enter(MHD_Connection* connection, Connection_Watch::Phase phase);
+    bool pass_on(Worker_Pool& pool, MHD_Connection* connection, Exchange& exchange,
+                 void (Daemon::*step)(MHD_Connection*, Exchange&) noexcept) noexcept;
+    void enter(MHD_Connection* connection, Connection_Watch::Phase phase, std::size_t answer_bytes = 0);
     void refuse_connections();
     bool wait_for_answers(Clock::time_point deadline);
 
@@ -97,9 +105,10 @@ private:
     std::condition_variable _answered;
     std::size_t _unanswered = 0; // submitted, the answer not yet sent
 
-    Refusal_Log _refusals;
+    Bounded_Log _refusals{"more logins were refused"};
     Connection_Watch _watch;
     Worker_Pool _verifiers;
+    Worker_Pool _handlers;
     Worker_Pool _pool;
     MHD_Daemon* _http = nullptr;
 };
@@ -110,9 +119,10 @@ Http_Server::Daemon::Daemon(const Http_Endpoint& endpoint, const Http_Limits& li
     , _credentials(credentials)
     , _handler(std::move(handler))
     , _listener(endpoint.address, endpoint.port)
-    , _watch({limits.connections, limits.receive, limits.send})
-    , _verifiers(1, limits.waiting_logins)
-    , _pool(limits.workers, limits.waiting_requests)
+    , _watch({limits.connections, limits.answer_bytes, limits.receive, limits.send})
+    , _verifiers({1, 0, limits.connections + spare_connections})
+    , _handlers({handlers, 0, limits.waiting_requests})
+    , _pool({limits.workers, spare_workers, limits.waiting_requests})
 {
     start(endpoint);
     if (!_http)
@@ -123,8 +133,7 @@ void Http_Server::Daemon::start(const Http_Endpoint& endpoint)
 {
     std::vector<MHD_OptionItem> tls;
     if (endpoint.tls)
-        tls = {{MHD_OPTION_HTTPS_MEM_CERT, 0, const_cast<char*>(endpoint.tls->certificate.c_str())},
-               {MHD_OPTION_HTTPS_MEM_KEY, 0, const_cast<char*>(endpoint.tls->key.c_str())},
+        tls = {{MHD_OPTION_HTTPS_CERT_CALLBACK2, 0, identity_callback()},
                {MHD_OPTION_HTTPS_PRIORITIES, 0, const_cast<char*>(tls_priorities)}};
     tls.push_back({MHD_OPTION_END, 0, nullptr});
 
@@ -156,7 +165,7 @@ bool Http_Server::Daemon::stop(Clock::time_point deadline)
         return true;
     if (!_stopping.exchange(true))
         refuse_connections();
-    if (!_verifiers.stop(deadline) || !_pool.stop(deadline))
+    if (!_verifiers.stop(deadline) || !_handlers.stop(deadline) || !_pool.stop(deadline))
         return false;
     wait_for_answers(deadline);
     MHD_stop_daemon(_http);
@@ -228,6 +237,8 @@ MHD_Result Http_Server::Daemon::begin(MHD_Connection* connection, std::string_vi
 {
     if (method != MHD_HTTP_METHOD_POST)
         return reply(connection, {MHD_HTTP_METHOD_NOT_ALLOWED, "", ""});
+    if (!_credentials && may_be_a_web_page(connection))
+        return reply(connection, {MHD_HTTP_FORBIDDEN, "", ""});
     if (announces_more_than(connection, _limits.request_bytes))
         return reply(connection, {MHD_HTTP_CONTENT_TOO_LARGE, "", ""});
     enter(connection, Connection_Watch::Phase::receiving);
@@ -256,7 +267,7 @@ void Http_Server::Daemon::log_in(MHD_Connection* connection, Exchange& exchange)
     enter(connection, Connection_Watch::Phase::working);
     MHD_suspend_connection(connection);
     exchange.verifying = true;
-    if (_verifiers.submit(std::move(job)))
+    if (_verifiers.submit(std::move(job), client_address(connection)))
         return;
     exchange.answer = {MHD_HTTP_SERVICE_UNAVAILABLE, "", ""};
     MHD_resume_connection(connection);
@@ -270,7 +281,7 @@ void Http_Server::Daemon::verify(MHD_Connection* connection, Exchange& exchange,
             exchange.answer = {MHD_HTTP_SERVICE_UNAVAILABLE, "", ""};
         else if (!_credentials->verify(login))
         {
-            _refusals.tell(login.name, client_address(connection));
+            _refusals.tell("refused the login of \"" + printable_name(login.name) + "\" from " + client_address(connection));
             exchange.answer = {MHD_HTTP_UNAUTHORIZED, "", ""};
         }
     }
@@ -297,14 +308,13 @@ MHD_Result Http_Server::Daemon::finish(MHD_Connection* connection, Exchange& exc
         submit(connection, exchange);
         return MHD_YES;
     }
-    enter(connection, Connection_Watch::Phase::sending);
+    enter(connection, Connection_Watch::Phase::sending, exchange.answer->body.size());
     return reply(connection, *exchange.answer);
 }
 
 // The connection is suspended first: a worker may resume it before submit() returns.
 void Http_Server::Daemon::submit(MHD_Connection* connection, Exchange& exchange)
 {
-    Worker_Pool::Job job = [this, connection, &exchange] { work(connection, exchange); };
     enter(connection, Connection_Watch::Phase::working);
     MHD_suspend_connection(connection);
     exchange.submitted = true;
@@ -312,19 +322,47 @@ void Http_Server::Daemon::submit(MHD_Connection* connection, Exchange& exchange)
         const std::lock_guard lock(_mutex);
         ++_unanswered;
     }
-    if (_pool.submit(std::move(job)))
-        return;
+    if (!pass_on(_handlers, connection, exchange, &Daemon::handle))
+        MHD_resume_connection(connection);
+}
+
+// False when too much waits: the answer then says so.
+bool Http_Server::Daemon::pass_on(Worker_Pool& pool, MHD_Connection* connection, Exchange& exchange,
+                                  void (Daemon::*step)(MHD_Connection*, Exchange&) noexcept) noexcept
+{
     exchange.answer = {MHD_HTTP_SERVICE_UNAVAILABLE, "", ""};
-    MHD_resume_connection(connection);
+    return pool.submit([this, connection, &exchange, step] { (this->*step)(connection, exchange); });
+}
+
+void Http_Server::Daemon::handle(MHD_Connection* connection, Exchange& exchange) noexcept
+{
+    bool passed_on = false;
+    try
+    {
+        if (!_stopping)
+        {
+            Http_Work made = _handler(exchange.request);
+            exchange.rest = std::move(made.rest);
+            if (exchange.rest)
+                passed_on = pass_on(_pool, connection, exchange, &Daemon::work);
+            else
+                exchange.answer = std::move(made.answer);
+        }
+    }
+    catch (...)
+    {
+        exchange.answer = {MHD_HTTP_INTERNAL_SERVER_ERROR, "", ""};
+    }
+    if (!passed_on)
+        MHD_resume_connection(connection);
 }
 
 void Http_Server::Daemon::work(MHD_Connection* connection, Exchange& exchange) noexcept
 {
-    exchange.answer = {MHD_HTTP_SERVICE_UNAVAILABLE, "", ""};
     try
     {
         if (!_stopping)
-            exchange.answer = _handler(exchange.request);
+            exchange.answer = exchange.rest();
     }
     catch (...)
     {
@@ -333,10 +371,10 @@ void Http_Server::Daemon::work(MHD_Connection* connection, Exchange& exchange) n
     MHD_resume_connection(connection);
 }
 
-void Http_Server::Daemon::enter(MHD_Connection* connection, Connection_Watch::Phase phase)
+void Http_Server::Daemon::enter(MHD_Connection* connection, Connection_Watch::Phase phase, std::size_t answer_bytes)
 {
     void* context = MHD_get_connection_info(connection, MHD_CONNECTION_INFO_SOCKET_CONTEXT)->socket_context;
-    _watch.enter(static_cast<Connection_Watch::Connection*>(context), phase);
+    _watch.enter(static_cast<Connection_Watch::Connection*>(context), phase, answer_bytes);
 }
 
 Http_Server::Http_Server(const Http_Endpoint& endpoint, const Http_Limits& limits, Credentials* credentials, Http_Handler handler)

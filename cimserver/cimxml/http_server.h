@@ -2,23 +2,23 @@
 //
 // With credentials every request is asked for HTTP Basic, before its body is kept: 401 without a login or with a wrong one.
 // Logins that have to be verified by their hash wait apart from the requests of users who are known, so that nobody without a
-// password can take the workers from those; 503 when too many wait.
+// password can take the workers from those; addresses take turns, so that wrong passwords delay none but those who send them.
+// Without credentials what may come from a web page is refused: 403 (http_connection.h).
 //
-// One thread moves bytes for all connections, a few workers run the handler, so neither a slow client nor a slow operation
-// keeps others from being served. What passes a limit is refused with a status: 413 for a body beyond request_bytes (told
-// by its Content-Length, before any of it is read, else at its end), 503 when too many requests wait. Clients that do not
-// deliver a request or take an answer in time are cut, so is a body without a Content-Length that goes on far beyond the
-// limit, and so may be a client that ends its sending side before it has its answer.
+// One thread moves bytes for all connections, two run the handler, a few workers do what it leaves to be done, so neither a
+// slow client nor a slow operation keeps others from being served. Workers that are stuck are replaced (worker_pool.h). What
+// passes a limit is refused with a status: 413 for a body beyond request_bytes (told by its Content-Length, before any of it is
+// read, else at its end), 503 when too many requests wait. Clients that do not deliver a request or take an answer in time are
+// cut, so is a body without a Content-Length that goes on far beyond the limit, and so may be a client that ends its sending side
+// before it has its answer.
 #pragma once
 
 #include "cimserver/cimxml/http_message.h"
-#include "cimserver/security/tls_identity.h"
 
 #include <chrono>
 #include <cstddef>
 #include <cstdint>
 #include <memory>
-#include <optional>
 #include <string>
 
 namespace cimserver
@@ -30,15 +30,15 @@ struct Http_Endpoint
 {
     std::string address = "127.0.0.1"; // numeric, IPv4 or IPv6
     std::uint16_t port = 0;            // 0 picks a free one
-    std::optional<Tls_Identity> tls;   // none: plain HTTP
+    bool tls = false;                  // with what show_identity() shows, else plain HTTP
 };
 
 struct Http_Limits
 {
     std::size_t request_bytes = std::size_t{1} << 20;
     std::size_t connections = 256;
-    std::size_t waiting_requests = 256; // complete, not yet taken by a worker
-    std::size_t waiting_logins = 64;    // to be verified by their hash
+    std::size_t waiting_requests = 256;               // complete, not yet taken by a worker
+    std::size_t answer_bytes = std::size_t{64} << 20; // of all answers that clients have not taken
     unsigned workers = 8;
     std::chrono::milliseconds receive{30'000}; // for the head of a request, and again for its body
     std::chrono::milliseconds send{120'000};   // for an answer
@@ -57,8 +57,8 @@ public:
     std::uint16_t port() const;
 
     // Accepts no more connections, lets the running requests finish and their answers leave, refuses others with 503, ends
-    // all threads. False when a request still ran after the grace time: it goes on, the threads too, and neither the server
-    // nor what its handler uses may be destroyed without waiting for it.
+    // all threads. False when a request still ran after the grace time, or as soon as all that run are stuck: it goes on, the
+    // threads too, and neither the server nor what its handler uses may be destroyed without waiting for it.
     bool stop(std::chrono::milliseconds grace);
 
 private:

@@ -1,11 +1,9 @@
 #include "cimserver/cimxml/object_reader.h"
 
-#include "cimserver/broker/names.h"
 #include "cimserver/cimxml/http_message.h"
 #include "cimserver/cimxml/request_rules.h"
-#include "cimserver/cimxml/value_text.h"
-
-#include <charconv>
+#include "cimserver/model/names.h"
+#include "cimserver/model/value_conversion.h"
 
 namespace cimserver
 {
@@ -14,20 +12,6 @@ namespace
 {
 
 [[noreturn]] void fail(const std::string& description) { throw Cim_Error(CIM_ERR_INVALID_PARAMETER, description); }
-
-// Decimal or hexadecimal integers and decimal reals (DSP0201).
-bool is_number(std::string_view text)
-{
-    if (!text.empty() && (text.front() == '+' || text.front() == '-'))
-        text.remove_prefix(1);
-    if (text.starts_with("0x") || text.starts_with("0X"))
-        return text.size() > 2 && text.find_first_not_of("0123456789abcdefABCDEF", 2) == std::string_view::npos;
-    if (text.empty() || text.front() == '+' || text.front() == '-')
-        return false;
-    double number = 0;
-    const auto result = std::from_chars(text.data(), text.data() + text.size(), number);
-    return result.ec == std::errc() && result.ptr == text.data() + text.size();
-}
 
 Value text_value(std::string text) { return Value{CMPI_string, std::move(text)}; }
 
@@ -40,10 +24,9 @@ Value read_key_value(const Xml_Element& element)
         return Value{CMPI_boolean, read_boolean(element.text)};
     if (*value_type != "numeric")
         fail("unknown VALUETYPE of a key: " + *value_type);
-    const std::string_view number = trimmed(element.text);
-    if (!is_number(number))
+    if (!is_number_text(element.text))
         fail("not a number: " + element.text);
-    return text_value(std::string(number));
+    return text_value(std::string(trimmed(element.text)));
 }
 
 Value read_key(const Xml_Element& element, const std::string& name_space)
@@ -53,20 +36,12 @@ Value read_key(const Xml_Element& element, const std::string& name_space)
     return Value{CMPI_ref, std::make_shared<const Object_Path>(read_path(element, name_space))};
 }
 
-bool has_key(const Object_Path& path, std::string_view name)
-{
-    for (const Named_Value& key : path.keys)
-        if (equal_names(key.name, name))
-            return true;
-    return false;
-}
-
 void add_key(Object_Path& path, const Xml_Element& binding)
 {
     if (binding.name != "KEYBINDING")
         fail("more than one unnamed key");
     const std::string& name = *binding.attribute("NAME");
-    if (name.empty() || has_key(path, name))
+    if (name.empty() || find_named(path.keys, name))
         fail("key without a name of its own: " + name);
     path.keys.push_back({name, read_key(binding.children.front(), path.name_space)});
 }
@@ -167,20 +142,6 @@ Instance read_instance(const Xml_Element& element, const std::string& name_space
     return instance;
 }
 
-Instance read_embedded_instance(const std::string& text)
-try
-{
-    const Xml_Element element = read_xml(text);
-    if (element.name != "INSTANCE")
-        fail("no embedded instance but a " + element.name);
-    check_rules(element);
-    return read_instance(element, "");
-}
-catch (const Http_Refusal&)
-{
-    fail("an embedded instance that cannot be read");
-}
-
 std::string read_name_space(const Xml_Element& element)
 {
     std::string name_space;
@@ -202,12 +163,10 @@ Object_Path read_path(const Xml_Element& element, const std::string& name_space)
 
 bool read_boolean(std::string_view text)
 {
-    const std::string_view word = trimmed(text);
-    if (equal_names(word, "true"))
-        return true;
-    if (!equal_names(word, "false"))
+    const auto flag = read_boolean_text(text);
+    if (!flag)
         fail("neither true nor false: " + std::string(text));
-    return false;
+    return *flag;
 }
 
 } // namespace cimserver

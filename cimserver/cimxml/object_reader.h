@@ -1,8 +1,8 @@
 // Reads names, paths, values and instances of CIM-XML (DSP0201) whose shape has been checked by check_rules().
 #pragma once
 
-#include "cimserver/broker/model.h"
 #include "cimserver/cimxml/xml_tree.h"
+#include "cimserver/model/values.h"
 
 #include <string>
 #include <string_view>
@@ -27,9 +27,6 @@ Value read_value(const Xml_Element& element, const std::string& name_space);
 // An INSTANCE or a VALUE.NAMEDINSTANCE, which has the path in front; qualifiers are passed over, and what a property says of
 // its type too: the class knows it. Throws Cim_Error (invalid parameter) for a property with two values.
 Instance read_instance(const Xml_Element& element, const std::string& name_space);
-
-// The INSTANCE element that a text holds. Throws Cim_Error (invalid parameter) for any other text.
-Instance read_embedded_instance(const std::string& text);
 
 // TRUE or FALSE in any case, surrounded by blanks or not; anything else throws Cim_Error (invalid parameter).
 bool read_boolean(std::string_view text);

@@ -1,8 +1,8 @@
 #include "cimserver/cimxml/object_writer.h"
 
-#include "cimserver/cimxml/meta_search.h"
-#include "cimserver/cimxml/value_text.h"
-#include "cimserver/host_name.h"
+#include "cimserver/model/host_name.h"
+#include "cimserver/model/meta_search.h"
+#include "cimserver/model/value_text.h"
 
 #include <algorithm>
 #include <optional>
@@ -14,10 +14,6 @@ namespace
 {
 
 using Reference = std::shared_ptr<const Object_Path>;
-using Embedded = std::shared_ptr<const Instance>;
-
-// Each level of embedding escapes the one below it once more.
-constexpr int max_embedding = 4;
 
 void write_local_name_space(Xml_Writer& writer, const std::string& name_space)
 {
@@ -71,32 +67,15 @@ void write_local_path(Xml_Writer& writer, const Object_Path& path)
     writer.end();
 }
 
-void write_instance_at(Xml_Writer& writer, const Instance& instance, const zmlr::Meta_Class* origins, int depth);
-
-std::optional<std::string> embedded_text(const Embedded& instance, int depth)
-{
-    if (!instance || depth >= max_embedding)
-        return std::nullopt;
-    Xml_Writer writer;
-    write_instance_at(writer, *instance, nullptr, depth + 1);
-    return writer.take();
-}
-
-std::optional<std::string> scalar_text(const Value& value, int depth)
-{
-    const auto* embedded = std::get_if<Embedded>(&value.content);
-    return embedded ? embedded_text(*embedded, depth) : value_text(value);
-}
-
 // The texts of an array's elements; nothing when one of them cannot be sent. A null text is sent as an empty one: clients
 // know no null inside an array.
-std::optional<std::vector<std::string>> element_texts(const std::vector<Value>& elements, bool texts, int depth)
+std::optional<std::vector<std::string>> element_texts(const std::vector<Value>& elements, bool texts)
 {
     std::vector<std::string> result;
     result.reserve(elements.size());
     for (const Value& element : elements)
     {
-        std::optional<std::string> text = scalar_text(element, depth);
+        std::optional<std::string> text = value_text(element);
         if (!text && !(texts && element.null()))
             return std::nullopt;
         result.push_back(text ? std::move(*text) : std::string());
@@ -104,24 +83,16 @@ std::optional<std::vector<std::string>> element_texts(const std::vector<Value>& 
     return result;
 }
 
-void write_array(Xml_Writer& writer, const std::vector<Value>& elements, CMPIType type, int depth)
+void write_array(Xml_Writer& writer, const std::vector<Value>& elements, CMPIType type)
 {
     const CMPIType element_type = type & static_cast<CMPIType>(~CMPI_ARRAY);
-    const auto texts = element_texts(elements, element_type == CMPI_string || element_type == CMPI_chars, depth);
+    const auto texts = element_texts(elements, element_type == CMPI_string);
     if (!texts)
         return;
     writer.start("VALUE.ARRAY");
     for (const std::string& text : *texts)
         writer.element("VALUE", text);
     writer.end();
-}
-
-void write_value_at(Xml_Writer& writer, const Value& value, int depth)
-{
-    if (const auto* elements = std::get_if<std::vector<Value>>(&value.content))
-        write_array(writer, *elements, value.type, depth);
-    else if (const std::optional<std::string> text = scalar_text(value, depth))
-        writer.element("VALUE", *text);
 }
 
 // What all three kinds of property begin with.
@@ -144,7 +115,7 @@ void write_reference_property(Xml_Writer& writer, const Named_Value& property, c
     writer.end();
 }
 
-void write_property(Xml_Writer& writer, const Named_Value& property, const zmlr::Meta_Class* origins, int depth)
+void write_property(Xml_Writer& writer, const Named_Value& property, const zmlr::Meta_Class* origins)
 {
     const CMPIType type = property.value.type;
     if (!cim_type_name(type) || type == (CMPI_ref | CMPI_ARRAY))
@@ -152,17 +123,7 @@ void write_property(Xml_Writer& writer, const Named_Value& property, const zmlr:
     if (type == CMPI_ref)
         return write_reference_property(writer, property, origins);
     start_property(writer, (type & CMPI_ARRAY) != 0 ? "PROPERTY.ARRAY" : "PROPERTY", property, origins);
-    if (type == CMPI_instance)
-        writer.attribute("EmbeddedObject", "instance");
-    write_value_at(writer, property.value, depth);
-    writer.end();
-}
-
-void write_instance_at(Xml_Writer& writer, const Instance& instance, const zmlr::Meta_Class* origins, int depth)
-{
-    writer.start("INSTANCE").attribute("CLASSNAME", instance.path.class_name);
-    for (const Named_Value& property : instance.properties)
-        write_property(writer, property, origins, depth);
+    write_value(writer, property.value);
     writer.end();
 }
 
@@ -225,10 +186,19 @@ void write_object_with_path(Xml_Writer& writer, const Instance& instance, const 
 
 void write_instance(Xml_Writer& writer, const Instance& instance, const zmlr::Meta_Class* origins)
 {
-    write_instance_at(writer, instance, origins, 0);
+    writer.start("INSTANCE").attribute("CLASSNAME", instance.path.class_name);
+    for (const Named_Value& property : instance.properties)
+        write_property(writer, property, origins);
+    writer.end();
 }
 
-void write_value(Xml_Writer& writer, const Value& value) { write_value_at(writer, value, 0); }
+void write_value(Xml_Writer& writer, const Value& value)
+{
+    if (const auto* elements = std::get_if<std::vector<Value>>(&value.content))
+        write_array(writer, *elements, value.type);
+    else if (const std::optional<std::string> text = value_text(value))
+        writer.element("VALUE", *text);
+}
 
 void write_any_value(Xml_Writer& writer, const Value& value)
 {
@@ -257,8 +227,6 @@ void write_output_parameter(Xml_Writer& writer, const Named_Value& parameter)
     if (!can_be_sent(parameter.value))
         return;
     writer.start("PARAMVALUE").attribute("NAME", parameter.name).attribute("PARAMTYPE", cim_type_name(parameter.value.type));
-    if ((parameter.value.type & ~CMPI_ARRAY) == CMPI_instance)
-        writer.attribute("EmbeddedObject", "instance");
     write_any_value(writer, parameter.value);
     writer.end();
 }

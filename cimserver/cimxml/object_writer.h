@@ -4,8 +4,8 @@
 // at all: null keys, arrays of references (there is no element for them) and values of no known type.
 #pragma once
 
-#include "cimserver/broker/model.h"
 #include "cimserver/cimxml/xml_writer.h"
+#include "cimserver/model/values.h"
 #include "runtime/meta.h"
 
 namespace cimserver

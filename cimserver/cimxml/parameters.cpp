@@ -1,7 +1,7 @@
 #include "cimserver/cimxml/parameters.h"
 
-#include "cimserver/broker/names.h"
 #include "cimserver/cimxml/object_reader.h"
+#include "cimserver/model/names.h"
 
 #include <algorithm>
 

@@ -2,8 +2,8 @@
 // without regard to case.
 #pragma once
 
-#include "cimserver/broker/model.h"
 #include "cimserver/cimxml/request_reader.h"
+#include "cimserver/model/values.h"
 
 #include <span>
 #include <string>

@@ -1,11 +1,12 @@
 #include "cimserver/cimxml/qualifier_writer.h"
 
-#include "cimserver/broker/names.h"
-#include "cimserver/cimxml/meta_search.h"
-#include "cimserver/qualifier_table.h"
+#include "cimserver/model/meta_search.h"
+#include "cimserver/model/names.h"
+#include "cimserver/model/qualifier_table.h"
 
 #include <span>
-#include <string_view>
+#include <sstream>
+#include <string>
 
 namespace cimserver
 {
@@ -13,81 +14,54 @@ namespace cimserver
 namespace
 {
 
-// The flavours of DSP0004: whether a subclass may give the qualifier another value, and whether it inherits it.
-struct Flavors
-{
-    bool overridable = true;
-    bool to_subclass = true;
-    bool translatable = false;
-};
+using Declaration = Qualifier_Declaration;
 
-struct Flag_Row
-{
-    zmlr::uint32 flag;
-    const char* name;
-    Flavors flavors;
-};
+std::span<const Declaration> declarations() { return {qualifier_declarations, num_qualifier_declarations}; }
 
-// The flags that are boolean qualifiers, in bit order. Not here: the kinds of features, In and Read, which are true unless
-// said otherwise, and EmbeddedInstance, which names a class: the table has it.
-// clang-format off
-constexpr Flag_Row flag_rows[] = {
-    {zmlr::Flag_Abstract,       "Abstract",       {false, false}},
-    {zmlr::Flag_Aggregate,      "Aggregate",      {false, true}},
-    {zmlr::Flag_Aggregation,    "Aggregation",    {false, true}},
-    {zmlr::Flag_Association,    "Association",    {false, true}},
-    {zmlr::Flag_Composition,    "Composition",    {false, true}},
-    {zmlr::Flag_Counter,        "Counter",        {}},
-    {zmlr::Flag_Delete,         "Delete",         {}},
-    {zmlr::Flag_DN,             "DN",             {false, true}},
-    {zmlr::Flag_EmbeddedObject, "EmbeddedObject", {false, true}},
-    {zmlr::Flag_Exception,      "Exception",      {false, true}},
-    {zmlr::Flag_Expensive,      "Expensive",      {}},
-    {zmlr::Flag_Experimental,   "Experimental",   {true, false}},
-    {zmlr::Flag_Gauge,          "Gauge",          {}},
-    {zmlr::Flag_IfDeleted,      "IfDeleted",      {}},
-    {zmlr::Flag_Indication,     "Indication",     {false, true}},
-    {zmlr::Flag_Invisible,      "Invisible",      {}},
-    {zmlr::Flag_Key,            "Key",            {false, true}},
-    {zmlr::Flag_Large,          "Large",          {}},
-    {zmlr::Flag_OctetString,    "OctetString",    {false, true}},
-    {zmlr::Flag_Out,            "Out",            {false, true}},
-    {zmlr::Flag_Required,       "Required",       {false, true}},
-    {zmlr::Flag_Static,         "Static",         {false, true}},
-    {zmlr::Flag_Terminal,       "Terminal",       {false, false}},
-    {zmlr::Flag_Weak,           "Weak",           {false, true}},
-    {zmlr::Flag_Write,          "Write",          {}},
-};
-// clang-format on
-
-void start_qualifier(Xml_Writer& writer, const char* name, const char* type, Flavors flavors)
+// Null when there is none of that name.
+const Declaration* find_declaration(std::string_view name)
 {
-    writer.start("QUALIFIER").attribute("NAME", name).attribute("TYPE", type);
-    if (!flavors.overridable)
+    for (const Declaration& row : declarations())
+        if (equal_names(row.name, name))
+            return &row;
+    return nullptr;
+}
+
+void start(Xml_Writer& writer, const char* element, const Declaration& row)
+{
+    writer.start(element).attribute("NAME", row.name).attribute("TYPE", row.type);
+    if (!row.overridable)
         writer.attribute("OVERRIDABLE", "false");
-    if (!flavors.to_subclass)
+    if (!row.to_subclass)
         writer.attribute("TOSUBCLASS", "false");
-    if (flavors.translatable)
+    if (row.translatable)
         writer.attribute("TRANSLATABLE", "true");
 }
 
-void write_boolean(Xml_Writer& writer, const char* name, bool value, Flavors flavors)
+void write_qualifier(Xml_Writer& writer, std::string_view name, std::string_view value)
 {
-    start_qualifier(writer, name, "boolean", flavors);
-    writer.element("VALUE", value ? "true" : "false").end();
-}
-
-void write_text(Xml_Writer& writer, const char* name, std::string_view value, Flavors flavors)
-{
-    start_qualifier(writer, name, "string", flavors);
+    start(writer, "QUALIFIER", *find_declaration(name));
     writer.element("VALUE", value).end();
 }
 
 void write_flags(Xml_Writer& writer, zmlr::uint32 flags)
 {
-    for (const Flag_Row& row : flag_rows)
+    for (const Declaration& row : declarations())
         if ((flags & row.flag) != 0)
-            write_boolean(writer, row.name, true, row.flavors);
+            write_qualifier(writer, row.name, "true");
+}
+
+void write_declaration(Xml_Writer& writer, const Declaration& row)
+{
+    start(writer, "QUALIFIER.DECLARATION", row);
+    writer.attribute("ISARRAY", row.array ? "true" : "false").start("SCOPE");
+    std::istringstream scopes(row.scopes);
+    for (std::string scope; scopes >> scope;)
+        writer.attribute(scope, "true");
+    writer.end();
+    if (row.value)
+        writer.element("VALUE", row.value);
+    writer.end();
 }
 
 using Rows = std::span<const Qualifier_Row>;
@@ -116,15 +90,13 @@ Rows rows_of(std::string_view class_name)
     return entry == index.end() ? Rows() : entry->second;
 }
 
-bool is_translatable(std::string_view name) { return equal_names(name, "Description") || equal_names(name, "Values"); }
-
 void write_row(Xml_Writer& writer, const Qualifier_Row& row)
 {
-    const std::span<const char* const> values(row.values, row.num_values);
-    start_qualifier(writer, row.name, "string", {true, true, is_translatable(row.name)});
+    const std::span<const char* const> texts(row.values, row.num_values);
+    start(writer, "QUALIFIER", *find_declaration(row.name));
     if (row.array)
         writer.start("VALUE.ARRAY");
-    for (const char* value : values)
+    for (const char* value : texts)
         writer.element("VALUE", value);
     if (row.array)
         writer.end();
@@ -158,9 +130,9 @@ void write_feature_qualifiers(Xml_Writer& writer, const zmlr::Meta_Class& meta_c
     const zmlr::Meta_Feature& feature = *meta_class.meta_features[index];
     write_flags(writer, feature.flags);
     if (zmlr::is_property(&feature) && (feature.flags & zmlr::Flag_Read) == 0)
-        write_boolean(writer, "Read", false, {});
+        write_qualifier(writer, "Read", "false");
     if (overrides(meta_class, index))
-        write_text(writer, "Override", feature.name, {true, false});
+        write_qualifier(writer, "Override", feature.name);
     if (const zmlr::Meta_Class* origin = describing_class_of(meta_class, feature.name))
         write_rows(writer, *origin, feature.name);
 }
@@ -168,10 +140,24 @@ void write_feature_qualifiers(Xml_Writer& writer, const zmlr::Meta_Class& meta_c
 void write_parameter_qualifiers(Xml_Writer& writer, const zmlr::Meta_Class& meta_class, const zmlr::Meta_Method& method,
                                 const zmlr::Meta_Feature& parameter)
 {
-    write_boolean(writer, "In", (parameter.flags & zmlr::Flag_In) != 0, {false, true});
+    write_qualifier(writer, "In", (parameter.flags & zmlr::Flag_In) != 0 ? "true" : "false");
     write_flags(writer, parameter.flags);
     if (const zmlr::Meta_Class* origin = describing_class_of(meta_class, method.name))
         write_rows(writer, *origin, method.name, parameter.name);
+}
+
+void write_qualifier_declarations(Xml_Writer& writer)
+{
+    for (const Declaration& row : declarations())
+        write_declaration(writer, row);
+}
+
+bool write_qualifier_declaration(Xml_Writer& writer, std::string_view name)
+{
+    const Declaration* row = find_declaration(name);
+    if (row)
+        write_declaration(writer, *row);
+    return row != nullptr;
 }
 
 } // namespace cimserver

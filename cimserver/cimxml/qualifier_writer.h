@@ -5,6 +5,8 @@
 #include "cimserver/cimxml/xml_writer.h"
 #include "runtime/meta.h"
 
+#include <string_view>
+
 namespace cimserver
 {
 
@@ -15,5 +17,9 @@ void write_feature_qualifiers(Xml_Writer& writer, const zmlr::Meta_Class& meta_c
 // A parameter's direction and flags, and the table's rows of the class that declares the method or last overrides it.
 void write_parameter_qualifiers(Xml_Writer& writer, const zmlr::Meta_Class& meta_class, const zmlr::Meta_Method& method,
                                 const zmlr::Meta_Feature& parameter);
+
+// QUALIFIER.DECLARATION of each qualifier that the server knows, or of one; false when there is none of that name.
+void write_qualifier_declarations(Xml_Writer& writer);
+bool write_qualifier_declaration(Xml_Writer& writer, std::string_view name);
 
 } // namespace cimserver

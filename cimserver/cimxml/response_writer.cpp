@@ -1,7 +1,7 @@
 #include "cimserver/cimxml/response_writer.h"
 
 #include "cimserver/cimxml/object_writer.h"
-#include "cimserver/cimxml/value_text.h"
+#include "cimserver/model/value_text.h"
 
 namespace cimserver
 {

@@ -1,10 +1,10 @@
 // Puts the answer of an operation into its CIM-XML response message (DSP0201).
 #pragma once
 
-#include "cimserver/broker/model.h"
 #include "cimserver/cimxml/request_reader.h"
 #include "cimserver/cimxml/xml_writer.h"
-#include "cimserver/operations.h"
+#include "cimserver/model/operations.h"
+#include "cimserver/model/values.h"
 
 #include <functional>
 #include <string>

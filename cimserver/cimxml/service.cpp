@@ -1,14 +1,16 @@
 #include "cimserver/cimxml/service.h"
 
-#include "cimserver/broker/names.h"
 #include "cimserver/cimxml/class_writer.h"
 #include "cimserver/cimxml/object_reader.h"
 #include "cimserver/cimxml/object_writer.h"
 #include "cimserver/cimxml/parameters.h"
+#include "cimserver/cimxml/qualifier_writer.h"
 #include "cimserver/cimxml/request_reader.h"
 #include "cimserver/cimxml/response_writer.h"
+#include "cimserver/model/names.h"
 
 #include <array>
+#include <memory>
 #include <new>
 
 namespace cimserver
@@ -26,37 +28,53 @@ Class_Selection read_class_selection(const Parameters& parameters)
     return selection;
 }
 
-void get_class(Operations& operations, const Parameters& parameters, Xml_Writer& writer)
+void get_class(Name_Spaces& name_spaces, const Parameters& parameters, Xml_Writer& writer)
 {
     Class_Selection selection = read_class_selection(parameters);
     selection.properties = parameters.property_list("PropertyList");
     const std::string class_name = parameters.class_name("ClassName");
-    write_class(writer, *operations.get_class(parameters.name_space(), class_name), selection);
+    write_class(writer, *name_spaces.at(parameters.name_space(), class_name).get_class(class_name), selection);
 }
 
-void enumerate_classes(Operations& operations, const Parameters& parameters, Xml_Writer& writer)
+void enumerate_classes(Name_Spaces& name_spaces, const Parameters& parameters, Xml_Writer& writer)
 {
     const Class_Selection selection = read_class_selection(parameters);
     const std::string class_name = parameters.optional_class_name("ClassName");
     const bool deep = parameters.boolean("DeepInheritance", false);
-    for (const zmlr::Meta_Class* meta_class : operations.enumerate_classes(parameters.name_space(), class_name, deep))
+    for (const zmlr::Meta_Class* meta_class :
+         name_spaces.at(parameters.name_space(), class_name).enumerate_classes(class_name, deep))
         write_class(writer, *meta_class, selection);
 }
 
-void enumerate_class_names(Operations& operations, const Parameters& parameters, Xml_Writer& writer)
+void enumerate_class_names(Name_Spaces& name_spaces, const Parameters& parameters, Xml_Writer& writer)
 {
     const std::string class_name = parameters.optional_class_name("ClassName");
     const bool deep = parameters.boolean("DeepInheritance", false);
-    for (const zmlr::Meta_Class* meta_class : operations.enumerate_classes(parameters.name_space(), class_name, deep))
+    for (const zmlr::Meta_Class* meta_class :
+         name_spaces.at(parameters.name_space(), class_name).enumerate_classes(class_name, deep))
         writer.start("CLASSNAME").attribute("NAME", meta_class->name).end();
 }
 
+void get_qualifier(Name_Spaces& name_spaces, const Parameters& parameters, Xml_Writer& writer)
+{
+    name_spaces.at(parameters.name_space(), "");
+    const std::string name = parameters.text("QualifierName");
+    if (!write_qualifier_declaration(writer, name))
+        throw Cim_Error(CIM_ERR_NOT_FOUND, "there is no qualifier " + name);
+}
+
+void enumerate_qualifiers(Name_Spaces& name_spaces, const Parameters& parameters, Xml_Writer& writer)
+{
+    name_spaces.at(parameters.name_space(), "");
+    write_qualifier_declarations(writer);
+}
+
 // A key without a name is the only key of its class.
-void name_single_key(Operations& operations, Object_Path& path)
+void name_single_key(Name_Spaces& name_spaces, Object_Path& path)
 {
     if (path.keys.size() != 1 || !path.keys.front().name.empty())
         return;
-    const zmlr::Meta_Class& meta_class = *operations.get_class(path.name_space, path.class_name);
+    const zmlr::Meta_Class& meta_class = *name_spaces.at(path).get_class(path.class_name);
     for (unsigned i = 0; meta_class.num_keys == 1 && i < meta_class.num_meta_features; ++i)
         if (zmlr::is_key(meta_class.meta_features[i]))
             path.keys.front().name = meta_class.meta_features[i]->name;
@@ -66,13 +84,13 @@ void name_single_key(Operations& operations, Object_Path& path)
 
 // The class whose features' origins are written; null when the client does not want them, and for an object of a class or a
 // name space that nobody here knows.
-const zmlr::Meta_Class* origins_of(Operations& operations, const Parameters& parameters, const Object_Path& path)
+const zmlr::Meta_Class* origins_of(Name_Spaces& name_spaces, const Parameters& parameters, const Object_Path& path)
 {
     if (!parameters.boolean("IncludeClassOrigin", false))
         return nullptr;
     try
     {
-        return operations.get_class(path.name_space, path.class_name);
+        return name_spaces.at(path).get_class(path.class_name);
     }
     catch (const Cim_Error&)
     {
@@ -80,85 +98,83 @@ const zmlr::Meta_Class* origins_of(Operations& operations, const Parameters& par
     }
 }
 
-Object_Path named_instance(Operations& operations, const Parameters& parameters)
+Object_Path named_instance(Name_Spaces& name_spaces, const Parameters& parameters)
 {
     Object_Path path = parameters.instance_name("InstanceName");
-    name_single_key(operations, path);
+    name_single_key(name_spaces, path);
     return path;
 }
 
-void get_instance(Operations& operations, const Parameters& parameters, Xml_Writer& writer)
+void get_instance(Name_Spaces& name_spaces, const Parameters& parameters, Xml_Writer& writer)
 {
     const Property_List properties = parameters.property_list("PropertyList");
-    const Instance instance = operations.get_instance(named_instance(operations, parameters), properties);
-    write_instance(writer, instance, origins_of(operations, parameters, instance.path));
+    const Object_Path path = named_instance(name_spaces, parameters);
+    const Instance instance = name_spaces.at(path).get_instance(path, properties);
+    write_instance(writer, instance, origins_of(name_spaces, parameters, instance.path));
 }
 
-void enumerate_instances(Operations& operations, const Parameters& parameters, Xml_Writer& writer)
+void enumerate_instances(Name_Spaces& name_spaces, const Parameters& parameters, Xml_Writer& writer)
 {
     const std::string class_name = parameters.class_name("ClassName");
     const bool deep = parameters.boolean("DeepInheritance", true);
     const Property_List properties = parameters.property_list("PropertyList");
-    for (const Instance& instance : operations.enumerate_instances(parameters.name_space(), class_name, deep, properties))
+    for (const Instance& instance :
+         name_spaces.at(parameters.name_space(), class_name).enumerate_instances(class_name, deep, properties))
     {
         writer.start("VALUE.NAMEDINSTANCE");
         write_instance_name(writer, instance.path);
-        write_instance(writer, instance, origins_of(operations, parameters, instance.path));
+        write_instance(writer, instance, origins_of(name_spaces, parameters, instance.path));
         writer.end();
     }
 }
 
-void enumerate_instance_names(Operations& operations, const Parameters& parameters, Xml_Writer& writer)
+void enumerate_instance_names(Name_Spaces& name_spaces, const Parameters& parameters, Xml_Writer& writer)
 {
     const std::string class_name = parameters.class_name("ClassName");
-    for (const Object_Path& path : operations.enumerate_instance_names(parameters.name_space(), class_name))
+    for (const Object_Path& path : name_spaces.at(parameters.name_space(), class_name).enumerate_instance_names(class_name))
         write_instance_name(writer, path);
 }
 
-void create_instance(Operations& operations, const Parameters& parameters, Xml_Writer& writer)
+void create_instance(Name_Spaces& name_spaces, const Parameters& parameters, Xml_Writer& writer)
 {
-    write_instance_name(writer, operations.create_instance(parameters.instance("NewInstance")));
+    const Instance instance = parameters.instance("NewInstance");
+    write_instance_name(writer, name_spaces.at(instance.path).create_instance(instance));
 }
 
-void modify_instance(Operations& operations, const Parameters& parameters, Xml_Writer&)
+void modify_instance(Name_Spaces& name_spaces, const Parameters& parameters, Xml_Writer&)
 {
     Instance instance = parameters.named_instance("ModifiedInstance");
-    name_single_key(operations, instance.path);
-    operations.modify_instance(instance, parameters.property_list("PropertyList"));
+    name_single_key(name_spaces, instance.path);
+    name_spaces.at(instance.path).modify_instance(instance, parameters.property_list("PropertyList"));
 }
 
-void delete_instance(Operations& operations, const Parameters& parameters, Xml_Writer&)
+void delete_instance(Name_Spaces& name_spaces, const Parameters& parameters, Xml_Writer&)
 {
-    operations.delete_instance(named_instance(operations, parameters));
+    const Object_Path path = named_instance(name_spaces, parameters);
+    name_spaces.at(path).delete_instance(path);
 }
 
-void get_property(Operations& operations, const Parameters& parameters, Xml_Writer& writer)
-{
-    const std::string property = parameters.text("PropertyName");
-    write_any_value(writer, operations.get_property(named_instance(operations, parameters), property));
-}
-
-void set_property(Operations& operations, const Parameters& parameters, Xml_Writer&)
+void get_property(Name_Spaces& name_spaces, const Parameters& parameters, Xml_Writer& writer)
 {
     const std::string property = parameters.text("PropertyName");
-    operations.set_property(named_instance(operations, parameters), property, parameters.value("NewValue"));
+    const Object_Path path = named_instance(name_spaces, parameters);
+    write_any_value(writer, name_spaces.at(path).get_property(path, property));
 }
 
-void exec_query(Operations& operations, const Parameters& parameters, Xml_Writer& writer)
+void set_property(Name_Spaces& name_spaces, const Parameters& parameters, Xml_Writer&)
 {
-    const std::string query = parameters.text("Query");
-    const std::string language = parameters.text("QueryLanguage");
-    for (const Instance& instance : operations.exec_query(parameters.name_space(), query, language))
-        write_object_with_path(writer, instance, nullptr);
+    const std::string property = parameters.text("PropertyName");
+    const Object_Path path = named_instance(name_spaces, parameters);
+    name_spaces.at(path).set_property(path, property, parameters.value("NewValue"));
 }
 
 // Where a traversal starts and what it is to find. References call the association's class their result class.
 struct Traversal
 {
-    Traversal(Operations& operations, const Parameters& parameters, bool to_associations)
+    Traversal(Name_Spaces& name_spaces, const Parameters& parameters, bool to_associations)
         : source(parameters.object_name("ObjectName"))
     {
-        name_single_key(operations, source);
+        name_single_key(name_spaces, source);
         filter.association_class = parameters.optional_class_name(to_associations ? "ResultClass" : "AssocClass");
         filter.role = parameters.optional_text("Role");
         if (to_associations)
@@ -171,10 +187,11 @@ struct Traversal
     Association_Filter filter;
 };
 
-void write_objects(Operations& operations, const Parameters& parameters, Xml_Writer& writer, const std::vector<Instance>& objects)
+void write_objects(Name_Spaces& name_spaces, const Parameters& parameters, Xml_Writer& writer,
+                   const std::vector<Instance>& objects)
 {
     for (const Instance& object : objects)
-        write_object_with_path(writer, object, origins_of(operations, parameters, object.path));
+        write_object_with_path(writer, object, origins_of(name_spaces, parameters, object.path));
 }
 
 void write_paths(Xml_Writer& writer, const std::vector<Object_Path>& paths)
@@ -187,30 +204,30 @@ void write_paths(Xml_Writer& writer, const std::vector<Object_Path>& paths)
     }
 }
 
-void associators(Operations& operations, const Parameters& parameters, Xml_Writer& writer)
+void associators(Name_Spaces& name_spaces, const Parameters& parameters, Xml_Writer& writer)
 {
-    const Traversal asked(operations, parameters, false);
-    write_objects(operations, parameters, writer,
-                  operations.associators(asked.source, asked.filter, parameters.property_list("PropertyList")));
+    const Traversal asked(name_spaces, parameters, false);
+    write_objects(name_spaces, parameters, writer,
+                  name_spaces.at(asked.source).associators(asked.source, asked.filter, parameters.property_list("PropertyList")));
 }
 
-void associator_names(Operations& operations, const Parameters& parameters, Xml_Writer& writer)
+void associator_names(Name_Spaces& name_spaces, const Parameters& parameters, Xml_Writer& writer)
 {
-    const Traversal asked(operations, parameters, false);
-    write_paths(writer, operations.associator_names(asked.source, asked.filter));
+    const Traversal asked(name_spaces, parameters, false);
+    write_paths(writer, name_spaces.at(asked.source).associator_names(asked.source, asked.filter));
 }
 
-void references(Operations& operations, const Parameters& parameters, Xml_Writer& writer)
+void references(Name_Spaces& name_spaces, const Parameters& parameters, Xml_Writer& writer)
 {
-    const Traversal asked(operations, parameters, true);
-    write_objects(operations, parameters, writer,
-                  operations.references(asked.source, asked.filter, parameters.property_list("PropertyList")));
+    const Traversal asked(name_spaces, parameters, true);
+    write_objects(name_spaces, parameters, writer,
+                  name_spaces.at(asked.source).references(asked.source, asked.filter, parameters.property_list("PropertyList")));
 }
 
-void reference_names(Operations& operations, const Parameters& parameters, Xml_Writer& writer)
+void reference_names(Name_Spaces& name_spaces, const Parameters& parameters, Xml_Writer& writer)
 {
-    const Traversal asked(operations, parameters, true);
-    write_paths(writer, operations.reference_names(asked.source, asked.filter));
+    const Traversal asked(name_spaces, parameters, true);
+    write_paths(writer, name_spaces.at(asked.source).reference_names(asked.source, asked.filter));
 }
 
 enum class Answer
@@ -219,10 +236,19 @@ enum class Answer
     nothing // no IRETURNVALUE at all
 };
 
+enum class Asks
+{
+    nobody,
+    the_class,    // the providers of ClassName, unless the server itself answers for it
+    the_instance, // the same of InstanceName
+    providers
+};
+
 struct Operation_Row
 {
     std::string_view name;
-    void (*run)(Operations&, const Parameters&, Xml_Writer&);
+    void (*run)(Name_Spaces&, const Parameters&, Xml_Writer&);
+    Asks asks;
     Answer answer;
     std::array<std::string_view, 8> parameters;
 };
@@ -230,33 +256,40 @@ struct Operation_Row
 // LocalOnly and IncludeQualifiers are deprecated for instances: they have no effect.
 // clang-format off
 constexpr Operation_Row operation_rows[] = {
-    {"AssociatorNames",        associator_names,         Answer::value,   {"ObjectName", "AssocClass", "ResultClass", "Role",
-                                                                           "ResultRole"}},
-    {"Associators",            associators,              Answer::value,   {"ObjectName", "AssocClass", "ResultClass", "Role",
-                                                                           "ResultRole", "IncludeQualifiers",
-                                                                           "IncludeClassOrigin", "PropertyList"}},
-    {"CreateInstance",         create_instance,          Answer::value,   {"NewInstance"}},
-    {"DeleteInstance",         delete_instance,          Answer::nothing, {"InstanceName"}},
-    {"EnumerateClassNames",    enumerate_class_names,    Answer::value,   {"ClassName", "DeepInheritance"}},
-    {"EnumerateClasses",       enumerate_classes,        Answer::value,   {"ClassName", "DeepInheritance", "LocalOnly",
-                                                                           "IncludeQualifiers", "IncludeClassOrigin"}},
-    {"EnumerateInstanceNames", enumerate_instance_names, Answer::value,   {"ClassName"}},
-    {"EnumerateInstances",     enumerate_instances,      Answer::value,   {"ClassName", "LocalOnly", "DeepInheritance",
-                                                                           "IncludeQualifiers", "IncludeClassOrigin",
-                                                                           "PropertyList"}},
-    {"ExecQuery",              exec_query,               Answer::value,   {"QueryLanguage", "Query"}},
-    {"GetClass",               get_class,                Answer::value,   {"ClassName", "LocalOnly", "IncludeQualifiers",
-                                                                           "IncludeClassOrigin", "PropertyList"}},
-    {"GetInstance",            get_instance,             Answer::value,   {"InstanceName", "LocalOnly", "IncludeQualifiers",
-                                                                           "IncludeClassOrigin", "PropertyList"}},
-    {"GetProperty",            get_property,             Answer::value,   {"InstanceName", "PropertyName"}},
-    {"ModifyInstance",         modify_instance,          Answer::nothing, {"ModifiedInstance", "IncludeQualifiers",
-                                                                           "PropertyList"}},
-    {"ReferenceNames",         reference_names,          Answer::value,   {"ObjectName", "ResultClass", "Role"}},
-    {"References",             references,               Answer::value,   {"ObjectName", "ResultClass", "Role",
-                                                                           "IncludeQualifiers", "IncludeClassOrigin",
-                                                                           "PropertyList"}},
-    {"SetProperty",            set_property,             Answer::nothing, {"InstanceName", "PropertyName", "NewValue"}},
+    {"AssociatorNames",        associator_names,         Asks::providers,    Answer::value,
+        {"ObjectName", "AssocClass", "ResultClass", "Role", "ResultRole"}},
+    {"Associators",            associators,              Asks::providers,    Answer::value,
+        {"ObjectName", "AssocClass", "ResultClass", "Role", "ResultRole", "IncludeQualifiers", "IncludeClassOrigin", "PropertyList"}},
+    {"CreateInstance",         create_instance,          Asks::providers,    Answer::value,
+        {"NewInstance"}},
+    {"DeleteInstance",         delete_instance,          Asks::providers,    Answer::nothing,
+        {"InstanceName"}},
+    {"EnumerateClassNames",    enumerate_class_names,    Asks::nobody,       Answer::value,
+        {"ClassName", "DeepInheritance"}},
+    {"EnumerateClasses",       enumerate_classes,        Asks::nobody,       Answer::value,
+        {"ClassName", "DeepInheritance", "LocalOnly", "IncludeQualifiers", "IncludeClassOrigin"}},
+    {"EnumerateInstanceNames", enumerate_instance_names, Asks::the_class,    Answer::value,
+        {"ClassName"}},
+    {"EnumerateInstances",     enumerate_instances,      Asks::the_class,    Answer::value,
+        {"ClassName", "LocalOnly", "DeepInheritance", "IncludeQualifiers", "IncludeClassOrigin", "PropertyList"}},
+    {"EnumerateQualifiers",    enumerate_qualifiers,     Asks::nobody,       Answer::value,
+        {}},
+    {"GetClass",               get_class,                Asks::nobody,       Answer::value,
+        {"ClassName", "LocalOnly", "IncludeQualifiers", "IncludeClassOrigin", "PropertyList"}},
+    {"GetInstance",            get_instance,             Asks::the_instance, Answer::value,
+        {"InstanceName", "LocalOnly", "IncludeQualifiers", "IncludeClassOrigin", "PropertyList"}},
+    {"GetProperty",            get_property,             Asks::the_instance, Answer::value,
+        {"InstanceName", "PropertyName"}},
+    {"GetQualifier",           get_qualifier,            Asks::nobody,       Answer::value,
+        {"QualifierName"}},
+    {"ModifyInstance",         modify_instance,          Asks::providers,    Answer::nothing,
+        {"ModifiedInstance", "IncludeQualifiers", "PropertyList"}},
+    {"ReferenceNames",         reference_names,          Asks::providers,    Answer::value,
+        {"ObjectName", "ResultClass", "Role"}},
+    {"References",             references,               Asks::providers,    Answer::value,
+        {"ObjectName", "ResultClass", "Role", "IncludeQualifiers", "IncludeClassOrigin", "PropertyList"}},
+    {"SetProperty",            set_property,             Asks::providers,    Answer::nothing,
+        {"InstanceName", "PropertyName", "NewValue"}},
 };
 // clang-format on
 
@@ -268,33 +301,47 @@ const Operation_Row& row_of(const std::string& method)
     throw Cim_Error(CIM_ERR_NOT_SUPPORTED, "operation not supported: " + method);
 }
 
-std::string run_operation(Operations& operations, const Cimxml_Request& request)
+bool may_take_long(Name_Spaces& name_spaces, const Operation_Row& row, const Parameters& parameters)
 {
-    const Operation_Row& row = row_of(request.method);
-    const Parameters parameters(request, row.parameters);
-    for (std::string_view flag : {"LocalOnly", "DeepInheritance", "IncludeQualifiers", "IncludeClassOrigin"})
-        parameters.boolean(flag, false); // refused when it is none, also where it has no effect
-    const auto run = [&](Xml_Writer& writer) { row.run(operations, parameters, writer); };
+    switch (row.asks)
+    {
+    case Asks::nobody:
+        return false;
+    case Asks::the_class:
+        return name_spaces.at(parameters.name_space(), parameters.class_name("ClassName")).asks_providers();
+    case Asks::the_instance:
+        return name_spaces.at(parameters.instance_name("InstanceName")).asks_providers();
+    case Asks::providers:
+        break;
+    }
+    return true;
+}
+
+std::string run_operation(Name_Spaces& name_spaces, const Operation_Row& row, const Parameters& parameters,
+                          const Cimxml_Request& request)
+{
+    const auto run = [&](Xml_Writer& writer) { row.run(name_spaces, parameters, writer); };
     return row.answer == Answer::value ? write_success(request, run) : write_empty_success(request, run);
 }
 
-std::string call_method(Operations& operations, const Cimxml_Request& request)
+std::string call_method(Name_Spaces& name_spaces, const Cimxml_Request& request)
 {
     Object_Path target = read_path(target_of(request), "");
-    name_single_key(operations, target);
+    name_single_key(name_spaces, target);
     const std::vector<Named_Value> in = read_arguments(request, target.name_space);
-    return write_method_result(request, operations.invoke_method(target, request.method, in));
+    return write_method_result(request, name_spaces.at(target).invoke_method(target, request.method, in));
 }
 
-std::string run(Operations& operations, const Cimxml_Request& request)
+// The answer that the work gives, or the error that it throws.
+template <class Work> Http_Answer answer(const Cimxml_Request& request, Work work)
 {
     try
     {
-        return request.intrinsic ? run_operation(operations, request) : call_method(operations, request);
+        return {200, "", work()};
     }
     catch (const Cim_Error& error)
     {
-        return write_error(request, error);
+        return {200, "", write_error(request, error)};
     }
     catch (const std::bad_alloc&)
     {
@@ -302,23 +349,46 @@ std::string run(Operations& operations, const Cimxml_Request& request)
     }
     catch (const std::exception& error)
     {
-        return write_error(request, Cim_Error(CIM_ERR_FAILED, error.what()));
+        return {200, "", write_error(request, Cim_Error(CIM_ERR_FAILED, error.what()))};
     }
+}
+
+Http_Work handle_operation(Name_Spaces& name_spaces, const std::shared_ptr<const Cimxml_Request>& request)
+{
+    Http_Work result;
+    const auto work = [&]
+    {
+        const Operation_Row& row = row_of(request->method);
+        const Parameters parameters(*request, row.parameters);
+        for (std::string_view flag : {"LocalOnly", "DeepInheritance", "IncludeQualifiers", "IncludeClassOrigin"})
+            parameters.boolean(flag, false); // refused when it is none, also where it has no effect
+        if (!may_take_long(name_spaces, row, parameters))
+            return run_operation(name_spaces, row, parameters, *request);
+        result.rest = [&name_spaces, &row, parameters, request]
+        { return answer(*request, [&] { return run_operation(name_spaces, row, parameters, *request); }); };
+        return std::string();
+    };
+    result.answer = answer(*request, work);
+    return result;
 }
 
 } // namespace
 
-Http_Answer Service::answer(const Http_Request& request)
+Http_Work Service::handle(const Http_Request& http_request)
 {
     try
     {
-        if (!request.cim_operation.empty() && !equal_names(request.cim_operation, "MethodCall"))
+        if (!equal_names(http_request.cim_operation, "MethodCall"))
             throw Http_Refusal(400, "unsupported-operation");
-        return {200, "", run(_operations, read_request(request.body))};
+        const auto request = std::make_shared<const Cimxml_Request>(read_request(http_request.body));
+        if (request->intrinsic)
+            return handle_operation(_name_spaces, request);
+        const auto call = [this, request] { return call_method(_name_spaces, *request); };
+        return {{}, [request, call] { return answer(*request, call); }};
     }
     catch (const Http_Refusal& refusal)
     {
-        return {refusal.status(), refusal.cim_error(), ""};
+        return {{refusal.status(), refusal.cim_error(), ""}, {}};
     }
 }
 

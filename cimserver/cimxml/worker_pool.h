@@ -1,47 +1,73 @@
-// A fixed number of threads that run jobs from a bounded queue.
+// Threads that take jobs from a queue.
 #pragma once
 
 #include <chrono>
 #include <condition_variable>
 #include <cstddef>
-#include <deque>
 #include <functional>
+#include <list>
+#include <map>
 #include <mutex>
+#include <string>
 #include <thread>
-#include <vector>
 
 namespace cimserver
 {
 
-// A job must not throw. All functions may be called from any thread but a worker's own.
+// A job that runs longer than `stuck_after` counts as stuck: while others wait, a spare thread takes its place, as long as there
+// are spare ones. Those who submit take turns, however many jobs each has.
 class Worker_Pool
 {
 public:
     using Job = std::function<void()>;
+    using Clock = std::chrono::steady_clock;
 
-    Worker_Pool(unsigned workers, std::size_t max_waiting);
-    ~Worker_Pool(); // waits for the accepted jobs, without bound
+    static constexpr std::chrono::seconds stuck_after{5};
+
+    struct Limits
+    {
+        unsigned workers;
+        unsigned spare; // threads that are started only for stuck ones
+        std::size_t waiting;
+    };
+
+    // Throws std::system_error when the threads cannot be had.
+    explicit Worker_Pool(const Limits& limits);
+    ~Worker_Pool(); // stops, waiting for running jobs without bound
     Worker_Pool(const Worker_Pool&) = delete;
     Worker_Pool& operator=(const Worker_Pool&) = delete;
 
-    // False, and the job is not taken, when max_waiting jobs wait already, memory is out or the pool has been stopped.
-    bool submit(Job job) noexcept;
+    // False, and the job is not run, when too many jobs wait, memory is out or the pool is stopping.
+    bool submit(Job job, const std::string& whose = "") noexcept;
 
-    // Takes no more jobs and runs those accepted. False when they had not finished by the deadline; they go on, and stop()
-    // may be called again.
-    bool stop(std::chrono::steady_clock::time_point deadline);
+    // Takes no more jobs, runs those that wait, and ends the threads. False when a job still runs at the deadline, or as soon as
+    // all that run are stuck: they go on.
+    bool stop(Clock::time_point deadline);
 
 private:
-    explicit Worker_Pool(std::size_t max_waiting) : _max_waiting(max_waiting) {}
-    void work();
+    struct Worker
+    {
+        std::thread thread;
+        Clock::time_point since = Clock::time_point::max(); // when its job began
+    };
 
+    void start_worker();
+    void work(Worker& self);
+    Job take_job();
+    void oversee();
+    std::size_t stuck() const;
+
+    const Limits _limits;
     std::mutex _mutex;
     std::condition_variable _changed;
-    std::deque<Job> _jobs;
-    std::size_t _max_waiting;
-    std::size_t _running = 0; // workers that have not ended
+    std::condition_variable _over;              // for the overseer, whom a job does not concern
+    std::multimap<std::size_t, Job> _jobs;      // by the round in which each has its turn
+    std::map<std::string, std::size_t> _rounds; // of the last job of each that waits
+    std::size_t _round = 0;
+    std::size_t _running = 0; // workers, with a job or without
     bool _stopping = false;
-    std::vector<std::thread> _workers;
+    std::list<Worker> _workers;
+    std::thread _overseer;
 };
 
 } // namespace cimserver

@@ -1,8 +1,8 @@
 #include "cimserver/indications/delivery.h"
 
-#include "cimserver/broker/names.h"
 #include "cimserver/indications/export_transfer.h"
 #include "cimserver/indications/listener_queue.h"
+#include "cimserver/model/names.h"
 
 #include <algorithm>
 #include <new>
@@ -76,7 +76,7 @@ void Delivery::keep(const std::set<std::string>& urls)
         const std::lock_guard lock(_mutex);
         for (const std::string& url : urls)
             if (!_listeners.contains(url))
-                _listeners.emplace(url, std::make_shared<Listener_Queue>(url));
+                _listeners.emplace(url, std::make_shared<Listener_Queue>(url, _log));
         for (const auto& [url, listener] : _listeners)
         {
             listener->removed = !urls.contains(url);

@@ -9,6 +9,8 @@
 // way; when all queues together hold too much, the oldest one of all does. Everything that is lost is told on standard error.
 #pragma once
 
+#include "cimserver/security/bounded_log.h"
+
 #include <atomic>
 #include <chrono>
 #include <cstddef>
@@ -71,6 +73,7 @@ private:
     std::chrono::milliseconds time_to_next();
 
     const Delivery_Limits _limits;
+    Bounded_Log _log{"more lines about listeners"};
     std::atomic<std::size_t> _bytes = 0; // of the messages that live
     std::mutex _mutex;                   // guards what follows, and the listeners
     std::size_t _last_number = 0;        // of a message

@@ -1,7 +1,7 @@
 // The CIM-XML message that carries an indication to a listener (DSP0200, DSP0201).
 #pragma once
 
-#include "cimserver/broker/model.h"
+#include "cimserver/model/values.h"
 
 #include <string>
 

@@ -1,7 +1,7 @@
 #include "cimserver/indications/indication_providers.h"
 
-#include "cimserver/broker/principal.h"
-#include "cimserver/provider_call.h"
+#include "cimserver/model/principal.h"
+#include "cimserver/operations/provider_call.h"
 
 #include <cstdio>
 
@@ -34,9 +34,8 @@ struct Indication_Call
 
     template <class MI, class Function, class... Arguments> void run(MI* mi, Function function, Arguments... arguments)
     {
-        if (!function)
-            throw Cim_Error(CIM_ERR_NOT_SUPPORTED, std::string(provider.registration->provider_name) + " does not offer this");
-        check_status(provider, function(mi, request.context(), arguments...));
+        check_offered(provider, "indications", function != nullptr);
+        check_status(provider, "indications", function(mi, request.context(), arguments...));
     }
 
     const Class_Entry& provider;

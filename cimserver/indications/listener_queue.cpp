@@ -42,10 +42,7 @@ void Listener_Queue::drop_oldest()
         tell("too much waits, indications are lost");
 }
 
-void Listener_Queue::tell(const std::string& text) const
-{
-    std::fprintf(stderr, "zmlr-cimserver: listener %s: %s\n", url.c_str(), text.c_str());
-}
+void Listener_Queue::tell(const std::string& text) const { log.tell("listener " + url + ": " + text); }
 
 void Listener_Queue::tell_dropped()
 {
@@ -58,7 +55,8 @@ void Listener_Queue::tell_end(const std::string& why)
 {
     tell_dropped();
     if (!waiting.empty())
-        tell(why + ", " + lost_indications(waiting.size()));
+        std::fprintf(stderr, "zmlr-cimserver: listener %s: %s, %s\n", url.c_str(), why.c_str(),
+                     lost_indications(waiting.size()).c_str());
 }
 
 } // namespace cimserver

@@ -1,6 +1,8 @@
 // What waits for one listener, and what of it was lost. Not safe for several threads at once.
 #pragma once
 
+#include "cimserver/security/bounded_log.h"
+
 #include <atomic>
 #include <chrono>
 #include <cstddef>
@@ -29,7 +31,7 @@ struct Listener_Queue
 {
     static constexpr std::size_t no_number = std::numeric_limits<std::size_t>::max(); // of no message
 
-    explicit Listener_Queue(std::string url_) : url(std::move(url_)) {}
+    Listener_Queue(std::string url_, Bounded_Log& log_) : url(std::move(url_)), log(log_) {}
 
     // Appends a message. When more than `limit` wait without being under way, the oldest of these is dropped.
     void append(std::shared_ptr<const Waiting_Message> message, std::size_t limit);
@@ -39,13 +41,14 @@ struct Listener_Queue
     std::size_t oldest_number() const;
     void drop_oldest();
 
-    // On standard error: anything about the listener; how many messages were dropped since it was last told, if any; that all
-    // that waits is lost, if any does.
+    // On standard error: anything about the listener, within the bounds of the log; how many messages were dropped since it was
+    // last told, if any; that all that waits is lost, if any does, whatever the bounds.
     void tell(const std::string& text) const;
     void tell_dropped();
     void tell_end(const std::string& why);
 
     const std::string url;
+    Bounded_Log& log;                                           // outlives it
     std::deque<std::shared_ptr<const Waiting_Message>> waiting; // the first one may be under way
     bool under_way = false;
     bool removed = false;

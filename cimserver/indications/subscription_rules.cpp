@@ -1,10 +1,10 @@
 #include "cimserver/indications/subscription_rules.h"
 
-#include "cimserver/broker/datetime_text.h"
-#include "cimserver/broker/names.h"
-#include "cimserver/host_name.h"
 #include "cimserver/indications/delivery.h"
-#include "cimserver/module_operations.h"
+#include "cimserver/model/host_name.h"
+#include "cimserver/model/names.h"
+#include "cimserver/model/value_text.h"
+#include "cimserver/operations/module_operations.h"
 
 #include <algorithm>
 #include <chrono>
@@ -40,14 +40,6 @@ std::string text_of(const Instance& instance, std::string_view name)
     return text ? *text : "";
 }
 
-void set(std::vector<Named_Value>& list, const std::string& name, Value value)
-{
-    if (Named_Value* there = find_named(list, name))
-        there->value = std::move(value);
-    else
-        list.push_back({name, std::move(value)});
-}
-
 std::size_t text_bytes(const Value& value)
 {
     if (const auto* text = std::get_if<std::string>(&value.content))
@@ -72,7 +64,7 @@ void check_size(const Instance& instance)
 void complete(Instance& instance, const std::string& name, std::uint64_t value)
 {
     if (!value_of(instance, name))
-        set(instance.properties, name, {CMPI_uint16, value});
+        put(instance.properties, name, {CMPI_uint16, value});
 }
 
 // The four keys that filters and destinations have.
@@ -94,7 +86,7 @@ void complete_keys(Instance& instance)
         if (value.empty() || value.size() > max_name_bytes)
             refuse(instance, std::string(name) + " has 1 to " + std::to_string(max_name_bytes) + " bytes");
         complete.push_back({name, {CMPI_string, value}});
-        set(instance.properties, name, {CMPI_string, value});
+        put(instance.properties, name, {CMPI_string, value});
     }
     if (!equal_names(text_of(instance, "CreationClassName"), instance.path.class_name))
         refuse(instance, "CreationClassName is another class");
@@ -128,7 +120,7 @@ std::string now_text()
 {
     const auto now = std::chrono::system_clock::now().time_since_epoch();
     const auto microseconds = std::chrono::duration_cast<std::chrono::microseconds>(now).count();
-    return format_datetime({static_cast<std::uint64_t>(microseconds), false}).value_or("");
+    return timestamp_text(static_cast<std::uint64_t>(microseconds));
 }
 
 } // namespace
@@ -176,7 +168,7 @@ Instance complete_subscription(Instance instance)
         const Named_Value* key = find_named(instance.path.keys, end);
         if (!key || key->value.null())
             refuse(instance, std::string("it needs a ") + end);
-        set(instance.properties, end, key->value);
+        put(instance.properties, end, key->value);
     }
     if (value_of(instance, "SubscriptionDuration"))
         refuse(instance, "it lasts until it is deleted: a SubscriptionDuration is not kept", CIM_ERR_NOT_SUPPORTED);
@@ -184,7 +176,7 @@ Instance complete_subscription(Instance instance)
     allow_only(instance, "RepeatNotificationPolicy", not_suppressed);
     allow_only(instance, "SubscriptionState", enabled);
     if (!value_of(instance, "SubscriptionStartTime"))
-        set(instance.properties, "SubscriptionStartTime", {CMPI_dateTime, now_text()});
+        put(instance.properties, "SubscriptionStartTime", {CMPI_dateTime, now_text()});
     return instance;
 }
 

@@ -2,8 +2,8 @@
 // completed.
 #pragma once
 
-#include "cimserver/broker/repository.h"
-#include "cimserver/indications/event_query.h"
+#include "cimserver/model/event_query.h"
+#include "cimserver/model/repository.h"
 
 #include <memory>
 #include <string>

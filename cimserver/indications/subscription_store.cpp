@@ -18,6 +18,8 @@ using Json = nlohmann::json;
 
 constexpr std::size_t max_file_bytes = std::size_t{64} << 20;
 constexpr int version = 1;
+constexpr const char* damaged = " is damaged: ";
+constexpr const char* remedy = " (move it away to start without subscriptions)";
 constexpr int max_depth = 8; // a subscription's reference has its keys at 5
 
 struct List
@@ -133,10 +135,13 @@ std::string made_folder(const std::string& folder)
 
 } // namespace
 
+const zmlr::Meta_Class& class_of(Subscription_Kind kind) { return *lists[static_cast<std::size_t>(kind)].meta_class; }
+
 Subscription_Store::Subscription_Store(const std::string& folder)
     : _lock(made_folder(folder), Folder_Lock::Wait::no)
     , _file(folder + "/subscriptions.json")
 {
+    remove_unfinished_writes(_file);
 }
 
 Stored_Instances Subscription_Store::load() const
@@ -148,9 +153,13 @@ Stored_Instances Subscription_Store::load() const
     {
         return instances_of(Json::parse(text, refuse_deep));
     }
-    catch (const std::exception& error)
+    catch (const Json::exception&)
     {
-        throw std::runtime_error(_file + " is damaged: " + error.what());
+        throw std::runtime_error(_file + damaged + "it is not what this server writes" + remedy);
+    }
+    catch (const std::runtime_error& error)
+    {
+        throw std::runtime_error(_file + damaged + error.what() + remedy);
     }
 }
 

@@ -1,8 +1,9 @@
 // The file that keeps filters, destinations and subscriptions over a restart: DIR/subscriptions.json.
 #pragma once
 
-#include "cimserver/broker/model.h"
+#include "cimserver/model/values.h"
 #include "cimserver/security/private_file.h"
+#include "runtime/meta.h"
 
 #include <array>
 #include <string>
@@ -17,6 +18,8 @@ enum class Subscription_Kind
     destination,
     subscription
 };
+
+const zmlr::Meta_Class& class_of(Subscription_Kind kind); // by which clients manage them
 
 using Stored_Instances = std::array<std::vector<Instance>, 3>; // one list a kind, in the order of the enumerators
 

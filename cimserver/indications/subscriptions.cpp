@@ -1,14 +1,15 @@
 #include "cimserver/indications/subscriptions.h"
 
-#include "cimserver/broker/names.h"
 #include "cimserver/indications/export_message.h"
 #include "cimserver/interop/interop_operations.h"
 #include "cimserver/interop/server_schema.h"
-#include "cimserver/object_conversion.h"
-#include "cimserver/path_identity.h"
+#include "cimserver/model/names.h"
+#include "cimserver/model/paths.h"
+#include "cimserver/operations/object_conversion.h"
+#include "cimserver/security/bounded_log.h"
 
 #include <algorithm>
-#include <stdexcept>
+#include <system_error>
 
 namespace cimserver
 {
@@ -149,7 +150,10 @@ void Subscriptions::save() const
         return;
     try
     {
-        _store->save({list(Kind::filter), list(Kind::destination), list(Kind::subscription)});
+        Stored_Instances instances{list(Kind::filter), list(Kind::destination), list(Kind::subscription)};
+        for (std::size_t kind = 0; kind < instances.size(); ++kind)
+            instances[kind].insert(instances[kind].end(), _aside[kind].begin(), _aside[kind].end());
+        _store->save(instances);
     }
     catch (const std::system_error& error)
     {
@@ -157,9 +161,17 @@ void Subscriptions::save() const
     }
 }
 
+Subscriptions::Change Subscriptions::begin_change()
+{
+    Change change(_changes, Provider_Turns::patience);
+    if (!change)
+        throw Cim_Error(CIM_ERR_FAILED, "an earlier change of subscriptions does not end: a provider does not answer");
+    return change;
+}
+
 Object_Path Subscriptions::create(Kind kind, Instance instance)
 {
-    const std::lock_guard change(_changes);
+    const Change change = begin_change();
     Entry entry = checked(kind, std::move(instance));
     const Object_Path path = entry.instance.path;
     const std::string id = path_identity(path);
@@ -191,7 +203,7 @@ Object_Path Subscriptions::create(Kind kind, Instance instance)
 
 void Subscriptions::remove(Kind kind, const Object_Path& path)
 {
-    const std::lock_guard change(_changes);
+    const Change change = begin_change();
     const std::string id = path_identity(path);
     if (!table(kind).contains(id))
         throw Cim_Error(CIM_ERR_NOT_FOUND, "there is no such instance of " + path.class_name);
@@ -219,24 +231,24 @@ void Subscriptions::restore()
         return;
     const std::lock_guard change(_changes);
     const Repository classes(server_registrations());
-    const Stored_Instances stored = _store->load();
-    try
-    {
-        for (const Kind kind : {Kind::filter, Kind::destination, Kind::subscription})
-            for (Instance instance : stored[static_cast<std::size_t>(kind)])
+    Bounded_Log log("more stored objects are kept aside");
+    Stored_Instances stored = _store->load();
+    for (const Kind kind : {Kind::filter, Kind::destination, Kind::subscription})
+        for (Instance& instance : stored[static_cast<std::size_t>(kind)])
+            try
             {
-                instance.path.name_space = Interop_Operations::name_space;
-                const Class_Entry& own = *classes.find(instance.path.class_name);
-                Entry entry = checked(kind, typed_instance(classes, own, instance, CIM_ERR_INVALID_PARAMETER));
+                Instance asked = instance;
+                asked.path.name_space = Interop_Operations::name_space;
+                const Class_Entry& own = *classes.find(asked.path.class_name);
+                Entry entry = checked(kind, typed_instance(classes, own, asked, CIM_ERR_INVALID_PARAMETER));
                 const std::string id = path_identity(entry.instance.path);
                 insert(kind, id, std::move(entry));
             }
-    }
-    catch (const Cim_Error& error)
-    {
-        throw std::runtime_error(_store->file() + " is damaged: " + error.what());
-    }
-
+            catch (const Cim_Error& error)
+            {
+                log.tell(_store->file() + ": kept aside, because this module cannot serve it: " + error.what());
+                _aside[static_cast<std::size_t>(kind)].push_back(std::move(instance));
+            }
     std::map<std::string, Provider_Filter> filters;
     for (const auto& [id, subscription] : table(Kind::subscription))
         filters.emplace(subscription.filter_id, provider_filter(subscription.filter_id));

@@ -31,9 +31,9 @@ public:
     // Without a store (null) nothing outlives the process. What is handed over must outlive this object.
     Subscriptions(Module& module, Delivery& delivery, Indication_Order order, const Subscription_Store* store);
 
-    // Takes up what the store holds; once, before the first change, when the module may already be called. Throws
-    // std::runtime_error when something in it is not sound. A provider that cannot be enabled does not count: standard error
-    // tells.
+    // Takes up what the store holds; once, before the first change, when the module may already be called. What the module cannot
+    // serve any more, because a class or a property is gone, is kept aside: it stays in the store. Throws std::runtime_error
+    // when the store is damaged. A provider that cannot be enabled does not count. Standard error tells of both.
     void restore();
 
     // Disables all indications; what is stored stays. No change afterwards.
@@ -64,6 +64,9 @@ private:
         std::vector<std::string> urls;
     };
     using Table = std::map<std::string, Entry>;
+    using Change = std::unique_lock<std::timed_mutex>;
+
+    Change begin_change(); // throws Cim_Error when the one before it does not end: a provider hangs
 
     Table& table(Subscription_Kind kind) { return _tables[static_cast<std::size_t>(kind)]; }
     const Table& table(Subscription_Kind kind) const { return _tables[static_cast<std::size_t>(kind)]; }
@@ -80,8 +83,9 @@ private:
     Module& _module;
     Delivery& _delivery;
     const Subscription_Store* const _store;
-    std::mutex _changes;             // one change at a time
+    std::timed_mutex _changes;       // one change at a time
     Indication_Providers _providers; // guarded by it
+    Stored_Instances _aside;         // too
     mutable std::mutex _data;        // guards what follows against readers; never held while others are called
     std::array<Table, 3> _tables;
     std::shared_ptr<const std::vector<Route>> _routes;

@@ -1,8 +1,11 @@
 #include "cimserver/interop/object_manager.h"
 
-#include "cimserver/cimxml/version.h"
-#include "cimserver/host_name.h"
 #include "cimserver/interop/server_schema.h"
+#include "cimserver/model/host_name.h"
+#include "cimserver/model/version.h"
+
+#include <algorithm>
+#include <iterator>
 
 namespace cimserver
 {
@@ -24,61 +27,42 @@ Instance with_keys(const zmlr::Meta_Class& meta_class, std::vector<Named_Value> 
     return {{"", "", meta_class.name, keys}, keys};
 }
 
-class Object_Manager : public Server_Class
+std::vector<Instance> object_managers()
 {
-public:
-    const zmlr::Meta_Class& meta_class() const override { return CIM_ObjectManager; }
+    Instance instance = with_keys(CIM_ObjectManager, {{"SystemCreationClassName", text(system_class)},
+                                                      {"SystemName", text(host_name())},
+                                                      {"CreationClassName", text("CIM_ObjectManager")},
+                                                      {"Name", text(manager_name())}});
+    instance.properties.push_back({"ElementName", text(product)});
+    instance.properties.push_back({"Description", text(std::string(product) + " version " + version())});
+    instance.properties.push_back({"Started", {CMPI_boolean, true}});
+    instance.properties.push_back({"GatherStatisticalData", {CMPI_boolean, false}});
+    instance.properties.push_back({"OperationalStatus", array_of({CMPI_uint16, std::uint64_t{2}})}); // OK
+    return {instance};
+}
 
-    std::vector<Instance> enumerate() override
-    {
-        Instance instance = with_keys(CIM_ObjectManager, {{"SystemCreationClassName", text(system_class)},
-                                                          {"SystemName", text(host_name())},
-                                                          {"CreationClassName", text("CIM_ObjectManager")},
-                                                          {"Name", text(manager_name())}});
-        instance.properties.push_back({"ElementName", text(product)});
-        instance.properties.push_back({"Description", text(std::string(product) + " version " + version())});
-        instance.properties.push_back({"Started", {CMPI_boolean, true}});
-        instance.properties.push_back({"GatherStatisticalData", {CMPI_boolean, false}});
-        instance.properties.push_back({"OperationalStatus", array_of({CMPI_uint16, std::uint64_t{2}})}); // OK
-        return {instance};
-    }
-};
-
-class Name_Space_Class : public Server_Class
+Instance name_space_instance(const std::string& name)
 {
-public:
-    explicit Name_Space_Class(std::vector<std::string> name_spaces) : _name_spaces(std::move(name_spaces)) {}
-
-    const zmlr::Meta_Class& meta_class() const override { return CIM_Namespace; }
-
-    std::vector<Instance> enumerate() override
-    {
-        std::vector<Instance> instances;
-        for (const std::string& name : _name_spaces)
-        {
-            instances.push_back(with_keys(CIM_Namespace, {{"SystemCreationClassName", text(system_class)},
-                                                          {"SystemName", text(host_name())},
-                                                          {"ObjectManagerCreationClassName", text("CIM_ObjectManager")},
-                                                          {"ObjectManagerName", text(manager_name())},
-                                                          {"CreationClassName", text("CIM_Namespace")},
-                                                          {"Name", text(name)}}));
-            instances.back().properties.push_back({"ClassInfo", {CMPI_uint16, std::uint64_t{11}}});
-            instances.back().properties.push_back({"ClassType", {CMPI_uint16, std::uint64_t{2}}});
-        }
-        return instances;
-    }
-
-private:
-    const std::vector<std::string> _name_spaces;
-};
+    Instance instance = with_keys(CIM_Namespace, {{"SystemCreationClassName", text(system_class)},
+                                                  {"SystemName", text(host_name())},
+                                                  {"ObjectManagerCreationClassName", text("CIM_ObjectManager")},
+                                                  {"ObjectManagerName", text(manager_name())},
+                                                  {"CreationClassName", text("CIM_Namespace")},
+                                                  {"Name", text(name)}});
+    instance.properties.push_back({"ClassInfo", {CMPI_uint16, std::uint64_t{11}}});
+    instance.properties.push_back({"ClassType", {CMPI_uint16, std::uint64_t{2}}});
+    return instance;
+}
 
 } // namespace
 
-std::unique_ptr<Server_Class> make_object_manager() { return std::make_unique<Object_Manager>(); }
+Server_Class object_manager_class() { return {CIM_ObjectManager, object_managers, {}, {}}; }
 
-std::unique_ptr<Server_Class> make_name_space_class(std::vector<std::string> name_spaces)
+Server_Class name_space_class(const std::vector<std::string>& names)
 {
-    return std::make_unique<Name_Space_Class>(std::move(name_spaces));
+    std::vector<Instance> instances;
+    std::ranges::transform(names, std::back_inserter(instances), name_space_instance);
+    return {CIM_Namespace, [instances] { return instances; }, {}, {}};
 }
 
 } // namespace cimserver

@@ -3,7 +3,6 @@
 
 #include "cimserver/interop/server_class.h"
 
-#include <memory>
 #include <string>
 #include <vector>
 
@@ -12,8 +11,8 @@ namespace cimserver
 
 // One instance: ElementName "zmlr-cimserver", Description "zmlr-cimserver version <version>", Name the element name with the
 // host's, so that managers of several hosts tell the servers apart.
-std::unique_ptr<Server_Class> make_object_manager();
+Server_Class object_manager_class();
 
-std::unique_ptr<Server_Class> make_name_space_class(std::vector<std::string> name_spaces);
+Server_Class name_space_class(const std::vector<std::string>& names);
 
 } // namespace cimserver

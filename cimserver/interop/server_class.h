@@ -1,36 +1,29 @@
 // Server_Class: a class whose instances are the server's own, in the interop name space.
 #pragma once
 
-#include "cimserver/broker/model.h"
+#include "cimserver/model/values.h"
 #include "runtime/meta.h"
 
+#include <functional>
 #include <optional>
 #include <vector>
 
 namespace cimserver
 {
 
-// Called on several threads at once. Interop_Operations checks a request before it comes here: paths have all the keys of the
-// class, typed; instances hold only properties of the class, typed. Every function may throw Cim_Error.
+// The functions are called on several threads at once. Own_Operations checks a request before it comes here: paths have all the
+// keys of the class, typed; instances hold only properties of the class, typed. Every function may throw Cim_Error.
 //
 // An answer may leave properties out that are null, and the name space of its path; it names the class itself.
-class Server_Class
+struct Server_Class
 {
-public:
-    Server_Class() = default;
-    virtual ~Server_Class() = default;
-    Server_Class(const Server_Class&) = delete;
-    Server_Class& operator=(const Server_Class&) = delete;
-
-    virtual const zmlr::Meta_Class& meta_class() const = 0; // one of server_schema.h
-    virtual std::vector<Instance> enumerate() = 0;
-
-    // The instance that the path names; nothing when there is none. Found by enumeration unless a class knows better.
-    virtual std::optional<Instance> get(const Object_Path& path);
-
-    // CIM_ERR_NOT_SUPPORTED unless a class can do it. Nothing of the server's can be modified.
-    virtual Object_Path create(const Instance& instance); // its path may lack keys
-    virtual void remove(const Object_Path& path);         // CIM_ERR_NOT_FOUND too
+    const zmlr::Meta_Class& meta_class; // one of server_schema.h
+    std::function<std::vector<Instance>()> enumerate;
+    std::function<Object_Path(const Instance&)> create; // its path may lack keys; none: not supported
+    std::function<void(const Object_Path&)> remove;     // CIM_ERR_NOT_FOUND too; none: not supported
 };
+
+// The instance that the path names; nothing when there is none.
+std::optional<Instance> find_instance(const Server_Class& server_class, const Object_Path& path);
 
 } // namespace cimserver

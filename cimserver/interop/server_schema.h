@@ -1,5 +1,5 @@
-// The classes whose instances are the server's own: meta-data of the standard classes of the interop name space, reduced to
-// what this server fills or a client sets (DMTF schema 2.23).
+// The classes whose instances are the server's own: meta-data of the standard classes of the interop name space, generated
+// from server_schema.mof.
 #pragma once
 
 #include "cmpi/registration.h"

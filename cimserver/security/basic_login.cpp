@@ -1,6 +1,6 @@
 #include "cimserver/security/basic_login.h"
 
-#include "cimserver/broker/names.h"
+#include "cimserver/model/names.h"
 
 #include <gnutls/gnutls.h>
 

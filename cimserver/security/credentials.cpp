@@ -60,6 +60,13 @@ void Credentials::refresh()
     }
 }
 
+void Credentials::reload()
+{
+    const std::lock_guard lock(_mutex);
+    _stamp = {};
+    refresh();
+}
+
 Credentials::Digest Credentials::digest(const Login& login) const
 {
     const std::string text = login.name + ":" + login.password; // a name holds no colon

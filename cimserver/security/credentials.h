@@ -31,6 +31,8 @@ public:
     Credentials(const Credentials&) = delete;
     Credentials& operator=(const Credentials&) = delete;
 
+    void reload(); // reads the file again, whatever it looks like
+
     bool remembers(const Login& login); // quick
     bool verify(const Login& login);    // tens of milliseconds
 

@@ -80,11 +80,15 @@ void sync_folder(const std::string& folder)
         fail("cannot write " + folder);
 }
 
+constexpr std::string_view temporary_suffix = ".XXXXXX";
+
 // A file of a name of its own, gone at the end of the scope unless it was renamed.
 class Temporary_File
 {
 public:
-    explicit Temporary_File(const std::string& target) : _name(target + ".XXXXXX"), _descriptor(mkostemp(_name.data(), O_CLOEXEC))
+    explicit Temporary_File(const std::string& target)
+        : _name(target + std::string(temporary_suffix))
+        , _descriptor(mkostemp(_name.data(), O_CLOEXEC))
     {
         if (_descriptor < 0)
             fail("cannot write " + target);
@@ -151,6 +155,18 @@ void write_private_file(const std::string& file, const std::string& content)
 {
     Temporary_File(file).write_and_rename(content, file);
     sync_folder(folder_of(file));
+}
+
+void remove_unfinished_writes(const std::string& file)
+{
+    const std::string start = std::filesystem::path(file).filename().string() + ".";
+    std::error_code error;
+    for (const auto& entry : std::filesystem::directory_iterator(folder_of(file), error))
+    {
+        const std::string name = entry.path().filename();
+        if (name.starts_with(start) && name.size() == start.size() - 1 + temporary_suffix.size())
+            std::filesystem::remove(entry.path(), error);
+    }
 }
 
 void make_private_folder(const std::string& folder, File_Privacy privacy)

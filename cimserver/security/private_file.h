@@ -23,6 +23,9 @@ std::string read_private_file(const std::string& file, std::size_t max_bytes, Fi
 // failure. Throws std::system_error that names the file; it is then as it was.
 void write_private_file(const std::string& file, const std::string& content);
 
+// Removes what a write to the file left behind that was cut off by the end of its process. No other process may be writing it.
+void remove_unfinished_writes(const std::string& file);
+
 // Makes the folder, mode 0700, unless it is there; its parent must exist. Throws std::runtime_error when it cannot be made, is
 // no folder, belongs to neither the server's user nor root, or is less private than asked.
 void make_private_folder(const std::string& folder, File_Privacy privacy);

@@ -2,11 +2,16 @@
 
 #include "cimserver/security/private_file.h"
 
-#include <gnutls/gnutls.h>
+#include <gnutls/abstract.h>
+#include <gnutls/x509.h>
 
+#include <algorithm>
+#include <array>
+#include <ctime>
 #include <fstream>
 #include <iterator>
 #include <memory>
+#include <mutex>
 #include <stdexcept>
 
 namespace cimserver
@@ -15,12 +20,18 @@ namespace
 {
 
 constexpr std::size_t max_pem_bytes = std::size_t{1} << 20;
+constexpr unsigned max_chain = 16;
 
-struct Free_Credentials
+struct Free_Certificate
 {
-    void operator()(gnutls_certificate_credentials_t credentials) const { gnutls_certificate_free_credentials(credentials); }
+    void operator()(gnutls_x509_crt_t certificate) const { gnutls_x509_crt_deinit(certificate); }
 };
-using Certificate_Credentials = std::unique_ptr<std::remove_pointer_t<gnutls_certificate_credentials_t>, Free_Credentials>;
+struct Free_Key
+{
+    void operator()(gnutls_x509_privkey_t key) const { gnutls_x509_privkey_deinit(key); }
+};
+using Certificate = std::unique_ptr<std::remove_pointer_t<gnutls_x509_crt_t>, Free_Certificate>;
+using Private_Key = std::unique_ptr<std::remove_pointer_t<gnutls_x509_privkey_t>, Free_Key>;
 
 // A certificate is no secret: whoever may read it does not matter.
 std::string read_public_file(const std::string& file)
@@ -40,17 +51,84 @@ gnutls_datum_t datum(const std::string& text)
     return {reinterpret_cast<unsigned char*>(const_cast<char*>(text.data())), static_cast<unsigned>(text.size())};
 }
 
-void check_pair(const Tls_Identity& identity, const std::string& certificate_file, const std::string& key_file)
+// The first certificate of a text; null when there is none.
+Certificate first_certificate(const std::string& text)
 {
-    gnutls_certificate_credentials_t made = nullptr;
-    if (gnutls_certificate_allocate_credentials(&made) != GNUTLS_E_SUCCESS)
+    gnutls_x509_crt_t made = nullptr;
+    if (gnutls_x509_crt_init(&made) != GNUTLS_E_SUCCESS)
         throw std::bad_alloc();
-    const Certificate_Credentials credentials(made);
-    const gnutls_datum_t certificate = datum(identity.certificate);
-    const gnutls_datum_t key = datum(identity.key);
-    const int result = gnutls_certificate_set_x509_key_mem2(made, &certificate, &key, GNUTLS_X509_FMT_PEM, nullptr, 0);
-    if (result < 0)
-        throw std::runtime_error(certificate_file + " and " + key_file + ": " + gnutls_strerror(result));
+    Certificate certificate(made);
+    const gnutls_datum_t pem = datum(text);
+    return gnutls_x509_crt_import(made, &pem, GNUTLS_X509_FMT_PEM) == GNUTLS_E_SUCCESS ? std::move(certificate) : nullptr;
+}
+
+Private_Key private_key(const std::string& text)
+{
+    gnutls_x509_privkey_t made = nullptr;
+    if (gnutls_x509_privkey_init(&made) != GNUTLS_E_SUCCESS)
+        throw std::bad_alloc();
+    Private_Key key(made);
+    const gnutls_datum_t pem = datum(text);
+    const int result = gnutls_x509_privkey_import2(made, &pem, GNUTLS_X509_FMT_PEM, nullptr, 0);
+    return result == GNUTLS_E_SUCCESS ? std::move(key) : nullptr;
+}
+
+// Both have the same number when they belong together.
+using Key_Id = std::array<unsigned char, 32>;
+
+Key_Id key_id_of(const Certificate& certificate)
+{
+    Key_Id id{};
+    std::size_t size = id.size();
+    gnutls_x509_crt_get_key_id(certificate.get(), GNUTLS_KEYID_USE_SHA256, id.data(), &size);
+    return id;
+}
+
+Key_Id key_id_of(const Private_Key& key)
+{
+    Key_Id id{};
+    std::size_t size = id.size();
+    gnutls_x509_privkey_get_key_id(key.get(), GNUTLS_KEYID_USE_SHA256, id.data(), &size);
+    return id;
+}
+
+std::string date_text(std::time_t time)
+{
+    char text[32] = "";
+    std::tm fields{};
+    gmtime_r(&time, &fields);
+    std::strftime(text, sizeof text, "%Y-%m-%d %H:%M UTC", &fields);
+    return text;
+}
+
+struct Free
+{
+    void operator()(void* memory) const { gnutls_free(memory); }
+};
+
+std::mutex shown_mutex;
+std::shared_ptr<const Tls_Identity> shown;
+
+int retrieve(gnutls_session_t, const gnutls_cert_retr_st*, gnutls_pcert_st** certificates, unsigned* count, gnutls_ocsp_data_st**,
+             unsigned* ocsp_count, gnutls_privkey_t* key, unsigned* flags)
+{
+    std::shared_ptr<const Tls_Identity> identity;
+    {
+        const std::lock_guard lock(shown_mutex);
+        identity = shown;
+    }
+    const gnutls_datum_t certificate_pem = datum(identity->certificate);
+    const gnutls_datum_t key_pem = datum(identity->key);
+    std::unique_ptr<gnutls_pcert_st, Free> list(
+        static_cast<gnutls_pcert_st*>(gnutls_malloc(max_chain * sizeof(gnutls_pcert_st))));
+    *count = max_chain;
+    *ocsp_count = 0;
+    if (!list || gnutls_pcert_list_import_x509_raw(list.get(), count, &certificate_pem, GNUTLS_X509_FMT_PEM, 0) < 0 ||
+        gnutls_privkey_init(key) < 0 || gnutls_privkey_import_x509_raw(*key, &key_pem, GNUTLS_X509_FMT_PEM, nullptr, 0) < 0)
+        return -1; // memory is out: both were sound when they were read
+    *certificates = list.release();
+    *flags = GNUTLS_CERT_RETR_DEINIT_ALL;
+    return 0;
 }
 
 } // namespace
@@ -59,8 +137,43 @@ Tls_Identity read_tls_identity(const std::string& certificate_file, const std::s
 {
     Tls_Identity identity{read_public_file(certificate_file),
                           read_private_file(key_file, max_pem_bytes, File_Privacy::group_may_read)};
-    check_pair(identity, certificate_file, key_file);
+    const Certificate certificate = first_certificate(identity.certificate);
+    if (!certificate)
+        throw std::runtime_error(certificate_file + " holds no certificate in PEM form");
+    const Private_Key key = private_key(identity.key);
+    if (!key)
+        throw std::runtime_error(key_file + " holds no private key in PEM form without a password");
+    if (key_id_of(certificate) != key_id_of(key))
+        throw std::runtime_error(key_file + " is not the key of the certificate " + certificate_file);
     return identity;
 }
+
+std::vector<std::string> weaknesses_of(const Tls_Identity& identity)
+{
+    const Certificate certificate = first_certificate(identity.certificate);
+    std::vector<std::string> found;
+    const std::time_t now = std::time(nullptr);
+    const std::time_t begin = gnutls_x509_crt_get_activation_time(certificate.get());
+    const std::time_t end = gnutls_x509_crt_get_expiration_time(certificate.get());
+    if (now < begin)
+        found.push_back("it is not valid before " + date_text(begin));
+    if (now > end)
+        found.push_back("it has expired on " + date_text(end));
+    unsigned bits = 0;
+    const auto algorithm = static_cast<gnutls_pk_algorithm_t>(gnutls_x509_crt_get_pk_algorithm(certificate.get(), &bits));
+    if (gnutls_pk_bits_to_sec_param(algorithm, bits) < GNUTLS_SEC_PARAM_MEDIUM)
+        found.push_back("its key is weak (" + std::string(gnutls_pk_get_name(algorithm)) + " of " + std::to_string(bits) +
+                        " bits)");
+    return found;
+}
+
+void show_identity(Tls_Identity identity)
+{
+    auto next = std::make_shared<const Tls_Identity>(std::move(identity));
+    const std::lock_guard lock(shown_mutex);
+    shown = std::move(next);
+}
+
+void* identity_callback() { return reinterpret_cast<void*>(&retrieve); }
 
 } // namespace cimserver

@@ -9,11 +9,12 @@ ROOT = Path(__file__).resolve().parents[2]
 
 # folder: the folders (or single files) of ours that it may include besides itself
 MAY_INCLUDE = {
-    "runtime": [],
+    "text": [],
+    "runtime": ["text"],
     "schema": ["runtime"],
     "hxal": [],
     "cmpi": ["runtime", "providers/providers.def"],
-    "inventory": ["schema", "runtime", "hxal"],
+    "inventory": ["schema", "runtime", "text", "hxal"],
     "profiles": ["schema", "runtime", "hxal", "inventory"],
     "diagnostics": ["schema", "runtime", "hxal", "inventory"],
     "indications": ["schema", "runtime", "hxal", "inventory"],
@@ -29,7 +30,7 @@ MAY_INCLUDE = {
         "cmpi/status.h",
         "runtime",
     ],
-    "cimserver": ["cmpi/standard", "cmpi/registration.h", "runtime/meta.h", "runtime/types.h"],
+    "cimserver": ["cmpi/standard", "cmpi/registration.h", "runtime/meta.h", "runtime/types.h", "text"],
     "sim": ["hxal/records", "hxal/commands.h"],
 }
 
@@ -52,6 +53,16 @@ FLOORS = {
         "internal": ["records", "adapter.h", "ioc.h", "library.h"],
         "config": ["internal", "records", "adapter.h", "ioc.h"],
         ".": ["config", "internal", "records"],
+    },
+    "cimserver": {
+        "model": [],
+        "broker": ["model"],
+        "security": ["model"],
+        "cimxml": ["model", "security"],
+        "operations": ["model", "broker"],
+        "interop": ["model", "broker", "operations"],
+        "indications": ["model", "broker", "cimxml", "security", "operations", "interop"],
+        ".": ["model", "broker", "cimxml", "security", "operations", "interop", "indications"],
     },
 }
 

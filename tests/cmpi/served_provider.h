@@ -2,8 +2,8 @@
 #pragma once
 
 #include "cimserver/broker/broker.h"
-#include "cimserver/broker/model.h"
 #include "cimserver/broker/request.h"
+#include "cimserver/model/values.h"
 #include "cmpi/entry.h"
 #include "tests/cmpi/test_providers.h"
 

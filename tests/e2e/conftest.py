@@ -5,6 +5,7 @@ import os
 import socket
 import subprocess
 import sys
+import time
 from pathlib import Path
 
 import pytest
@@ -16,18 +17,27 @@ from tools.simulated_server import ROOT, SimulatedServer  # noqa: E402
 from tools.wbemcli import Wbemcli  # noqa: E402
 
 NAME_SPACE = "root/zemlar"
+TIMEOUT = 60  # seconds until something that must happen has failed to
 REQUEST = (ROOT / "tests/e2e/enumerate_host.xml").read_bytes()
 TST_MODULE = Path(os.environ.get("ZMLR_BUILD_DIR", ROOT / "build/dev")) / "tests/e2e/module/libtst_module.so"
 
 
 def post(port, body=REQUEST, headers="", tls=None):
     """All that the server says to one request before it closes."""
-    head = f"POST /cimom HTTP/1.1\r\nHost: x\r\n{headers}Connection: close\r\nContent-Length: {len(body)}\r\n\r\n"
+    head = f"POST /cimom HTTP/1.1\r\nHost: localhost\r\nCIMOperation: MethodCall\r\n{headers}Connection: close\r\n"
+    head += f"Content-Length: {len(body)}\r\n\r\n"
     with socket.create_connection(("127.0.0.1", port), timeout=60) as plain:
         connection = tls.wrap_socket(plain, server_hostname="127.0.0.1") if tls else plain
         with connection:
             connection.sendall(head.encode() + body)
             return b"".join(iter(lambda: connection.recv(65536), b""))
+
+
+def wait_until(condition):
+    deadline = time.monotonic() + TIMEOUT
+    while not condition():
+        assert time.monotonic() < deadline
+        time.sleep(0.02)
 
 
 def code_of(call, *arguments):

@@ -26,8 +26,8 @@ def interop(mixed):
 
 def test_the_server_describes_itself(mixed, interop):
     server = pywbem.WBEMServer(mixed.pywbem)
-    assert server.interop_ns == INTEROP
-    assert sorted(server.namespaces) == [INTEROP, "root/zemlar"]
+    assert server.interop_ns == "interop"
+    assert sorted(server.namespaces) == ["interop", INTEROP, "root/interop", "root/zemlar"]
     assert server.brand == "zmlr-cimserver"
     assert server.version and server.version[0].isdigit()
     assert server.cimom_inst["SystemName"] == socket.gethostname()
@@ -35,11 +35,18 @@ def test_the_server_describes_itself(mixed, interop):
     assert server.profiles == interop.EnumerateInstances("CIM_RegisteredProfile")
 
 
+@pytest.mark.parametrize("name", ["interop", "root/interop", "ROOT/PG_INTEROP"])
+def test_the_interop_name_space_has_the_names_that_clients_try(interop, name):
+    assert [dict(manager) for manager in interop.EnumerateInstances("CIM_ObjectManager", name)] == [
+        dict(manager) for manager in interop.EnumerateInstances("CIM_ObjectManager")
+    ]
+
+
 def test_only_the_servers_own_object_manager_is_there(interop):
     managers = interop.EnumerateInstances("CIM_ObjectManager")
     assert [manager.classname for manager in managers] == ["CIM_ObjectManager"]
     assert interop.GetInstance(managers[0].path)["ElementName"] == "zmlr-cimserver"
-    assert [space.classname for space in interop.EnumerateInstanceNames("cim_namespace")] == ["CIM_Namespace"] * 2
+    assert [space.classname for space in interop.EnumerateInstanceNames("cim_namespace")] == ["CIM_Namespace"] * 4
     assert code_of(interop.EnumerateInstanceNames, "ZEMLAR_ObjectManager") == pywbem.CIM_ERR_INVALID_CLASS
 
 

@@ -145,6 +145,30 @@ def test_class_origins_are_told_when_asked_for(mixed):
         assert {port.properties["DeviceID"].class_origin for port in ports} == {origin}
 
 
+def test_qualifiers(mixed):
+    declared = {qualifier.name: qualifier for qualifier in mixed.pywbem.EnumerateQualifiers()}
+    used = {name for cls in mixed.pywbem.EnumerateClasses(DeepInheritance=True, LocalOnly=False) for name in cls.qualifiers}
+    assert used <= declared.keys() and {"Key", "Override", "Values", "EmbeddedInstance"} <= declared.keys()
+    key = mixed.pywbem.GetQualifier("key")
+    assert (key.name, key.type, key.value, key.overridable, key.scopes["REFERENCE"]) == ("Key", "boolean", False, False, True)
+    assert mixed.pywbem.GetQualifier("ValueMap").is_array
+    assert code_of(mixed.pywbem.GetQualifier, "Colour") == 6
+    assert code_of(mixed.pywbem.EnumerateQualifiers, "root/nowhere") == 3
+    assert code_of(mixed.pywbem.DeleteQualifier, "Key") == 7
+
+
+def test_errors_are_sentences(mixed, tst):
+    port = mixed.pywbem.EnumerateInstanceNames("ZEMLAR_FCPort")[0]
+    for call, told in [
+        (lambda: mixed.pywbem.InvokeMethod("RequestStateChange", port), "ZEMLAR_FCPort does not support RequestStateChange"),
+        (lambda: tst.pywbem.GetInstance(CIMInstanceName("TST_Refusal", {"Name": "63"})), "TST_Refusal: GetInstance: access denied"),
+        (lambda: tst.pywbem.GetInstance(CIMInstanceName("TST_Refusal", {"Name": "64"})), "TST_Refusal: GetInstance failed"),
+    ]:
+        with pytest.raises(pywbem.CIMError) as caught:
+            call()
+        assert caught.value.status_description == told
+
+
 GOOD = dict(zip(FC_PORT_KEYS, ["ZEMLAR_ComputerSystem", "nowhere", "ZEMLAR_FCPort", "0000000000000000"]))
 
 

@@ -1,5 +1,6 @@
 """The server as a process: start, stop, and clients that behave badly while others are served."""
 
+import os
 import re
 import signal
 import socket
@@ -9,9 +10,13 @@ from concurrent.futures import ThreadPoolExecutor
 from pathlib import Path
 
 import pytest
-from conftest import REQUEST, post
+from conftest import REQUEST, post, wait_until
 
-HEAD = b"POST /cimom HTTP/1.1\r\nHost: localhost\r\n"
+from tools.simulated_server import ROOT
+
+BARE = b"POST /cimom HTTP/1.1\r\nHost: localhost\r\n"
+CALL = b"CIMOperation: MethodCall\r\n"
+HEAD = BARE + CALL
 BODY = b"Content-Length: %d\r\n\r\n%b" % (len(REQUEST), REQUEST)
 CHUNKS = b"Transfer-Encoding: chunked\r\n\r\n"
 
@@ -35,6 +40,46 @@ def test_stops_while_clients_hang_on_it(start, stop_signal):
         assert time.monotonic() - begin < 10
 
 
+def test_only_term_and_int_end_it(start):
+    host = start("fc-hba")
+    for name in ("HUP", "USR1", "USR2", "QUIT", "ALRM", "PIPE", "IO", "PWR"):
+        os.kill(host.server.pid, signal.Signals[f"SIG{name}"])
+    assert served(host)
+    assert host.server.stop() == 0
+
+
+def test_closed_standard_descriptors_are_taken_by_nothing_else(program, tmp_path):
+    command = 'exec "$@" <&- >&- 2>&-'
+    process = subprocess.Popen(["sh", "-c", command, "sh", *program, "--no-auth"], cwd=tmp_path)
+    try:
+        descriptors = Path(f"/proc/{process.pid}/fd")
+        wait_until(lambda: len(list(descriptors.iterdir())) > 5)  # it listens
+        assert {os.readlink(descriptors / number) for number in "012"} == {"/dev/null"}
+    finally:
+        process.terminate()
+        assert process.wait(60) == 0
+
+
+def test_a_hung_driver_stops_only_its_provider(start, tmp_path):
+    control = tmp_path / "control"
+    host = start("fc-hba", {"HXASIM_CONTROL": str(control)})
+    hxasim = [Path(host.server.arguments()[0]).parents[1] / "sim/hxasim", "--socket", control]
+    subprocess.run([*hxasim, "fault", "--command", "IOCMD_PORT_GET_ATTR", "--delay", "600000"], check=True, timeout=60)
+    with ThreadPoolExecutor(9) as pool:
+        hung = [pool.submit(host.device_ids) for _ in range(9)]
+        time.sleep(1)
+        begin = time.monotonic()
+        assert len(host.pywbem.EnumerateClassNames(DeepInheritance=True)) == 177
+        assert len(host.pywbem.EnumerateInstanceNames("CIM_Namespace", "root/PG_InterOp")) == 4
+        assert time.monotonic() - begin < 4
+        assert len(host.pywbem.EnumerateInstances("ZEMLAR_ComputerSystem")) == 1, "another provider, once its turn comes"
+        assert time.monotonic() - begin < 30
+        begin = time.monotonic()
+        assert host.server.stop() == 0
+        assert time.monotonic() - begin < 9
+        assert all(future.exception() for future in hung)
+
+
 def signals_kept(pid):
     """The signals that a program would not get which the server's threads start: those blocked or ignored in any of them."""
     kept = 0
@@ -45,7 +90,8 @@ def signals_kept(pid):
     return kept
 
 
-def test_programs_that_the_module_starts_can_be_stopped(mixed):
+def test_programs_that_the_module_starts_can_be_stopped(start):
+    mixed = start("mixed", {"HXASIM_CONTROL": "off"})  # its thread takes no signals, and starts no programs
     build = Path(mixed.server.arguments()[0]).parents[1]
     if "fsanitize=thread" in (build / "build.ninja").read_text(encoding="utf-8"):
         pytest.skip("the thread sanitizer has a thread of its own that blocks everything")
@@ -61,25 +107,46 @@ def test_says_what_is_wrong_at_the_start(mixed, program):
     for arguments, code, told in [
         (["--module", "/nonexistent.so", *port_0], 1, "/nonexistent.so"),
         (["--module", server, *port_0], 1, server),
+        (["--module", str(Path(server).parents[1] / "sim/libhxasim.so"), *port_0], 1, "has no function cimple_module"),
         (["--module", module, "--port", str(mixed.server.port)], 1, str(mixed.server.port)),
         (port_0, 2, "--module"),
         (["--module", module, "--port", "65536"], 2, "65536"),
         (["--module", module, "--workers", "0"], 2, "--workers"),
         (["--module", module, "--colour"], 2, "--colour"),
+        (["--module", module, "--max-connections", "10000", *port_0], 1, "lower --max-connections"),
     ]:
-        done = subprocess.run([server, "--no-auth", *arguments], capture_output=True, text=True, timeout=60, check=False)
+        limited = ["prlimit", "--nofile=2048:2048", server, "--no-auth", *arguments]
+        done = subprocess.run(limited, capture_output=True, text=True, timeout=60, check=False)
         assert (done.returncode, done.stdout) == (code, ""), arguments
         assert told in done.stderr
+
+
+def test_help_shows_units(program):
+    programs = [program[0], *(ROOT / "script").iterdir()]
+    for path in (path for path in programs if os.access(path, os.X_OK)):
+        done = subprocess.run([path, "--help"], capture_output=True, text=True, timeout=60, check=False)
+        assert (done.returncode, done.stderr, len(done.stdout) > 50) == (0, "", True), path
+    shown = subprocess.run([program[0], "--help"], capture_output=True, text=True, check=True).stdout
+    assert "--max-request BYTES" in shown and "--delivery-pause SECONDS" in shown
+    assert not re.search(r"\b(TEXT|UINT|INT|FLOAT)\b", shown)
 
 
 @pytest.mark.parametrize(
     "request_bytes,answers",
     [
-        (HEAD + b"CIMOperation: MethodCall\r\n" + BODY, [b"200 OK", b"CIMOperation: MethodResponse", b"<INSTANCENAME"]),
-        (HEAD + b"CIMOperation: MethodRequest\r\n" + BODY, [b"400", b"CIMError: unsupported-operation"]),
+        (HEAD + BODY, [b"200 OK", b"CIMOperation: MethodResponse", b"<INSTANCENAME"]),
+        (BARE + b"CIMOperation: MethodRequest\r\n" + BODY, [b"400", b"CIMError: unsupported-operation"]),
+        # What a web page can send: no header of its own, its own name that leads here, or where it comes from.
+        (BARE + BODY, [b"400", b"CIMError: unsupported-operation"]),
+        (HEAD.replace(b"localhost", b"evil.example:5988") + BODY, [b"403"]),
+        (HEAD.replace(b"localhost", b"127.0.0.1.evil.example") + BODY, [b"403"]),
+        (HEAD + b"Origin: http://localhost\r\n" + BODY, [b"403"]),
+        (HEAD + b"Origin: null\r\n" + BODY, [b"403"]),
+        (HEAD.replace(b"localhost", b"127.0.0.1:5988") + BODY, [b"<INSTANCENAME"]),
+        (HEAD.replace(b"localhost", b"[::1]:5988") + BODY, [b"<INSTANCENAME"]),
         (HEAD + BODY + HEAD + BODY, [b"<INSTANCENAME", b"HTTP/1.1 200", b"<INSTANCENAME"]),
         (HEAD + CHUNKS + b"%x\r\n%b\r\n1\r\n \r\n0\r\n\r\n" % (len(REQUEST), REQUEST), [b"<INSTANCENAME"]),
-        (b"POST / HTTP/1.0\r\n" + BODY, [b"<INSTANCENAME"]),
+        (b"POST / HTTP/1.0\r\n" + CALL + BODY, [b"<INSTANCENAME"]),
         (b"GET / HTTP/1.1\r\nHost: x\r\n\r\n", [b"405", b"Allow: POST"]),
         (b"M-POST / HTTP/1.1\r\nHost: x\r\n\r\n", [b"405"]),
         (b"BREW / HTTP/1.1\r\nHost: x\r\n\r\n", [b"405"]),

@@ -18,8 +18,8 @@ TEST_F(Life, unloading_leaves_nothing_behind)
     {
         {
             cimserver::Module module(module_path);
-            cimserver::Name_Spaces operations(module);
-            EXPECT_GT(operations.enumerate_instances(name_space, "ZEMLAR_FCPort", true, std::nullopt).size(), 0U);
+            cimserver::Server_Name_Spaces name_spaces(module);
+            EXPECT_GT(name_spaces.at(name_space, "").enumerate_instances("ZEMLAR_FCPort", true, std::nullopt).size(), 0U);
             hxasim::take_requests(); // what the simulator remembers is no leak
         }
         EXPECT_EQ(dlopen(module_path, RTLD_NOW | RTLD_NOLOAD), nullptr) << "the module is still mapped";

@@ -43,19 +43,19 @@ void Loaded_Module::load(const std::string& scenario)
     unload();
     hxasim::load(scenario);
     _module = std::make_unique<cimserver::Module>(module_path);
-    _operations = std::make_unique<cimserver::Name_Spaces>(*_module);
+    _name_spaces = std::make_unique<cimserver::Server_Name_Spaces>(*_module);
 }
 
 // A module that is still mapped would not look at the new host.
 void Loaded_Module::unload()
 {
-    _operations.reset();
+    _name_spaces.reset();
     _module.reset();
 }
 
 std::vector<cimserver::Instance> Loaded_Module::enumerate(const std::string& class_name)
 {
-    return operations().enumerate_instances(name_space, class_name, true, std::nullopt);
+    return operations().enumerate_instances(class_name, true, std::nullopt);
 }
 
 std::vector<std::string> Loaded_Module::requests()

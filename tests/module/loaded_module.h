@@ -2,7 +2,7 @@
 #pragma once
 
 #include "cimserver/broker/module.h"
-#include "cimserver/name_spaces.h"
+#include "cimserver/interop/name_spaces.h"
 #include "sim/hxasim.h"
 
 #include <gtest/gtest.h>
@@ -37,11 +37,11 @@ protected:
     void TearDown() override;
 
     cimserver::Module& module() { return *_module; }
-    cimserver::Operations& operations() { return *_operations; }
+    cimserver::Operations& operations() { return _name_spaces->at(name_space, ""); }
 
 private:
     void unload();
 
     std::unique_ptr<cimserver::Module> _module;
-    std::unique_ptr<cimserver::Name_Spaces> _operations;
+    std::unique_ptr<cimserver::Server_Name_Spaces> _name_spaces;
 };

@@ -38,7 +38,7 @@ TEST_F(Requests, ports_cost_one_request_each)
     EXPECT_THAT(device_ids(enumerate("ZEMLAR_FCPort")), ElementsAre("100000051E123456", "100000051E123457"));
     EXPECT_THAT(requests(), ElementsAre("IOCMD_PORT_GET_ATTR", "IOCMD_PORT_GET_ATTR"));
 
-    EXPECT_THAT(operations().enumerate_instance_names(name_space, "ZEMLAR_FCPort"), SizeIs(2));
+    EXPECT_THAT(operations().enumerate_instance_names("ZEMLAR_FCPort"), SizeIs(2));
     EXPECT_THAT(requests(), SizeIs(2));
 
     EXPECT_THAT(enumerate("ZEMLAR_ComputerSystem"), SizeIs(1));
@@ -91,7 +91,7 @@ TEST_F(Requests, every_class_answers_on_every_host)
         load(host.scenario);
         const std::map<std::string, std::size_t> expected = {
             {"ZEMLAR_ComputerSystem", 1}, {"ZEMLAR_PortController", host.adapters}, {"ZEMLAR_FCPort", host.ports}};
-        for (const auto* meta_class : operations().enumerate_classes(name_space, "", true))
+        for (const auto* meta_class : operations().enumerate_classes("", true))
         {
             const std::string name = meta_class->name;
             if (!name.starts_with("ZEMLAR_"))

@@ -1,5 +1,5 @@
 // The generated qualifier table: usable by binary search, and every code has its text.
-#include "cimserver/qualifier_table.h"
+#include "cimserver/model/qualifier_table.h"
 #include "schema/repository.h"
 
 #include <gtest/gtest.h>

@@ -1,7 +1,7 @@
 // A fixture with the test module loaded and its operations on top.
 #pragma once
 
-#include "cimserver/name_spaces.h"
+#include "cimserver/interop/name_spaces.h"
 #include "test_module.h"
 
 #include <dlfcn.h>
@@ -62,14 +62,15 @@ protected:
     std::vector<std::string> enumerate_ids(const std::string& class_name)
     {
         std::vector<std::string> result;
-        for (const Object_Path& found : operations.enumerate_instance_names("root/zemlar", class_name))
+        for (const Object_Path& found : operations.enumerate_instance_names(class_name))
             result.push_back(found.class_name + ":" + std::get<std::string>(found.keys.at(0).value.content));
         return result;
     }
 
     Test_Module test_module;
     Module module{TEST_MODULE};
-    Name_Spaces operations{module};
+    Server_Name_Spaces name_spaces{module};
+    Operations& operations = name_spaces.at("root/zemlar", "");
 };
 
 } // namespace cimserver

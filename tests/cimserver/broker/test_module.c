@@ -54,8 +54,10 @@ static CMPIInstance* tape(const CMPIContext* context, const char** properties)
 {
     CMPIInstance* instance = instance_of(path_of("TST_Tape", "tape", 0), properties);
     CMPIEnumeration* disks =
-        broker->bft->enumerateInstanceNames(broker, context, CMNewObjectPath(broker, "root/zemlar", "TST_Disk", NULL), NULL);
-    CMPIUint32 count = disks ? CMGetArrayCount(CMToArray(disks, NULL), NULL) : 0;
+        broker->bft->enumerateInstances(broker, context, CMNewObjectPath(broker, "root/zemlar", "TST_Disk", NULL), NULL, NULL);
+    CMPIUint32 count = 0;
+    for (; disks && CMHasNext(disks, NULL); ++count)
+        CMGetNext(disks, NULL);
     CMSetProperty(instance, "Speed", &count, CMPI_uint32);
     return instance;
 }

@@ -46,9 +46,8 @@ constexpr Meta_Class base = make_class("TST_Base", Flag_Abstract, base_features,
 constexpr Meta_Property size = property("Uint8", UINT8);
 constexpr Meta_Property numbers = property("Uint16s", UINT16, -1);
 constexpr Meta_Property texts = property("Strings", STRING, -1);
-constexpr Meta_Reference detail = reference("Detail", &base, Flag_EmbeddedInstance);
 
-constexpr const Meta_Feature* disk_features[] = {&id, &name, &reset, &size, &numbers, &texts, &detail};
+constexpr const Meta_Feature* disk_features[] = {&id, &name, &reset, &size, &numbers, &texts};
 constexpr Meta_Class disk = make_class("TST_Disk", 0, disk_features, &base);
 
 constexpr Meta_Property speed = property("Speed", UINT32);

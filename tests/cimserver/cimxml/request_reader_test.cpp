@@ -1,7 +1,6 @@
 // Every odd request gets its exact refusal, and the accepted forms are read as they are meant.
 #include "cimserver/cimxml/http_message.h"
 #include "cimserver/cimxml/object_reader.h"
-#include "cimserver/cimxml/parameters.h"
 #include "cimserver/cimxml/request_reader.h"
 
 #include <gtest/gtest.h>
@@ -30,8 +29,6 @@ std::string parameter(const std::string& name, const std::string& value)
 {
     return "<IPARAMVALUE NAME=\"" + name + "\">" + value + "</IPARAMVALUE>";
 }
-
-std::string flag(const std::string& name, const std::string& value) { return parameter(name, "<VALUE>" + value + "</VALUE>"); }
 
 std::string class_name(const std::string& name) { return parameter("ClassName", "<CLASSNAME NAME=\"" + name + "\"/>"); }
 
@@ -210,34 +207,4 @@ TEST(object_reader, refuses_keys_that_cannot_be_read)
           "<KEYBINDING NAME=\"K\"><VALUE.REFERENCE><INSTANCEPATH><NAMESPACEPATH>" + name_space + name_space +
               "</NAMESPACEPATH><INSTANCENAME CLASSNAME=\"B\"/></INSTANCEPATH></VALUE.REFERENCE></KEYBINDING>"})
         EXPECT_THROW(read_path(instance_name(keys), "n"), Cim_Error) << keys;
-}
-
-TEST(parameters, are_read_by_name_and_type)
-{
-    constexpr std::string_view known[] = {"ClassName", "LocalOnly", "PropertyList", "InstanceName"};
-    const auto fails = [&](const std::string& text)
-    {
-        const Cimxml_Request request = read_request(intrinsic("X", text));
-        try
-        {
-            const Parameters parameters(request, known);
-            parameters.class_name("ClassName");
-            parameters.boolean("LocalOnly", true);
-            parameters.property_list("PropertyList");
-            return 0;
-        }
-        catch (const Cim_Error& error)
-        {
-            return error.code();
-        }
-    };
-    const std::string name = class_name("A");
-    EXPECT_EQ(fails(name + flag("localonly", " FALSE ") + parameter("PropertyList", "")), 0);
-    EXPECT_EQ(fails(""), CIM_ERR_INVALID_PARAMETER);
-    EXPECT_EQ(fails(parameter("ClassName", "")), CIM_ERR_INVALID_PARAMETER);
-    EXPECT_EQ(fails(name + class_name("B")), CIM_ERR_INVALID_PARAMETER);
-    EXPECT_EQ(fails(name + flag("Unknown", "x")), CIM_ERR_INVALID_PARAMETER);
-    EXPECT_EQ(fails(name + flag("LocalOnly", "1")), CIM_ERR_INVALID_PARAMETER);
-    EXPECT_EQ(fails(name + flag("PropertyList", "Name")), CIM_ERR_INVALID_PARAMETER);
-    EXPECT_EQ(fails(name + parameter("PropertyList", "<VALUE.ARRAY><VALUE.NULL/></VALUE.ARRAY>")), CIM_ERR_INVALID_PARAMETER);
 }

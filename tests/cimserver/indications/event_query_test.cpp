@@ -1,5 +1,5 @@
 // Which queries are served, what they let through, and why others are refused.
-#include "cimserver/indications/event_query.h"
+#include "cimserver/model/event_query.h"
 
 #include <gtest/gtest.h>
 
@@ -65,7 +65,7 @@ TEST(event_query, lets_through_what_meets_its_condition)
     const Row rows[] = {
         {"Text = 'it''s \"hot\"'", true},
         {"text = \"it's \\\"hot\\\"\"", true},
-        {"Text <> 'cold'", true},
+        {"Text <> ' FROM TST_Other WHERE '", true}, // in a literal these are no clauses
         {"Text = 'IT''S \"HOT\"'", false},
         {"Number = -5", true},
         {"Number < -4 AND Number > -6", true},
@@ -94,17 +94,6 @@ TEST(event_query, lets_through_what_meets_its_condition)
     };
     for (const Row& row : rows)
         EXPECT_EQ(wanted(row.where), row.wanted) << row.where;
-}
-
-TEST(event_query, hands_on_the_selected_properties)
-{
-    const Event_Query query("select TST_Alert.Number, text from TST_Alert");
-    query.check(Property_Layout(alert()));
-    const Instance selected = query.selected(alert());
-    ASSERT_EQ(selected.properties.size(), 2U);
-    EXPECT_EQ(selected.properties[0].name, "Text");
-    EXPECT_EQ(selected.properties[1].name, "Number");
-    EXPECT_EQ(Event_Query("SELECT * FROM TST_Alert").selected(alert()).properties.size(), alert().properties.size());
 }
 
 TEST(event_query, refuses_what_it_cannot_keep)

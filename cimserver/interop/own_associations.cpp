@@ -1,0 +1,128 @@
+// Association traversal from an object of the server's own along the server's own associations.
+#include "cimserver/interop/own_operations.h"
+
+#include "cimserver/model/paths.h"
+#include "cimserver/operations/association_routing.h"
+#include "cimserver/operations/key_conversion.h"
+
+#include <algorithm>
+
+namespace cimserver
+{
+namespace
+{
+
+using Target = std::shared_ptr<const Object_Path>;
+
+const Target* reference_in(const Named_Value& property)
+{
+    const auto* reference = std::get_if<Target>(&property.value.content);
+    return reference && *reference ? reference : nullptr;
+}
+
+bool may_play(const Named_Value& property, const std::string& role) { return role.empty() || equal_names(property.name, role); }
+
+// A reference without a name space is to an object of the association's.
+std::string identity_of(Object_Path target)
+{
+    if (target.name_space.empty())
+        target.name_space = Own_Operations::name_space;
+    return path_identity(target);
+}
+
+} // namespace
+
+// A class of the filter may be the server's or the module's. One that the server's part does not have admits nothing there.
+bool Own_Operations::admits(const Association_Filter& filter) const
+{
+    bool all_own = true;
+    for (const std::string* class_name : {&filter.association_class, &filter.result_class})
+        if (!class_name->empty() && !_repository.find(*class_name))
+        {
+            if (!_module_classes.find(*class_name))
+                throw Cim_Error(CIM_ERR_INVALID_PARAMETER, "there is no class " + *class_name);
+            all_own = false;
+        }
+    return all_own;
+}
+
+std::vector<Own_Operations::Reference> Own_Operations::find_references(const Object_Path& path, const Association_Filter& filter,
+                                                                       Ends ends) const
+{
+    const Class_Entry& named = *_repository.find(path.class_name);
+    if (!admits(filter))
+        return {};
+    const std::string source = path_identity({"", name_space, named.meta_class->name, keys_of(named, path)});
+
+    std::vector<Reference> found;
+    for (const Class_Entry* entry : concerned_associations(_repository, named, filter, ends))
+        if (const Server_Class* server_class = answering(*entry))
+            for (Instance& association : server_class->enumerate())
+                for (const Named_Value& property : association.properties)
+                    if (const Target* reference = reference_in(property);
+                        reference && may_play(property, filter.role) && identity_of(**reference) == source)
+                    {
+                        std::string near = property.name;
+                        found.push_back({*entry, std::move(association), std::move(near)});
+                        break;
+                    }
+    return found;
+}
+
+std::vector<Object_Path> Own_Operations::associator_names(const Object_Path& path, const Association_Filter& filter)
+{
+    const Class_Entry* result_class = _repository.find(filter.result_class);
+    std::vector<Object_Path> paths;
+    for (const Reference& found : find_references(path, filter, Ends::both))
+        for (const Named_Value& property : found.association.properties)
+        {
+            const Target* reference = reference_in(property);
+            if (!reference || property.name == found.near || !may_play(property, filter.result_role))
+                continue;
+            const Class_Entry* far = _repository.find((*reference)->class_name);
+            if (far && (!result_class || Repository::is_a(far->meta_class, result_class->meta_class)))
+                paths.push_back(**reference);
+        }
+    remove_duplicates(paths);
+    return paths;
+}
+
+// One that is deleted meanwhile is left out.
+std::vector<Instance> Own_Operations::associators(const Object_Path& path, const Association_Filter& filter,
+                                                  const Property_List& properties)
+{
+    std::vector<Instance> instances;
+    for (const Object_Path& target : associator_names(path, filter))
+        try
+        {
+            instances.push_back(get_instance(target, properties));
+        }
+        catch (const Cim_Error& error)
+        {
+            if (error.code() != CIM_ERR_NOT_FOUND)
+                throw;
+        }
+    return instances;
+}
+
+std::vector<Instance> Own_Operations::references(const Object_Path& path, const Association_Filter& filter,
+                                                 const Property_List& properties)
+{
+    std::vector<Instance> instances;
+    for (Reference& found : find_references(path, filter, Ends::source))
+        instances.push_back(shown(std::move(found.association), found.entry, properties));
+    return instances;
+}
+
+std::vector<Object_Path> Own_Operations::reference_names(const Object_Path& path, const Association_Filter& filter)
+{
+    std::vector<Object_Path> paths;
+    for (Reference& found : find_references(path, filter, Ends::source))
+    {
+        paths.push_back(std::move(found.association.path));
+        paths.back().name_space = name_space;
+    }
+    return paths;
+}
+
+} // namespace cimserver

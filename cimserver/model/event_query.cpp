@@ -1,0 +1,161 @@
+#include "cimserver/model/event_query.h"
+
+#include "cimserver/model/names.h"
+#include "cimserver/model/query_parser.h"
+#include "cimserver/model/query_tokens.h"
+
+#include <algorithm>
+
+namespace cimserver
+{
+namespace
+{
+
+using Kind = Query_Condition::Kind;
+using Relation = Query_Condition::Relation;
+
+bool is_number(CMPIType type) { return (type & (CMPI_INTEGER | CMPI_REAL)) != 0; }
+
+std::optional<long double> number_of(const Value& value)
+{
+    if (const auto* number = std::get_if<std::uint64_t>(&value.content))
+        return *number;
+    if (const auto* number = std::get_if<std::int64_t>(&value.content))
+        return *number;
+    if (const auto* number = std::get_if<double>(&value.content))
+        return *number;
+    return std::nullopt;
+}
+
+template <class T> bool holds(const T& left, Relation relation, const T& right)
+{
+    switch (relation)
+    {
+    case Relation::equal:
+        return left == right;
+    case Relation::unequal:
+        return left != right;
+    case Relation::less:
+        return left < right;
+    case Relation::less_or_equal:
+        return left <= right;
+    case Relation::greater:
+        return left > right;
+    case Relation::greater_or_equal:
+        return left >= right;
+    }
+    return false;
+}
+
+// Absent: unknown, because the property is null.
+std::optional<bool> compare(const Query_Condition& condition, const Value& value)
+{
+    if (const auto* text = std::get_if<std::string>(&condition.literal))
+        if (const auto* mine = std::get_if<std::string>(&value.content))
+            return holds(*mine, condition.relation, *text);
+    if (const auto* flag = std::get_if<bool>(&condition.literal))
+        if (const auto* mine = std::get_if<bool>(&value.content))
+            return holds(*mine, condition.relation, *flag);
+    if (const auto* number = std::get_if<long double>(&condition.literal))
+        if (const auto mine = number_of(value))
+            return holds(*mine, condition.relation, *number);
+    return std::nullopt;
+}
+
+std::optional<bool> evaluate(const Query_Condition& condition, const Instance& indication);
+
+// A part that equals `decisive` decides; else one that is unknown makes the whole unknown.
+std::optional<bool> join(const std::vector<Query_Condition>& parts, bool decisive, const Instance& indication)
+{
+    std::optional<bool> result = !decisive;
+    for (const Query_Condition& part : parts)
+    {
+        const auto outcome = evaluate(part, indication);
+        if (outcome == decisive)
+            return decisive;
+        if (!outcome)
+            result.reset();
+    }
+    return result;
+}
+
+std::optional<bool> evaluate(const Query_Condition& condition, const Instance& indication)
+{
+    switch (condition.kind)
+    {
+    case Kind::negation:
+    {
+        const auto outcome = evaluate(condition.parts.front(), indication);
+        return outcome ? std::optional(!*outcome) : std::nullopt;
+    }
+    case Kind::conjunction:
+        return join(condition.parts, false, indication);
+    case Kind::disjunction:
+        return join(condition.parts, true, indication);
+    case Kind::is_null:
+    case Kind::compare:
+        break;
+    }
+    const Named_Value* property = find_named(indication.properties, condition.property);
+    const Value value = property ? property->value : Value();
+    return condition.kind == Kind::is_null ? std::optional(value.null()) : compare(condition, value);
+}
+
+void check_property(const std::string& name, const Property_Layout& layout, const std::string& class_name)
+{
+    if (!layout.find(name))
+        refuse_query("class " + class_name + " has no property " + name);
+}
+
+void check_types(const Query_Condition& condition, CMPIType type)
+{
+    const bool ordered = condition.relation != Relation::equal && condition.relation != Relation::unequal;
+    const bool fits = std::holds_alternative<std::string>(condition.literal) ? type == CMPI_string && !ordered
+                      : std::holds_alternative<bool>(condition.literal)      ? type == CMPI_boolean && !ordered
+                                                                             : (type & CMPI_ARRAY) == 0 && is_number(type);
+    if (!fits)
+        refuse_query("property " + condition.property + " cannot be compared like this");
+}
+
+void check_condition(const Query_Condition& condition, const Property_Layout& layout, const std::string& class_name)
+{
+    for (const Query_Condition& part : condition.parts)
+        check_condition(part, layout, class_name);
+    if (condition.kind != Kind::compare && condition.kind != Kind::is_null)
+        return;
+    check_property(condition.property, layout, class_name);
+    if (condition.kind == Kind::compare)
+        check_types(condition, layout.slots()[*layout.find(condition.property)].type);
+}
+
+} // namespace
+
+Event_Query::Event_Query(const std::string& text)
+{
+    Parsed_Query parsed = parse_query(text);
+    _class_name = std::move(parsed.class_name);
+    _select = std::move(parsed.select);
+    _where = std::move(parsed.where);
+}
+
+void Event_Query::check(const Property_Layout& layout) const
+{
+    if (_select)
+        for (const std::string& name : *_select)
+            check_property(name, layout, _class_name);
+    if (_where)
+        check_condition(*_where, layout, _class_name);
+}
+
+bool Event_Query::wants(const Instance& indication) const { return !_where || evaluate(*_where, indication).value_or(false); }
+
+Instance Event_Query::selected(Instance indication) const
+{
+    if (_select)
+        std::erase_if(
+            indication.properties, [&](const Named_Value& property)
+            { return std::ranges::none_of(*_select, [&](const auto& name) { return equal_names(name, property.name); }); });
+    return indication;
+}
+
+} // namespace cimserver

@@ -1,0 +1,45 @@
+#include "cimserver/model/operations.h"
+
+#include "cimserver/model/meta_search.h"
+#include "cimserver/model/names.h"
+
+namespace cimserver
+{
+namespace
+{
+
+void check_property(const zmlr::Meta_Class& meta_class, const std::string& property)
+{
+    if (!find_value(meta_class, property))
+        throw Cim_Error(CIM_ERR_NO_SUCH_PROPERTY, "class " + std::string(meta_class.name) + " has no property " + property);
+}
+
+} // namespace
+
+void Operations::not_supported(const char* operation)
+{
+    throw Cim_Error(CIM_ERR_NOT_SUPPORTED, std::string("operation not supported: ") + operation);
+}
+
+Value Operations::get_property(const Object_Path& path, const std::string& property)
+{
+    const Instance instance = get_instance(path, std::vector{property});
+    check_property(*get_class(instance.path.class_name), property);
+    const Named_Value* found = find_named(instance.properties, property);
+    return found ? found->value : Value();
+}
+
+void Operations::set_property(const Object_Path& path, const std::string& property, const Value& value)
+{
+    Instance instance{path, {{property, value}}};
+    try
+    {
+        modify_instance(instance, std::vector{property});
+    }
+    catch (const Type_Error& error)
+    {
+        throw Cim_Error(CIM_ERR_TYPE_MISMATCH, error.description());
+    }
+}
+
+} // namespace cimserver

@@ -1,0 +1,71 @@
+#include "cimserver/model/paths.h"
+
+#include "cimserver/model/names.h"
+
+#include <algorithm>
+
+namespace cimserver
+{
+namespace
+{
+
+std::string quoted(const std::string& text)
+{
+    std::string result = "\"";
+    for (const char c : text)
+    {
+        if (c == '"' || c == '\\')
+            result += '\\';
+        result += c;
+    }
+    return result + '"';
+}
+
+std::string key_text(const Value& value)
+{
+    if (const auto* flag = std::get_if<bool>(&value.content))
+        return *flag ? "TRUE" : "FALSE";
+    if (const auto* number = std::get_if<std::uint64_t>(&value.content))
+        return std::to_string(*number);
+    if (const auto* number = std::get_if<std::int64_t>(&value.content))
+        return std::to_string(*number);
+    if (const auto* number = std::get_if<double>(&value.content))
+        return std::to_string(*number);
+    if (const auto* text = std::get_if<std::string>(&value.content))
+        return quoted(*text);
+    if (const auto* path = std::get_if<std::shared_ptr<const Object_Path>>(&value.content); path && *path)
+        return quoted(path_text(**path));
+    return "NULL";
+}
+
+Object_Path normal_form(Object_Path path)
+{
+    path.class_name = lower_name(path.class_name);
+    path.name_space = lower_name(path.name_space);
+    for (Named_Value& key : path.keys)
+    {
+        key.name = lower_name(key.name);
+        if (auto* target = std::get_if<std::shared_ptr<const Object_Path>>(&key.value.content); target && *target)
+            *target = std::make_shared<const Object_Path>(normal_form(**target));
+    }
+    std::ranges::sort(path.keys, {}, &Named_Value::name);
+    return path;
+}
+
+} // namespace
+
+std::string path_text(const Object_Path& path)
+{
+    std::string text = path.name_space.empty() ? path.class_name : path.name_space + ':' + path.class_name;
+    char separator = '.';
+    for (const Named_Value& key : path.keys)
+    {
+        text += separator + key.name + '=' + key_text(key.value);
+        separator = ',';
+    }
+    return text;
+}
+
+std::string path_identity(const Object_Path& path) { return path_text(normal_form(path)); }
+
+} // namespace cimserver

@@ -1,0 +1,79 @@
+#include "cimserver/model/property_layout.h"
+
+#include "cimserver/model/cim_types.h"
+
+namespace cimserver
+{
+namespace
+{
+
+constexpr zmlr::uint32 embedded = zmlr::Flag_EmbeddedObject | zmlr::Flag_EmbeddedInstance;
+
+CMPIType array_if(bool is_array, CMPIType type) { return is_array ? array_of(type) : type; }
+
+} // namespace
+
+CMPIType cmpi_type(const zmlr::Meta_Feature& feature)
+{
+    if (zmlr::is_reference(&feature))
+    {
+        const bool is_array = zmlr::as_reference(&feature)->subscript != 0;
+        return array_if(is_array, (feature.flags & embedded) != 0 ? CMPI_instance : CMPI_ref);
+    }
+    const zmlr::Meta_Property* property = zmlr::as_property(&feature);
+    return array_if(property->subscript != 0, cmpi_type(property->type));
+}
+
+Property_Layout::Property_Layout(const zmlr::Meta_Class& meta_class)
+{
+    for (zmlr::uint32 i = 0; i < meta_class.num_meta_features; ++i)
+    {
+        const zmlr::Meta_Feature* feature = meta_class.meta_features[i];
+        if (!zmlr::is_method(feature))
+            _slots.push_back({feature->name, cmpi_type(*feature), zmlr::is_key(feature)});
+    }
+    index_slots();
+}
+
+Property_Layout::Property_Layout(const Instance& instance)
+{
+    for (const Named_Value& property : instance.properties)
+        _slots.push_back({property.name, property.value.type, find_named(instance.path.keys, property.name) != nullptr});
+    index_slots();
+}
+
+void Property_Layout::index_slots()
+{
+    _index.reserve(_slots.size());
+    for (std::size_t i = 0; i < _slots.size(); ++i)
+        _index.emplace(_slots[i].name, i);
+}
+
+std::optional<std::size_t> Property_Layout::find(std::string_view name) const
+{
+    const auto found = _index.find(name);
+    if (found == _index.end())
+        return std::nullopt;
+    return found->second;
+}
+
+std::vector<bool> Property_Layout::select(const std::vector<std::string>& names) const
+{
+    std::vector<bool> selection(_slots.size());
+    for (const std::string& name : names)
+        if (const auto slot = find(name))
+            selection[*slot] = true;
+    return selection;
+}
+
+std::vector<std::string> Property_Layout::names(const Property_List& wanted) const
+{
+    const std::vector<bool> selected = wanted ? select(*wanted) : std::vector<bool>(size(), true);
+    std::vector<std::string> result;
+    for (std::size_t slot = 0; slot < size(); ++slot)
+        if (selected[slot])
+            result.push_back(_slots[slot].name);
+    return result;
+}
+
+} // namespace cimserver

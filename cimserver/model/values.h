@@ -1,0 +1,91 @@
+// What the server knows of CIM objects: typed values, object paths and instances, free of CMPI handles and of XML.
+#pragma once
+
+#include <cmpidt.h>
+
+#include <cstdint>
+#include <exception>
+#include <memory>
+#include <optional>
+#include <string>
+#include <utility>
+#include <variant>
+#include <vector>
+
+namespace cimserver
+{
+
+struct Object_Path;
+struct Instance;
+
+// A CIM value. `type` is the CMPI type (with the array bit for an array); its content stands in the alternative that fits:
+// booleans bool, unsigned integers and char16 std::uint64_t, signed integers std::int64_t, reals double, strings and
+// datetimes (25-character text) std::string, references and embedded instances a pointer, arrays a vector of scalars.
+struct Value
+{
+    using Content = std::variant<std::monostate, bool, std::uint64_t, std::int64_t, double, std::string,
+                                 std::shared_ptr<const Object_Path>, std::shared_ptr<const Instance>, std::vector<Value>>;
+
+    CMPIType type = CMPI_null;
+    Content content; // std::monostate: null
+
+    bool null() const { return content.index() == 0; }
+};
+
+struct Named_Value
+{
+    std::string name;
+    Value value;
+};
+
+struct Object_Path
+{
+    std::string host;
+    std::string name_space;
+    std::string class_name;
+    std::vector<Named_Value> keys;
+};
+
+struct Instance
+{
+    Object_Path path;
+    std::vector<Named_Value> properties;
+};
+
+// Adds a value to a list, in the place of one of the same name.
+void put(std::vector<Named_Value>& list, const std::string& name, Value value); // names.cpp
+
+// A list of property names a client asked for; absent: all.
+using Property_List = std::optional<std::vector<std::string>>;
+
+// A CIM operation that failed: a CIM status code (DSP0200) and a description for people.
+class Cim_Error : public std::exception
+{
+public:
+    Cim_Error(int code, std::string description) : _code(code), _description(std::move(description)) {}
+    int code() const { return _code; }
+    const std::string& description() const { return _description; }
+    const char* what() const noexcept override { return _description.c_str(); }
+
+private:
+    int _code;
+    std::string _description;
+};
+
+inline constexpr int CIM_ERR_FAILED = 1;
+inline constexpr int CIM_ERR_ACCESS_DENIED = 2;
+inline constexpr int CIM_ERR_INVALID_NAMESPACE = 3;
+inline constexpr int CIM_ERR_INVALID_PARAMETER = 4;
+inline constexpr int CIM_ERR_INVALID_CLASS = 5;
+inline constexpr int CIM_ERR_NOT_FOUND = 6;
+inline constexpr int CIM_ERR_NOT_SUPPORTED = 7;
+inline constexpr int CIM_ERR_ALREADY_EXISTS = 11;
+inline constexpr int CIM_ERR_NO_SUCH_PROPERTY = 12;
+inline constexpr int CIM_ERR_TYPE_MISMATCH = 13;
+inline constexpr int CIM_ERR_QUERY_LANGUAGE_NOT_SUPPORTED = 14;
+inline constexpr int CIM_ERR_INVALID_QUERY = 15;
+inline constexpr int CIM_ERR_METHOD_NOT_AVAILABLE = 16;
+inline constexpr int CIM_ERR_METHOD_NOT_FOUND = 17;
+inline constexpr int CIM_ERR_SERVER_LIMITS_EXCEEDED = 27;
+
+} // namespace cimserver

@@ -1,0 +1,8 @@
+#include "cimserver/model/version.h"
+
+namespace cimserver
+{
+
+const char* version() { return ZMLR_VERSION; }
+
+} // namespace cimserver

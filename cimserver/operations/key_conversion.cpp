@@ -1,0 +1,102 @@
+#include "cimserver/operations/key_conversion.h"
+
+#include "cimserver/model/repository.h"
+#include "cimserver/model/value_conversion.h"
+#include "cimserver/model/value_text.h"
+
+namespace cimserver
+{
+namespace
+{
+
+// References in references: no class of any schema comes near this depth, a hostile request may.
+constexpr int max_depth = 8;
+
+class Converter
+{
+public:
+    explicit Converter(const Repository& repository) : _repository(repository) {}
+
+    std::vector<Named_Value> keys(const Class_Entry& entry, const Object_Path& path)
+    {
+        if (++_depth > max_depth)
+            throw Key_Error("the references in the keys are nested too deeply");
+
+        refuse_unknown_and_repeated(entry, path);
+        std::vector<Named_Value> result;
+        for (zmlr::uint32 i = 0; i < entry.meta_class->num_meta_features; ++i)
+        {
+            const zmlr::Meta_Feature* feature = entry.meta_class->meta_features[i];
+            if (zmlr::is_key(feature))
+                result.push_back({feature->name, converted(entry, *feature, path)});
+        }
+        --_depth;
+        return result;
+    }
+
+    // A reference may name the declared class, one derived from it, or a superclass that a client walked in through.
+    Value::Content reference_content(const Value& value, const zmlr::Meta_Reference& reference, const std::string& name_space)
+    {
+        const auto* target = std::get_if<std::shared_ptr<const Object_Path>>(&value.content);
+        const Class_Entry* entry = target && *target ? _repository.find((*target)->class_name) : nullptr;
+        if (!entry || !are_related(entry->meta_class, reference.meta_class))
+            return {};
+
+        Object_Path result{(*target)->host, (*target)->name_space, entry->meta_class->name, keys(*entry, **target)};
+        if (result.name_space.empty())
+            result.name_space = name_space;
+        return std::make_shared<const Object_Path>(std::move(result));
+    }
+
+private:
+    [[noreturn]] static void refuse(const std::string& key, const Class_Entry& entry, const std::string& reason)
+    {
+        throw Key_Error("key " + key + " of class " + std::string(entry.meta_class->name) + ": " + reason);
+    }
+
+    static void refuse_unknown_and_repeated(const Class_Entry& entry, const Object_Path& path)
+    {
+        std::vector<bool> seen(entry.layout->size());
+        for (const Named_Value& key : path.keys)
+        {
+            const auto slot = entry.layout->find(key.name);
+            if (!slot || !entry.layout->slots()[*slot].key)
+                refuse(key.name, entry, "there is no such key");
+            if (seen[*slot])
+                refuse(key.name, entry, "it is given twice");
+            seen[*slot] = true;
+        }
+    }
+
+    Value converted(const Class_Entry& entry, const zmlr::Meta_Feature& feature, const Object_Path& path)
+    {
+        const Named_Value* given = find_named(path.keys, feature.name);
+        if (!given || given->value.null())
+            refuse(feature.name, entry, "it is missing");
+
+        const CMPIType type = cmpi_type(feature);
+        Value value{type, type == CMPI_ref ? reference_content(given->value, *zmlr::as_reference(&feature), path.name_space)
+                                           : scalar_content(given->value, type)};
+        if (value.null())
+            refuse(feature.name, entry, std::string("its value is no ") + cim_type_name(type));
+        return value;
+    }
+
+    const Repository& _repository;
+    int _depth = 0;
+};
+
+} // namespace
+
+Value::Content typed_reference(const Repository& repository, const zmlr::Meta_Reference& reference, const Value& value,
+                               const std::string& name_space)
+{
+    return Converter(repository).reference_content(value, reference, name_space);
+}
+
+std::vector<Named_Value> typed_keys(const Repository& repository, const Class_Entry& entry, const Object_Path& path)
+{
+    return Converter(repository).keys(entry, path);
+}
+
+} // namespace cimserver

@@ -1,0 +1,159 @@
+#include "cimserver/operations/object_conversion.h"
+
+#include "cimserver/model/meta_search.h"
+#include "cimserver/model/operations.h"
+#include "cimserver/model/paths.h"
+#include "cimserver/model/repository.h"
+#include "cimserver/model/value_conversion.h"
+#include "cimserver/model/value_text.h"
+#include "cimserver/operations/key_conversion.h"
+
+#include <span>
+#include <unordered_set>
+
+namespace cimserver
+{
+namespace
+{
+
+using Features = std::span<const zmlr::Meta_Feature* const>;
+
+Features features_of(const zmlr::Meta_Record& record) { return {record.meta_features, record.num_meta_features}; }
+
+std::string described(CMPIType type)
+{
+    if ((type & CMPI_ARRAY) != 0)
+        return std::string("array of ") + cim_type_name(type);
+    return (type == CMPI_instance) ? "embedded instance" : cim_type_name(type);
+}
+
+class Converter
+{
+public:
+    Converter(const Repository& repository, const std::string& name_space) : _repository(repository), _name_space(name_space) {}
+
+    // The value for a feature, null when it is null. Throws Type_Error.
+    Value value(const zmlr::Meta_Feature& feature, const Value& given)
+    {
+        const CMPIType type = cmpi_type(feature);
+        Value result{type, {}};
+        if (given.null())
+            return result;
+        result.content = (type & CMPI_ARRAY) != 0 ? array(feature, given) : scalar(feature, type, given);
+        if (result.null())
+            throw Type_Error("the value of " + std::string(feature.name) + " is no " + described(type));
+        return result;
+    }
+
+    std::vector<Named_Value> properties(const Class_Entry& entry, const std::vector<Named_Value>& given, int unknown_property)
+    {
+        std::vector<Named_Value> result;
+        std::unordered_set<const zmlr::Meta_Feature*> seen;
+        for (const Named_Value& property : given)
+        {
+            const zmlr::Meta_Feature* feature = find_value(*entry.meta_class, property.name);
+            if (!feature)
+                throw Cim_Error(unknown_property,
+                                "class " + std::string(entry.meta_class->name) + " has no property " + property.name);
+            if (!seen.insert(feature).second)
+                throw Type_Error("property given twice: " + property.name);
+            result.push_back({feature->name, value(*feature, property.value)});
+        }
+        return result;
+    }
+
+private:
+    Value::Content scalar(const zmlr::Meta_Feature& feature, CMPIType type, const Value& given)
+    {
+        if (type == CMPI_ref)
+            return typed_reference(_repository, *zmlr::as_reference(&feature), given, _name_space);
+        return type == CMPI_instance ? Value::Content() : scalar_content(given, type); // no class that is served has such a value
+    }
+
+    // Null when one element is none of the type; an element that is null stays so.
+    Value::Content array(const zmlr::Meta_Feature& feature, const Value& given)
+    {
+        const auto* elements = std::get_if<std::vector<Value>>(&given.content);
+        if (!elements)
+            return {};
+        const CMPIType type = cmpi_type(feature) & static_cast<CMPIType>(~CMPI_ARRAY);
+        std::vector<Value> result;
+        result.reserve(elements->size());
+        for (const Value& element : *elements)
+        {
+            result.push_back({type, element.null() ? Value::Content() : scalar(feature, type, element)});
+            if (!element.null() && result.back().null())
+                return {};
+        }
+        return result;
+    }
+
+    const Repository& _repository;
+    const std::string& _name_space;
+};
+
+std::vector<Named_Value> keys_among(const Class_Entry& entry, const std::vector<Named_Value>& properties)
+{
+    std::vector<Named_Value> keys;
+    for (const Property_Layout::Slot& slot : entry.layout->slots())
+        if (const Named_Value* property = slot.key ? find_named(properties, slot.name) : nullptr;
+            property && !property->value.null())
+            keys.push_back(*property);
+    return keys;
+}
+
+// An instance that has a path has its keys among its properties, too, and keeps them.
+void add_keys(Instance& instance)
+{
+    for (const Named_Value& key : instance.path.keys)
+    {
+        const Named_Value* property = find_named(instance.properties, key.name);
+        if (!property)
+            instance.properties.push_back(key);
+        else if (path_identity({"", "", "", {*property}}) != path_identity({"", "", "", {key}}))
+            throw Cim_Error(CIM_ERR_INVALID_PARAMETER, "the key " + key.name + " cannot be changed");
+    }
+}
+
+} // namespace
+
+Instance typed_instance(const Repository& repository, const Class_Entry& entry, const Instance& instance, int unknown_property)
+{
+    Instance result{{"", instance.path.name_space, entry.meta_class->name, {}}, {}};
+    Converter converter(repository, result.path.name_space);
+    result.properties = converter.properties(entry, instance.properties, unknown_property);
+    if (instance.path.keys.empty())
+    {
+        result.path.keys = keys_among(entry, result.properties);
+        return result;
+    }
+    result.path.keys = typed_keys(repository, entry, instance.path);
+    add_keys(result);
+    return result;
+}
+
+std::vector<Named_Value> typed_arguments(const Repository& repository, const zmlr::Meta_Method& method,
+                                         const std::vector<Named_Value>& in, const std::string& name_space)
+{
+    const auto refuse = [&](const std::string& reason, const std::string& parameter)
+    { throw Type_Error("method " + std::string(method.name) + ": " + reason + ": " + parameter); };
+
+    std::unordered_set<const zmlr::Meta_Feature*> seen;
+    for (const Named_Value& argument : in)
+    {
+        const zmlr::Meta_Feature* parameter = find_value(method, argument.name);
+        if (!parameter || (parameter->flags & zmlr::Flag_In) == 0)
+            refuse("it has no such input parameter", argument.name);
+        if (!seen.insert(parameter).second)
+            refuse("parameter given twice", argument.name);
+    }
+
+    Converter converter(repository, name_space);
+    std::vector<Named_Value> result;
+    for (const zmlr::Meta_Feature* parameter : features_of(method))
+        if (const Named_Value* argument = find_named(in, parameter->name))
+            result.push_back({parameter->name, converter.value(*parameter, argument->value)});
+    return result;
+}
+
+} // namespace cimserver
