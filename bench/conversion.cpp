@@ -50,8 +50,7 @@ void convert(const Port& port)
 {
     zmlr::CMPI_Ptr<CMPIObjectPath> path;
     zmlr::CMPI_Ptr<CMPIInstance> instance;
-    zmlr::make_cmpi_object_path(port.broker(), port.instance.ptr(), name_space, path);
-    zmlr::make_cmpi_instance(port.broker(), port.instance.ptr(), name_space, path.get(), nullptr, instance);
+    zmlr::make_cmpi_object(port.broker(), port.instance.ptr(), name_space, nullptr, path, instance);
 }
 
 // ---- the bare calls ----

@@ -25,9 +25,10 @@ MEASURED = {
 # Where the instructions of one enumeration go: benchmark, units, and the functions whose whole cost is counted. What the
 # callback does belongs to the conversion and the rest, not to the provider that calls it.
 SHARES = {"enumerate_fc_ports": ("enumerate_fc_ports/16", 32, "port")}
-CONVERSION = ["zmlr::make_cmpi_object_path(", "zmlr::make_cmpi_instance("]
-PROVIDER = "ZEMLAR_FCPort_Provider::enum_instances("
-CALLBACK = "zmlr::answer_with<"
+CONVERSION = ["zmlr::make_cmpi_object("]
+PROVIDER = "zmlr::Enumerating_Provider<zmlr::ZEMLAR_FCPort_Provider_Skeleton>::enum_instances("
+CALLBACK = "bool zmlr::answer_with<"
+DRIVER = ":ioctl ["
 
 NANOSECONDS = {"ns": 1, "us": 1_000, "ms": 1_000_000}
 
@@ -65,7 +66,8 @@ def instructions(program, benchmark):
 
 
 def shares(program, benchmark):
-    """Instructions of one iteration in the conversion, in the provider and in the rest."""
+    """Instructions of one iteration in the conversion (broker calls included), in the provider, in the simulated driver and in the
+    rest, which is the server's. The first two are what the module spends."""
     with tempfile.TemporaryDirectory() as folder:
         output = Path(folder) / "callgrind.out"
         total = callgrind(program, benchmark, output)
@@ -79,8 +81,10 @@ def shares(program, benchmark):
         return max(int(count.replace(",", "")) for count in counts)
 
     conversion = sum(cost(function) for function in CONVERSION)
-    provider = cost(PROVIDER) - cost(CALLBACK)
-    return {"conversion": conversion, "provider": provider, "rest": total - conversion - provider}
+    driver = cost(DRIVER)
+    provider = cost(PROVIDER) - cost(CALLBACK) - driver
+    rest = total - conversion - provider - driver
+    return {"conversion": conversion, "provider": provider, "module": conversion + provider, "driver": driver, "rest": rest}
 
 
 def main():

@@ -11,23 +11,10 @@ CMPI_Data& CMPI_Data::operator=(CMPI_Data&& x) noexcept
     return *this;
 }
 
-void CMPI_Data::set(CMPIType type, const CMPIValue& value)
+void CMPI_Data::release_object()
 {
-    release();
-    _data = {type, CMPI_goodValue, value};
-}
-
-void CMPI_Data::set_null(CMPIType type)
-{
-    release();
-    _data = {type, CMPI_nullValue, {.uint64 = 0}};
-}
-
-void CMPI_Data::release()
-{
-    if (auto* release_object = std::exchange(_release, nullptr))
-        release_object(_data.value);
-    _elements.clear();
+    std::exchange(_release, nullptr)(_data.value);
+    _elements.reset();
 }
 
 } // namespace zmlr

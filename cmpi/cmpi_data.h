@@ -6,8 +6,8 @@
 #include <cmpimacs.h>
 
 #include <cstring>
+#include <memory>
 #include <utility>
-#include <vector>
 
 namespace zmlr
 {
@@ -18,18 +18,28 @@ namespace zmlr
 class CMPI_Data
 {
 public:
+    using Elements = std::unique_ptr<CMPI_Data[]>;
+
     CMPI_Data() = default;
     ~CMPI_Data() { release(); }
     CMPI_Data(CMPI_Data&& x) noexcept { *this = std::move(x); }
     CMPI_Data& operator=(CMPI_Data&& x) noexcept;
 
     // A value without an object behind it.
-    void set(CMPIType type, const CMPIValue& value);
-    void set_null(CMPIType type);
+    void set(CMPIType type, const CMPIValue& value)
+    {
+        release();
+        _data = {type, CMPI_goodValue, value};
+    }
+    void set_null(CMPIType type)
+    {
+        release();
+        _data = {type, CMPI_nullValue, {.uint64 = 0}};
+    }
 
     // Takes over an object, an array with the elements that it points to; false when there is none (the broker could not make
     // it).
-    template <class Object> bool adopt(CMPIType type, Object* object, std::vector<CMPI_Data> elements = {})
+    template <class Object> bool adopt(CMPIType type, Object* object, Elements elements = {})
     {
         if (!object)
             return false;
@@ -48,14 +58,18 @@ public:
 
     CMPIType type() const { return _data.type; }
     const CMPIValue* value() const { return CMIsNullValue(_data) ? nullptr : &_data.value; }
-    bool owns() const { return _release != nullptr; }
 
 private:
-    void release();
+    void release()
+    {
+        if (_release)
+            release_object();
+    }
+    void release_object();
 
     CMPIData _data = {CMPI_null, CMPI_nullValue, {.uint64 = 0}};
     void (*_release)(const CMPIValue& owned) = nullptr; // of the object, when there is one
-    std::vector<CMPI_Data> _elements;                   // of the array
+    Elements _elements;                                 // of the array
 };
 
 } // namespace zmlr

@@ -1,5 +1,6 @@
 #include "cmpi/container.h"
 
+#include "runtime/features.h"
 #include "runtime/log.h"
 
 namespace zmlr
@@ -62,18 +63,23 @@ int Container::convert(const Instance* instance, uint32 mask)
     }
     const Meta_Record* record = record_of(instance);
 
-    for (uint32 i = 0; i < record->num_meta_features; ++i)
+    // Keys stand among the first features: what follows the last of them is not looked at.
+    uint32 left = mask == Flag_Key ? instance->meta_class->num_keys : record->num_meta_features;
+    Value value;
+    for (uint32 i = 0; i < record->num_meta_features && left > 0; ++i)
     {
         const Meta_Feature* feature = record->meta_features[i];
-        if (!selected(feature, mask) || is_method(feature))
+        if (!selected(feature, mask))
             continue;
-        Value value;
+        --left;
+        if (is_method(feature) || is_null(instance, feature))
+            continue;
         if (value.borrow(instance, feature) != 0)
         {
             ZMLR_LOG(LL_WARN, "unexpected failure: %s.%s", record->name, feature->name);
             continue;
         }
-        if (!value.null() && set_value(feature->name, value, feature->flags) != 0)
+        if (set_value(feature->name, value, feature->flags) != 0)
             ZMLR_LOG(LL_WARN, "conversion error: %s.%s", record->name, feature->name);
     }
     return 0;

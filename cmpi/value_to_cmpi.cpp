@@ -100,16 +100,17 @@ template <class T> int to_cmpi_array(const Target& target, CMPIType element_type
     CMPI_Ptr<CMPIArray> array(CMNewArray(target.broker, elements.size(), element_type, nullptr));
     if (!array)
         return failed("CMNewArray() failed");
-    std::vector<CMPI_Data> made; // what the elements point to
+    // What the elements point to is kept as long as the array; numbers point to nothing.
+    constexpr bool number = std::is_arithmetic_v<T> || std::is_same_v<T, char16>;
+    CMPI_Data::Elements made(number ? nullptr : new CMPI_Data[elements.size()]);
+    CMPI_Data single;
     for (uint32 i = 0; i < elements.size(); ++i)
     {
-        CMPI_Data element;
+        CMPI_Data& element = number ? single : made[i];
         if (to_cmpi_scalar(target, element_type, elements[i], element) != 0)
             return failed("element conversion failed");
         if (!okay(CMSetArrayElementAt(array.get(), i, element.value(), element.type())))
             return failed("CMSetArrayElementAt() failed");
-        if (element.owns())
-            made.push_back(std::move(element));
     }
     return data.adopt(static_cast<CMPIType>(element_type | CMPI_ARRAY), array.release(), std::move(made)) ? 0 : -1;
 }

@@ -50,6 +50,16 @@ inline const Array<Instance*>& references_of(const Instance* instance, const Met
     return value_at<Array<Instance*>>(instance, array_reference->offset);
 }
 
+// Whether a property, a reference or an array of references has no value. Every walk over an instance asks it of every feature.
+inline bool is_null(const Instance* instance, const Meta_Feature* feature)
+{
+    if (const Meta_Property* property = to_property(feature))
+        return value_at<uint8>(instance,
+                               property->offset + (is_array(property) ? uint32{sizeof(void*)} : type_size[property->type])) != 0;
+    const Meta_Reference* reference = as_reference(feature);
+    return is_array(reference) ? null_of(instance, reference) != 0 : !reference_of(instance, reference);
+}
+
 // A new record of a class or a method: null flags clear, values zero, references unset.
 Instance* create_record(const Meta_Record* record);
 

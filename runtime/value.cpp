@@ -82,20 +82,13 @@ void Value::swap(Value& x) noexcept
     std::swap(_held, x._held);
 }
 
-void Value::clear() noexcept
+void Value::release() noexcept
 {
-    if (_owned && _type != NONE)
-    {
-        for_each_instance(*this, [](const Instance* instance) { unref(instance); });
-        if (is_array(_type))
-            __destruct(reinterpret_cast<__Array_Rep*&>(_held));
-        else if (traits_of(_type).destruct)
-            traits_of(_type).destruct(_held, 1);
-    }
-    _type = NONE;
-    _null = true;
-    _owned = true;
-    _elsewhere = nullptr;
+    for_each_instance(*this, [](const Instance* instance) { unref(instance); });
+    if (is_array(_type))
+        __destruct(reinterpret_cast<__Array_Rep*&>(_held));
+    else if (traits_of(_type).destruct)
+        traits_of(_type).destruct(_held, 1);
 }
 
 // Of an empty value. Nothing is held when it throws.
@@ -149,28 +142,23 @@ void Value::set_null(Type type)
 int Value::borrow(const Instance* instance, const Meta_Feature* feature)
 {
     check_inst(instance);
-    Value made;
-    made._owned = false;
-    made._type = type_of(feature);
+    clear();
+    _type = type_of(feature);
+    _owned = false;
+    if (_type == NONE)
+        return -1;
+    _null = is_null(instance, feature);
     if (const Meta_Property* property = to_property(feature))
-    {
-        made._elsewhere = address_of(instance, property->offset);
-        made._null = null_of(instance, property) != 0;
-    }
+        _elsewhere = address_of(instance, property->offset);
     else if (const Meta_Reference* array = to_array_reference(feature))
-    {
-        made._elsewhere = address_of(instance, array->offset);
-        made._null = null_of(instance, array) != 0;
-    }
-    else if (const Meta_Reference* single = to_single_reference(feature))
+        _elsewhere = address_of(instance, array->offset);
+    else
     {
         // The record's field is a pointer to its own class: only its value is taken.
-        const Instance* referenced = reference_of(instance, single);
-        std::memcpy(made._held, &referenced, sizeof(referenced));
-        made._null = !referenced;
+        const Instance* referenced = reference_of(instance, as_reference(feature));
+        std::memcpy(_held, &referenced, sizeof(referenced));
     }
-    swap(made);
-    return _type == NONE ? -1 : 0;
+    return 0;
 }
 
 // Everything is copied and referenced before the instance it is read from may be released.

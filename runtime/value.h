@@ -57,12 +57,19 @@ public:
     Value(const Value& x); // holds a copy, also of what x only borrows
     Value(Value&& x) noexcept;
     Value& operator=(Value x) noexcept;
-    ~Value() { clear(); }
+    ~Value() { drop(); }
 
     Type type() const { return _type; }
     bool null() const { return _null; }
     void null(bool flag) { _null = flag; }
-    void clear() noexcept; // back to NONE and null; unrefs the instances held
+    void clear() noexcept // back to NONE and null; unrefs the instances held
+    {
+        drop();
+        _type = NONE;
+        _null = true;
+        _owned = true;
+        _elsewhere = nullptr;
+    }
 
     // Takes a copy of x, sets the type and makes the value non-null. An Instance* is stored as it is: the value then owns
     // one reference to it, as it does to each element of an instance array.
@@ -95,7 +102,8 @@ public:
     // Loads a property or reference of an instance (one more reference to each instance loaded): 0, or -1 for a method.
     int set(const Instance* instance, const Meta_Feature* feature);
 
-    // The same without a copy: the value reads the instance's own, and is good for as long as that one stays as it is.
+    // The same without a copy: the value reads the instance's own, and is good for as long as that one stays as it is. (The
+    // instance is not one that the value itself holds.)
     int borrow(const Instance* instance, const Meta_Feature* feature);
 
     // Stores the value into a property or reference; -1 and a warning when instance, type or referenced class do not fit. An
@@ -120,6 +128,12 @@ private:
     template <class T> static constexpr Type code_of = Code<T>::value;
 
     const void* content() const { return _elsewhere ? _elsewhere : _held; }
+    void drop() noexcept
+    {
+        if (_owned && _type != NONE)
+            release();
+    }
+    void release() noexcept;             // what is held
     void hold(Type type, const void* x); // a copy of what lies there (null: the type's zero)
     void hold_moved(Type type, void* array);
     void construct(Type type, const void* x);
