@@ -29,7 +29,7 @@ template <std::size_t N> void expect_terminated(const char (&text)[N])
 
 extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, size_t size)
 {
-    if (read_fru_number(block_of<hxa_mfg_vpd_t>(data, size)).size() > sizeof(hxa_mfg_vpd_t::data))
+    if (getFRUNumber(block_of<hxa_mfg_vpd_t>(data, size)).size() > sizeof(hxa_mfg_vpd_t::data))
         std::abort();
 
     const _sfpInfo module = sfp_info(block_of<sfp_mem_t>(data, size), size % 2 == 0, 1, 0);

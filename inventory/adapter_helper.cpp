@@ -35,6 +35,7 @@ constexpr Walk_Row walk = {
 struct Adapter_Reading
 {
     Hba_Reading& adapter;
+    const Wanted& wanted;
     bool& network_driver_is_told;
     bool& storage_driver_is_told;
 };
@@ -96,8 +97,11 @@ void append_bios(Instance_Array& instances, Hba_Reading& adapter)
 void append_software(Instance_Array& instances, Adapter_Reading& reading)
 {
     Hba_Reading& adapter = reading.adapter;
-    append_driver(instances, adapter.info, adapter.ethernet.are_read, true, reading.network_driver_is_told);
-    append_driver(instances, adapter.info, adapter.fc.are_read, false, reading.storage_driver_is_told);
+    if (reading.wanted.is_all()) // which adapter tells of a driver is known only when none is left out
+    {
+        append_driver(instances, adapter.info, adapter.ethernet.are_read, true, reading.network_driver_is_told);
+        append_driver(instances, adapter.info, adapter.fc.are_read, false, reading.storage_driver_is_told);
+    }
     if (adapter.port.fc)
         append_bios(instances, adapter);
     instances.adopt(getAdapterSoftwareIdentityInstance(adapter.info, SOFTWARE_FIRMWARE, false));
@@ -136,7 +140,7 @@ Instance_Array AdapterHelper::getInstancesByClass(classId_t id, const Inventory_
         std::optional<Hba_Reading> adapter = read_hba(adapters.adapter(), std::move(*port), request);
         if (!adapter)
             continue;
-        Adapter_Reading reading = {*adapter, network_driver_is_told, storage_driver_is_told};
+        Adapter_Reading reading = {*adapter, request.wanted, network_driver_is_told, storage_driver_is_told};
         build(instances, builders, id, reading, log_source, "Default case . Other classes ");
     }
     ZMLR_LOG(LL_INFO, "Number of instances: %d", static_cast<int>(instances.size()));

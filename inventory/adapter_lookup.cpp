@@ -39,11 +39,15 @@ constexpr Walk_Row by_address(Iocs iocs)
 constexpr Walk_Row by_wwn = by_address(Iocs::fc);
 constexpr Walk_Row by_mac = by_address(Iocs::ethernet);
 
-bool parse_mac(const String& text, mac_t& mac) { return ProviderUtil::getRawMacFromStr(text.c_str(), mac.mac); }
+bool parse_mac(const String& text, mac_t& mac)
+{
+    return text.size() == ProviderUtil::mac_text_size - 1 && ProviderUtil::getRawMacFromStr(text.c_str(), mac.mac);
+}
 
 bool parse_wwn(const String& text, wwn_t& wwn)
 {
-    return ProviderUtil::getRawWWNFromStr(text.c_str(), reinterpret_cast<unsigned char*>(&wwn));
+    return text.size() == ProviderUtil::wwn_text_size - 1 &&
+           ProviderUtil::getRawWWNFromStr(text.c_str(), reinterpret_cast<unsigned char*>(&wwn));
 }
 
 bool read_attributes(hxal_t* ioc, hxa_ioc_attr_t& attributes)
@@ -62,20 +66,11 @@ String version_in(const hxa_ioc_attr_t& attributes)
 
 } // namespace
 
-bool ProviderUtil::has_wwn(const hxal_t* fc, const String& address)
-{
-    char text[wwn_text_size];
-    const wwn_t wwn = hxal_ioc_get_pwwn(fc);
-    WWN2str(text, &wwn);
-    return address.equali(text);
-}
+bool ProviderUtil::has_wwn(const hxal_t* fc, const String& address) { return address.equali(wwn_text(hxal_ioc_get_pwwn(fc))); }
 
 bool ProviderUtil::has_mac(const hxal_t* ethernet, const String& address)
 {
-    char text[mac_text_size];
-    const mac_t mac = hxal_ioc_get_mac(ethernet);
-    MAC2str(text, &mac);
-    return address.equali(text);
+    return address.equali(mac_text(hxal_ioc_get_mac(ethernet)));
 }
 
 int ProviderUtil::getAdapterIdByNWWN(const String& wwn)
@@ -123,18 +118,8 @@ String ProviderUtil::getAddrByAdapterId(int index)
     if (!port)
         return String();
 
-    char text[wwn_text_size];
-    if (adapter->is_cna)
-    {
-        const mac_t mac = read_cna_mac(port->fc.get(), port->ethernet.get());
-        MAC2str(text, &mac);
-    }
-    else
-    {
-        const wwn_t wwn = hxal_ioc_get_nwwn(port->fc.get());
-        WWN2str(text, &wwn);
-    }
-    return text;
+    return adapter->is_cna ? mac_text(read_cna_mac(port->fc.get(), port->ethernet.get()))
+                           : wwn_text(hxal_ioc_get_nwwn(port->fc.get()));
 }
 
 hxal_t* ProviderUtil::getHxalHandlerByAdapterId(int index)

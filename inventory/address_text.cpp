@@ -16,17 +16,6 @@ namespace
 
 constexpr const char* log_source = "ProviderUtil";
 
-void write_hex(char* out, std::span<const unsigned char> bytes)
-{
-    constexpr const char* digits = "0123456789ABCDEF";
-    for (const unsigned char byte : bytes)
-    {
-        *out++ = digits[byte >> 4];
-        *out++ = digits[byte & 0xF];
-    }
-    *out = '\0';
-}
-
 int hex_value(char digit)
 {
     if (digit >= '0' && digit <= '9')
@@ -85,6 +74,31 @@ void ProviderUtil::MAC2str(char* out, const mac_t* mac)
 {
     const Scope_Trace trace(log_source);
     write_hex(out, mac->mac);
+}
+
+String ProviderUtil::wwn_text(wwn_t wwn)
+{
+    char text[wwn_text_size];
+    WWN2str(text, &wwn);
+    return text;
+}
+
+String ProviderUtil::mac_text(const mac_t& mac)
+{
+    char text[mac_text_size];
+    MAC2str(text, &mac);
+    return text;
+}
+
+void ProviderUtil::write_hex(char* out, std::span<const unsigned char> bytes)
+{
+    constexpr const char* digits = "0123456789ABCDEF";
+    for (const unsigned char byte : bytes)
+    {
+        *out++ = digits[byte >> 4];
+        *out++ = digits[byte & 0xF];
+    }
+    *out = '\0';
 }
 
 bool ProviderUtil::getRawWWNFromStr(const char* text, unsigned char* out)

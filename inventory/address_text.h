@@ -6,6 +6,7 @@
 #include "runtime/string.h"
 
 #include <cstddef>
+#include <span>
 
 namespace zmlr::ProviderUtil
 {
@@ -17,6 +18,11 @@ inline constexpr std::size_t mac_text_size = 13;
 // Write the text of an address to `out` (wwn_text_size or mac_text_size bytes). The bytes of a WWN count in memory order.
 void WWN2str(char* out, const wwn_t* wwn);
 void MAC2str(char* out, const mac_t* mac);
+
+// The texts, and any bytes as upper-case hexadecimal digits with a terminator (two for each, and one more).
+String wwn_text(wwn_t wwn);
+String mac_text(const mac_t& mac);
+void write_hex(char* out, std::span<const unsigned char> bytes);
 
 // Read 16 (12) hexadecimal digits into the 8 (6) bytes at `out`; false, and zero bytes, when the text does not begin with
 // that many.

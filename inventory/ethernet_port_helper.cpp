@@ -2,7 +2,6 @@
 
 #include "inventory/adapter_lookup.h"
 #include "inventory/adapter_walk.h"
-#include "inventory/address_text.h"
 #include "inventory/builder.h"
 #include "inventory/ethernet_port.h"
 #include "inventory/property_text.h"
@@ -109,8 +108,7 @@ Instance_Array EthernetPortHelper::getEthernetPortInstancesByAdapter(const Strin
 {
     const Scope_Trace trace(log_source);
     ZMLR_LOG(LL_INFO, "getEthernetPortInstancesByMacAddress invoked with MAC Address = %s", mac.c_str());
-    const bool is_mac = mac.size() == ProviderUtil::mac_text_size - 1;
-    const int adapter = is_mac ? ProviderUtil::getAdapterIdByMacAddr(mac) : -1;
+    const int adapter = ProviderUtil::getAdapterIdByMacAddr(mac);
     if (adapter == -1)
     {
         ZMLR_LOG(LL_WARN, "Failed to get adapterId");

@@ -83,4 +83,10 @@ Instance_Array FCHBAManager::getFCPortInstancesByAdapter(const String& address, 
     return PortHelper::getPortHelperObject().getFCPortInstancesByAdapter(address, request);
 }
 
+Instance_Array FCHBAManager::getEthernetPortInstancesByAdapter(const String& mac, const Inventory_Request& request) const
+{
+    const Scope_Trace trace(log_source);
+    return EthernetPortHelper::getEthernetPortHelperObject().getEthernetPortInstancesByAdapter(mac, request);
+}
+
 } // namespace zmlr

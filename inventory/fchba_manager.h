@@ -21,6 +21,9 @@ public:
     // The ZEMLAR_FCPort instances of the adapter with this MAC address or node WWN.
     Instance_Array getFCPortInstancesByAdapter(const String& address, const Inventory_Request& request = {}) const;
 
+    // The ZEMLAR_EthernetPort instances of the adapter with this MAC address.
+    Instance_Array getEthernetPortInstancesByAdapter(const String& mac, const Inventory_Request& request = {}) const;
+
 private:
     FCHBAManager();
 };

@@ -102,7 +102,7 @@ String find_fru(Data data, std::size_t limit)
 
 } // namespace
 
-String read_fru_number(const hxa_mfg_vpd_t& vpd)
+String getFRUNumber(const hxa_mfg_vpd_t& vpd)
 {
     const Data data(vpd.data);
     if (vpd.vendor == plain_layout)

@@ -11,6 +11,6 @@ namespace zmlr
 // The card's FRU number as it stands in the data, at most 16 characters (of a card that carries it as plain text: up to the end
 // of the text). Empty, with a log line, when the data are damaged or of another layout; empty without one when no keyword
 // carries a number. Reads nothing beyond the 512 bytes, whatever their lengths say.
-String read_fru_number(const hxa_mfg_vpd_t& vpd);
+String getFRUNumber(const hxa_mfg_vpd_t& vpd);
 
 } // namespace zmlr

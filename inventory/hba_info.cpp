@@ -29,7 +29,7 @@ void fill_card(_hbaInfo& info, const hxa_ioc_attr_t& attributes)
 
 void fill_fru_number(_hbaInfo& info, const hxa_ioc_attr_t& fc_attributes)
 {
-    const String fru_number = read_fru_number(fc_attributes.adapter_attr.vpd);
+    const String fru_number = getFRUNumber(fc_attributes.adapter_attr.vpd);
     copy_text(info.fru_number, sizeof info.fru_number, fru_number.c_str(), fru_number.size());
 }
 

@@ -15,6 +15,8 @@ constexpr const char* log_source = "AdapterHelper";
 void read(Ioc_Attributes& attributes, hxal_t* ioc)
 {
     attributes.are_read = ioc && hxal_ioc_get_attr(ioc, &attributes.value) == HXA_STATUS_OK;
+    if (!attributes.are_read)
+        attributes.value = {}; // a refusal may have come with any bytes
 }
 
 void take_ethernet(Hba_Reading& reading)

@@ -45,32 +45,36 @@ bool has_address(const Open_Port& port, const String& address)
     return port.fc && ProviderUtil::has_wwn(port.fc.get(), address);
 }
 
-std::optional<bool> is_fc_disabled(const hxal_t* fc)
+bool is_out_of_service(std::uint32_t port_state)
 {
-    hxa_pport_attr_t attributes = {};
-    if (hxal_port_get_attr(fc, &attributes) == HXA_STATUS_OK)
-        return attributes.port_state == HXA_PPORT_ST_DISABLING || attributes.port_state == HXA_PPORT_ST_DISABLED;
-    ZMLR_LOG(LL_ERR, "hxal_port_get_attr failed");
-    return std::nullopt;
+    return port_state == HXA_PPORT_ST_DISABLING || port_state == HXA_PPORT_ST_DISABLED;
 }
 
-std::optional<bool> is_ethernet_disabled(const hxal_t* ethernet)
+// The state of one side of a port, read by `read`; none, with a log line, when the driver does not tell.
+template <class Attributes>
+std::optional<std::uint32_t> state_of(const hxal_t* ioc, hxa_status_t (*read)(const hxal_t*, Attributes*), const char* failure)
 {
-    hxa_ethport_attr_t attributes = {};
-    if (hxal_ethport_get_attr(ethernet, &attributes) == HXA_STATUS_OK)
-        return attributes.port_state == HXA_PPORT_ST_DISABLING || attributes.port_state == HXA_PPORT_ST_DISABLED;
-    ZMLR_LOG(LL_ERR, "hxal_ethport_get_attr failed");
+    Attributes attributes = {};
+    if (read(ioc, &attributes) == HXA_STATUS_OK)
+        return attributes.port_state;
+    ZMLR_LOG(LL_ERR, "%s", failure);
     return std::nullopt;
 }
 
 bool is_disabled(const Open_Port& port)
 {
-    const std::optional<bool> fc = port.fc ? is_fc_disabled(port.fc.get()) : false;
-    if (!fc || *fc)
-        return fc.value_or(false);
-    const std::optional<bool> ethernet = port.ethernet ? is_ethernet_disabled(port.ethernet.get()) : false;
-    if (!ethernet || *ethernet)
-        return ethernet.value_or(false);
+    if (port.fc)
+    {
+        const auto state = state_of(port.fc.get(), hxal_port_get_attr, "hxal_port_get_attr failed");
+        if (!state || is_out_of_service(*state))
+            return state.has_value();
+    }
+    if (port.ethernet)
+    {
+        const auto state = state_of(port.ethernet.get(), hxal_ethport_get_attr, "hxal_ethport_get_attr failed");
+        if (!state || is_out_of_service(*state))
+            return state.has_value();
+    }
     ZMLR_LOG(LL_INFO, "Port Enabled");
     return false;
 }

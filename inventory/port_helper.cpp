@@ -37,9 +37,8 @@ void append_port(Instance_Array& instances, const Port_Reading& reading) { insta
 
 void append_target_endpoint(Instance_Array& instances, const Port_Reading& reading, wwn_t remote_port)
 {
-    char remote_wwn[ProviderUtil::wwn_text_size];
-    ProviderUtil::WWN2str(remote_wwn, &remote_port);
-    if (!reading.request.wanted.may_hold(remote_wwn))
+    const String remote_wwn = ProviderUtil::wwn_text(remote_port);
+    if (!reading.request.wanted.may_hold(remote_wwn.c_str()))
         return;
 
     hxa_rport_attr_t attributes = {};
@@ -54,7 +53,7 @@ void append_target_endpoint(Instance_Array& instances, const Port_Reading& readi
         return;
 
     _hbaPortInfo endpoint = reading.info;
-    std::snprintf(endpoint.address, sizeof endpoint.address, "%s_%s", reading.info.port_wwn, remote_wwn);
+    std::snprintf(endpoint.address, sizeof endpoint.address, "%s_%s", reading.info.port_wwn, remote_wwn.c_str());
     instances.adopt(getSCSIProtocolEndpointInstance(endpoint, false));
 }
 

@@ -1,10 +1,10 @@
 #include "inventory/scsi_pages.h"
 
+#include "inventory/address_text.h"
 #include "inventory/property_text.h"
 #include "runtime/log.h"
 
 #include <algorithm>
-#include <cstdio>
 
 namespace zmlr
 {
@@ -35,12 +35,6 @@ bool is_used(std::uint32_t identifier_type)
 const char* text_at(std::span<const std::uint8_t> data, std::size_t position)
 {
     return reinterpret_cast<const char*>(data.data()) + position;
-}
-
-void write_hex(char* out, std::span<const std::uint8_t> bytes)
-{
-    for (std::size_t i = 0; i < bytes.size(); i++)
-        std::snprintf(out + 2 * i, 3, "%02X", bytes[i]);
 }
 
 } // namespace
@@ -77,7 +71,7 @@ bool fill_identifier(_hbaLunInfo& info, const Identification_Page& page)
 
     const auto identifier = designator.subspan(designator_head, std::min(length, max_identifier));
     if (code_set == code_set_binary)
-        write_hex(info.identifier, identifier);
+        ProviderUtil::write_hex(info.identifier, identifier);
     else
     {
         if (length > max_identifier)

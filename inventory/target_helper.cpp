@@ -37,13 +37,6 @@ struct Nexus
     wwn_t remote_port;
 };
 
-String text_of(wwn_t wwn)
-{
-    char text[ProviderUtil::wwn_text_size];
-    ProviderUtil::WWN2str(text, &wwn);
-    return text;
-}
-
 lun_t lun_of(const _hbaLunInfo& info)
 {
     lun_t lun;
@@ -236,7 +229,7 @@ Instance_Array TargetHelper::getTargetInstances(const hxal_t* ioc, const _hbaPor
     {
         ZMLR_LOG(LL_INFO, "Loop for the rport index =   %d", index);
         nexus.remote_port = remote_port;
-        if (request.wanted.may_hold(text_of(remote_port).c_str()) && is_target_of_kind(nexus, id))
+        if (request.wanted.may_hold(ProviderUtil::wwn_text(remote_port).c_str()) && is_target_of_kind(nexus, id))
             append_units(instances, nexus, index, port, id, request.wanted);
         index++;
     }

@@ -4,6 +4,8 @@
 #include "inventory/property_text.h"
 #include "runtime/ascii.h"
 
+#include <algorithm>
+
 namespace zmlr
 {
 
@@ -37,15 +39,13 @@ const String* text_of(const Instance* model, const Meta_Property* property)
 
 bool may_be_ioc(const Wanted& wanted, const hxal_t* ioc)
 {
-    char text[ProviderUtil::wwn_text_size];
+    // An address of zeros is none, and stands in many keys.
     const mac_t mac = hxal_ioc_get_mac(ioc);
-    ProviderUtil::MAC2str(text, &mac);
-    if (wanted.may_hold(text))
+    if (std::ranges::any_of(mac.mac, [](auto byte) { return byte != 0; }) && wanted.may_hold(ProviderUtil::mac_text(mac).c_str()))
         return true;
     for (const wwn_t wwn : {hxal_ioc_get_pwwn(ioc), hxal_ioc_get_nwwn(ioc)})
     {
-        ProviderUtil::WWN2str(text, &wwn);
-        if (wanted.may_hold(text))
+        if (wwn != 0 && wanted.may_hold(ProviderUtil::wwn_text(wwn).c_str()))
             return true;
     }
     const String interface_name = property_text(ioc->eth_name);

@@ -74,8 +74,8 @@ TEST(FRU_number, comes_out_of_a_whole_block_only)
         {"nothing", hxa_mfg_vpd_t{}, ""},
     };
     for (const Row& row : rows)
-        EXPECT_STREQ(read_fru_number(row.vpd).c_str(), row.fru) << row.what;
-    EXPECT_EQ(std::string(400, 'P'), read_fru_number(plain).c_str());
+        EXPECT_STREQ(getFRUNumber(row.vpd).c_str(), row.fru) << row.what;
+    EXPECT_EQ(std::string(400, 'P'), getFRUNumber(plain).c_str());
 }
 
 TEST(Module_memory, tells_what_the_module_is)

@@ -78,13 +78,9 @@ private:
     void name_port(const Open_Port& port)
     {
         if (port.fc)
-            _any_of.push_back(text_of(hxal_ioc_get_pwwn(port.fc.get())));
+            _any_of.push_back(ProviderUtil::wwn_text(hxal_ioc_get_pwwn(port.fc.get())).c_str());
         if (port.ethernet)
-        {
-            char mac[ProviderUtil::mac_text_size];
-            ProviderUtil::MAC2str(mac, &port.ethernet->mac);
-            _any_of.push_back(mac);
-        }
+            _any_of.push_back(ProviderUtil::mac_text(port.ethernet->mac).c_str());
         _any_of.push_back("_" + std::to_string(port.adapter) + "_" + std::to_string(port.index) + "\"");
     }
 
@@ -92,16 +88,9 @@ private:
     {
         wwn_t wwn;
         std::memcpy(&wwn, request.sent.data() + 16, sizeof wwn);
-        _target = text_of(wwn);
+        _target = ProviderUtil::wwn_text(wwn).c_str();
         if (request.name == "IOCMD_SCSI_CMND" && request.sent[25] > 0)
             _unit = "_LUN_" + std::to_string(request.sent[25]) + '"';
-    }
-
-    static std::string text_of(wwn_t wwn)
-    {
-        char text[ProviderUtil::wwn_text_size];
-        ProviderUtil::WWN2str(text, &wwn);
-        return text;
     }
 
     Texts _any_of;

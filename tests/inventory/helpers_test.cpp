@@ -99,6 +99,10 @@ TEST_F(Helpers, find_ports_by_their_adapter)
     EXPECT_THAT(values_of(manager.getFCPortInstancesByAdapter("200000051E100100", request), "PortNumber"), ElementsAre("0", "1"));
     EXPECT_EQ(fake_host.lookups, 1);
     log();
+    EXPECT_THAT(values_of(manager.getEthernetPortInstancesByAdapter("00051e200001"), "DeviceID"),
+                ElementsAre(R"("00051E200000")", R"("00051E200001")"));
+    EXPECT_TRUE(manager.getEthernetPortInstancesByAdapter("200000051E100000").empty()) << "a WWN";
+    EXPECT_THAT(log(), Contains("WARN EthernetPortHelper: Failed to get adapterId"));
     EXPECT_TRUE(manager.getFCPortInstancesByAdapter("00051E999999").empty());
     EXPECT_THAT(log(), Contains("WARN PortHelper: Failed to get adapterId"));
     EXPECT_TRUE(PortHelper::getPortHelperObject().getInstancesByAdapterId(99, CLASSID_FCPort).empty());
@@ -127,6 +131,10 @@ TEST_F(Helpers, skip_what_fails_and_say_so)
     const hxasim::Fault info = {.command = "IOCMD_IOC_GET_INFO", .error = EIO};
     const hxasim::Fault hba_1 = {.command = "IOCMD_IOC_GET_ATTR", .node = "/dev/hxa", .instance = 0, .error = ENODEV};
     const hxasim::Fault port_1 = {.command = "IOCMD_PORT_GET_ATTR", .instance = 1, .error = EIO};
+    const hxasim::Fault stats = {.command = "IOCMD_PORT_GET_STATS", .instance = 0, .error = EIO};
+    const hxasim::Fault flash = {.command = "IOCMD_FLASH_GET_ATTR", .error = EIO};
+    const hxasim::Fault bad_boot_code = {.command = "IOCMD_FLASH_GET_ATTR", .answer = {{8 + 8 + 20, {5}}}};
+    const hxasim::Fault strange_boot_code = {.command = "IOCMD_FLASH_GET_ATTR", .answer = {{8 + 8 + 20, {6}}}};
     const hxasim::Fault port_2 = {.command = "IOCMD_PORT_GET_ATTR", .instance = 2, .status = 56};
     const struct
     {
@@ -160,6 +168,14 @@ TEST_F(Helpers, skip_what_fails_and_say_so)
              "INFO PortHelper: hxal_port_get_attr failed. Adapter=2, Port=0 "}},
         {port, port_1_only, {}, "PortNumber", {"1"}, {"WARN PortHelper: Unable to get the handler. Adapter=1, Port=0. "}},
         {port, nothing, {}, "DeviceID", {}, {"INFO PortHelper: No adapters in the system. "}},
+        {CLASSID_FCPortStatistics, cna, {stats}, "InstanceID", {R"("100000051E100001")"},
+            {"WARN PortHelper: hxal_port_get_stats failed for fcoe port WWN= 100000051E100000"}},
+        {CLASSID_AdapterSoftwareIdentity, cna, {flash}, "Classifications", {"{ 2 }", "{ 2 }", "{ 10 }"},
+            {"ERR AdapterHelper: hxal_ioc_get_attr call failed for Adapter id 1"}},
+        {CLASSID_AdapterSoftwareIdentity, cna, {bad_boot_code}, "Classifications", {"{ 2 }", "{ 2 }", "{ 10 }"},
+            {"INFO AdapterHelper: Boot code upload status is not GOOD"}},
+        {CLASSID_AdapterSoftwareIdentity, cna, {strange_boot_code}, "Classifications", {"{ 2 }", "{ 2 }", "{ 10 }"},
+            {"WARN AdapterHelper: No Flash Status Found"}},
         // clang-format on
     };
     for (const auto& row : rows)

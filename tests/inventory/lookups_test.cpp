@@ -1,7 +1,9 @@
 #include "hxal/hxal.h"
 #include "inventory/adapter_lookup.h"
+#include "inventory/port_disabled.h"
 #include "tests/inventory/inventory_fixture.h"
 
+#include <algorithm>
 #include <cerrno>
 
 using namespace zmlr;
@@ -105,4 +107,45 @@ TEST_F(Lookups, read_the_driver_version_where_there_is_one)
     plug_text(R"({"adapters": []})");
     EXPECT_STREQ(ProviderUtil::getDriverVersion().c_str(), "");
     EXPECT_THAT(log(), ElementsAre("WARN ProviderUtil: No adapters in the system!"));
+}
+
+// A port is asked on its FC side first; what it does not tell counts as in service.
+TEST_F(Lookups, tell_whether_a_port_is_disabled)
+{
+    const std::string enabled = R"({"adapters": [{"kind": "cna"}, {"kind": "fc-hba", "ports": [{}, {"state": "disabled"}]}]})";
+    const hxasim::Fault fc_disabling = {.command = "IOCMD_PORT_GET_ATTR", .answer = {{8 + 324, {7}}}};
+    const hxasim::Fault ethernet_disabled = {.command = "IOCMD_ETHPORT_GET_ATTR", .answer = {{8 + 8, {8}}}};
+    const hxasim::Fault fc_fails = {.command = "IOCMD_PORT_GET_ATTR", .error = EIO};
+    const hxasim::Fault ethernet_fails = {.command = "IOCMD_ETHPORT_GET_ATTR", .error = EIO};
+    const struct
+    {
+        const char* address;
+        std::vector<hxasim::Fault> faults;
+        bool disabled;
+        const char* line;
+    } rows[] = {
+        // clang-format off
+        {"", {}, false, "ERR PortHelper: ERROR: Invalid PortAddress"},
+        {"00051E999999", {}, false, "ERR PortHelper: ERROR: Invalid Adapter Index"},
+        {"1000000000000000", {}, false, "ERR PortHelper: ERROR: Invalid Adapter index"},
+        {"100000051e100000", {}, false, "INFO PortHelper: Port Enabled"},
+        {"00051e200000", {}, false, "INFO PortHelper: Port Enabled"},
+        {"00051E200000", {ethernet_disabled}, true, nullptr},
+        {"100000051E100000", {ethernet_disabled}, true, nullptr},
+        {"00051E200000", {fc_fails, ethernet_disabled}, false, "ERR PortHelper: hxal_port_get_attr failed"},
+        {"00051E200000", {ethernet_fails}, false, "ERR PortHelper: hxal_ethport_get_attr failed"},
+        {"00051E200000", {fc_disabling, ethernet_fails}, true, nullptr},
+        {"100000051E100101", {}, true, nullptr},
+        {"100000051E100100", {}, false, "INFO PortHelper: Port Enabled"},
+        // clang-format on
+    };
+    for (const auto& row : rows)
+    {
+        SCOPED_TRACE(row.address);
+        plug_text(enabled);
+        std::ranges::for_each(row.faults, hxasim::inject);
+        EXPECT_EQ(isPortDisabled(row.address), row.disabled);
+        const std::vector<std::string> said = log();
+        EXPECT_TRUE(!row.line || std::ranges::find(said, row.line) != said.end());
+    }
 }

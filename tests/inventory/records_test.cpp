@@ -1,5 +1,6 @@
 // What needs no host: texts, and the way from the library's records through ours to an instance.
 #include "inventory/address_text.h"
+#include "inventory/ethernet_port.h"
 #include "inventory/fc_port.h"
 #include "inventory/port_states.h"
 #include "inventory/property_text.h"
@@ -94,6 +95,13 @@ TEST(Records, port_states_and_types_of_the_driver)
     constexpr int types[][2] = {{0, 0}, {1, 0}, {2, 10}, {5, 10}, {6, 11}, {7, 0}, {20, 11}, {21, 10}, {22, 10}, {23, 0}};
     for (const auto& [driver, cim] : types)
         EXPECT_EQ(getPortType(static_cast<uint32>(driver)), cim) << driver;
+    constexpr std::pair<const char*, int> media[] = {
+        {"10G_BASE-SR", 105}, {"10G_BASE-LR", 108}, {"10G_BASE-LRM", 108}, {"10G_BASE-SR10G_BASE-LR", 0}, {"", 0}};
+    for (const auto& [text, cim] : media)
+        EXPECT_EQ(getEthernetPortType(text), cim) << text;
+    constexpr uint16 healths[][2] = {{0, 0}, {6, 15}, {8, 5}, {9, 10}, {10, 10}, {11, 5}, {13, 10}};
+    for (const auto& [operational, health] : healths)
+        EXPECT_EQ(getLANEndpointInstance({.operational_status = operational})->HealthState.value, health) << operational;
 }
 
 TEST(Records, a_port_of_a_driver_that_says_anything)

@@ -42,7 +42,7 @@ struct Wanted_One : Inventory_Test
 
 } // namespace
 
-TEST_F(Wanted_One, is_what_the_enumeration_tells_and_costs_no_more)
+TEST_F(Wanted_One, is_what_the_enumeration_tells)
 {
     for (const char* scenario : {"fc-hba", "cna", "mixed", "odd"})
     {
@@ -70,6 +70,12 @@ TEST_F(Wanted_One, costs_what_it_needs)
     plug_text(R"({"generate": {"adapters": 64, "kind": "cna"}})");
     EXPECT_EQ(cost_of(CLASSID_FCPort, 70), 1U);
     EXPECT_EQ(cost_of(CLASSID_FCPortStatistics, 70), 2U);
+    EXPECT_EQ(cost_of(CLASSID_LogicalPortGroup, 70), 1U);
+    EXPECT_EQ(cost_of(CLASSID_AlarmDevice, 70), 2U);
+    EXPECT_EQ(cost_of(CLASSID_SCSIProtocolEndpoint, 70), 2U);
+    EXPECT_EQ(cost_of(CLASSID_PortController, 40), 4U);
+    EXPECT_EQ(cost_of(CLASSID_PhysicalPackage, 40), 3U);
+    EXPECT_EQ(cost_of(CLASSID_AdapterSoftwareIdentity, 40), 4U);
     EXPECT_EQ(cost_of(CLASSID_EthernetPort, 70), 2U);
     EXPECT_EQ(cost_of(CLASSID_LANEndpoint, 70), 1U);
     EXPECT_EQ(cost_of(CLASSID_PhysicalConnector, 70), 1U);
