@@ -1,7 +1,7 @@
 #include "cimserver/options.h"
 
 #include "cimserver/cimxml/listener.h"
-#include "cimserver/model/version.h"
+#include "cimserver/model/server_identity.h"
 
 #include <CLI/CLI.hpp>
 

@@ -23,19 +23,6 @@ std::string last_loader_error()
     return text ? text : "unknown error";
 }
 
-// Sets a flag for a scope.
-class Flag_Scope
-{
-public:
-    explicit Flag_Scope(bool& flag) : _flag(flag) { _flag = true; }
-    ~Flag_Scope() { _flag = false; }
-    Flag_Scope(const Flag_Scope&) = delete;
-    Flag_Scope& operator=(const Flag_Scope&) = delete;
-
-private:
-    bool& _flag;
-};
-
 bool wants_to_stay(CMPIrc rc) { return rc == CMPI_RC_DO_NOT_UNLOAD || rc == CMPI_RC_NEVER_UNLOAD; }
 
 } // namespace
@@ -135,7 +122,8 @@ template <class MI> MI* Module::interface(const Class_Entry& entry, std::atomic<
     if (provider.being_made)
         throw Cim_Error(CIM_ERR_FAILED, std::string(entry.registration->provider_name) + " is still being loaded");
 
-    const Flag_Scope making(provider.being_made);
+    provider.being_made = true;
+    const std::unique_ptr<bool, void (*)(bool*)> making(&provider.being_made, [](bool* flag) { *flag = false; });
     MI* made = make_interface<MI>(entry.registration->provider_name, suffix);
     provider.*slot = made;
     return made;

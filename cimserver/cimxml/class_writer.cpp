@@ -32,8 +32,6 @@ constexpr Element_Names parameter_elements{"PARAMETER", "PARAMETER.ARRAY", "PARA
 
 bool is_embedded(const zmlr::Meta_Feature& feature) { return (feature.flags & embedding) != 0; }
 
-bool is_object_reference(const zmlr::Meta_Feature& feature) { return zmlr::is_reference(&feature) && !is_embedded(feature); }
-
 int subscript_of(const zmlr::Meta_Feature& feature)
 {
     if (zmlr::is_property(&feature))
@@ -44,7 +42,7 @@ int subscript_of(const zmlr::Meta_Feature& feature)
 const char* element_of(const zmlr::Meta_Feature& feature, const Element_Names& names)
 {
     const bool array = subscript_of(feature) != 0;
-    if (is_object_reference(feature))
+    if (zmlr::is_reference(&feature))
         return array ? names.reference_array : names.reference;
     return array ? names.array : names.scalar;
 }
@@ -58,7 +56,7 @@ const char* type_of(const zmlr::Meta_Feature& feature)
 void start_typed(Xml_Writer& writer, const char* element, const zmlr::Meta_Feature& feature)
 {
     writer.start(element).attribute("NAME", feature.name);
-    if (is_object_reference(feature))
+    if (zmlr::is_reference(&feature))
         writer.attribute("REFERENCECLASS", zmlr::as_reference(&feature)->meta_class->name);
     else
         writer.attribute("TYPE", type_of(feature));

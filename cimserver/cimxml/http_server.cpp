@@ -93,7 +93,6 @@ private:
                  void (Daemon::*step)(MHD_Connection*, Exchange&) noexcept) noexcept;
     void enter(MHD_Connection* connection, Connection_Watch::Phase phase, std::size_t answer_bytes = 0);
     void refuse_connections();
-    bool wait_for_answers(Clock::time_point deadline);
 
     const Http_Limits _limits;
     Credentials* const _credentials;
@@ -167,7 +166,10 @@ bool Http_Server::Daemon::stop(Clock::time_point deadline)
         refuse_connections();
     if (!_verifiers.stop(deadline) || !_handlers.stop(deadline) || !_pool.stop(deadline))
         return false;
-    wait_for_answers(deadline);
+    {
+        std::unique_lock lock(_mutex); // a client that does not take its answer does not keep the server from stopping
+        _answered.wait_until(lock, deadline, [this] { return _unanswered == 0; });
+    }
     MHD_stop_daemon(_http);
     _http = nullptr;
     return true;
@@ -177,13 +179,6 @@ void Http_Server::Daemon::refuse_connections()
 {
     MHD_quiesce_daemon(_http);
     _listener.refuse();
-}
-
-// A client that does not take its answer does not keep the server from stopping.
-bool Http_Server::Daemon::wait_for_answers(Clock::time_point deadline)
-{
-    std::unique_lock lock(_mutex);
-    return _answered.wait_until(lock, deadline, [this] { return _unanswered == 0; });
 }
 
 MHD_Result Http_Server::Daemon::on_request(void* self, MHD_Connection* connection, const char*, const char* method, const char*,

@@ -1,7 +1,7 @@
 #include "cimserver/cimxml/object_writer.h"
 
-#include "cimserver/model/host_name.h"
 #include "cimserver/model/meta_search.h"
+#include "cimserver/model/server_identity.h"
 #include "cimserver/model/value_text.h"
 
 #include <algorithm>

@@ -173,6 +173,7 @@ struct Traversal
 {
     Traversal(Name_Spaces& name_spaces, const Parameters& parameters, bool to_associations)
         : source(parameters.object_name("ObjectName"))
+        , operations(name_spaces.at(source))
     {
         name_single_key(name_spaces, source);
         filter.association_class = parameters.optional_class_name(to_associations ? "ResultClass" : "AssocClass");
@@ -184,50 +185,29 @@ struct Traversal
     }
 
     Object_Path source;
+    Operations& operations;
     Association_Filter filter;
 };
 
-void write_objects(Name_Spaces& name_spaces, const Parameters& parameters, Xml_Writer& writer,
-                   const std::vector<Instance>& objects)
+template <bool to_associations> void traverse(Name_Spaces& name_spaces, const Parameters& parameters, Xml_Writer& writer)
 {
-    for (const Instance& object : objects)
+    const Traversal asked(name_spaces, parameters, to_associations);
+    const Property_List list = parameters.property_list("PropertyList");
+    for (const Instance& object : to_associations ? asked.operations.references(asked.source, asked.filter, list)
+                                                  : asked.operations.associators(asked.source, asked.filter, list))
         write_object_with_path(writer, object, origins_of(name_spaces, parameters, object.path));
 }
 
-void write_paths(Xml_Writer& writer, const std::vector<Object_Path>& paths)
+template <bool to_associations> void traverse_names(Name_Spaces& name_spaces, const Parameters& parameters, Xml_Writer& writer)
 {
-    for (const Object_Path& path : paths)
+    const Traversal asked(name_spaces, parameters, to_associations);
+    for (const Object_Path& path : to_associations ? asked.operations.reference_names(asked.source, asked.filter)
+                                                   : asked.operations.associator_names(asked.source, asked.filter))
     {
         writer.start("OBJECTPATH");
         write_instance_path(writer, path);
         writer.end();
     }
-}
-
-void associators(Name_Spaces& name_spaces, const Parameters& parameters, Xml_Writer& writer)
-{
-    const Traversal asked(name_spaces, parameters, false);
-    write_objects(name_spaces, parameters, writer,
-                  name_spaces.at(asked.source).associators(asked.source, asked.filter, parameters.property_list("PropertyList")));
-}
-
-void associator_names(Name_Spaces& name_spaces, const Parameters& parameters, Xml_Writer& writer)
-{
-    const Traversal asked(name_spaces, parameters, false);
-    write_paths(writer, name_spaces.at(asked.source).associator_names(asked.source, asked.filter));
-}
-
-void references(Name_Spaces& name_spaces, const Parameters& parameters, Xml_Writer& writer)
-{
-    const Traversal asked(name_spaces, parameters, true);
-    write_objects(name_spaces, parameters, writer,
-                  name_spaces.at(asked.source).references(asked.source, asked.filter, parameters.property_list("PropertyList")));
-}
-
-void reference_names(Name_Spaces& name_spaces, const Parameters& parameters, Xml_Writer& writer)
-{
-    const Traversal asked(name_spaces, parameters, true);
-    write_paths(writer, name_spaces.at(asked.source).reference_names(asked.source, asked.filter));
 }
 
 enum class Answer
@@ -256,9 +236,9 @@ struct Operation_Row
 // LocalOnly and IncludeQualifiers are deprecated for instances: they have no effect.
 // clang-format off
 constexpr Operation_Row operation_rows[] = {
-    {"AssociatorNames",        associator_names,         Asks::providers,    Answer::value,
+    {"AssociatorNames",        traverse_names<false>,    Asks::providers,    Answer::value,
         {"ObjectName", "AssocClass", "ResultClass", "Role", "ResultRole"}},
-    {"Associators",            associators,              Asks::providers,    Answer::value,
+    {"Associators",            traverse<false>,          Asks::providers,    Answer::value,
         {"ObjectName", "AssocClass", "ResultClass", "Role", "ResultRole", "IncludeQualifiers", "IncludeClassOrigin", "PropertyList"}},
     {"CreateInstance",         create_instance,          Asks::providers,    Answer::value,
         {"NewInstance"}},
@@ -284,9 +264,9 @@ constexpr Operation_Row operation_rows[] = {
         {"QualifierName"}},
     {"ModifyInstance",         modify_instance,          Asks::providers,    Answer::nothing,
         {"ModifiedInstance", "IncludeQualifiers", "PropertyList"}},
-    {"ReferenceNames",         reference_names,          Asks::providers,    Answer::value,
+    {"ReferenceNames",         traverse_names<true>,     Asks::providers,    Answer::value,
         {"ObjectName", "ResultClass", "Role"}},
-    {"References",             references,               Asks::providers,    Answer::value,
+    {"References",             traverse<true>,           Asks::providers,    Answer::value,
         {"ObjectName", "ResultClass", "Role", "IncludeQualifiers", "IncludeClassOrigin", "PropertyList"}},
     {"SetProperty",            set_property,             Asks::providers,    Answer::nothing,
         {"InstanceName", "PropertyName", "NewValue"}},

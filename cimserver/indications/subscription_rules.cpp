@@ -1,8 +1,8 @@
 #include "cimserver/indications/subscription_rules.h"
 
 #include "cimserver/indications/delivery.h"
-#include "cimserver/model/host_name.h"
 #include "cimserver/model/names.h"
+#include "cimserver/model/server_identity.h"
 #include "cimserver/model/value_text.h"
 #include "cimserver/operations/module_operations.h"
 

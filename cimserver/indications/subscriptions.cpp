@@ -90,12 +90,6 @@ void Subscriptions::tie(Entry& subscription) const
     subscription.destination_id = find(Kind::destination, "Handler", CIM_ListenerDestinationCIMXML);
 }
 
-std::size_t Subscriptions::uses(const std::string& filter_id) const
-{
-    const auto uses_it = [&](const auto& entry) { return entry.second.filter_id == filter_id; };
-    return static_cast<std::size_t>(std::ranges::count_if(table(Kind::subscription), uses_it));
-}
-
 bool Subscriptions::in_use(Kind kind, const std::string& id) const
 {
     return std::ranges::any_of(table(Kind::subscription), [&](const auto& entry)
@@ -181,7 +175,7 @@ Object_Path Subscriptions::create(Kind kind, Instance instance)
         throw Cim_Error(CIM_ERR_SERVER_LIMITS_EXCEEDED, "there are too many instances of " + path.class_name);
 
     const std::string filter_id = entry.filter_id;
-    const bool starts = kind == Kind::subscription && uses(filter_id) == 0;
+    const bool starts = kind == Kind::subscription && !in_use(Kind::filter, filter_id);
     insert(kind, id, std::move(entry));
     bool started = false;
     try
@@ -220,7 +214,7 @@ void Subscriptions::remove(Kind kind, const Object_Path& path)
         insert(kind, id, std::move(entry));
         throw;
     }
-    if (kind == Kind::subscription && uses(entry.filter_id) == 0)
+    if (kind == Kind::subscription && !in_use(Kind::filter, entry.filter_id))
         _providers.stop(entry.filter_id);
 }
 

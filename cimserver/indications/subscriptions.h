@@ -72,7 +72,6 @@ private:
     const Table& table(Subscription_Kind kind) const { return _tables[static_cast<std::size_t>(kind)]; }
     Entry checked(Subscription_Kind kind, Instance instance) const;
     void tie(Entry& subscription) const;
-    std::size_t uses(const std::string& filter_id) const;
     bool in_use(Subscription_Kind kind, const std::string& id) const;
     Provider_Filter provider_filter(const std::string& filter_id) const;
     void insert(Subscription_Kind kind, const std::string& id, Entry entry);

@@ -1,8 +1,7 @@
 #include "cimserver/interop/object_manager.h"
 
 #include "cimserver/interop/server_schema.h"
-#include "cimserver/model/host_name.h"
-#include "cimserver/model/version.h"
+#include "cimserver/model/server_identity.h"
 
 #include <algorithm>
 #include <iterator>

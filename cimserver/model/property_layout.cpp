@@ -4,24 +4,13 @@
 
 namespace cimserver
 {
-namespace
-{
-
-constexpr zmlr::uint32 embedded = zmlr::Flag_EmbeddedObject | zmlr::Flag_EmbeddedInstance;
-
-CMPIType array_if(bool is_array, CMPIType type) { return is_array ? array_of(type) : type; }
-
-} // namespace
-
 CMPIType cmpi_type(const zmlr::Meta_Feature& feature)
 {
     if (zmlr::is_reference(&feature))
-    {
-        const bool is_array = zmlr::as_reference(&feature)->subscript != 0;
-        return array_if(is_array, (feature.flags & embedded) != 0 ? CMPI_instance : CMPI_ref);
-    }
+        return zmlr::as_reference(&feature)->subscript != 0 ? array_of(CMPI_ref) : CMPIType{CMPI_ref};
     const zmlr::Meta_Property* property = zmlr::as_property(&feature);
-    return array_if(property->subscript != 0, cmpi_type(property->type));
+    const CMPIType type = cmpi_type(property->type);
+    return property->subscript != 0 ? array_of(type) : type;
 }
 
 Property_Layout::Property_Layout(const zmlr::Meta_Class& meta_class)

@@ -20,12 +20,7 @@ using Features = std::span<const zmlr::Meta_Feature* const>;
 
 Features features_of(const zmlr::Meta_Record& record) { return {record.meta_features, record.num_meta_features}; }
 
-std::string described(CMPIType type)
-{
-    if ((type & CMPI_ARRAY) != 0)
-        return std::string("array of ") + cim_type_name(type);
-    return (type == CMPI_instance) ? "embedded instance" : cim_type_name(type);
-}
+std::string described(CMPIType type) { return std::string((type & CMPI_ARRAY) != 0 ? "array of " : "") + cim_type_name(type); }
 
 class Converter
 {
@@ -67,7 +62,7 @@ private:
     {
         if (type == CMPI_ref)
             return typed_reference(_repository, *zmlr::as_reference(&feature), given, _name_space);
-        return type == CMPI_instance ? Value::Content() : scalar_content(given, type); // no class that is served has such a value
+        return scalar_content(given, type);
     }
 
     // Null when one element is none of the type; an element that is null stays so.

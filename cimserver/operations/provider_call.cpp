@@ -4,22 +4,6 @@
 
 namespace cimserver
 {
-namespace
-{
-
-// Empty when a provider gives no message, or none that the broker made.
-std::string message(const CMPIString* string)
-try
-{
-    return string ? object<String_Object>(string).text : "";
-}
-catch (const Failure&)
-{
-    return "";
-}
-
-} // namespace
-
 Name_List::Name_List(const Property_List& properties, const Property_Layout* layout) : _absent(!properties)
 {
     if (properties)
@@ -57,12 +41,8 @@ void Instance_Sink::take_instance(const Instance_Object& instance)
 
 void check_status(const Class_Entry& provider, const std::string& action, const CMPIStatus& status)
 {
-    if (status.rc == CMPI_RC_OK)
-        return;
-    std::string description = outcome_text(provider.meta_class->name, action, status.rc);
-    if (const auto text = message(status.msg); !text.empty())
-        description += ": " + text;
-    throw Cim_Error(cim_status(status.rc), description);
+    if (status.rc != CMPI_RC_OK)
+        throw Cim_Error(cim_status(status.rc), outcome_text(provider.meta_class->name, action, status.rc));
 }
 
 void check_offered(const Class_Entry& provider, const std::string& action, bool offered)

@@ -76,19 +76,11 @@ Private_Key private_key(const std::string& text)
 // Both have the same number when they belong together.
 using Key_Id = std::array<unsigned char, 32>;
 
-Key_Id key_id_of(const Certificate& certificate)
+template <class Function, class Owner> Key_Id key_id_of(Function get_key_id, const Owner& owner)
 {
     Key_Id id{};
     std::size_t size = id.size();
-    gnutls_x509_crt_get_key_id(certificate.get(), GNUTLS_KEYID_USE_SHA256, id.data(), &size);
-    return id;
-}
-
-Key_Id key_id_of(const Private_Key& key)
-{
-    Key_Id id{};
-    std::size_t size = id.size();
-    gnutls_x509_privkey_get_key_id(key.get(), GNUTLS_KEYID_USE_SHA256, id.data(), &size);
+    get_key_id(owner.get(), GNUTLS_KEYID_USE_SHA256, id.data(), &size);
     return id;
 }
 
@@ -143,7 +135,7 @@ Tls_Identity read_tls_identity(const std::string& certificate_file, const std::s
     const Private_Key key = private_key(identity.key);
     if (!key)
         throw std::runtime_error(key_file + " holds no private key in PEM form without a password");
-    if (key_id_of(certificate) != key_id_of(key))
+    if (key_id_of(gnutls_x509_crt_get_key_id, certificate) != key_id_of(gnutls_x509_privkey_get_key_id, key))
         throw std::runtime_error(key_file + " is not the key of the certificate " + certificate_file);
     return identity;
 }

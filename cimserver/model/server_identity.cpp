@@ -1,4 +1,4 @@
-#include "cimserver/model/host_name.h"
+#include "cimserver/model/server_identity.h"
 
 #include <unistd.h>
 
@@ -12,5 +12,7 @@ std::string host_name()
         return "localhost";
     return name;
 }
+
+const char* version() { return ZMLR_VERSION; }
 
 } // namespace cimserver

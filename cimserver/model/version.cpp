@@ -1,8 +1,0 @@
-#include "cimserver/model/version.h"
-
-namespace cimserver
-{
-
-const char* version() { return ZMLR_VERSION; }
-
-} // namespace cimserver
