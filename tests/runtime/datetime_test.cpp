@@ -1,6 +1,6 @@
 #include "runtime/datetime.h"
 
-#include "tests/runtime/rows.h"
+#include "tests/support/rows.h"
 
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>

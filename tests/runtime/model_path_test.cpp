@@ -1,7 +1,7 @@
 #include "runtime/model_path.h"
 
-#include "tests/runtime/rows.h"
 #include "tests/runtime/sample_classes.h"
+#include "tests/support/rows.h"
 
 #include <gtest/gtest.h>
 

@@ -1,7 +1,7 @@
 #include "runtime/number.h"
 
 #include "runtime/string.h"
-#include "tests/runtime/rows.h"
+#include "tests/support/rows.h"
 
 #include <cstdio>
 #include <map>

@@ -3,7 +3,7 @@
 #include "runtime/print.h"
 #include "schema/repository.h"
 #include "tests/runtime/printed.h"
-#include "tests/runtime/rows.h"
+#include "tests/support/rows.h"
 
 #include <gtest/gtest.h>
 

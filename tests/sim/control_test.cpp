@@ -1,5 +1,7 @@
 // The control socket of a simulated process, and the tool that talks to it.
 #include "tests/sim/simulated_host.h"
+#include "tests/support/rows.h"
+#include "tests/support/temporary_folder.h"
 
 #include <sys/socket.h>
 #include <sys/stat.h>
@@ -7,7 +9,6 @@
 #include <sys/wait.h>
 
 #include <cstdio>
-#include <fstream>
 #include <memory>
 
 namespace
@@ -18,10 +19,7 @@ using testing::HasSubstr;
 class Control : public Raw_Host
 {
 protected:
-    Control() : Raw_Host("cna"), _path(testing::TempDir() + "sim_control_" + std::to_string(getpid()))
-    {
-        hxasim::serve_control(_path);
-    }
+    Control() : Raw_Host("cna") { hxasim::serve_control(_path); }
     ~Control() override { hxasim::serve_control(""); }
 
     // A socket that bind() or connect() was called on; none when that failed.
@@ -85,7 +83,8 @@ protected:
         return {WEXITSTATUS(status), output};
     }
 
-    std::string _path;
+    const Temporary_Folder _folder;
+    const std::string _path = _folder.path("control");
 };
 
 constexpr const char* done = "{\"ok\":true}\n";
@@ -96,31 +95,8 @@ TEST_F(Control, answers_every_request_with_one_line)
 {
     hxasim::load_text(R"({"adapters": [{"kind": "fc-hba", "option_rom": false, "ports": [{}]}]})");
     Raw_Host::ask<hxa_ioctl_gen_t>(Open_File("/dev/hxa"), "IOCMD_FLASH_ENABLE_OPTROM", '\xB5', 0);
-    const std::pair<const char*, std::string> cases[] = {
-        {R"({"request": "event", "category": "port", "event": "sfp-pom", "level": 2})", done},
-        {R"({"request": "port", "adapter": 0, "port": 0, "link": "down"})", done},
-        {R"({"request": "sfp", "adapter": 0, "port": 0, "module": "remove"})", done},
-        {R"({"request": "unplug", "adapter": 0})", done},
-        {R"({"request": "plug", "adapter": 0})", done},
-        {R"({"request": "fault", "command": "IOCMD_PORT_GET_ATTR", "error": "EIO", "delay": 5})", done},
-        {R"({"request": "requests"})", "{\"ok\":true,\"requests\":1}\n"},
-        {R"({"request": "status"})",
-         R"({"adapters":[{"model":"Zemlar-F86","option_rom":true,"plugged":true,"ports":[{"functions":[{"instance":0,)"
-         R"("ioc":"operational","node":"/dev/hxa","port":"linkdown"}],"sfp":false}],"serial":"ZMF0000001"}],)"
-         R"("faults":1,"lost_events":[0,0,0,0],"ok":true,"open_descriptors":0,"requests":1,"violations":[]})"
-         "\n"},
-        {R"({"request": "clear-faults"})", done},
-        {R"({"request": "event", "category": 2, "event": 1, "instance": 3})", refusal("no instance 3 of /dev/hxa")},
-        {R"({"request": "port", "adapter": 0, "link": "down"})", refusal("request.port: is missing")},
-        {R"({"request": "port", "adapter": 0, "port": 0, "link": "up"})", refusal("no SFP in the port")},
-        {R"({"request": "unplug", "adapter": 0, "force": true})", refusal("request.force: unknown key")},
-        {R"({"request": "fault"})",
-         refusal("request: needs an error, a status, a SCSI status, an answer, data, garbage or a delay")},
-        {R"({"request": "reboot"})", refusal("request.request: no such request: reboot")},
-        {R"([])", refusal("request: must be an object")},
-    };
-    for (const auto& [request, answer] : cases)
-        EXPECT_EQ(ask(request), answer) << request;
+    for (const auto& row : rows_of("control_requests.txt"))
+        EXPECT_EQ(ask(row[0]), row.at(1) + "\n") << row[0];
     hxasim::unload();
     EXPECT_EQ(ask(R"({"request": "unplug", "adapter": 0})"), refusal("no host is loaded"));
     EXPECT_THAT(ask("{"), HasSubstr("parse error"));
@@ -139,10 +115,7 @@ TEST_F(Control, serves_its_own_user_in_the_place_of_a_dead_socket_only)
     EXPECT_EQ(serve(_path + "x"), "done");
     hxasim::serve_control(_path);
 
-    const std::string file = _path + ".txt";
-    std::ofstream(file) << "mine";
-    EXPECT_EQ(serve(file), "bind: Address already in use");
-    EXPECT_EQ(unlink(file.c_str()), 0);
+    EXPECT_EQ(serve(_folder.file("mine", "mine")), "bind: Address already in use");
     EXPECT_EQ(serve("/no/such/folder/socket"), "bind: No such file or directory");
     EXPECT_EQ(serve(std::string(200, 'x')), "socket: File name too long");
 }

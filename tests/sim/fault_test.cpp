@@ -204,25 +204,4 @@ TEST_F(Faults, strike_a_recorded_request_when_it_is_sent_again)
     EXPECT_TRUE(recorded[1].carries_status);
 }
 
-TEST_F(Faults, that_could_not_do_what_they_say_are_refused)
-{
-    const std::pair<Fault, const char*> cases[] = {
-        {{.command = "IOCMD_IOC_GET_ATTRS", .error = EIO}, "fault.command: no such command: IOCMD_IOC_GET_ATTRS"},
-        {{.node = "/dev/hxx", .error = EIO}, "fault.node: no such node: /dev/hxx"},
-        {{.command = "IOCMD_IOC_GET_INFO"},
-         "fault: needs an error, a status, a SCSI status, an answer, data, garbage or a delay"},
-        {{.command = "IOCMD_IOC_GET_INST", .status = 1}, "fault.status: IOCMD_IOC_GET_INST carries no status"},
-        {{.command = "IOCMD_IOC_GET_INST", .answer = {{.offset = 37, .bytes = {1, 2, 3, 4}}}},
-         "fault.answer: beyond the 40 bytes of IOCMD_IOC_GET_INST"},
-        {{.command = "IOCMD_IOC_GET_INST", .answer = {{.offset = SIZE_MAX, .bytes = {1, 2}}}},
-         "fault.answer: beyond the 40 bytes of IOCMD_IOC_GET_INST"},
-        {{.command = "IOCMD_IOC_GET_ATTR", .lun = 0, .error = EIO}, "fault: IOCMD_IOC_GET_ATTR is no SCSI command"},
-        {{.command = "IOCMD_IOC_GET_ATTR", .remote_port = Wwn{}, .error = EIO},
-         "fault.remote_port: IOCMD_IOC_GET_ATTR names no remote port"},
-        {{.command = "IOCMD_IOC_GET_ATTR", .data = {{.bytes = {1}}}}, "fault.data: IOCMD_IOC_GET_ATTR fills no buffer"},
-    };
-    for (const auto& row : cases)
-        EXPECT_EQ(refusal_of([&] { hxasim::inject(row.first); }), row.second);
-}
-
 } // namespace

@@ -1,7 +1,10 @@
 // Requests that no driver accepts fail, are told as violations, and are recorded like all others.
 #include "tests/sim/simulated_host.h"
+#include "tests/support/rows.h"
 
 #include <sys/mman.h>
+
+#include <map>
 
 namespace
 {
@@ -17,74 +20,28 @@ protected:
     Open_File hxn{"/dev/hxn"};
 };
 
-struct Bad_Request
-{
-    const char* node;
-    std::uint32_t code;
-    std::size_t offset; // of one byte that is set in a record of zeros
-    std::uint8_t value;
-    int error;
-    const char* violation;
-};
-
-// clang-format off
-const Bad_Request bad_requests[] = {
-    // commands that the node does not know
-    {"/dev/hxa", 0xC0084399, 0, 0, ENOTTY, "/dev/hxa 0xC0084399: unknown command"},
-    {"/dev/hxa", 0xC648B006, 0, 0, ENOTTY, "/dev/hxa 0xC648B006: unknown command"},
-    {"/dev/hxa", 0x86484306, 0, 0, ENOTTY, "/dev/hxa 0x86484306: unknown command"},
-    {"/dev/hxa", 0xC6484406, 0, 0, ENOTTY, "/dev/hxa IOCMD_IOC_GET_ATTR: belongs on /dev/hxn"},
-    {"/dev/hxn", 0xC058432A, 0, 0, ENOTTY, "/dev/hxn IOCMD_AEN_SYNC: belongs on /dev/hxa"},
-    // records of another size
-    {"/dev/hxa", 0xC6474306, 0, 0, EINVAL, "/dev/hxa IOCMD_IOC_GET_ATTR: record of 1607 bytes, must be 1608"},
-    // bytes that must be 0: status, reserved, output, the last one
-    {"/dev/hxa", 0xC6484306,    0,   1, EINVAL, "/dev/hxa IOCMD_IOC_GET_ATTR instance 0: byte 0 is 1, must be 0"},
-    {"/dev/hxa", 0xC6484306,    6, 255, EINVAL, "/dev/hxa IOCMD_IOC_GET_ATTR instance 0: byte 6 is 255, must be 0"},
-    {"/dev/hxn", 0xC2084407, 519, 7, EINVAL, "/dev/hxn IOCMD_IOC_GET_INFO instance 0: byte 519 is 7, must be 0"},
-    {"/dev/hxa", 0xC0084301,    4,   2, EINVAL, "/dev/hxa IOCMD_IOC_GET_VERSION: byte 4 is 2, must be 0"},
-    {"/dev/hxa", 0xC058432A,    0,   1, EINVAL, "/dev/hxa IOCMD_AEN_SYNC: byte 0 is 1, must be 0"},
-    {"/dev/hxa", 0xC058432A,   16,   1, EINVAL, "/dev/hxa IOCMD_AEN_SYNC: byte 16 is 1, must be 0"},
-    {"/dev/hxa", 0xC0584329,   12,   1, EINVAL, "/dev/hxa IOCMD_AEN_GET instance 0: byte 12 is 1, must be 0"},
-    {"/dev/hxa", 0xC0584329,   16,   1, EINVAL, "/dev/hxa IOCMD_AEN_GET instance 0: byte 16 is 1, must be 0"},
-    {"/dev/hxa", 0xC060BA02,   36,   1, EINVAL, "/dev/hxa IOCMD_FCPT instance 0: byte 36 is 1, must be 0"},
-    {"/dev/hxa", 0xC020B207,   12,   1, EINVAL, "/dev/hxa IOCMD_RPORT_SET_SPEED instance 0: byte 12 is 1, must be 0"},
-    // inputs that make no sense
-    {"/dev/hxa", 0xC018432E,    8,   1, EINVAL, "/dev/hxa IOCMD_PORT_GET_STATS instance 0: buffer of 1 bytes, must be 304"},
-    {"/dev/hxa", 0xC060BA02,   64,   1, EINVAL, "/dev/hxa IOCMD_FCPT instance 0: needs a nexus: 1"},
-    {"/dev/hxa", 0xC060BA02,   40,   0, EINVAL, "/dev/hxa IOCMD_FCPT instance 0: frame without R_CTL"},
-    {"/dev/hxa", 0xC060BA02,   40,   2, EINVAL, "/dev/hxa IOCMD_FCPT instance 0: frame without D_ID"},
-    {"/dev/hxa", 0xC0584329,    8,   2, EINVAL,
-     "/dev/hxa IOCMD_AEN_GET instance 0: application 2 has not synchronised on this descriptor"},
-    {"/dev/hxa", 0xC0584329,    7, 128, EINVAL, "/dev/hxa IOCMD_AEN_GET instance 0: room for -2147483648 events"},
-    // instances and applications that are not there
-    {"/dev/hxa", 0xC178432D,    4,   2, ENODEV, "/dev/hxa IOCMD_PORT_GET_ATTR instance 2: no such instance"},
-    {"/dev/hxn", 0xC178442D,    5,   1, ENODEV, "/dev/hxn IOCMD_PORT_GET_ATTR instance 256: no such instance"},
-    {"/dev/hxa", 0xC0584329,    0,   2, ENODEV, "/dev/hxa IOCMD_AEN_GET instance 2: no such instance"},
-    {"/dev/hxa", 0xC058432A,    8,   5, EINVAL, "/dev/hxa IOCMD_AEN_SYNC: no such application: 5"},
-    {"/dev/hxa", 0xC0584329,    8,   5, EINVAL, "/dev/hxa IOCMD_AEN_GET instance 0: no such application: 5"},
-};
-// clang-format on
-
 TEST_F(Strictness, refuses_bad_requests_and_leaves_the_record_alone)
 {
-    for (const auto& bad : bad_requests)
+    const std::map<std::string, int> errors = {{"ENOTTY", ENOTTY}, {"EINVAL", EINVAL}, {"ENODEV", ENODEV}};
+    const auto rows = rows_of("bad_requests.txt");
+    for (const auto& row : rows)
     {
-        SCOPED_TRACE(bad.violation);
+        SCOPED_TRACE(row.at(5));
         std::array<std::uint8_t, 2048> record{};
-        record[bad.offset] = bad.value;
+        record.at(std::stoul(row[2])) = static_cast<std::uint8_t>(std::stoul(row[3]));
         auto sent = record;
         errno = 0;
-        EXPECT_EQ(ioctl(std::string(bad.node) == "/dev/hxa" ? *hxa : *hxn, bad.code, record.data()), -1);
-        EXPECT_EQ(errno, bad.error);
+        EXPECT_EQ(ioctl(row[0] == "/dev/hxa" ? *hxa : *hxn, std::stoul(row[1], nullptr, 16), record.data()), -1);
+        EXPECT_EQ(errno, errors.at(row[4]));
         EXPECT_EQ(record, sent);
-        expect_violation(bad.violation);
+        expect_violation(row[5]);
     }
     auto requests = hxasim::take_requests();
-    ASSERT_EQ(requests.size(), std::size(bad_requests));
+    ASSERT_EQ(requests.size(), rows.size());
     for (std::size_t i = 0; i < requests.size(); ++i)
     {
-        EXPECT_EQ(requests[i].command, bad_requests[i].code);
-        EXPECT_EQ(requests[i].error, bad_requests[i].error);
+        EXPECT_EQ(requests[i].command, std::stoul(rows[i][1], nullptr, 16));
+        EXPECT_EQ(requests[i].error, errors.at(rows[i][4]));
         EXPECT_THAT(requests[i].answered, IsEmpty());
     }
     EXPECT_EQ(requests[0].name, "");
