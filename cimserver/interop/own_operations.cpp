@@ -139,7 +139,6 @@ Object_Path Own_Operations::create_instance(const Instance& instance)
     asked.path.name_space = name_space;
     asked = typed_instance(_repository, entry, asked, CIM_ERR_INVALID_PARAMETER);
     use_one_name(asked.path.keys);
-    use_one_name(asked.properties);
     Object_Path path = server_class->create(asked);
     path.name_space = name_space;
     return path;
