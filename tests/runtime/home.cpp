@@ -1,7 +1,6 @@
 #include "tests/runtime/home.h"
 
 #include <cstdlib>
-#include <filesystem>
 #include <fstream>
 #include <sys/wait.h>
 #include <unistd.h>
@@ -9,25 +8,13 @@
 namespace sample
 {
 
-Home::Home()
-{
-    char name[] = "/tmp/zmlr-home-XXXXXX";
-    _path = mkdtemp(name);
-}
-
-Home::~Home() { std::filesystem::remove_all(_path); }
-
-void Home::options(const std::string& text) const { std::ofstream(path(".cimplerc")) << text; }
-
-bool Home::has(const std::string& name) const { return std::filesystem::exists(path(name)); }
-
 int Home::start(const std::function<void()>& work, bool with_home) const
 {
     const pid_t pid = fork();
     if (pid != 0)
         return pid;
     if (with_home)
-        setenv("HOME", _path.c_str(), 1);
+        setenv("HOME", _folder.folder.c_str(), 1);
     else
         unsetenv("HOME");
     work();

@@ -1,6 +1,8 @@
 // A home directory of a test's own, and processes that log into it.
 #pragma once
 
+#include "tests/support/temporary_folder.h"
+
 #include <functional>
 #include <string>
 #include <vector>
@@ -11,14 +13,9 @@ namespace sample
 class Home
 {
 public:
-    Home();
-    ~Home();
-    Home(const Home&) = delete;
-    Home& operator=(const Home&) = delete;
-
-    void options(const std::string& text) const; // writes the option file
-    std::string path(const std::string& name) const { return _path + "/" + name; }
-    bool has(const std::string& name) const;
+    void options(const std::string& text) const { _folder.file(".cimplerc", text); }
+    std::string path(const std::string& name) const { return _folder.path(name); }
+    bool has(const std::string& name) const { return std::filesystem::exists(path(name)); }
 
     // Starts a process that does the work with this home (or with HOME unset) and ends; the log of each process is fresh.
     int start(const std::function<void()>& work, bool with_home = true) const;
@@ -31,7 +28,7 @@ public:
     std::vector<std::string> lines() const;
 
 private:
-    std::string _path;
+    const Temporary_Folder _folder;
 };
 
 } // namespace sample

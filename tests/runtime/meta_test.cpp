@@ -10,23 +10,6 @@ using namespace sample;
 namespace
 {
 
-TEST(Meta, finds_flags_and_only_what_is_of_the_kind)
-{
-    EXPECT_EQ(1U << flag_name_to_index("property"), uint32{Flag_Property});
-    EXPECT_EQ(1U << flag_name_to_index("EmbeddedInstance"), uint32{Flag_EmbeddedInstance});
-    EXPECT_EQ(flag_name_to_index("Keys"), 0xFFFFFFFF);
-    const Meta_Class* disk_class = &Sample_Disk::static_meta_class;
-    EXPECT_EQ(find_meta_class(static_cast<const Meta_Repository*>(nullptr), "Sample_Disk"), nullptr);
-    EXPECT_EQ(find_meta_class(disk_class, "sample_LINK"), &Sample_Link::static_meta_class);
-    EXPECT_EQ(find_meta_class(disk_class, "Sample_Disk2"), nullptr);
-    EXPECT_STREQ(find_feature(disk_class, "bLOCKS")->name, "Blocks");
-    EXPECT_EQ(find_property(disk_class, "Reset"), nullptr);
-    EXPECT_EQ(find_feature(disk_class, ""), nullptr);
-    EXPECT_EQ(find_parameter(&Sample_Element_Reset_method::static_meta_class, "Peer", Flag_Property), nullptr);
-    EXPECT_TRUE(has_feature(&Sample_Link::static_meta_class, Flag_Reference));
-    EXPECT_FALSE(has_feature(&Sample_Link::static_meta_class, Flag_Method));
-}
-
 TEST(Meta, every_class_descends_from_the_root)
 {
     const Meta_Class* const element_class = &Sample_Element::static_meta_class;

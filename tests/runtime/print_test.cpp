@@ -2,6 +2,7 @@
 #include "runtime/print.h"
 #include "tests/runtime/printed.h"
 #include "tests/runtime/sample_classes.h"
+#include "tests/support/temporary_folder.h"
 
 #include <gtest/gtest.h>
 
@@ -53,37 +54,7 @@ TEST(Print, an_instance_is_a_block_and_so_is_what_it_refers_to)
     record->Peer->Labels.value.clear();
     record->Delay.null = 1;
     EXPECT_EQ(printed([&](std::FILE* stream) { fprint(stream, record.ptr()); }),
-              R"(Reset
-{
-    string __name_space = "root/zemlar";
-    uint32 Delay = NULL;
-    Sample_Element Peer =
-    {
-        string Name = "a\"b";
-        boolean Online = NULL;
-        uint8 Slot = NULL;
-        uint32 Size = 1;
-        sint64 Delta = NULL;
-        real64 Load = NULL;
-        char16 Letter = NULL;
-        datetime Since = "00000001000000.000000:000";
-        string Caption = "new element";
-        string Labels[] = { };
-        uint16 Codes[] = { 2, 3, 5 };
-        datetime Intervals[] = { "00000000000000.000000:000" };
-        real64 Samples[] = NULL;
-    }
-    Sample_Element Others[] =
-    {
-        Sample_Setting Others =
-        {
-            uint32 Level = 0;
-        }
-        NULL
-    };
-    uint32 return_value = 0;
-}
-)");
+              Temporary_Folder::content(TEST_TABLES "/printed.txt"));
     EXPECT_NE(printed([&](std::FILE* stream) { fprint(stream, linked({}, {}).ptr()); }).find("Sample_Disk Dependent = NULL;\n"),
               std::string::npos);
 

@@ -77,26 +77,6 @@ TEST(Value, owns_one_reference_to_each_instance)
     EXPECT_EQ(refs(), 3U);
 }
 
-TEST(Value, carries_every_property_from_one_instance_to_another)
-{
-    const auto from = element("a");
-    from->Online.set(true);
-    from->Load.set(0.25);
-    from->Caption.null = 1;
-    const Ref<Sample_Element> to(create<Sample_Element>(false));
-    for (const Meta_Feature* feature : features_of(from.ptr()))
-    {
-        Value value;
-        EXPECT_EQ(value.set(from.ptr(), feature), is_method(feature) ? -1 : 0);
-        EXPECT_EQ(value.type(), type_of(feature));
-        if (is_method(feature))
-            continue;
-        EXPECT_EQ(value.null(), null_of(from.ptr(), as_property(feature)) != 0);
-        EXPECT_EQ(value.get(to.ptr(), feature), 0) << feature->name;
-    }
-    EXPECT_TRUE(identical(from.ptr(), to.ptr()));
-}
-
 TEST(Value, carries_references)
 {
     const auto target = element("target");

@@ -74,25 +74,13 @@ TEST(Meta_Data, inherited_features_are_the_ancestors)
 // An override stands for itself: without a default of its own the property has none.
 TEST(Meta_Data, defaults)
 {
-    const struct
+    for (const auto& row : rows_of("defaults.txt"))
     {
-        const char *class_name, *property, *value; // null: none
-    } rows[] = {
-        {"ZEMLAR_FCPort", "EnabledState", "5"},
-        {"ZEMLAR_FCPort", "HealthState", nullptr},
-        {"ZEMLAR_SCSIProtocolEndpoint", "EnabledState", nullptr},
-        {"ZEMLAR_ConcreteJob", "JobRunTimes", "1"},
-        {"ZEMLAR_ConcreteJob", "TimeBeforeRemoval", "\"00000000000500.000000:000\""},
-        {"ZEMLAR_ObjectManager", "GatherStatisticalData", "true"},
-    };
-    for (const auto& row : rows)
-    {
-        const Ref<Instance> made(create(&class_named(row.class_name), true));
-        const Meta_Property* property = as_property(&feature_named(row.class_name, row.property));
+        const Ref<Instance> made(create(&class_named(row[0].c_str()), true));
+        const Meta_Property* property = as_property(&feature_named(row[0].c_str(), row.at(1).c_str()));
         const void* value = address_of(made.ptr(), property->offset);
         const auto print = [&](std::FILE* stream) { print_scalar(stream, static_cast<Type>(property->type), value); };
-        EXPECT_EQ(null_of(made.ptr(), property) ? "none" : printed(print), row.value ? row.value : "none")
-            << row.class_name << "." << row.property;
+        EXPECT_EQ(null_of(made.ptr(), property) ? "none" : printed(print), row.at(2)) << row[0] << "." << row[1];
     }
 }
 

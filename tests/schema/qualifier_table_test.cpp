@@ -90,14 +90,6 @@ TEST(Qualifier_Table, every_embedded_instance_has_its_class_and_every_served_cla
             EXPECT_EQ(find(c->name, feature->name, "EmbeddedInstance") != nullptr, flagged) << c->name << "." << feature->name;
         }
     }
-
-    const Qualifier_Row* jobs = find("CIM_DiagnosticService", "RunDiagnosticService", "EmbeddedInstance", "JobSettings");
-    ASSERT_NE(jobs, nullptr);
-    EXPECT_STREQ(jobs->values[0], "CIM_JobSettingData");
-    const Qualifier_Row* setting = find("CIM_AllocatedLogicalElement", "AllocationState", "EmbeddedInstance");
-    ASSERT_NE(setting, nullptr);
-    EXPECT_FALSE(setting->array);
-    EXPECT_STREQ(setting->values[0], "CIM_SettingData");
 }
 
 } // namespace
