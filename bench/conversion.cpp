@@ -26,7 +26,7 @@ class Port
 public:
     Port()
     {
-        bench::Simulated_Host host(1);
+        bench::Simulated_Host host(bench::two_port_hbas(1));
         wire = host.operations().enumerate_instances("ZEMLAR_FCPort", true, std::nullopt).at(0);
         auto& object = cimserver::make<cimserver::Instance_Object>(wire);
         zmlr::make_cimple_instance(broker(), &zmlr::ZEMLAR_FCPort::static_meta_class,

@@ -9,7 +9,7 @@ from pathlib import Path
 
 # By program: the benchmarks to measure, and how many of which unit one iteration handles.
 MEASURED = {
-    "enumerate_fc_ports": [(f"enumerate_fc_ports/{adapters}", 2 * adapters, "port") for adapters in [1, 4, 16, 64]],
+    "inventory": [("enumerate/ZEMLAR_FCPort/16", 32, "port")],
     "scan": [(f"scan/{iocs}", 2 * iocs, "IOC") for iocs in [1, 16, 128]],
     "runtime_instances": [
         ("life_of_a_port", 1_000, "port"),
@@ -24,7 +24,7 @@ MEASURED = {
 
 # Where the instructions of one enumeration go: benchmark, units, and the functions whose whole cost is counted. What the
 # callback does belongs to the conversion and the rest, not to the provider that calls it.
-SHARES = {"enumerate_fc_ports": ("enumerate_fc_ports/16", 32, "port")}
+SHARES = {"inventory": ("enumerate/ZEMLAR_FCPort/16", 32, "port")}
 CONVERSION = ["zmlr::make_cmpi_object("]
 PROVIDER = "zmlr::Enumerating_Provider<zmlr::ZEMLAR_FCPort_Provider_Skeleton>::enum_instances("
 CALLBACK = "bool zmlr::answer_with<"

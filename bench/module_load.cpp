@@ -11,7 +11,7 @@ namespace
 
 void load_module(benchmark::State& state)
 {
-    bench::simulate(static_cast<int>(state.range(0)));
+    hxasim::load_text(bench::two_port_hbas(static_cast<int>(state.range(0))));
     for (auto _ : state)
     {
         void* module = dlopen(bench::module_path, RTLD_NOW | RTLD_GLOBAL);

@@ -2,21 +2,19 @@
 
 #include "sim/hxasim.h"
 
-#include <string>
-
 namespace bench
 {
 
 const char* const module_path = ZMLR_MODULE_PATH;
 
-void simulate(int adapters)
+std::string two_port_hbas(int adapters)
 {
-    hxasim::load_text(R"({"generate": {"kind": "fc-hba", "ports": 2, "adapters": )" + std::to_string(adapters) + "}}");
+    return R"({"generate": {"kind": "fc-hba", "ports": 2, "adapters": )" + std::to_string(adapters) + "}}";
 }
 
-Simulated_Host::Simulated_Host(int adapters)
+Simulated_Host::Simulated_Host(const std::string& scenario)
 {
-    simulate(adapters);
+    hxasim::load_text(scenario);
     _module = std::make_unique<cimserver::Module>(module_path);
     _name_spaces = std::make_unique<cimserver::Server_Name_Spaces>(*_module);
 }

@@ -1,10 +1,11 @@
-// A simulated host with a given number of two-port FC HBAs and the module loaded on it.
+// A simulated host and the module loaded on it.
 #pragma once
 
 #include "cimserver/broker/module.h"
 #include "cimserver/interop/name_spaces.h"
 
 #include <memory>
+#include <string>
 
 namespace bench
 {
@@ -12,14 +13,14 @@ namespace bench
 // The path of the built module.
 extern const char* const module_path;
 
-// Replaces the simulated host: `adapters` two-port FC HBAs. A module loaded before keeps what it saw at load.
-void simulate(int adapters);
+// The scenario of a host with so many two-port FC HBAs.
+std::string two_port_hbas(int adapters);
 
-// The module loaded on such a host and the operations it answers.
+// The module loaded on the scenario's host (JSON text), and the operations it answers.
 class Simulated_Host
 {
 public:
-    explicit Simulated_Host(int adapters);
+    explicit Simulated_Host(const std::string& scenario);
 
     cimserver::Operations& operations() { return _name_spaces->at("root/zemlar", ""); }
 

@@ -1,0 +1,124 @@
+// The inventory through the broker, for every class that has instances: all of them, and one by its path, on hosts of 1 to 64
+// adapters; then the units behind one target. Driver requests, memory above idle and time, each per instance.
+//
+// Under callgrind each benchmark dumps its instructions by its name; inventory_table.py makes a table of all of it.
+
+#include "bench/meter.h"
+#include "bench/simulated_host.h"
+#include "sim/hxasim.h"
+
+#include <benchmark/benchmark.h>
+
+#include <string>
+#include <vector>
+
+namespace
+{
+
+// Two-port CNAs; behind each port an array with four disks and a tape drive.
+std::string host_of_adapters(std::int64_t adapters)
+{
+    const std::string adapter =
+        R"({"kind": "cna", "ports": [{"remote_ports": [{"luns": {"count": 4}}, {"luns": {"type": "tape"}}]},
+                                                             {"remote_ports": [{"luns": {"count": 4}}, {"luns": {"type": "tape"}}]}]})";
+    std::string list = adapter;
+    for (std::int64_t i = 1; i < adapters; ++i)
+        list += "," + adapter;
+    return R"({"adapters": [)" + list + "]}";
+}
+
+// One port and two equal targets.
+std::string host_of_luns(std::int64_t luns)
+{
+    const std::string target = R"({"luns": {"count": )" + std::to_string(luns / 2) + "}}";
+    return R"({"adapters": [{"kind": "fc-hba", "ports": [{"remote_ports": [)" + target + "," + target + "]}]}]}";
+}
+
+using Host_Text = std::string (*)(std::int64_t size);
+using Instances = std::vector<cimserver::Instance>;
+using Work = Instances (*)(cimserver::Operations&, const cimserver::Object_Path&);
+
+Instances enumerate(cimserver::Operations& operations, const cimserver::Object_Path& path)
+{
+    return operations.enumerate_instances(path.class_name, true, std::nullopt);
+}
+
+Instances get(cimserver::Operations& operations, const cimserver::Object_Path& path)
+{
+    return {operations.get_instance(path, std::nullopt)};
+}
+
+// The work is done with the path of the instance in the middle.
+void measure(benchmark::State& state, const std::string& name, const std::string& class_name, Host_Text host_text, Work work)
+{
+    bench::Simulated_Host host(host_text(state.range(0)));
+    const Instances all = enumerate(host.operations(), {.class_name = class_name}); // the first request makes the provider
+    const cimserver::Object_Path path = all.at(all.size() / 2).path;
+    work(host.operations(), path);
+
+    const auto before = hxasim::request_count();
+    std::size_t instances = 0;
+    bench::Memory memory{};
+    {
+        const bench::Memory_Meter meter;
+        const Instances answer = work(host.operations(), path);
+        memory = meter.memory();
+        instances = answer.size();
+    }
+    const auto requests = hxasim::request_count() - before;
+
+    for (auto _ : state)
+    {
+        const bench::Counted counted;
+        work(host.operations(), path);
+    }
+    CALLGRIND_DUMP_STATS_AT((name + "/" + std::to_string(state.range(0))).c_str());
+
+    const auto per_instance = [&](auto total) { return static_cast<double>(total) / static_cast<double>(instances); };
+    state.counters["instances"] = static_cast<double>(instances);
+    state.counters["requests"] = static_cast<double>(requests);
+    state.counters["requests/instance"] = per_instance(requests);
+    state.counters["peak/instance"] = per_instance(memory.peak);
+    state.counters["answer/instance"] = per_instance(memory.answer);
+    state.counters["time/instance"] = benchmark::Counter(
+        static_cast<double>(instances), benchmark::Counter::kIsIterationInvariantRate | benchmark::Counter::kInvert);
+}
+
+void add(const std::string& name, const std::string& class_name, Host_Text host_text, Work work,
+         const std::vector<std::int64_t>& sizes)
+{
+    auto* added = benchmark::RegisterBenchmark(name.c_str(), [=](benchmark::State& state)
+                                               { measure(state, name, class_name, host_text, work); });
+    for (const std::int64_t size : sizes)
+        added->Arg(size);
+    added->Unit(benchmark::kMicrosecond);
+}
+
+std::vector<std::string> classes_with_instances()
+{
+    bench::Simulated_Host host(host_of_adapters(1));
+    std::vector<std::string> classes;
+    for (const zmlr::Meta_Class* meta_class : host.operations().enumerate_classes("", true))
+    {
+        const std::string name = meta_class->name;
+        if (name.starts_with("ZEMLAR_") && !enumerate(host.operations(), {.class_name = name}).empty())
+            classes.push_back(name);
+    }
+    return classes;
+}
+
+} // namespace
+
+int main(int argc, char** argv)
+{
+    const std::vector<std::string> classes = classes_with_instances();
+    for (const std::string& name : classes)
+        add("enumerate/" + name, name, host_of_adapters, enumerate, {1, 4, 16, 64});
+    for (const std::string& name : classes)
+        add("get/" + name, name, host_of_adapters, get, {1, 4, 16, 64});
+    add("enumerate_luns", "ZEMLAR_StorageExtent", host_of_luns, enumerate, {10, 1000, 10000});
+    add("get_lun", "ZEMLAR_StorageExtent", host_of_luns, get, {10, 1000, 10000});
+
+    benchmark::Initialize(&argc, argv);
+    benchmark::RunSpecifiedBenchmarks();
+}

@@ -1,0 +1,100 @@
+"""Runs `inventory` (bench/inventory.cpp), then once more under callgrind, and prints its figures as tables: inventory_table.py PROGRAM [FILTER]"""
+
+import json
+import re
+import subprocess
+import sys
+import tempfile
+from pathlib import Path
+
+ADAPTERS = [1, 4, 16, 64]
+LUNS = [10, 1_000, 10_000]
+
+
+def measured(program, selection):
+    """By benchmark: its counters, and the microseconds of one iteration."""
+    command = [program, selection, "--benchmark_min_time=0.05", "--benchmark_format=json"]
+    run = subprocess.run(command, check=True, stdout=subprocess.PIPE)
+    return {row["name"]: row for row in json.loads(run.stdout)["benchmarks"]}
+
+
+def instructions(program, selection):
+    """By benchmark: the instructions of one iteration, the simulated driver's left out."""
+    with tempfile.TemporaryDirectory() as folder:
+        command = ["valgrind", "--tool=callgrind", "--collect-atstart=no", f"--callgrind-out-file={folder}/out", program]
+        subprocess.run([*command, selection, "--benchmark_min_time=0.000001"], check=True, capture_output=True)
+        dumps = [path.read_text() for path in Path(folder).iterdir()]
+    counts = {}
+    for dump in dumps:
+        if name := re.search(r"^desc: Trigger: Client Request: (.+)$", dump, re.MULTILINE):
+            counts[name[1]] = int(re.search(r"^(?:totals|summary): (\d+)", dump, re.MULTILINE)[1])
+    return counts
+
+
+def print_table(title, head, rows):
+    print(f"\n{title}\n\n| {' | '.join(head)} |\n|---|{'---:|' * (len(head) - 1)}")
+    for row in rows:
+        print(f"| {' | '.join(f'{cell:,.0f}' if isinstance(cell, (int, float)) else cell for cell in row)} |")
+
+
+def fold(values):
+    """Equal figures once, others all: 2 or 2 / 5 / 17."""
+    texts = [f"{value:,.4g}" for value in values]
+    return texts[0] if len(set(texts)) == 1 else " / ".join(texts)
+
+
+class Figures:
+    def __init__(self, program, selection):
+        self.rows = measured(program, selection)
+        self.counts = instructions(program, selection)
+
+    def names(self, kind):
+        return sorted({name.rsplit("/", 1)[0] for name in self.rows if name.startswith(kind + "/")})
+
+    def of(self, name, sizes, counter):
+        return [self.rows[f"{name}/{size}"][counter] for size in sizes]
+
+    def instructions(self, name, sizes):
+        return [self.counts[f"{name}/{size}"] / self.rows[f"{name}/{size}"]["instances"] for size in sizes]
+
+    def last(self, name, size):
+        """Microseconds, peak and answer in bytes: each per instance."""
+        row = self.rows[f"{name}/{size}"]
+        return [row["real_time"] / row["instances"], row["peak/instance"], row["answer/instance"]]
+
+
+def class_rows(figures, kind, requests):
+    for name in figures.names(kind):
+        counts = figures.instructions(name, ADAPTERS)
+        spread = 100 * (max(counts[1:]) / min(counts[1:]) - 1)
+        yield [
+            f"`{name.split('_')[1]}`",
+            fold(figures.of(name, ADAPTERS, "instances")),
+            fold(figures.of(name, ADAPTERS, requests)),
+            *counts,
+            f"{spread:.1f} %",
+            *figures.last(name, ADAPTERS[-1]),
+        ]
+
+
+def lun_rows(figures):
+    for name in ["enumerate_luns", "get_lun"]:
+        for size, count in zip(LUNS, figures.instructions(name, LUNS)):
+            row = figures.rows[f"{name}/{size}"]
+            yield [f"`{name}/{size}`", row["instances"], row["requests"], count, *figures.last(name, size)]
+
+
+def main():
+    figures = Figures(sys.argv[1], f"--benchmark_filter={sys.argv[2] if len(sys.argv) > 2 else '.'}")
+    counts = [f"instructions at {adapters}" for adapters in ADAPTERS]
+    ends = ["µs", "peak bytes", "of them answer"]
+    head = ["class", "instances", "requests", *counts, "spread 4 to 64", *ends]
+    print_table("All instances; each figure per instance", head, class_rows(figures, "enumerate", "requests/instance"))
+    print_table("One instance by its path", head, class_rows(figures, "get", "requests"))
+    if "enumerate_luns/10" in figures.rows:
+        head = ["units", "instances", "requests", "instructions per instance", *ends]
+        print_table("Units of two equal targets", head, lun_rows(figures))
+
+
+if __name__ == "__main__":
+    main()

@@ -1,0 +1,41 @@
+// What the work of this program takes of memory and, under callgrind, of instructions. A program that links this has its
+// allocations watched. The simulated driver is no part of the work: what it does and keeps for a request does not count.
+#pragma once
+
+#include <valgrind/callgrind.h>
+
+#include <cstddef>
+
+namespace bench
+{
+
+// Bytes of the heap above what was in use before the work, the allocator's own included.
+struct Memory
+{
+    std::size_t peak;
+    std::size_t answer; // still in use when the work was done
+};
+
+// Watches the allocations of this thread from its making on. One at a time.
+class Memory_Meter
+{
+public:
+    Memory_Meter();
+    ~Memory_Meter();
+    Memory_Meter(const Memory_Meter&) = delete;
+    Memory_Meter& operator=(const Memory_Meter&) = delete;
+
+    Memory memory() const;
+};
+
+// Callgrind (with --collect-atstart=no) counts this thread's instructions while one lives.
+class Counted
+{
+public:
+    Counted();
+    ~Counted();
+    Counted(const Counted&) = delete;
+    Counted& operator=(const Counted&) = delete;
+};
+
+} // namespace bench
