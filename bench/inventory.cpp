@@ -5,6 +5,8 @@
 
 #include "bench/meter.h"
 #include "bench/simulated_host.h"
+#include "cimserver/broker/objects.h"
+#include "cimserver/operations/provider_call.h"
 #include "sim/hxasim.h"
 
 #include <benchmark/benchmark.h>
@@ -36,11 +38,15 @@ std::string host_of_luns(std::int64_t luns)
 
 using Host_Text = std::string (*)(std::int64_t size);
 using Instances = std::vector<cimserver::Instance>;
-using Work = Instances (*)(cimserver::Operations&, const cimserver::Object_Path&);
+
+Instances all_of(cimserver::Operations& operations, const std::string& class_name)
+{
+    return operations.enumerate_instances(class_name, true, std::nullopt);
+}
 
 Instances enumerate(cimserver::Operations& operations, const cimserver::Object_Path& path)
 {
-    return operations.enumerate_instances(path.class_name, true, std::nullopt);
+    return all_of(operations, path.class_name);
 }
 
 Instances get(cimserver::Operations& operations, const cimserver::Object_Path& path)
@@ -48,21 +54,52 @@ Instances get(cimserver::Operations& operations, const cimserver::Object_Path& p
     return {operations.get_instance(path, std::nullopt)};
 }
 
-// The work is done with the path of the instance in the middle.
-void measure(benchmark::State& state, const std::string& name, const std::string& class_name, Host_Text host_text, Work work)
+// What is measured: an operation of the server, and the provider's function behind it.
+struct Work
+{
+    Instances (*ask)(cimserver::Operations&, const cimserver::Object_Path&);
+    decltype(&CMPIInstanceMIFT::getInstance) function;
+    bool of_one; // with the path of an instance
+};
+
+constexpr Work enumeration = {enumerate, &CMPIInstanceMIFT::enumerateInstances, false};
+constexpr Work one_by_path = {get, &CMPIInstanceMIFT::getInstance, true};
+
+// A server that keeps nothing of what it is given.
+class Passing_Sink : public cimserver::Result_Sink
+{
+    void take_instance(const cimserver::Instance_Object&) override {}
+};
+
+// The peak of what the module and the broker's objects take, without an answer that a server collects.
+std::size_t module_peak(cimserver::Module& module, const cimserver::Object_Path& path, const Work& work)
+{
+    const cimserver::Class_Entry& provider = *module.repository().find(path.class_name);
+    CMPIInstanceMI* mi = module.instance_mi(provider);
+    Passing_Sink sink;
+    const bench::Memory_Meter meter;
+    cimserver::Provider_Call(module, provider, "", path, sink).run(mi, mi->ft->*work.function, nullptr);
+    return meter.peak();
+}
+
+// The one instance is that in the middle.
+void measure(benchmark::State& state, const std::string& name, const std::string& class_name, Host_Text host_text,
+             const Work& work)
 {
     bench::Simulated_Host host(host_text(state.range(0)));
-    const Instances all = enumerate(host.operations(), {.class_name = class_name}); // the first request makes the provider
-    const cimserver::Object_Path path = all.at(all.size() / 2).path;
-    work(host.operations(), path);
+    const Instances all = all_of(host.operations(), class_name); // the first request makes the provider
+    cimserver::Object_Path path = all.at(all.size() / 2).path;
+    if (!work.of_one)
+        path.keys.clear();
+    work.ask(host.operations(), path);
 
     const auto before = hxasim::request_count();
     std::size_t instances = 0;
-    bench::Memory memory{};
+    std::size_t peak = 0;
     {
         const bench::Memory_Meter meter;
-        const Instances answer = work(host.operations(), path);
-        memory = meter.memory();
+        const Instances answer = work.ask(host.operations(), path);
+        peak = meter.peak();
         instances = answer.size();
     }
     const auto requests = hxasim::request_count() - before;
@@ -70,24 +107,25 @@ void measure(benchmark::State& state, const std::string& name, const std::string
     for (auto _ : state)
     {
         const bench::Counted counted;
-        work(host.operations(), path);
+        work.ask(host.operations(), path);
     }
-    CALLGRIND_DUMP_STATS_AT((name + "/" + std::to_string(state.range(0))).c_str());
+    const std::string whole_name = name + "/" + std::to_string(state.range(0));
+    CALLGRIND_DUMP_STATS_AT(whole_name.c_str());
 
     const auto per_instance = [&](auto total) { return static_cast<double>(total) / static_cast<double>(instances); };
     state.counters["instances"] = static_cast<double>(instances);
     state.counters["requests"] = static_cast<double>(requests);
     state.counters["requests/instance"] = per_instance(requests);
-    state.counters["peak/instance"] = per_instance(memory.peak);
-    state.counters["answer/instance"] = per_instance(memory.answer);
+    state.counters["peak/instance"] = per_instance(peak);
+    state.counters["module peak/instance"] = per_instance(module_peak(host.module(), path, work));
     state.counters["time/instance"] = benchmark::Counter(
         static_cast<double>(instances), benchmark::Counter::kIsIterationInvariantRate | benchmark::Counter::kInvert);
 }
 
-void add(const std::string& name, const std::string& class_name, Host_Text host_text, Work work,
+void add(const std::string& name, const std::string& class_name, Host_Text host_text, const Work& work,
          const std::vector<std::int64_t>& sizes)
 {
-    auto* added = benchmark::RegisterBenchmark(name.c_str(), [=](benchmark::State& state)
+    auto* added = benchmark::RegisterBenchmark(name.c_str(), [name, class_name, host_text, work](benchmark::State& state)
                                                { measure(state, name, class_name, host_text, work); });
     for (const std::int64_t size : sizes)
         added->Arg(size);
@@ -101,7 +139,7 @@ std::vector<std::string> classes_with_instances()
     for (const zmlr::Meta_Class* meta_class : host.operations().enumerate_classes("", true))
     {
         const std::string name = meta_class->name;
-        if (name.starts_with("ZEMLAR_") && !enumerate(host.operations(), {.class_name = name}).empty())
+        if (name.starts_with("ZEMLAR_") && !all_of(host.operations(), name).empty())
             classes.push_back(name);
     }
     return classes;
@@ -113,11 +151,11 @@ int main(int argc, char** argv)
 {
     const std::vector<std::string> classes = classes_with_instances();
     for (const std::string& name : classes)
-        add("enumerate/" + name, name, host_of_adapters, enumerate, {1, 4, 16, 64});
+        add("enumerate/" + name, name, host_of_adapters, enumeration, {1, 4, 16, 64});
     for (const std::string& name : classes)
-        add("get/" + name, name, host_of_adapters, get, {1, 4, 16, 64});
-    add("enumerate_luns", "ZEMLAR_StorageExtent", host_of_luns, enumerate, {10, 1000, 10000});
-    add("get_lun", "ZEMLAR_StorageExtent", host_of_luns, get, {10, 1000, 10000});
+        add("get/" + name, name, host_of_adapters, one_by_path, {1, 4, 16, 64});
+    add("enumerate_luns", "ZEMLAR_StorageExtent", host_of_luns, enumeration, {10, 1000, 10000});
+    add("get_lun", "ZEMLAR_StorageExtent", host_of_luns, one_by_path, {10, 1000, 10000});
 
     benchmark::Initialize(&argc, argv);
     benchmark::RunSpecifiedBenchmarks();

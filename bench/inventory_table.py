@@ -58,9 +58,9 @@ class Figures:
         return [self.counts[f"{name}/{size}"] / self.rows[f"{name}/{size}"]["instances"] for size in sizes]
 
     def last(self, name, size):
-        """Microseconds, peak and answer in bytes: each per instance."""
+        """Microseconds, peaks in bytes: each per instance."""
         row = self.rows[f"{name}/{size}"]
-        return [row["real_time"] / row["instances"], row["peak/instance"], row["answer/instance"]]
+        return [row["real_time"] / row["instances"], row["module peak/instance"], row["peak/instance"]]
 
 
 def class_rows(figures, kind, requests):
@@ -87,7 +87,7 @@ def lun_rows(figures):
 def main():
     figures = Figures(sys.argv[1], f"--benchmark_filter={sys.argv[2] if len(sys.argv) > 2 else '.'}")
     counts = [f"instructions at {adapters}" for adapters in ADAPTERS]
-    ends = ["µs", "peak bytes", "of them answer"]
+    ends = ["µs", "peak bytes", "with the server's answer"]
     head = ["class", "instances", "requests", *counts, "spread 4 to 64", *ends]
     print_table("All instances; each figure per instance", head, class_rows(figures, "enumerate", "requests/instance"))
     print_table("One instance by its path", head, class_rows(figures, "get", "requests"))

@@ -34,11 +34,7 @@ Memory_Meter::Memory_Meter() { state = {.watches_memory = true}; }
 
 Memory_Meter::~Memory_Meter() { state = {}; }
 
-Memory Memory_Meter::memory() const
-{
-    return {.peak = static_cast<std::size_t>(state.peak),
-            .answer = static_cast<std::size_t>(state.in_use > 0 ? state.in_use : 0)};
-}
+std::size_t Memory_Meter::peak() const { return static_cast<std::size_t>(state.peak); }
 
 Counted::Counted()
 {
@@ -80,7 +76,7 @@ void operator delete(void* block) noexcept
 void operator delete(void* block, std::size_t) noexcept { operator delete(block); }
 
 // Stands before the simulator's: the meters rest while the driver answers.
-extern "C" int ioctl(int descriptor, unsigned long request, ...) noexcept
+extern "C" [[gnu::visibility("default")]] int ioctl(int descriptor, unsigned long request, ...) noexcept
 {
     static const auto driver = reinterpret_cast<int (*)(int, unsigned long, ...)>(dlsym(RTLD_NEXT, "ioctl"));
     va_list arguments;

@@ -9,13 +9,6 @@
 namespace bench
 {
 
-// Bytes of the heap above what was in use before the work, the allocator's own included.
-struct Memory
-{
-    std::size_t peak;
-    std::size_t answer; // still in use when the work was done
-};
-
 // Watches the allocations of this thread from its making on. One at a time.
 class Memory_Meter
 {
@@ -25,7 +18,8 @@ public:
     Memory_Meter(const Memory_Meter&) = delete;
     Memory_Meter& operator=(const Memory_Meter&) = delete;
 
-    Memory memory() const;
+    // The most that was in use of the heap, in bytes beyond what was before; the allocator's own included.
+    std::size_t peak() const;
 };
 
 // Callgrind (with --collect-atstart=no) counts this thread's instructions while one lives.

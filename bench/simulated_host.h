@@ -22,6 +22,7 @@ class Simulated_Host
 public:
     explicit Simulated_Host(const std::string& scenario);
 
+    cimserver::Module& module() { return *_module; }
     cimserver::Operations& operations() { return _name_spaces->at("root/zemlar", ""); }
 
 private:
