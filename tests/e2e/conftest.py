@@ -2,6 +2,7 @@
 
 import json
 import os
+import re
 import socket
 import subprocess
 import sys
@@ -31,6 +32,10 @@ def post(port, body=REQUEST, headers="", tls=None):
         with connection:
             connection.sendall(head.encode() + body)
             return b"".join(iter(lambda: connection.recv(65536), b""))
+
+
+def without_id(message):
+    return re.sub(r'MESSAGE ID="\d+"', 'MESSAGE ID=""', message)
 
 
 def wait_until(condition):

@@ -8,15 +8,7 @@ from conftest import code_of
 from pywbem import CIMInstance, CIMInstanceName
 
 INTEROP = "root/PG_InterOp"
-OWN = {
-    "CIM_ManagedElement",
-    "CIM_ObjectManager",
-    "CIM_Namespace",
-    "CIM_IndicationFilter",
-    "CIM_ListenerDestination",
-    "CIM_ListenerDestinationCIMXML",
-    "CIM_IndicationSubscription",
-}
+OWN = {"CIM_ManagedElement", "CIM_ObjectManager", "CIM_Namespace", "CIM_IndicationFilter", "CIM_IndicationSubscription"}
 
 
 @pytest.fixture(scope="module")
