@@ -10,6 +10,15 @@ using namespace sample;
 namespace
 {
 
+TEST(Meta, finds_only_what_is_of_the_kind)
+{
+    EXPECT_EQ(1U << flag_name_to_index("EmbeddedInstance"), uint32{Flag_EmbeddedInstance});
+    EXPECT_EQ(flag_name_to_index("Keys"), 0xFFFFFFFF);
+    EXPECT_EQ(find_property(&Sample_Disk::static_meta_class, "Reset"), nullptr);
+    EXPECT_EQ(find_parameter(&Sample_Element_Reset_method::static_meta_class, "Peer", Flag_Property), nullptr);
+    EXPECT_FALSE(has_feature(&Sample_Link::static_meta_class, Flag_Method));
+}
+
 TEST(Meta, every_class_descends_from_the_root)
 {
     const Meta_Class* const element_class = &Sample_Element::static_meta_class;
