@@ -1,4 +1,5 @@
 #include "tests/hxal/boot_files.h"
+#include "tests/hxal/golden.h"
 #include "tests/hxal/library_fixture.h"
 #include "tests/support/temporary_folder.h"
 
@@ -28,12 +29,7 @@ const Bytes firmware = []
 const Bytes configuration = bytes_of("configuration");
 const Bytes overlay = bytes_of("12345678");
 
-const std::string description = "# boot code\n"
-                                "IMAGE 1\nTYPE = Option ROM\nID = 13, 17\n"
-                                "IMAGE 2\nTYPE=\tF\nID=13,\t17 , 21\n"
-                                "IMAGE 3\nPORT = 0,1\nTYPE = C\nID = 13\n"
-                                "IMAGE 4\nID = 13\nTYPE = L\n"
-                                "IMAGE 5\nTYPE = X\nID = 13\n";
+const std::string description = golden("boot.txt");
 
 Archive archive_of(const std::string& text, const Bytes& firmware_image = firmware)
 {
@@ -244,17 +240,7 @@ TEST_F(Boot_Update, of_every_card_tells_how_it_goes)
     fail("IOCMD_IOC_GET_ATTR", ENXIO);
     EXPECT_EQ(hxal_boot_fwupdate(nullptr, "archive", 0), HXA_STATUS_ENXIO);
     std::fflush(stdout);
-    EXPECT_EQ(testing::internal::GetCapturedStdout(), "found 2 adapters, uploading boot code...\n"
-                                                      "updating boot code for adapter id 1\n"
-                                                      "updated boot code for adapter id 1\n"
-                                                      "updating boot code for adapter id 2\n"
-                                                      "updated boot code for 1 out of 2 adapters\n"
-                                                      "found 2 adapters, uploading boot code...\n"
-                                                      "updating boot code for adapter id 1\n"
-                                                      "boot code update failed for adapter id 1, exiting...\n"
-                                                      "updated boot code for 0 out of 2 adapters\n"
-                                                      "found 2 adapters, uploading boot code...\n"
-                                                      "IOCTL ERR  IOCMD_IOC_GET_ATTR   No such device or address\n");
+    EXPECT_EQ(testing::internal::GetCapturedStdout(), golden("boot_progress.txt"));
 }
 
 TEST(BootDescription, is_read_line_by_line_or_refused)

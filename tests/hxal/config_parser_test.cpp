@@ -1,6 +1,8 @@
 // What a line, and a whole file, does to the model.
 #include "config_fixture.h"
+#include "tests/hxal/golden.h"
 
+#include <sstream>
 #include <sys/stat.h>
 #include <thread>
 
@@ -11,40 +13,23 @@ using testing::ElementsAre;
 using testing::IsEmpty;
 using Config_Parser = Config_Model;
 
-// What the writer makes of a line of an instance, where that is more than the line itself; null: the setting is absent.
 TEST_F(Config_Parser, takes_values_in_every_form_and_drops_those_that_are_none)
 {
-    const std::pair<const char*, const char*> rows[] = {
-        {"hxn3-port-mac=00:05:1e:20:00:00", "hxn3-port-mac = \"00:05:1e:20:00:00\";"},
-        {"hxa3-port-name = \t\"uplink A\" ;", "hxa3-port-name = \"uplink A\";"},
-        {"hxa3-port-speed = fast", "hxa3-port-speed = 0;"},
-        {"hxa3 -port-speed = 8", "hxa0-port-speed = 8;"},
-        {"hxa3-port-topology = ring", nullptr},
-        {"hxa3-port-hardalpa = 1F;", "hxa3-port-hardalpa = 0x1f;"},
-        {"hxa3-port-hardalpa = 0x100;", "hxa3-port-hardalpa = 0x0;"},
-        {"hxa3-port-maxfrsize = 65535;", "hxa3-port-maxfrsize = 65535;"},
-        {"hxa3-port-maxfrsize = 65536;", "hxa3-port-maxfrsize = 0;"},
-        {"hxa3-port-trunk = 0, 1", "hxa3-port-trunk = 0, 1;"},
-        {"hxa3-port-trunk = ;", "hxa3-port-trunk = "},
-        {"hxa3-port-enable = false", nullptr},
-        {"hxa3-log-level = None", nullptr},
-        {"hxa3-vf-list = 15,1, 16", "hxa3-vf-list = 1, 15;"},
-        {"hxa3-vport-7 = pw, nw, sym, role, 9", "hxa3-vport-7 = \"pw,nw,sym,role,9\";"},
-        {"hxa3-vport = pw,,,role", "hxa3-vport-0 = \"pw,,,role,0\";"},
-        {"hxa3-vport-7 = ,nw,sym,role,9", nullptr},
-    };
-    for (const auto& [line, line_written] : rows)
+    std::istringstream rows(golden("config_lines.txt"));
+    for (std::string line, written_line; std::getline(rows, line) && std::getline(rows, written_line);)
     {
         empty_model();
-        hxal_config_parse(line);
-        EXPECT_EQ(settings(), line_written ? std::vector<std::string>{line_written} : std::vector<std::string>{}) << line;
+        hxal_config_parse(line.c_str());
+        EXPECT_EQ(settings(), written_line == "-" ? std::vector<std::string>() : std::vector{written_line}) << line;
     }
 }
 
 TEST_F(Config_Parser, stores_values_as_numbers)
 {
     parse({"hxa3-port-topology = auto", "hxa3-log-level = Info", "hxa3-auth-algo = ms", "hxa3-auth-secretsource = RADIUS",
-           "hxa3-qos = TRUE", "hxa3-qos = maybe"});
+           "hxa3-qos = TRUE", "hxa3-qos = maybe", "msix-disable = 11;", "pcie-max-read-reqsz = 12;"});
+    EXPECT_EQ(hxal_config_get()->tuning.msix_disable, 11);
+    EXPECT_EQ(hxal_config_get()->tuning.pcie_max_read_reqsz, 12);
     EXPECT_FALSE(has(ioc(3).flags, HXAL_CONFIG_QOS)) << "a later word that is none";
     EXPECT_EQ(ioc(3).topology, uint32_t{HXA_PPORT_TOPOLOGY_AUTO});
     EXPECT_EQ(ioc(3).log, HXA_LOG_INFO);
@@ -54,12 +39,10 @@ TEST_F(Config_Parser, stores_values_as_numbers)
 
 TEST_F(Config_Parser, ignores_what_does_not_fit)
 {
-    // clang-format off
-    parse({"", " ", "=", "-", "hxa", "hxa-", "hxa3-port-speed", "hxa3-=8", "hxa3-port-speeds = 8", "hxa128-port-speed = 8",
-           "hxa200-port-name = x;", "hxa2147483648-port-speed = 8", "hxa4294967296-port-speed = 8", "hxn3-port-speed = 8",
-           "hxn3-vport-1 = a,b,c,d,1", "hxa3-port-mac = 00:05", "port-mac = 00:05", "vport-1 = a,b,c,d,1",
-           "adapter-SN1", "adapter = x", "name = x", "num-ioses = 5", nullptr});
-    // clang-format on
+    std::istringstream lines(golden("no_config_lines.txt"));
+    for (std::string line; std::getline(lines, line);)
+        hxal_config_parse(line.c_str());
+    hxal_config_parse(nullptr);
     EXPECT_THAT(settings(), IsEmpty());
     EXPECT_EQ(hxal_config_ad_get_num() + hxal_config_ioc_get_num(), 0);
 }
@@ -119,14 +102,6 @@ TEST_F(Config_Parser, gives_a_key_without_instance_to_the_entries_so_far)
     EXPECT_FALSE(has(ioc(0).flags, HXAL_CONFIG_PORT_TOPOLOGY));
     EXPECT_STREQ(ioc(1).name, "x");
     EXPECT_STREQ(ioc(1).ethname, "");
-}
-
-TEST_F(Config_Parser, reads_the_tuning_numbers)
-{
-    parse({"msix-disable = 11;", "pcie-max-read-reqsz = 12;"});
-    EXPECT_EQ(hxal_config_get()->tuning.msix_disable, 11);
-    EXPECT_EQ(hxal_config_get()->tuning.pcie_max_read_reqsz, 12);
-    EXPECT_THAT(settings(), IsEmpty());
 }
 
 TEST_F(Config_Parser, keeps_virtual_ports_by_their_wwn)

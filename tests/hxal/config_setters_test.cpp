@@ -120,14 +120,12 @@ TEST_F(Config_Setters, keep_a_value_that_is_no_default)
 
 TEST_F(Config_Setters, keep_moderation_that_differs_from_the_drivers_defaults)
 {
-    struct Row
+    const struct
     {
         hxa_boolean_t coalesce;
-        uint16_t delay;
-        uint16_t latency;
+        uint16_t delay, latency;
         Lines lines;
-    };
-    const Row rows[] = {
+    } rows[] = {
         {HXA_TRUE, 1125, 225, {}},
         {HXA_TRUE, 1125, 224, {"hxa0-delay = 1125;", "hxa0-latency = 224;"}},
         {HXA_TRUE, 0, 0, {"hxa0-delay = 0;", "hxa0-latency = 0;"}},
@@ -138,7 +136,7 @@ TEST_F(Config_Setters, keep_moderation_that_differs_from_the_drivers_defaults)
         {HXA_FALSE, 1125, 225, {"hxa0-coalesce = \"off\";"}},
         {HXA_TRUE, 1125, 225, {}},
     };
-    for (const Row& row : rows)
+    for (const auto& row : rows)
     {
         hxal_config_iocfc_intr(&fc[0], row.coalesce, row.delay, row.latency);
         EXPECT_EQ(lines(), row.lines) << &row - rows;

@@ -1,16 +1,15 @@
 // The file as it is written, whole.
 #include "config_fixture.h"
+#include "tests/hxal/golden.h"
+
+#include <numeric>
 
 namespace
 {
 
 using testing::ElementsAre;
 
-class Config_Writer : public Config_Model
-{
-protected:
-    static std::string golden(const std::string& name) { return content(std::string(CONFIG_FILES) + "/" + name); }
-};
+using Config_Writer = Config_Model;
 
 TEST_F(Config_Writer, writes_what_nobody_has_each_instance_has_and_all_instances_have)
 {
@@ -34,28 +33,13 @@ TEST_F(Config_Writer, writes_per_instance_what_has_no_line_for_all)
 
 TEST_F(Config_Writer, writes_a_value_for_all_that_reached_no_entry_as_it_was_read)
 {
-    const std::vector<std::string> lines = {
-        "power = 2;",
-        "port-name = \"x\";",
-        "port-topology = \"ring\";",
-        "port-hardalpa = 0x1f;",
-        "port-trunk = 0, 3;",
-        "port-enable = \"TRUE\";",
-        "hxa1-port-enable = \"FALSE\";",
-        "log-level = \"None\";",
-        "vf-enable = \"TRUE\"",
-        "auth-algo = \"sha1\";",
-        "auth-secretsource = \"LOCAL\";",
-        "auth-encrypt = \"1,2\";",
-        "pathtov = 30;",
-        "persistent-binding = \"TRUE\";",
-        "coalesce = \"off\";",
-    };
     for (int again = 0; again < 2; ++again)
     {
-        for (const std::string& line : lines)
-            hxal_config_parse(line.c_str());
-        EXPECT_EQ(settings(), lines);
+        load(golden("config_for_all.txt"));
+        const std::vector<std::string> lines = settings();
+        EXPECT_EQ(
+            std::accumulate(lines.begin(), lines.end(), std::string(), [](auto text, auto line) { return text + line + "\n"; }),
+            golden("config_for_all.txt"));
         hxal_config_ioc_add(1); // as a scan does
         hxal_config_ad_add("SN1");
         std::vector<std::string> after = settings();

@@ -92,20 +92,18 @@ TEST_F(Control, of_an_ioc_waits_a_second_before_each_look_at_its_state)
 
 TEST_F(Control, of_an_adapter_reaches_every_ioc_port_by_port)
 {
+    const auto each_ioc = [](const std::string& command)
+    { return ElementsAre(command + " /dev/hxa 0", command + " /dev/hxn 0", command + " /dev/hxa 1", command + " /dev/hxn 1"); };
     plug_cna();
     EXPECT_EQ(hxal_adapter_disable(1), HXA_STATUS_OK);
-    EXPECT_THAT(changes(), ElementsAre("IOCMD_IOC_DISABLE /dev/hxa 0", "IOCMD_IOC_DISABLE /dev/hxn 0",
-                                       "IOCMD_IOC_DISABLE /dev/hxa 1", "IOCMD_IOC_DISABLE /dev/hxn 1"));
+    EXPECT_THAT(changes(), each_ioc("IOCMD_IOC_DISABLE"));
     EXPECT_EQ(hxal_adapter_is_disabled(1), HXA_TRUE);
     EXPECT_EQ(hxal_adapter_disable(1), HXA_STATUS_IOC_DISABLED);
     hxasim::take_requests();
-
     EXPECT_EQ(hxal_adapter_enable(1), HXA_STATUS_OK);
-    EXPECT_THAT(changes(), ElementsAre("IOCMD_IOC_ENABLE /dev/hxa 0", "IOCMD_IOC_ENABLE /dev/hxn 0",
-                                       "IOCMD_IOC_ENABLE /dev/hxa 1", "IOCMD_IOC_ENABLE /dev/hxn 1"));
+    EXPECT_THAT(changes(), each_ioc("IOCMD_IOC_ENABLE"));
     EXPECT_EQ(hxal_adapter_is_enabled(1), HXA_TRUE);
     hxasim::take_requests();
-
     EXPECT_EQ(hxal_adapter_enable(1), HXA_STATUS_AD_IS_ENABLE);
     EXPECT_THAT(commands(), ElementsAre("IOCMD_IOC_GET_ATTR", "IOCMD_IOC_GET_ATTR", "IOCMD_IOC_GET_ATTR", "IOCMD_IOC_GET_ATTR"));
     for (int ad : {-1, 0, 2})

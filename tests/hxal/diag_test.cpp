@@ -48,14 +48,8 @@ TEST_F(Diagnostics, that_no_driver_offers_are_refused_without_a_request)
 
 TEST_F(Diagnostics, turn_the_beacon_only_when_it_changes)
 {
-    struct Case
-    {
-        const char* port;
-        hxa_boolean_t beacon;
-        hxa_status_t status;
-    };
     // clang-format off
-    const Case cases[] = {
+    const std::tuple<const char*, hxa_boolean_t, hxa_status_t> cases[] = {
         {R"()",                                      HXA_TRUE,  HXA_STATUS_OK},
         {R"("beacon": true)",                        HXA_TRUE,  HXA_STATUS_BEACON_ON},
         {R"("link_beacon": true)",                   HXA_TRUE,  HXA_STATUS_LBEACON_ON},

@@ -5,6 +5,8 @@
 namespace
 {
 
+using testing::ElementsAre;
+
 // Indexes: 0 FC (one-port HBA), 1 and 2 FCoE, 3 and 4 Ethernet.
 class Ioc : public Library_Test
 {
@@ -22,42 +24,37 @@ protected:
 
 TEST_F(Ioc, is_found_by_index_address_name_path_and_instance)
 {
-    EXPECT_EQ(id(hxal_ioc_open_idx(4)), 4);
-    EXPECT_EQ(id(hxal_ioc_open_pwwn(port_wwn(1, 1))), 2);
-    EXPECT_EQ(id(hxal_ioc_open_name("blue")), 1);
-    EXPECT_EQ(id(hxal_ioc_open_hwpath("0000:02:00.3")), 4);
-    EXPECT_EQ(id(hxal_ioc_get_by_eth_name("eth1")), 4);
-    EXPECT_EQ(id(hxal_ioc_get_by_inst(1)), 1);
-
-    EXPECT_EQ(hxal_ioc_get_idx_by_pwwn(port_wwn(0, 0)), 0);
-    EXPECT_EQ(hxal_ioc_get_idx_by_mac(fcoe_mac(1, 1)), 2);
-    EXPECT_EQ(hxal_ioc_get_idx_by_mac(eth_mac(1, 0)), 3);
-    EXPECT_EQ(hxal_ioc_get_fc_idx_by_name("r0"), 0);
-    EXPECT_EQ(hxal_ioc_get_fc_idx_by_name("b1"), 2);
-    EXPECT_EQ(hxal_ioc_get_eth_idx_by_name("b1"), 4);
-    EXPECT_EQ(hxal_ioc_get_idx_by_name("b1", HXA_IOC_TYPE_FCoE), 2);
-    EXPECT_EQ(hxal_ioc_get_fc_idx_by_hwpath("0000:02:00.0"), 1);
-    EXPECT_EQ(hxal_ioc_get_eth_idx_by_hwpath("0000:02:00.2"), 3);
-
-    EXPECT_EQ(hxal_ioc_get_inst_num_by_pwwn(port_wwn(1, 1)), 2);
-    EXPECT_EQ(hxal_ioc_get_inst_num_by_mac(eth_mac(1, 1)), 1);
+    const int handles[] = {id(hxal_ioc_open_idx(4)),
+                           id(hxal_ioc_open_pwwn(port_wwn(1, 1))),
+                           id(hxal_ioc_open_name("blue")),
+                           id(hxal_ioc_open_hwpath("0000:02:00.3")),
+                           id(hxal_ioc_get_by_eth_name("eth1")),
+                           id(hxal_ioc_get_by_inst(1))};
+    EXPECT_THAT(handles, ElementsAre(4, 2, 1, 4, 4, 1));
+    const int by_address[] = {hxal_ioc_get_idx_by_pwwn(port_wwn(0, 0)), hxal_ioc_get_idx_by_mac(fcoe_mac(1, 1)),
+                              hxal_ioc_get_idx_by_mac(eth_mac(1, 0)), hxal_ioc_get_inst_num_by_pwwn(port_wwn(1, 1)),
+                              hxal_ioc_get_inst_num_by_mac(eth_mac(1, 1))};
+    EXPECT_THAT(by_address, ElementsAre(0, 2, 3, 2, 1));
+    const int by_text[] = {hxal_ioc_get_fc_idx_by_name("r0"),
+                           hxal_ioc_get_fc_idx_by_name("b1"),
+                           hxal_ioc_get_eth_idx_by_name("b1"),
+                           hxal_ioc_get_idx_by_name("b1", HXA_IOC_TYPE_FCoE),
+                           hxal_ioc_get_fc_idx_by_hwpath("0000:02:00.0"),
+                           hxal_ioc_get_eth_idx_by_hwpath("0000:02:00.2")};
+    EXPECT_THAT(by_text, ElementsAre(0, 2, 4, 2, 1, 3));
 }
 
 TEST_F(Ioc, is_not_found_by_what_nobody_or_another_kind_has)
 {
-    const hxal_t* const handles[] = {hxal_ioc_open_idx(-1),
-                                     hxal_ioc_open_idx(5),
-                                     hxal_ioc_open_idx(INT_MAX),
-                                     hxal_ioc_open_name("Blue"),
-                                     hxal_ioc_open_name(nullptr),
-                                     hxal_ioc_open_hwpath(nullptr),
-                                     hxal_ioc_get_by_inst(3),
-                                     hxal_ioc_open_pwwn(0), // the Ethernet IOCs' own
-                                     hxal_ioc_get_by_eth_name(nullptr)};
+    const hxal_t* const handles[] = {hxal_ioc_open_idx(-1),       hxal_ioc_open_idx(5),
+                                     hxal_ioc_open_idx(INT_MAX),  hxal_ioc_open_name("Blue"),
+                                     hxal_ioc_open_name(nullptr), hxal_ioc_open_hwpath(nullptr),
+                                     hxal_ioc_get_by_inst(3),     hxal_ioc_get_by_eth_name(nullptr)};
     EXPECT_THAT(handles, testing::Each(nullptr));
+    EXPECT_EQ(hxal_ioc_open_pwwn(0), nullptr) << "the Ethernet IOCs' own";
+    EXPECT_EQ(hxal_ioc_get_idx_by_mac(mac_t{}), -1) << "the FC IOC's own";
     const int numbers[] = {hxal_ioc_get_idx_by_pwwn(node_wwn(1, 1)),
                            hxal_ioc_get_idx_by_mac(mac_t{{1}}),
-                           hxal_ioc_get_idx_by_mac(mac_t{}), // the FC IOC's own
                            hxal_ioc_get_idx_by_name("r0", HXA_IOC_TYPE_FCoE),
                            hxal_ioc_get_eth_idx_by_name("r0"),
                            hxal_ioc_get_fc_idx_by_name(nullptr),
