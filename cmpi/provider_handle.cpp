@@ -136,7 +136,7 @@ Get_Instance_Status Provider_Handle::get_instance(const Instance* model, Ref<Ins
         return status;
     }
 
-    Key_Search search{model, {}};
+    Key_Search search{.model = model, .found = {}};
     if (enum_instances(model, keep_first_match, &search) != ENUM_INSTANCES_OK || !search.found)
         return GET_INSTANCE_NOT_FOUND;
     found = std::move(search.found);
@@ -205,7 +205,13 @@ Enum_Associator_Names_Status Provider_Handle::enum_associator_names(const Instan
 
     const Ref<Instance> model(create(meta_class, false));
     nullify_non_keys(model.ptr());
-    Associator_Names_Args args{instance, result_class, role, result_role, proc, client_data, {}};
+    Associator_Names_Args args{.instance = instance,
+                               .result_class = result_class,
+                               .role = role,
+                               .result_role = result_role,
+                               .proc = proc,
+                               .client_data = client_data,
+                               .far_ends = {}};
     const auto status = enum_instances(model.ptr(), pass_on_far_ends, &args);
     proc(nullptr, ENUM_ASSOCIATOR_NAMES_OK, client_data);
 

@@ -65,7 +65,8 @@ int CMPI_Thread_Context::instance_enumerator_create(const char* name_space, cons
     CMPI_Ptr<CMPIEnumeration> found(CBEnumInstances(_cmpi_broker, _cmpi_context, outgoing.path.get(), nullptr, &status));
     if (!found || !okay(status))
         return -1;
-    std::unique_ptr<Instance_Enumerator_Rep> made(new Instance_Enumerator_Rep{std::move(found), model->meta_class, {}});
+    std::unique_ptr<Instance_Enumerator_Rep> made(
+        new Instance_Enumerator_Rep{.cmpi_enumeration = std::move(found), .meta_class = model->meta_class, .instance = {}});
     instance_enumerator_next(made.get());
     rep = made.release();
     return 0;

@@ -207,21 +207,6 @@ TEST(Log, stays_off_when_something_else_has_the_name_of_a_file)
     }
 }
 
-TEST(Log, level_and_directory_can_be_set_by_code)
-{
-    const Home home;
-    home.options("LOG_LEVEL=ERR\n");
-    ASSERT_TRUE(home.run(
-        [&]
-        {
-            open_log(".cimple");
-            if (log_set_level("loud") != -1 || log_set_level("Info") != 0)
-                std::abort();
-            log_one_of_each();
-        }));
-    EXPECT_EQ(home.lines().size(), 4U);
-}
-
 void store_what_does_not_fit()
 {
     const auto to = linked(element("a"), disk("d"));
@@ -240,7 +225,8 @@ TEST(Log, warnings_name_class_and_feature)
         []
         {
             store_what_does_not_fit();
-            if (log_enable(true) != -1 || log_enable(false) != 0 || log_enable(false) != -1)
+            if (log_set_level("loud") != -1 || log_set_level("Warn") != 0 || log_enable(true) != -1 || log_enable(false) != 0 ||
+                log_enable(false) != -1)
                 std::abort();
             store_what_does_not_fit();
             log(LL_WARN, "Other", 1, "still written");
