@@ -130,6 +130,23 @@ TEST_F(Aen_Thread, starts_none_for_an_application_without_events)
     EXPECT_TRUE(settles_at(before));
 }
 
+TEST_F(Aen_Thread, can_be_stopped_and_kept_by_a_callback)
+{
+    Listener listener(heard, "it");
+    listener.listen(HXA_AEN_CAT_IOC, fc);
+    listener.then = []
+    {
+        hxal_aen_exit();
+        EXPECT_EQ(hxal_aen_init(), HXA_STATUS_OK);
+    };
+    hxal_aen_init();
+    for (const uint32_t event : {1u, 2u})
+    {
+        raise(0, event);
+        EXPECT_THAT(heard.take(1), ElementsAre("it " + std::to_string(event)));
+    }
+}
+
 TEST_F(Aen_Thread, loses_no_event_when_callbacks_and_others_stop_and_start_it_at_once)
 {
     Listener listener(heard, "it");

@@ -121,6 +121,13 @@ TEST_F(Scan, of_a_failing_node_adds_nothing_while_the_other_node_serves)
         }
 }
 
+TEST_F(Scan, without_any_driver_leaves_the_later_node_s_error)
+{
+    EXPECT_EQ(scan(R"({"drivers": {"hxa": {"present": false}, "hxn": {"version_status": 70}}})"), 0);
+    EXPECT_EQ(hxal_get_last_error(), HXA_STATUS_VERSION_FAIL);
+    EXPECT_EQ(hxal_ioc_get_inst_num(), -1);
+}
+
 TEST_F(Scan, warns_of_another_driver_version_and_goes_on)
 {
     host(R"({"adapters": [{"kind": "cna"}], "drivers": {"hxa": {"version": 4129}}})");
