@@ -45,6 +45,7 @@ TEST_F(Method_Requests, carry_parameters_of_every_kind_there_and_back)
                {"Texts", {CMPI_string | CMPI_ARRAY, std::vector<cimserver::Value>{text}}},
                {"Partner", reference("tst_disk", "partner")}, // declared on the superclass
                {"Others", {CMPI_ref | CMPI_ARRAY, std::vector<cimserver::Value>{reference("TST_Thing", "other")}}},
+               {"Detail", embedded("detail")},
                {"Details", {CMPI_instance | CMPI_ARRAY, std::vector<cimserver::Value>{embedded("detail")}}},
                {"Count", {CMPI_sint64, std::int64_t{-5}}},
                {"Answer", text}}; // no input: ignored
@@ -58,6 +59,8 @@ TEST_F(Method_Requests, carry_parameters_of_every_kind_there_and_back)
         EXPECT_EQ(p.Partner->__name_space, name_space) << "a reference's own name space is not the module's";
         ASSERT_EQ(p.Others.value.size(), 1U);
         EXPECT_EQ(cast<TST_Thing>(p.Others.value[0])->Name.value, "other");
+        ASSERT_TRUE(p.Detail);
+        EXPECT_EQ(p.Detail->Uint8Value.value, 3) << "all of it, not only its keys";
         ASSERT_EQ(p.Details.value.size(), 1U);
         EXPECT_EQ(cast<TST_Thing>(p.Details.value[0])->Uint8Value.value, 3);
         EXPECT_EQ(p.Details.value[0]->__name_space, name_space);
@@ -75,9 +78,10 @@ TEST_F(Method_Requests, carry_parameters_of_every_kind_there_and_back)
     EXPECT_EQ(std::get<std::string>(result.data[0].content), "done");
     EXPECT_EQ(result.done, 1);
 
-    ASSERT_THAT(out.args, SizeIs(4)) << "neither the return value nor null outputs are arguments";
+    ASSERT_THAT(out.args, SizeIs(5)) << "neither the return value nor null outputs are arguments";
     EXPECT_EQ(content<std::int64_t>(out.args, "Count"), -6);
     EXPECT_THAT(content<std::vector<cimserver::Value>>(out.args, "Numbers"), SizeIs(2));
+    EXPECT_EQ(value(out.args, "Detail").type, CMPI_instance);
     EXPECT_EQ(value(out.args, "Details").type, CMPI_instance | CMPI_ARRAY);
     EXPECT_EQ(name_in(path_in(out.args, "Found")), "found");
     EXPECT_EQ(path_in(out.args, "Found").name_space, name_space);
