@@ -37,8 +37,7 @@ void append_port(Instance_Array& instances, const Port_Reading& reading) { insta
 
 void append_target_endpoint(Instance_Array& instances, const Port_Reading& reading, wwn_t remote_port)
 {
-    const String remote_wwn = ProviderUtil::wwn_text(remote_port);
-    if (!reading.request.wanted.may_hold(remote_wwn.c_str()))
+    if (!reading.request.wanted.may_hold(remote_port))
         return;
 
     hxa_rport_attr_t attributes = {};
@@ -53,7 +52,8 @@ void append_target_endpoint(Instance_Array& instances, const Port_Reading& readi
         return;
 
     _hbaPortInfo endpoint = reading.info;
-    std::snprintf(endpoint.address, sizeof endpoint.address, "%s_%s", reading.info.port_wwn, remote_wwn.c_str());
+    std::snprintf(endpoint.address, sizeof endpoint.address, "%s_%s", reading.info.port_wwn,
+                  ProviderUtil::wwn_text(remote_port).c_str());
     instances.adopt(getSCSIProtocolEndpointInstance(endpoint, false));
 }
 

@@ -25,7 +25,7 @@ constexpr const char* log_source = "TargetHelper";
 
 constexpr std::size_t first_list_size = 816; // REPORT LUNS: room for 101 units
 constexpr std::size_t max_units = 65536;     // more than a target can have
-constexpr std::uint32_t sense_size = 18;
+constexpr std::uint32_t max_sense = 18;
 constexpr std::uint8_t identification_page = 0x83;
 constexpr std::uint8_t serial_page = 0x80;
 
@@ -51,8 +51,8 @@ std::optional<Data> inquire(const Nexus& nexus, lun_t lun, std::optional<std::ui
 {
     Data data{};
     auto size = static_cast<std::uint32_t>(data.size());
-    std::array<std::uint8_t, sense_size> sense{};
-    std::uint32_t sense_room = sense_size;
+    std::array<std::uint8_t, max_sense> sense{};
+    std::uint32_t sense_room = max_sense;
     std::uint8_t scsi_status = 0;
     const hxa_status_t status = TargetHelper::getTargetHelperObject().sendSCSIInquiry(
         nexus.ioc, nexus.port, nexus.remote_port, base_fabric, lun, page.has_value(), page.value_or(0), data.data(), &size,
@@ -74,8 +74,8 @@ std::unique_ptr<std::uint8_t[]> report_luns(const Nexus& nexus, std::size_t size
     }
 
     scsi_cdb_t cdb{};
-    std::array<std::uint8_t, sense_size> sense{};
-    std::uint32_t sense_room = sense_size;
+    std::array<std::uint8_t, max_sense> sense{};
+    std::uint32_t sense_room = max_sense;
     std::uint8_t scsi_status = 0;
     const hxa_status_t status =
         hxal_scsi_reportluns(nexus.ioc, base_fabric, nexus.port, nexus.remote_port, lun_t{0}, &cdb, 0, list.get(),
@@ -229,7 +229,7 @@ Instance_Array TargetHelper::getTargetInstances(const hxal_t* ioc, const _hbaPor
     {
         ZMLR_LOG(LL_INFO, "Loop for the rport index =   %d", index);
         nexus.remote_port = remote_port;
-        if (request.wanted.may_hold(ProviderUtil::wwn_text(remote_port).c_str()) && is_target_of_kind(nexus, id))
+        if (request.wanted.may_hold(remote_port) && is_target_of_kind(nexus, id))
             append_units(instances, nexus, index, port, id, request.wanted);
         index++;
     }

@@ -1,33 +1,17 @@
 #include "inventory/wanted.h"
 
-#include "inventory/address_text.h"
 #include "inventory/property_text.h"
 #include "runtime/ascii.h"
 
 #include <algorithm>
+#include <cstring>
+#include <span>
 
 namespace zmlr
 {
 
 namespace
 {
-
-void append_comparable(String& out, const char* text)
-{
-    for (; *text; text++)
-    {
-        if (*text != '-')
-            out.append(static_cast<char>(ascii::to_lower(*text)));
-    }
-}
-
-bool holds(const String& keys, const char* text, const char* end)
-{
-    String part;
-    append_comparable(part, text);
-    part.append(end);
-    return keys.find(part) != String::npos;
-}
 
 // A property's text; null when it has none.
 const String* text_of(const Instance* model, const Meta_Property* property)
@@ -37,28 +21,66 @@ const String* text_of(const Instance* model, const Meta_Property* property)
     return static_cast<const String*>(address_of(model, property->offset));
 }
 
-bool may_be_ioc(const Wanted& wanted, const hxal_t* ioc)
+int digit_of(char c)
 {
-    // An address of zeros is none, and stands in many keys.
-    const mac_t mac = hxal_ioc_get_mac(ioc);
-    if (std::ranges::any_of(mac.mac, [](auto byte) { return byte != 0; }) && wanted.may_hold(ProviderUtil::mac_text(mac).c_str()))
-        return true;
-    for (const wwn_t wwn : {hxal_ioc_get_pwwn(ioc), hxal_ioc_get_nwwn(ioc)})
+    const char lower = static_cast<char>(ascii::to_lower(c));
+    if (ascii::is_digit(c))
+        return c - '0';
+    return lower >= 'a' && lower <= 'f' ? lower - 'a' + 10 : -1;
+}
+
+// The digits in a key, hyphens left out; -1 for everything else.
+std::vector<int> digits_in(const String& key)
+{
+    std::vector<int> digits;
+    for (const char* c = key.c_str(); *c; c++)
     {
-        if (wwn != 0 && wanted.may_hold(ProviderUtil::wwn_text(wwn).c_str()))
-            return true;
+        if (*c != '-')
+            digits.push_back(digit_of(*c));
     }
-    const String interface_name = property_text(ioc->eth_name);
-    if (!interface_name.empty() && wanted.may_end_with(interface_name.c_str()))
-        return true;
-    return wanted.may_hold(property_text(ioc->serialnum).c_str());
+    return digits;
+}
+
+std::uint64_t as_number(const void* bytes, std::size_t size)
+{
+    std::uint64_t number = 0;
+    std::memcpy(&number, bytes, size);
+    return number;
+}
+
+// Appends every address of `size` bytes that stands in the digits.
+void append_addresses(std::vector<std::uint64_t>& addresses, std::span<const int> digits, std::size_t size)
+{
+    for (std::size_t i = 0; i + 2 * size <= digits.size(); i++)
+    {
+        const auto part = digits.subspan(i, 2 * size);
+        if (std::ranges::find(part, -1) != part.end())
+            continue;
+        unsigned char bytes[sizeof(std::uint64_t)] = {};
+        for (std::size_t byte = 0; byte < size; byte++)
+            bytes[byte] = static_cast<unsigned char>(part[2 * byte] << 4 | part[2 * byte + 1]);
+        addresses.push_back(as_number(bytes, sizeof bytes));
+    }
+}
+
+// An address of zeros is none, and stands in many keys.
+bool holds(const std::vector<std::uint64_t>& addresses, std::uint64_t address)
+{
+    return address != 0 && std::ranges::find(addresses, address) != addresses.end();
+}
+
+// True when a key is the text of the field, as a property would show it.
+template <std::size_t N> bool is_one_of(const std::vector<String>& keys, const char (&field)[N])
+{
+    const std::size_t size = ::strnlen(field, N);
+    return std::ranges::any_of(keys, [&](const String& key)
+                               { return size > 0 && key.size() == size && key.equali(property_text(field)); });
 }
 
 } // namespace
 
 Wanted::Wanted(const Instance* model)
 {
-    String keys;
     for (uint32 i = 0; i < model->meta_class->num_meta_features; i++)
     {
         const Meta_Feature* feature = model->meta_class->meta_features[i];
@@ -66,20 +88,41 @@ Wanted::Wanted(const Instance* model)
             continue;
         const String* key = text_of(model, as_property(feature));
         if (!key || key->empty())
+        {
+            *this = Wanted();
             return;
-        append_comparable(keys, key->c_str());
-        keys.append('\n');
+        }
+        const std::vector<int> digits = digits_in(*key);
+        append_addresses(_wwns, digits, sizeof(wwn_t));
+        append_addresses(_macs, digits, sizeof(mac_t));
+        _keys.push_back(*key);
     }
-    _keys = keys;
 }
 
-bool Wanted::may_hold(const char* text) const { return is_all() || (*text && holds(_keys, text, "")); }
+bool Wanted::may_hold(wwn_t wwn) const { return is_all() || holds(_wwns, wwn); }
 
-bool Wanted::may_end_with(const char* text) const { return is_all() || holds(_keys, text, "\n"); }
+bool Wanted::may_end_with(const char* text) const
+{
+    const std::size_t size = std::strlen(text);
+    return is_all() || std::ranges::any_of(_keys,
+                                           [&](const String& key)
+                                           {
+                                               const std::size_t begin = key.size() - std::min<std::size_t>(size, key.size());
+                                               return eqi(key.c_str() + begin, text);
+                                           });
+}
+
+bool Wanted::may_be_of_ioc(const hxal_t* ioc) const
+{
+    const mac_t mac = hxal_ioc_get_mac(ioc);
+    return holds(_wwns, hxal_ioc_get_pwwn(ioc)) || holds(_wwns, hxal_ioc_get_nwwn(ioc)) ||
+           holds(_macs, as_number(mac.mac, sizeof mac.mac)) || is_one_of(_keys, ioc->eth_name) ||
+           is_one_of(_keys, ioc->serialnum);
+}
 
 bool Wanted::may_be_of(const Open_Port& port) const
 {
-    return is_all() || (port.fc && may_be_ioc(*this, port.fc.get())) || (port.ethernet && may_be_ioc(*this, port.ethernet.get()));
+    return is_all() || (port.fc && may_be_of_ioc(port.fc.get())) || (port.ethernet && may_be_of_ioc(port.ethernet.get()));
 }
 
 } // namespace zmlr

@@ -6,6 +6,9 @@
 #include "runtime/instance.h"
 #include "runtime/string.h"
 
+#include <cstdint>
+#include <vector>
+
 namespace zmlr
 {
 
@@ -20,16 +23,20 @@ public:
 
     bool is_all() const { return _keys.empty(); }
 
-    // False when no key holds the text (which is not empty), ends with it. Case and hyphens do not count.
-    bool may_hold(const char* text) const;
+    // False when the WWN's digits stand in no key (hyphens between them do not count), when no key ends with the text.
+    bool may_hold(wwn_t wwn) const;
     bool may_end_with(const char* text) const;
 
-    // False when no key holds an address, the interface name or the card's serial number of the port, as the last scan found
-    // them.
+    // False when no key holds an address of the port and none is its interface's name or its card's serial number, as the last
+    // scan found them. Cheap: it is asked for every port that is passed over.
     bool may_be_of(const Open_Port& port) const;
 
 private:
-    String _keys; // in lower case, without hyphens, each with a line feed behind it
+    bool may_be_of_ioc(const hxal_t* ioc) const;
+
+    std::vector<String> _keys;
+    std::vector<std::uint64_t> _wwns; // all that the digits in the keys may be, in memory order
+    std::vector<std::uint64_t> _macs; // the same, 6 bytes each
 };
 
 } // namespace zmlr
