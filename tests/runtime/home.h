@@ -28,7 +28,7 @@ public:
     std::vector<std::string> lines() const;
 
 private:
-    const Temporary_Folder _folder;
+    const Temporary_Folder _folder{};
 };
 
 } // namespace sample
