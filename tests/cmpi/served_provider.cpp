@@ -50,7 +50,7 @@ public:
         setenv("HOME", home.path("").c_str(), 1);
     }
 
-    const sample::Home home;
+    const sample::Home home{};
 };
 
 Logging_Home& logging_home = *static_cast<Logging_Home*>(testing::AddGlobalTestEnvironment(new Logging_Home));

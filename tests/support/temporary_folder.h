@@ -10,7 +10,7 @@
 class Temporary_Folder
 {
 public:
-    Temporary_Folder() = default;
+    Temporary_Folder() : folder(make()) {}
     Temporary_Folder(const Temporary_Folder&) = delete;
     Temporary_Folder& operator=(const Temporary_Folder&) = delete;
     ~Temporary_Folder() { std::filesystem::remove_all(folder); }
@@ -31,7 +31,7 @@ public:
         return {std::istreambuf_iterator<char>(stream), {}};
     }
 
-    const std::filesystem::path folder = make();
+    const std::filesystem::path folder;
 
 private:
     static std::filesystem::path make()
