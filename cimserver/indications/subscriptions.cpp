@@ -9,6 +9,7 @@
 #include "cimserver/security/bounded_log.h"
 
 #include <algorithm>
+#include <chrono>
 #include <system_error>
 
 namespace cimserver
@@ -157,7 +158,8 @@ void Subscriptions::save() const
 
 Subscriptions::Change Subscriptions::begin_change()
 {
-    Change change(_changes, Provider_Turns::patience);
+    // By the wall clock: the thread sanitizer of clang 14 does not see a lock that is taken by the steady one.
+    Change change(_changes, std::chrono::system_clock::now() + Provider_Turns::patience);
     if (!change)
         throw Cim_Error(CIM_ERR_FAILED, "an earlier change of subscriptions does not end: a provider does not answer");
     return change;
