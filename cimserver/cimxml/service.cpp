@@ -363,7 +363,7 @@ Http_Work Service::handle(const Http_Request& http_request)
         const auto request = std::make_shared<const Cimxml_Request>(read_request(http_request.body));
         if (request->intrinsic)
             return handle_operation(_name_spaces, request);
-        const auto call = [this, request] { return call_method(_name_spaces, *request); };
+        const auto call = [&name_spaces = _name_spaces, request] { return call_method(name_spaces, *request); };
         return {{}, [request, call] { return answer(*request, call); }};
     }
     catch (const Http_Refusal& refusal)
