@@ -1,5 +1,4 @@
-// The FRU number of a card, out of its vital product data: the resource tags and keywords of the PCI Local Bus Specification 2.2,
-// appendix I.
+// The FRU number of a card, out of its vital product data: the resource tags and keywords of PCI 2.2, appendix I.
 #pragma once
 
 #include "hxal/records/ioc.h"
