@@ -2,6 +2,7 @@
 
 #include "inventory/fchba_manager.h"
 #include "inventory/hdr_manager.h"
+#include "profiles/server_manager.h"
 
 #include <algorithm>
 
@@ -18,6 +19,11 @@ Instance_Array hdr_manager(classId_t id, const Inventory_Request& request)
     return HDRManager::getHDRManager().getInstances(id, request);
 }
 
+Instance_Array server_manager(classId_t id, const Inventory_Request& request)
+{
+    return ServerManager::getServerManager().getInstances(id, request);
+}
+
 namespace
 {
 
@@ -29,7 +35,7 @@ bool has(const Instance_Array& instances, const Instance* model)
 Instance_Array read(const Enumeration& row, const Instance* model)
 {
     Inventory_Request request;
-    if (model)
+    if (model && row.get_instances != server_manager) // which leaves nothing out, and need not be asked again
         request.wanted = Wanted(model);
     if (!request.wanted.is_all())
     {

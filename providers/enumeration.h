@@ -13,6 +13,7 @@ namespace zmlr
 using Get_Instances = Instance_Array (*)(classId_t id, const Inventory_Request& request);
 Instance_Array fchba_manager(classId_t id, const Inventory_Request& request);
 Instance_Array hdr_manager(classId_t id, const Inventory_Request& request);
+Instance_Array server_manager(classId_t id, const Inventory_Request& request);
 
 // A line of the log; without a text there is none.
 struct Log_Row

@@ -4,6 +4,7 @@
 #include "providers/enumeration.h"
 #include "schema/ZEMLAR_AdapterSoftwareIdentity.h"
 #include "schema/ZEMLAR_AlarmDevice.h"
+#include "schema/ZEMLAR_CIMXMLCommunicationMechanism.h"
 #include "schema/ZEMLAR_ComputerSystem.h"
 #include "schema/ZEMLAR_EthernetPort.h"
 #include "schema/ZEMLAR_FCPort.h"
@@ -12,10 +13,15 @@
 #include "schema/ZEMLAR_HBASoftwareInstallationServiceCapabilities.h"
 #include "schema/ZEMLAR_LANEndpoint.h"
 #include "schema/ZEMLAR_LogicalPortGroup.h"
+#include "schema/ZEMLAR_Namespace.h"
+#include "schema/ZEMLAR_ObjectManager.h"
 #include "schema/ZEMLAR_PhysicalConnector.h"
 #include "schema/ZEMLAR_PhysicalPackage.h"
 #include "schema/ZEMLAR_PortController.h"
 #include "schema/ZEMLAR_Product.h"
+#include "schema/ZEMLAR_ProfileSoftwareIdentity.h"
+#include "schema/ZEMLAR_RegisteredProfile.h"
+#include "schema/ZEMLAR_RegisteredSubProfile.h"
 #include "schema/ZEMLAR_RemoteServiceAccessPoint.h"
 #include "schema/ZEMLAR_SCSIProtocolEndpoint.h"
 #include "schema/ZEMLAR_StorageExtent.h"
@@ -36,6 +42,12 @@ inline constexpr Enumeration enumerations[] = {
     {of<ZEMLAR_PhysicalPackage>,          fchba_manager, CLASSID_PhysicalPackage,          {{LL_ERR, "No Adapter Found!"}}},
     {of<ZEMLAR_Product>,                  fchba_manager, CLASSID_Product,                  {{LL_ERR, "No Adapter Found!"}}},
     {of<ZEMLAR_SCSIProtocolEndpoint>,     fchba_manager, CLASSID_SCSIProtocolEndpoint,     {{LL_ERR, "No FC Ports Found!"}}},
+    {of<ZEMLAR_ObjectManager>,                 server_manager, CLASSID_ObjectManager,                {}},
+    {of<ZEMLAR_Namespace>,                     server_manager, CLASSID_Namespace,                    {}},
+    {of<ZEMLAR_CIMXMLCommunicationMechanism>,  server_manager, CLASSID_CIMXMLCommunicationMechanism, {}},
+    {of<ZEMLAR_RegisteredProfile>,             server_manager, CLASSID_RegisteredProfile,            {}},
+    {of<ZEMLAR_RegisteredSubProfile>,          server_manager, CLASSID_RegisteredSubProfile,         {}},
+    {of<ZEMLAR_ProfileSoftwareIdentity>,       server_manager, CLASSID_ProfileSoftwareIdentity,      {{LL_ERR, "Error: Invalid number of ProfileSoftwareIdentityInstances"}}},
     {of<ZEMLAR_StorageExtent>,            hdr_manager,   CLASSID_StorageExtent,            {{LL_ERR, "No StorageExtents Found!"}}},
     {of<ZEMLAR_TapeDrive>,                hdr_manager,   CLASSID_TapeDrive,                {{LL_ERR, "No TapeDrives Found!"}}},
     {of<ZEMLAR_RemoteServiceAccessPoint>, fchba_manager, CLASSID_RemoteServiceAccessPoint, {{LL_ERR, "Error: Invalid mapping information"}, {LL_ERR, "Warning: No service is available"}}},

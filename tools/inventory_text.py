@@ -5,6 +5,7 @@ before. What depends on the machine that runs the simulation is put into angle b
 """
 
 import re
+import socket
 import sys
 import textwrap
 
@@ -50,7 +51,8 @@ class Inventory:
     def _text(self, class_name, name, value):
         if class_name == "ZEMLAR_ComputerSystem" and name in OF_THE_MACHINE:
             return f"<{'a list' if isinstance(value, list) else 'a text'}>"
-        return value_text(value).replace(self._host, "<host>")
+        own_name = "zmlr-cimserver:"  # of the server that serves here
+        return value_text(value).replace(own_name + socket.gethostname(), own_name + "<name>").replace(self._host, "<host>")
 
 
 def value_text(value):

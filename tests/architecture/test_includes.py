@@ -15,7 +15,7 @@ MAY_INCLUDE = {
     "hxal": [],
     "cmpi": ["runtime", "providers/providers.def"],
     "inventory": ["schema", "runtime", "text", "hxal"],
-    "profiles": ["schema", "runtime", "hxal", "inventory"],
+    "profiles": ["schema", "runtime", "hxal", "inventory", "cmpi/cimom.h"],
     "diagnostics": ["schema", "runtime", "hxal", "inventory"],
     "indications": ["schema", "runtime", "hxal", "inventory"],
     "providers": [

