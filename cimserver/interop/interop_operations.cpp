@@ -1,5 +1,6 @@
 #include "cimserver/interop/interop_operations.h"
 
+#include <algorithm>
 #include <iterator>
 
 namespace cimserver
@@ -14,14 +15,13 @@ constexpr std::string_view module_roots[] = {
     "CIM_ReferencedProfile", "ZEMLAR_ProfileSoftwareIdentity", "ZEMLAR_ProfileElementSoftwareIdentity",
 };
 
-template <class T> void append(std::vector<T>& to, std::vector<T> from)
-{
-    to.insert(to.end(), std::make_move_iterator(from.begin()), std::make_move_iterator(from.end()));
-}
-
 } // namespace
 
-Interop_Operations::Interop_Operations(Module& module) : Module_Operations(module, name_space, module_roots), _own(classes()) {}
+Interop_Operations::Interop_Operations(Module& module)
+    : Module_Operations(module, name_space, module_roots)
+    , _own(module.repository())
+{
+}
 
 // A class without keys has no instance of its own.
 Operations& Interop_Operations::at(const std::string& class_name)
@@ -60,7 +60,7 @@ std::vector<Object_Path> Interop_Operations::enumerate_instance_names(const std:
     if (_own.classes().find(class_name))
         found = _own.enumerate_instance_names(class_name);
     if (!only_own(class_name))
-        append(found, Module_Operations::enumerate_instance_names(class_name));
+        std::ranges::move(Module_Operations::enumerate_instance_names(class_name), std::back_inserter(found));
     return found;
 }
 
@@ -71,7 +71,8 @@ std::vector<Instance> Interop_Operations::enumerate_instances(const std::string&
     if (_own.classes().find(class_name))
         found = _own.enumerate_instances(class_name, deep_inheritance, properties);
     if (!only_own(class_name))
-        append(found, Module_Operations::enumerate_instances(class_name, deep_inheritance, properties));
+        std::ranges::move(Module_Operations::enumerate_instances(class_name, deep_inheritance, properties),
+                          std::back_inserter(found));
     return found;
 }
 

@@ -55,7 +55,7 @@ std::vector<Own_Operations::Reference> Own_Operations::find_references(const Obj
     const std::string source = path_identity({"", name_space, named.meta_class->name, keys_of(named, path)});
 
     std::vector<Reference> found;
-    for (const Class_Entry* entry : concerned_associations(_repository, named, filter, ends))
+    for (const Class_Entry* entry : concerned_associations(_repository, _repository, named, filter, ends))
         if (const Server_Class* server_class = answering(*entry))
             for (Instance& association : server_class->enumerate())
                 for (const Named_Value& property : association.properties)

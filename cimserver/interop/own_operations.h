@@ -21,7 +21,7 @@ public:
     static constexpr const char* names[] = {name_space, "root/interop", "interop"}; // that clients try
     static bool is_name(std::string_view name);
 
-    // The filter of a traversal may also name classes that the module shows in this name space.
+    // The filter of a traversal may also name classes of the module.
     explicit Own_Operations(const Repository& module_classes); // which must outlive it
 
     // From now on these functions answer for their class. Before the first request; throws std::logic_error for a class that is

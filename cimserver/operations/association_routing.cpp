@@ -19,11 +19,11 @@ References references_of(const zmlr::Meta_Class& meta_class)
 }
 
 // A class that a filter names, null when it names none.
-const zmlr::Meta_Class* named(const Repository& classes, const std::string& class_name)
+const zmlr::Meta_Class* named(const Repository& known, const std::string& class_name)
 {
     if (class_name.empty())
         return nullptr;
-    const Class_Entry* entry = classes.find(class_name);
+    const Class_Entry* entry = known.find(class_name);
     if (!entry)
         throw Cim_Error(CIM_ERR_INVALID_PARAMETER, "there is no class " + class_name);
     return entry->meta_class;
@@ -36,11 +36,11 @@ bool can_name(const zmlr::Meta_Reference& reference, const zmlr::Meta_Class* met
 
 } // namespace
 
-std::vector<const Class_Entry*> concerned_associations(const Repository& classes, const Class_Entry& source,
-                                                       const Association_Filter& filter, Ends ends)
+std::vector<const Class_Entry*> concerned_associations(const Repository& classes, const Repository& known,
+                                                       const Class_Entry& source, const Association_Filter& filter, Ends ends)
 {
-    const zmlr::Meta_Class* wanted = named(classes, filter.association_class);
-    const zmlr::Meta_Class* result_class = ends == Ends::both ? named(classes, filter.result_class) : nullptr;
+    const zmlr::Meta_Class* wanted = named(known, filter.association_class);
+    const zmlr::Meta_Class* result_class = ends == Ends::both ? named(known, filter.result_class) : nullptr;
 
     const auto concerns = [&](const References& references, const zmlr::Meta_Reference* near)
     {

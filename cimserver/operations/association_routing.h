@@ -17,8 +17,8 @@ enum class Ends
 
 // The served association classes that can concern an instance of `source` and that the filter admits: one reference can name
 // the source in the filter's role, and for both ends another one can name the result in its role. Classes match when one is
-// the other or derives from it. Throws CIM_ERR_INVALID_PARAMETER for a class of the filter that the name space has not.
-std::vector<const Class_Entry*> concerned_associations(const Repository& classes, const Class_Entry& source,
-                                                       const Association_Filter& filter, Ends ends);
+// the other or derives from it. Throws CIM_ERR_INVALID_PARAMETER for a class of the filter that is not known.
+std::vector<const Class_Entry*> concerned_associations(const Repository& classes, const Repository& known,
+                                                       const Class_Entry& source, const Association_Filter& filter, Ends ends);
 
 } // namespace cimserver

@@ -36,7 +36,7 @@ void Module_Operations::ask_associations(const Object_Path& path, const Associat
     const Class_Entry* named = _classes.find(path.class_name);
     if (!named)
         throw Cim_Error(CIM_ERR_INVALID_PARAMETER, "there is no class " + path.class_name);
-    const std::vector<const Class_Entry*> asked = concerned_associations(_classes, *named, filter, ends);
+    const std::vector<const Class_Entry*> asked = concerned_associations(_classes, _module.repository(), *named, filter, ends);
     const std::optional<Object_Path> source = source_of(*named, path);
     if (!source)
         return;
