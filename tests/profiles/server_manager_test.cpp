@@ -91,8 +91,9 @@ TEST_F(Profiles, name_the_object_manager_as_its_server_does)
         {true, {{nullptr, "e", "d"}}, {stand_in, R"("e")", R"("d")"}},
     };
     const std::string question = "root/PG_InterOp CIM_ObjectManager\n";
-    const Ref<ZEMLAR_ObjectManager> other(ZEMLAR_ObjectManager::create(false));
-    other->Name.set("other");
+    const Ref<ZEMLAR_ObjectManager> other(ZEMLAR_ObjectManager::create());
+    for (Property<String>* key : {&other->SystemCreationClassName, &other->SystemName, &other->CreationClassName, &other->Name})
+        key->set("other");
     for (const auto& row : servers)
     {
         Foreign_Server server(row.answers, row.managers);
