@@ -30,7 +30,7 @@ public:
     }
 
 private:
-    static constexpr const Enumeration& _row = row_of(enumerations, Class::static_meta_class);
+    static constexpr const Enumeration& _row = row_of(Class::static_meta_class, enumerations);
 
     const char* _name;
 };

@@ -24,6 +24,15 @@ Instance_Array server_manager(classId_t id, const Inventory_Request& request)
     return ServerManager::getServerManager().getInstances(id, request);
 }
 
+void say(std::span<const Log_Row> lines, const char* log_source)
+{
+    for (const Log_Row& line : lines)
+    {
+        if (line.text)
+            ZMLR_LOG(line.level, "%s", line.text);
+    }
+}
+
 namespace
 {
 
@@ -57,11 +66,7 @@ Instance_Array instances_of(const Enumeration& row, const Instance* model, const
         ZMLR_LOG(LL_DBG, "Returning instances");
         return instances;
     }
-    for (const Log_Row& line : row.empty)
-    {
-        if (line.text)
-            ZMLR_LOG(line.level, "%s", line.text);
-    }
+    say(row.empty, log_source);
     return instances;
 }
 

@@ -6,6 +6,8 @@
 #include "runtime/instance.h"
 #include "runtime/log.h"
 
+#include <span>
+
 namespace zmlr
 {
 
@@ -21,6 +23,7 @@ struct Log_Row
     Log_Level level = LL_ERR;
     const char* text = nullptr;
 };
+void say(std::span<const Log_Row> lines, const char* log_source);
 
 struct Enumeration
 {

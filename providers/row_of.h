@@ -8,15 +8,22 @@
 namespace zmlr
 {
 
-// The row whose `meta_class` is the class, found by the compiler; without one the call does not compile.
-template <class Row, std::size_t N> consteval const Row& row_of(const Row (&rows)[N], const Meta_Class& meta_class)
+// The row whose `meta_class` is the class, found by the compiler in one of the tables; without one the call does not compile.
+template <class Row, std::size_t... N> consteval const Row& row_of(const Meta_Class& meta_class, const Row (&... tables)[N])
 {
-    for (const Row& row : rows)
+    const Row* found = nullptr;
+    const auto look = [&](const auto& rows)
     {
-        if (row.meta_class == &meta_class)
-            return row;
-    }
-    throw "the table has no row for the class";
+        for (const Row& row : rows)
+        {
+            if (row.meta_class == &meta_class)
+                found = &row;
+        }
+    };
+    (look(tables), ...);
+    if (!found)
+        throw "no table has a row for the class";
+    return *found;
 }
 
 } // namespace zmlr

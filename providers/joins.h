@@ -1,0 +1,12 @@
+// All tables of joins, one of each subsystem.
+#pragma once
+
+#include "providers/joins_inventory.h"
+
+namespace zmlr
+{
+
+// The row of an association class; without one the call does not compile.
+consteval const Join& join_of(const Meta_Class& meta_class) { return row_of(meta_class, inventory_joins); }
+
+} // namespace zmlr
