@@ -98,13 +98,13 @@ TEST_F(Profiles, name_the_object_manager_as_its_server_does)
     {
         Foreign_Server server(row.answers, row.managers);
         // A client that asks for another object manager costs no second question.
-        const auto managers = instances_of(row_of(enumerations, ZEMLAR_ObjectManager::static_meta_class), other.ptr(), "Test");
+        const auto managers = instances_of(row_of(ZEMLAR_ObjectManager::static_meta_class, enumerations), other.ptr(), "Test");
         ASSERT_EQ(managers.size(), 1U);
         EXPECT_THAT(server.asked, ElementsAre(question));
         EXPECT_THAT((std::vector{value_of(managers[0], "Name"), value_of(managers[0], "Caption"),
                                  value_of(managers[0], "Description"), value_of(managers[0], "ElementName")}),
                     ElementsAre(row.expected[0], row.expected[1], row.expected[2], stand_in));
-        const auto spaces = instances_of(row_of(enumerations, ZEMLAR_Namespace::static_meta_class), nullptr, "Test");
+        const auto spaces = instances_of(row_of(ZEMLAR_Namespace::static_meta_class, enumerations), nullptr, "Test");
         EXPECT_THAT(values_of(spaces, "ObjectManagerName"), ElementsAre(row.expected[0]));
         EXPECT_THAT(server.asked, ElementsAre(question, question));
     }
