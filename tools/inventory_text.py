@@ -1,7 +1,8 @@
 """Everything that a server on a simulated host serves, as text for a person to read: `python -m tools.inventory_text SCENARIO`.
 
 One paragraph a class, in the order of registration. The first instance is told whole, its nulls last; of the others only what differs from the one
-before. What depends on the machine that runs the simulation is put into angle brackets.
+before. An association is a line: what it joins, by the keys that tell one instance of the class from another, and what else it says. What depends on the
+machine that runs the simulation is put into angle brackets.
 """
 
 import re
@@ -37,6 +38,17 @@ class Inventory:
     def _of_class(self, class_name):
         instances = self._client.EnumerateInstances(class_name)
         yield f"{class_name}: {len(instances) or 'none'}"
+        if any(isinstance(value, pywbem.CIMInstanceName) for instance in instances for value in instance.values()):
+            yield from map(self._association, instances)
+        else:
+            yield from self._objects(class_name, instances)
+        yield ""
+
+    def _association(self, instance):
+        told = (f"{name}={value_text(value)}" for name, value in instance.items() if value is not None)
+        return "  " + " ".join(told).replace(self._host, "<host>").replace(', SystemName="<host>"', "")
+
+    def _objects(self, class_name, instances):
         before = {}
         for number, instance in enumerate(instances, 1):
             properties = {name: self._text(class_name, name, instance[name]) for name in instance.keys()}
@@ -46,7 +58,6 @@ class Inventory:
             yield from (f"    {name} = {properties[name]}" for name in told)
             yield from textwrap.wrap("null: " + ", ".join(nulls), 120, initial_indent="    ", subsequent_indent="      ") if nulls else []
             before = properties
-        yield ""
 
     def _text(self, class_name, name, value):
         if class_name == "ZEMLAR_ComputerSystem" and name in OF_THE_MACHINE:
@@ -61,8 +72,9 @@ def value_text(value):
     if isinstance(value, list):
         return "[" + ", ".join(value_text(element) for element in value) + "]"
     if isinstance(value, pywbem.CIMInstanceName):
-        keys = ", ".join(f"{key}={value_text(value[key])}" for key in sorted(value.keys()))
-        return f"{value.classname}({keys})"
+        usual = {"CreationClassName": value.classname, "SystemCreationClassName": "ZEMLAR_ComputerSystem"}
+        keys = (f"{key}={value_text(value[key])}" for key in sorted(value.keys()) if usual.get(key) != value[key])
+        return f"{value.classname}({', '.join(keys)})"
     if isinstance(value, str):
         return '"' + value.replace("\\", "\\\\").replace("\n", "\\n").replace("\t", "\\t").replace("\r", "\\r") + '"'
     return str(value)
