@@ -43,7 +43,7 @@ struct Side
 // Asks for the sides and joins their elements.
 using Match = void (*)(Joining& joining);
 
-inline constexpr std::size_t max_sides = 3;
+inline constexpr std::size_t max_sides = 4;
 
 struct Join
 {
@@ -153,9 +153,9 @@ consteval Side with_remark(Side side, Log_Row remark)
     return side;
 }
 
-consteval Join join(Match match, Side first, Side second, Side third = Side())
+consteval Join join(Match match, Side first, Side second, Side third = Side(), Side fourth = Side())
 {
-    Join row = {.meta_class = nullptr, .match = match, .sides = {first, second, third}};
+    Join row = {.meta_class = nullptr, .match = match, .sides = {first, second, third, fourth}};
     for (const Side& side : row.sides)
     {
         if (side.association && row.meta_class && side.association != row.meta_class)

@@ -2,11 +2,12 @@
 #pragma once
 
 #include "providers/joins_inventory.h"
+#include "providers/joins_profiles.h"
 
 namespace zmlr
 {
 
 // The row of an association class; without one the call does not compile.
-consteval const Join& join_of(const Meta_Class& meta_class) { return row_of(meta_class, inventory_joins); }
+consteval const Join& join_of(const Meta_Class& meta_class) { return row_of(meta_class, inventory_joins, profile_joins); }
 
 } // namespace zmlr

@@ -46,7 +46,7 @@ class Inventory:
 
     def _association(self, instance):
         told = (f"{name}={value_text(value)}" for name, value in instance.items() if value is not None)
-        return "  " + " ".join(told).replace(self._host, "<host>").replace(', SystemName="<host>"', "")
+        return "  " + self._without_host(" ".join(told)).replace(', SystemName="<host>"', "")
 
     def _objects(self, class_name, instances):
         before = {}
@@ -62,8 +62,11 @@ class Inventory:
     def _text(self, class_name, name, value):
         if class_name == "ZEMLAR_ComputerSystem" and name in OF_THE_MACHINE:
             return f"<{'a list' if isinstance(value, list) else 'a text'}>"
+        return self._without_host(value_text(value))
+
+    def _without_host(self, text):
         own_name = "zmlr-cimserver:"  # of the server that serves here
-        return value_text(value).replace(own_name + socket.gethostname(), own_name + "<name>").replace(self._host, "<host>")
+        return text.replace(own_name + socket.gethostname(), own_name + "<name>").replace(self._host, "<host>")
 
 
 def value_text(value):

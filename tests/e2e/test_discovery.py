@@ -27,13 +27,63 @@ def test_the_server_describes_itself(mixed, interop):
     assert len(server.profiles) == 15
 
 
-def test_the_object_manager_has_the_names_that_the_server_gives_itself(mixed, interop):
+@pytest.fixture(scope="module")
+def conforming(mixed):
+    """What conforms to each profile, as a client that knows only the server's address finds it."""
+    server = pywbem.WBEMServer(mixed.pywbem)
+    organization = {2: "DMTF", 11: "SNIA"}
+    found = {}
+    for profile in server.profiles:
+        words = (organization[profile["RegisteredOrganization"]], profile["RegisteredName"], profile["RegisteredVersion"])
+        assert server.get_selected_profiles(*words) == [profile]
+        found[profile["RegisteredName"]] = server.get_central_instances(profile.path)
+    return found
+
+
+def test_profiles_lead_to_what_conforms_to_them(mixed, conforming):
+    subprofiles = [profile["InstanceID"] for profile in mixed.pywbem.EnumerateInstances("ZEMLAR_RegisteredSubProfile")]
+    told = {name: [(path.namespace, path.classname) for path in paths] for name, paths in conforming.items()}
+    host = [("root/zemlar", "ZEMLAR_ComputerSystem")]
+    assert told == {
+        "SMI-S": [(INTEROP, "ZEMLAR_RegisteredSubProfile")] * 10,
+        "Server": [("root/zemlar", "ZEMLAR_ObjectManager")],
+        **dict.fromkeys(("FC HBA", "Host Discovered Resources", "Storage HBA"), host),
+        **dict.fromkeys(subprofiles, []),
+    }
+    assert [path["InstanceID"] for path in conforming["SMI-S"]] == subprofiles
+    for path in sum(conforming.values(), []):
+        assert mixed.pywbem.GetInstance(path)
+
+
+def test_the_object_manager_has_the_names_that_the_server_gives_itself(mixed, interop, conforming):
     own = interop.EnumerateInstances("CIM_ObjectManager")[0]
-    manager = mixed.pywbem.EnumerateInstances("ZEMLAR_ObjectManager")[0]
-    names = [manager[name] for name in ("Name", "Caption", "Description")]
-    assert names == [own[name] for name in ("Name", "ElementName", "Description")]
-    space = mixed.pywbem.EnumerateInstances("ZEMLAR_Namespace")[0]
+    manager = mixed.pywbem.GetInstance(conforming["Server"][0])
+    assert [manager[name] for name in ("Name", "Caption", "Description")] == [own[name] for name in ("Name", "ElementName", "Description")]
+    (space,) = mixed.pywbem.Associators(conforming["Server"][0], AssocClass="CIM_NamespaceInManager")
     assert (space["ObjectManagerName"], space["Name"]) == (own["Name"], "root/zemlar")
+
+
+@pytest.mark.parametrize(
+    "filters,expected",
+    [
+        ({"AssocClass": "CIM_ElementConformsToProfile"}, ["ZEMLAR_ComputerSystem"]),
+        ({"ResultClass": "CIM_ComputerSystem"}, ["ZEMLAR_ComputerSystem"]),
+        ({"ResultClass": "ZEMLAR_ObjectManager"}, []),
+        ({"AssocClass": "CIM_SubProfileRequiresProfile"}, ["ZEMLAR_RegisteredSubProfile"] * 8),
+        ({"ResultClass": "CIM_SoftwareIdentity"}, ["ZEMLAR_ProfileSoftwareIdentity"]),
+        ({"AssocClass": "ZEMLAR_PortControllerSystemDevice"}, []),
+    ],
+)
+def test_a_profile_leads_on(mixed, interop, filters, expected):
+    profile = CIMInstanceName("ZEMLAR_RegisteredProfile", {"InstanceID": "FC HBA"})
+    names = interop.AssociatorNames(profile, **filters)
+    assert [name.classname for name in names] == expected
+    far = {"ZEMLAR_ComputerSystem": "root/zemlar"}
+    assert all(name.namespace == far.get(name.classname, INTEROP) for name in names)
+    assert [instance.path for instance in interop.Associators(profile, **filters)] == names
+    for name in names:  # and back: from there, the profile lies in the name space of what is left
+        back = CIMInstanceName("ZEMLAR_RegisteredProfile", {"InstanceID": "FC HBA"}, host=name.host, namespace=name.namespace)
+        assert back in mixed.pywbem.AssociatorNames(name)
 
 
 @pytest.mark.parametrize("name", ["interop", "root/interop", "ROOT/PG_INTEROP"])

@@ -8,10 +8,11 @@ GATE = "Driver is not installed or there is a hxal mismatch hence no instances r
 @pytest.mark.parametrize(
     "scenario,line", [("no-driver", "ERROR: No driver found"), ("version-refused", "ERROR: HXAL version mismatch")]
 )
-def test_without_a_driver_only_the_host_is_left(start, tmp_path, scenario, line):
+def test_without_a_driver_the_host_and_the_profiles_are_left(start, tmp_path, scenario, line):
     (tmp_path / ".cimplerc").write_text("LOG_LEVEL = INFO\n", encoding="utf-8")
     host = start(scenario, {"HOME": str(tmp_path)})
     assert len(host.pywbem.EnumerateInstances("ZEMLAR_ComputerSystem")) == 1
+    assert len(host.pywbem.EnumerateInstances("ZEMLAR_ElementConformsToProfile")) == 14
     assert host.device_ids() == []
     log = (tmp_path / ".cimple/messages").read_text(encoding="utf-8")
     assert line in log and GATE in log
