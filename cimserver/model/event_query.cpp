@@ -1,7 +1,6 @@
 #include "cimserver/model/event_query.h"
 
 #include "cimserver/model/names.h"
-#include "cimserver/model/query_parser.h"
 #include "cimserver/model/query_tokens.h"
 
 #include <algorithm>
@@ -29,22 +28,11 @@ std::optional<long double> number_of(const Value& value)
 
 template <class T> bool holds(const T& left, Relation relation, const T& right)
 {
-    switch (relation)
-    {
-    case Relation::equal:
-        return left == right;
-    case Relation::unequal:
-        return left != right;
-    case Relation::less:
-        return left < right;
-    case Relation::less_or_equal:
-        return left <= right;
-    case Relation::greater:
-        return left > right;
-    case Relation::greater_or_equal:
-        return left >= right;
-    }
-    return false;
+    const Relation outcome = left < right    ? Relation::less
+                             : left > right  ? Relation::greater
+                             : left == right ? Relation::equal
+                                             : Relation::unordered;
+    return (static_cast<unsigned>(relation) & static_cast<unsigned>(outcome)) != 0;
 }
 
 // Absent: unknown, because the property is null.
@@ -130,31 +118,26 @@ void check_condition(const Query_Condition& condition, const Property_Layout& la
 
 } // namespace
 
-Event_Query::Event_Query(const std::string& text)
-{
-    Parsed_Query parsed = parse_query(text);
-    _class_name = std::move(parsed.class_name);
-    _select = std::move(parsed.select);
-    _where = std::move(parsed.where);
-}
-
 void Event_Query::check(const Property_Layout& layout) const
 {
-    if (_select)
-        for (const std::string& name : *_select)
-            check_property(name, layout, _class_name);
-    if (_where)
-        check_condition(*_where, layout, _class_name);
+    if (_query.select)
+        for (const std::string& name : *_query.select)
+            check_property(name, layout, _query.class_name);
+    if (_query.where)
+        check_condition(*_query.where, layout, _query.class_name);
 }
 
-bool Event_Query::wants(const Instance& indication) const { return !_where || evaluate(*_where, indication).value_or(false); }
+bool Event_Query::wants(const Instance& indication) const
+{
+    return !_query.where || evaluate(*_query.where, indication).value_or(false);
+}
 
 Instance Event_Query::selected(Instance indication) const
 {
-    if (_select)
+    if (_query.select)
         std::erase_if(
             indication.properties, [&](const Named_Value& property)
-            { return std::ranges::none_of(*_select, [&](const auto& name) { return equal_names(name, property.name); }); });
+            { return std::ranges::none_of(*_query.select, [&](const auto& name) { return equal_names(name, property.name); }); });
     return indication;
 }
 

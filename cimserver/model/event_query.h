@@ -33,14 +33,15 @@ struct Query_Condition
         conjunction,
         disjunction
     };
-    enum class Relation
+    enum class Relation : unsigned // what may come of a comparison that it allows, as bits
     {
-        equal,
-        unequal,
-        less,
-        less_or_equal,
-        greater,
-        greater_or_equal
+        less = 1,
+        equal = 2,
+        greater = 4,
+        unordered = 8, // a number that is none
+        less_or_equal = less | equal,
+        greater_or_equal = greater | equal,
+        unequal = less | greater | unordered
     };
 
     Kind kind = Kind::compare;
@@ -50,13 +51,23 @@ struct Query_Condition
     std::vector<Query_Condition> parts;                   // of a negation one, of the junctions two or more
 };
 
+// The parts of a query.
+struct Parsed_Query
+{
+    std::string class_name;
+    Property_List select; // absent: all
+    std::optional<Query_Condition> where;
+};
+
+// Throws Cim_Error CIM_ERR_INVALID_QUERY that tells where the text cannot be read. Depth and length of a query are bounded.
+Parsed_Query parse_query(const std::string& text);
+
 class Event_Query
 {
 public:
-    // Throws Cim_Error CIM_ERR_INVALID_QUERY that tells where the text cannot be read.
-    explicit Event_Query(const std::string& text);
+    explicit Event_Query(const std::string& text) : _query(parse_query(text)) {}
 
-    const std::string& class_name() const { return _class_name; }
+    const std::string& class_name() const { return _query.class_name; }
 
     // Throws Cim_Error CIM_ERR_INVALID_QUERY when the class lacks a property that the query names, or the property's type does
     // not go with what it is compared with.
@@ -66,9 +77,7 @@ public:
     Instance selected(Instance indication) const; // with the properties that the query names
 
 private:
-    std::string _class_name;
-    Property_List _select; // absent: all
-    std::optional<Query_Condition> _where;
+    Parsed_Query _query;
 };
 
 } // namespace cimserver

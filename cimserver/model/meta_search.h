@@ -3,10 +3,16 @@
 
 #include "runtime/meta.h"
 
+#include <span>
 #include <string_view>
 
 namespace cimserver
 {
+
+inline std::span<const zmlr::Meta_Feature* const> features_of(const zmlr::Meta_Record& record)
+{
+    return {record.meta_features, record.num_meta_features};
+}
 
 // The index of a feature in the list of a class or of a parameter in that of a method, num_meta_features when it has none of
 // that name; and the feature itself, null when there is none.

@@ -1,6 +1,7 @@
 #include "cimserver/model/property_layout.h"
 
 #include "cimserver/model/cim_types.h"
+#include "cimserver/model/meta_search.h"
 
 namespace cimserver
 {
@@ -15,12 +16,9 @@ CMPIType cmpi_type(const zmlr::Meta_Feature& feature)
 
 Property_Layout::Property_Layout(const zmlr::Meta_Class& meta_class)
 {
-    for (zmlr::uint32 i = 0; i < meta_class.num_meta_features; ++i)
-    {
-        const zmlr::Meta_Feature* feature = meta_class.meta_features[i];
+    for (const zmlr::Meta_Feature* feature : features_of(meta_class))
         if (!zmlr::is_method(feature))
             _slots.push_back({feature->name, cmpi_type(*feature), zmlr::is_key(feature)});
-    }
     index_slots();
 }
 

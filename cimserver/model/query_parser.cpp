@@ -1,5 +1,5 @@
-#include "cimserver/model/query_parser.h"
-
+// Reads the text of a query into its parts.
+#include "cimserver/model/event_query.h"
 #include "cimserver/model/names.h"
 #include "cimserver/model/query_tokens.h"
 

@@ -1,5 +1,7 @@
 #include "cimserver/model/repository.h"
 
+#include "cimserver/model/meta_search.h"
+
 #include <algorithm>
 #include <iterator>
 #include <stdexcept>
@@ -61,8 +63,8 @@ void Repository::show(const Repository& whole, const zmlr::Meta_Class* meta_clas
     if (entry == whole._index.end() || !_index.insert(*entry).second)
         return;
     show(whole, meta_class->super_meta_class);
-    for (unsigned i = 0; i < meta_class->num_meta_features; ++i)
-        if (const zmlr::Meta_Feature* feature = meta_class->meta_features[i]; zmlr::is_reference(feature))
+    for (const zmlr::Meta_Feature* feature : features_of(*meta_class))
+        if (zmlr::is_reference(feature))
             show(whole, zmlr::as_reference(feature)->meta_class);
 }
 

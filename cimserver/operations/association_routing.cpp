@@ -1,5 +1,7 @@
 #include "cimserver/operations/association_routing.h"
 
+#include "cimserver/model/meta_search.h"
+
 #include <algorithm>
 
 namespace cimserver
@@ -12,8 +14,8 @@ using References = std::vector<const zmlr::Meta_Reference*>;
 References references_of(const zmlr::Meta_Class& meta_class)
 {
     References result;
-    for (unsigned i = 0; i < meta_class.num_meta_features; ++i)
-        if (const zmlr::Meta_Feature* feature = meta_class.meta_features[i]; zmlr::is_reference(feature))
+    for (const zmlr::Meta_Feature* feature : features_of(meta_class))
+        if (zmlr::is_reference(feature))
             result.push_back(zmlr::as_reference(feature));
     return result;
 }

@@ -1,6 +1,6 @@
 #include "cimserver/operations/key_conversion.h"
 
-#include "cimserver/model/repository.h"
+#include "cimserver/model/meta_search.h"
 #include "cimserver/model/value_conversion.h"
 #include "cimserver/model/value_text.h"
 
@@ -24,12 +24,9 @@ public:
 
         refuse_unknown_and_repeated(entry, path);
         std::vector<Named_Value> result;
-        for (zmlr::uint32 i = 0; i < entry.meta_class->num_meta_features; ++i)
-        {
-            const zmlr::Meta_Feature* feature = entry.meta_class->meta_features[i];
+        for (const zmlr::Meta_Feature* feature : features_of(*entry.meta_class))
             if (zmlr::is_key(feature))
                 result.push_back({feature->name, converted(entry, *feature, path)});
-        }
         --_depth;
         return result;
     }

@@ -29,77 +29,52 @@ catch (const Cim_Error& error)
     return std::nullopt;
 }
 
-template <class Ask>
-void Module_Operations::ask_associations(const Object_Path& path, const Association_Filter& filter, Ends ends, Result_Sink& sink,
-                                         Ask ask)
+// Asks each provider through a function of its table, with the name of its own class and the words. What is found, each object
+// once.
+template <class Sink, class Function, class... Words>
+auto Module_Operations::traverse(const Object_Path& path, const Association_Filter& filter, Ends ends, Sink sink,
+                                 Function CMPIAssociationMIFT::*function, Words... words)
 {
+    const Module::Use use(_module);
     const Class_Entry* named = _classes.find(path.class_name);
     if (!named)
         throw Cim_Error(CIM_ERR_INVALID_PARAMETER, "there is no class " + path.class_name);
     const std::vector<const Class_Entry*> asked = concerned_associations(_classes, _module.repository(), *named, filter, ends);
     const std::optional<Object_Path> source = source_of(*named, path);
-    if (!source)
-        return;
-
-    for (const Class_Entry* provider : asked)
-        if (CMPIAssociationMI* mi = _module.association_mi(*provider))
-        {
-            Provider_Call call(_module, *provider, ends == Ends::both ? "Associators" : "References", *source, sink);
-            ask(call, mi, provider->meta_class->name);
-        }
+    if (source)
+        for (const Class_Entry* provider : asked)
+            if (CMPIAssociationMI* mi = _module.association_mi(*provider))
+                Provider_Call(_module, *provider, ends == Ends::both ? "Associators" : "References", *source, sink)
+                    .run(mi, mi->ft->*function, provider->meta_class->name, words...);
+    remove_duplicates(sink.found);
+    return std::move(sink.found);
 }
 
 std::vector<Instance> Module_Operations::associators(const Object_Path& path, const Association_Filter& filter,
                                                      const Property_List& properties)
 {
-    const Module::Use use(_module);
-    Instance_Sink sink(_name_space, properties);
     Name_List names(properties);
-    ask_associations(path, filter, Ends::both, sink,
-                     [&](Provider_Call& call, CMPIAssociationMI* mi, const char* own_class)
-                     {
-                         call.run(mi, mi->ft->associators, own_class, word(filter.result_class), word(filter.role),
-                                  word(filter.result_role), names.names());
-                     });
-    remove_duplicates(sink.found);
-    return std::move(sink.found);
+    return traverse(path, filter, Ends::both, Instance_Sink(_name_space, properties), &CMPIAssociationMIFT::associators,
+                    word(filter.result_class), word(filter.role), word(filter.result_role), names.names());
 }
 
 std::vector<Object_Path> Module_Operations::associator_names(const Object_Path& path, const Association_Filter& filter)
 {
-    const Module::Use use(_module);
-    Path_Sink sink(_name_space);
-    ask_associations(path, filter, Ends::both, sink,
-                     [&](Provider_Call& call, CMPIAssociationMI* mi, const char* own_class) {
-                         call.run(mi, mi->ft->associatorNames, own_class, word(filter.result_class), word(filter.role),
-                                  word(filter.result_role));
-                     });
-    remove_duplicates(sink.found);
-    return std::move(sink.found);
+    return traverse(path, filter, Ends::both, Path_Sink(_name_space), &CMPIAssociationMIFT::associatorNames,
+                    word(filter.result_class), word(filter.role), word(filter.result_role));
 }
 
 std::vector<Instance> Module_Operations::references(const Object_Path& path, const Association_Filter& filter,
                                                     const Property_List& properties)
 {
-    const Module::Use use(_module);
-    Instance_Sink sink(_name_space, properties);
     Name_List names(properties);
-    ask_associations(path, filter, Ends::source, sink,
-                     [&](Provider_Call& call, CMPIAssociationMI* mi, const char* own_class)
-                     { call.run(mi, mi->ft->references, own_class, word(filter.role), names.names()); });
-    remove_duplicates(sink.found);
-    return std::move(sink.found);
+    return traverse(path, filter, Ends::source, Instance_Sink(_name_space, properties), &CMPIAssociationMIFT::references,
+                    word(filter.role), names.names());
 }
 
 std::vector<Object_Path> Module_Operations::reference_names(const Object_Path& path, const Association_Filter& filter)
 {
-    const Module::Use use(_module);
-    Path_Sink sink(_name_space);
-    ask_associations(path, filter, Ends::source, sink,
-                     [&](Provider_Call& call, CMPIAssociationMI* mi, const char* own_class)
-                     { call.run(mi, mi->ft->referenceNames, own_class, word(filter.role)); });
-    remove_duplicates(sink.found);
-    return std::move(sink.found);
+    return traverse(path, filter, Ends::source, Path_Sink(_name_space), &CMPIAssociationMIFT::referenceNames, word(filter.role));
 }
 
 } // namespace cimserver

@@ -73,8 +73,9 @@ private:
     std::optional<Object_Path> source_of(const Class_Entry& named, const Object_Path& path);
     const Class_Entry* method_provider(const Class_Entry& named, const Object_Path& path);
 
-    template <class Ask>
-    void ask_associations(const Object_Path& path, const Association_Filter& filter, Ends ends, Result_Sink& sink, Ask ask);
+    template <class Sink, class Function, class... Words>
+    auto traverse(const Object_Path& path, const Association_Filter& filter, Ends ends, Sink sink,
+                  Function CMPIAssociationMIFT::*function, Words... words);
 
     Module& _module;
     const std::string _name_space;

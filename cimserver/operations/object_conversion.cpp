@@ -8,17 +8,12 @@
 #include "cimserver/model/value_text.h"
 #include "cimserver/operations/key_conversion.h"
 
-#include <span>
 #include <unordered_set>
 
 namespace cimserver
 {
 namespace
 {
-
-using Features = std::span<const zmlr::Meta_Feature* const>;
-
-Features features_of(const zmlr::Meta_Record& record) { return {record.meta_features, record.num_meta_features}; }
 
 std::string described(CMPIType type) { return std::string((type & CMPI_ARRAY) != 0 ? "array of " : "") + cim_type_name(type); }
 
