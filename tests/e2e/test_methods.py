@@ -73,6 +73,10 @@ def test_static_method_and_a_text_returned(tst):
     assert tst.pywbem.InvokeMethod("Join", "TST_Box", [("Separator", "&")])[0] is None
 
 
+def test_a_method_may_ask_the_server_in_turn(tst):
+    assert tst.pywbem.InvokeMethod("CountItems", "TST_Box")[0] == len(tst.pywbem.EnumerateInstanceNames("TST_Item")) == 4
+
+
 def test_a_superclass_names_the_object_too(tst):
     red = CIMInstanceName("TST_Element", {"Name": "red"})
     assert tst.pywbem.InvokeMethod("EchoScalars", red, [("Caption", "x")]) == (1, {"Caption": "x"})

@@ -41,6 +41,7 @@ def test_classes(mixed):
     status = port.properties["OperationalStatus"].qualifiers
     meaning = dict(zip(status["ValueMap"].value, status["Values"].value))
     assert meaning["11"] == "In Service"
+    assert dict(zip(*(port.properties["PortType"].qualifiers[name].value for name in ("ValueMap", "Values"))))["10"] == "N"
     assert port.properties["AllocationState"].embedded_object == "instance"
     change = port.methods["RequestStateChange"]
     assert change.return_type == "uint32"
@@ -121,6 +122,38 @@ def test_superclass_is_the_union_of_its_served_subclasses(mixed):
     assert all("PortNumber" not in device for device in shallow)
 
 
+def test_what_two_providers_have_is_there_once(tst):
+    assert [path.classname for path in tst.pywbem.EnumerateInstanceNames("TST_Keyed")] == ["TST_Box"]
+    names = tst.pywbem.EnumerateInstanceNames("tst_element")
+    for found in (names, [instance.path for instance in tst.pywbem.EnumerateInstances("TST_Element")]):
+        assert len(found) == len(set(found)) and {"red", "bolt"} <= {path["Name"] for path in found}
+    assert tst.pywbem.EnumerateInstances("TST_Alert") == tst.pywbem.EnumerateInstances("TST_Pair") == [], "nobody serves these"
+
+
+# A key of every kind: as values of its type, as texts of it, and what is neither.
+KEYS = {"Name": "x", "Left": CIMInstanceName("tst_box", {"Name": "red"}), "Flag": True, "Count": pywbem.Uint8(255), "Mark": "m"}
+KEYS |= {"Offset": pywbem.Sint8(-128), "Ratio": pywbem.Real64(-25.0), "when": "00000001000000.000000:000"}
+TEXTS = {"Flag": "True", "Count": "255", "Offset": "-128", "Ratio": "-2.5e1"}
+REACHED = (
+    'TST_Keyed.Name="x",Left="TST_Box.Name=\\"red\\"",Flag=true,Count=255,Offset=-128,Mark=\'m\',Ratio=-25.000000,'
+    "When=00000001000000.000000:000"
+)
+DEEP = KEYS["Left"]
+for _ in range(7):
+    DEEP = CIMInstanceName("TST_Keyed", {**KEYS, "Left": DEEP})
+NO_KEYS = [("Flag", 1), ("Count", "0x100"), ("Count", -1), ("Mark", "\u20ac\u20ac"), ("Ratio", "inf"), ("Left", 'TST_Box.Name="red"')]
+NO_KEYS += [("Left", CIMInstanceName(*target)) for target in [("TST_Nothing", {"Name": "red"}), ("TST_Alert", {"Text": "x"}), ("TST_Box", {"Caption": "x"})]]
+
+
+def test_keys_of_every_kind_reach_the_provider_or_are_refused(tst):
+    for keys in (KEYS, {**KEYS, **TEXTS}):
+        assert tst.pywbem.GetInstance(CIMInstanceName("TST_Keyed", keys))["Path"] == REACHED
+    for name, value in [*NO_KEYS, ("Left", DEEP)]:
+        with pytest.raises(pywbem.CIMError) as caught:
+            tst.pywbem.GetInstance(CIMInstanceName("TST_Keyed", {**KEYS, name: value}))
+        assert caught.value.status_code == 4 and "key" in caught.value.status_description, (name, value)
+
+
 def test_class_origins_are_told_when_asked_for(mixed):
     for asked, origin in [(True, "CIM_LogicalDevice"), (False, None)]:
         ports = mixed.pywbem.EnumerateInstances("ZEMLAR_FCPort", LocalOnly=True, IncludeClassOrigin=asked)
@@ -145,6 +178,9 @@ def test_errors_are_sentences(mixed, tst):
         (lambda: mixed.pywbem.InvokeMethod("RequestStateChange", port), "ZEMLAR_FCPort does not support RequestStateChange"),
         (lambda: tst.pywbem.GetInstance(CIMInstanceName("TST_Refusal", {"Name": "63"})), "TST_Refusal: GetInstance: access denied"),
         (lambda: tst.pywbem.GetInstance(CIMInstanceName("TST_Refusal", {"Name": "64"})), "TST_Refusal: GetInstance failed"),
+        (lambda: tst.pywbem.EnumerateInstances("TST_Part"), "TST_Broken: EnumerateInstances: access denied"),
+        (lambda: tst.pywbem.EnumerateInstanceNames("TST_Broken"), "TST_Broken: EnumerateInstanceNames: access denied"),
+        (lambda: mixed.pywbem.GetInstance(CIMInstanceName("CIM_FCPort", GOOD)), f"there is no instance root/zemlar:CIM_FCPort.{GOOD_TEXT}"),
     ]:
         with pytest.raises(pywbem.CIMError) as caught:
             call()
@@ -152,6 +188,7 @@ def test_errors_are_sentences(mixed, tst):
 
 
 GOOD = dict(zip(FC_PORT_KEYS, ["ZEMLAR_ComputerSystem", "nowhere", "ZEMLAR_FCPort", "0000000000000000"]))
+GOOD_TEXT = ",".join(f'{name}="{value}"' for name, value in GOOD.items())
 
 
 def port(**keys):
@@ -167,6 +204,7 @@ def port(**keys):
         (lambda c: c.EnumerateInstances("ZEMLAR_FCPort", "root/nowhere"), 3),
         (lambda c: c.GetInstance(port()), 6),
         (lambda c: c.GetInstance(CIMInstanceName("ZEMLAR_FCPort", {"DeviceID": "1"})), 4),
+        (lambda c: c.GetInstance(CIMInstanceName("CIM_FCPort", {"DeviceID": "1"})), 4),
         (lambda c: c.GetInstance(port(X="1")), 4),
         (lambda c: c.GetInstance(port(DeviceID=True)), 4),
         (lambda c: c.InvokeMethod("Explode", port()), 17),

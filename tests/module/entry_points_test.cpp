@@ -36,11 +36,7 @@ protected:
         ASSERT_NE(_library, nullptr);
     }
 
-    void TearDown() override
-    {
-        dlclose(_library);
-        Loaded_Module::TearDown();
-    }
+    void TearDown() override { dlclose(_library); }
 
     template <class Function> Function symbol(const std::string& name)
     {

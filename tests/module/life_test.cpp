@@ -2,7 +2,11 @@
 #include "tests/module/loaded_module.h"
 #include "tests/runtime/resources.h"
 
+#include <cmpift.h>
 #include <dlfcn.h>
+#include <unistd.h>
+
+#include <filesystem>
 
 namespace
 {
@@ -28,6 +32,26 @@ TEST_F(Life, unloading_leaves_nothing_behind)
     const sample::Resources before;
     sample::repeat(LOAD_ROUNDS, round);
     EXPECT_EQ(sample::Resources(), before);
+}
+
+// A copy of the module: it stays for good, and other tests rely on one that is loaded anew.
+TEST_F(Life, a_module_that_asks_for_it_stays_in_memory)
+{
+    const std::string copy = testing::TempDir() + "lasting_module-" + std::to_string(getpid()) + ".so";
+    std::filesystem::copy_file(module_path, copy);
+    {
+        cimserver::Module module(copy);
+        CMPIInstanceMI* mi = module.instance_mi(*module.repository().find("ZEMLAR_ComputerSystem"));
+        static CMPIInstanceMIFT table = *mi->ft;
+        table.cleanup = [](CMPIInstanceMI*, const CMPIContext*, CMPIBoolean) {
+            return CMPIStatus{CMPI_RC_NEVER_UNLOAD, nullptr};
+        };
+        mi->ft = &table;
+        module.close();
+        EXPECT_THROW(cimserver::Module::Use use(module), cimserver::Cim_Error);
+    }
+    EXPECT_NE(dlopen(copy.c_str(), RTLD_NOW | RTLD_NOLOAD), nullptr);
+    std::filesystem::remove(copy);
 }
 
 // The very first requests are among them: they race to make the managers, the helpers and the providers.

@@ -3,9 +3,7 @@
 
 #include "cimserver/broker/module.h"
 #include "cimserver/interop/name_spaces.h"
-#include "sim/hxasim.h"
-
-#include <gtest/gtest.h>
+#include "tests/support/simulated_host.h"
 
 #include <memory>
 #include <string>
@@ -15,13 +13,7 @@ extern const char* const module_path;
 
 inline constexpr const char* name_space = "root/zemlar";
 
-// The text of a string property; "(null)" when it is null, "(none)" when the instance has no such property.
-std::string text_of(const cimserver::Instance& instance, const std::string& property);
-
-// The class name, then a line for each property that is not null, in the order of the class.
-std::string describe(const cimserver::Instance& instance);
-
-class Loaded_Module : public testing::Test
+class Loaded_Module : public Simulated_Host
 {
 protected:
     // Loads the module anew on a shipped scenario.
@@ -29,12 +21,6 @@ protected:
 
     // The instances of a class, asked for as a client would.
     std::vector<cimserver::Instance> enumerate(const std::string& class_name);
-
-    // The names of the requests since the last call, in order.
-    static std::vector<std::string> requests();
-
-    // Every test also fails on requests that no driver would accept.
-    void TearDown() override;
 
     cimserver::Module& module() { return *_module; }
     cimserver::Operations& operations() { return _name_spaces->at(name_space, ""); }

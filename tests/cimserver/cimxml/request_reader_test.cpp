@@ -2,6 +2,7 @@
 #include "cimserver/cimxml/http_message.h"
 #include "cimserver/cimxml/object_reader.h"
 #include "cimserver/cimxml/request_reader.h"
+#include "tests/support/rows.h"
 
 #include <gtest/gtest.h>
 
@@ -73,17 +74,11 @@ struct Case
 const Case cases[] = {
     {"a plain request", good, "200"},
     {"no XML declaration", good.substr(good.find('\n')), "200"},
-    {"a comment", replaced(good, "<MESSAGE", "<!-- x --><MESSAGE"), "200"},
-    {"ASCII, said to be another encoding", replaced(good, "utf-8", "iso-8859-1"), "200"},
     {"a byte order mark", "\xEF\xBB\xBF" + good, "200"},
-    {"a later minor version", replaced(good, "DTDVERSION=\"2.0\"", "DTDVERSION=\"2.4\""), "200"},
     {"many signs that would be attributes in a tag",
      replaced(intrinsic("X", parameter("Y", "<VALUE><![CDATA[" + repeated("a='' ", 300) + "]]></VALUE>")), "<MESSAGE",
               "<?x " + repeated("a='' ", 300) + "?><!-- " + repeated("a='' ", 300) + "--><MESSAGE"),
      "200"},
-    {"a correlator",
-     replaced(good, "<SIMPLEREQ>", "<SIMPLEREQ><CORRELATOR NAME=\"x\" TYPE=\"string\"><VALUE>1</VALUE></CORRELATOR>"), "200"},
-
     {"nothing", "", not_well_formed},
     {"no XML", "GET / HTTP/1.1", not_well_formed},
     {"half a request", good.substr(0, good.size() / 2), not_well_formed},
@@ -94,20 +89,9 @@ const Case cases[] = {
     {"UTF-16", std::string("<\0C\0I\0M\0/\0>\0", 12), not_well_formed},
     {"UTF-16 with its mark", std::string("\xFF\xFE<\0C\0/\0>\0", 10), not_well_formed},
     {"EBCDIC", "\x4C\x6F\xA7\x94\x93\x40", not_well_formed},
-    {"a control character", replaced(good, "TST_Port", "TST&#1;"), not_well_formed},
-    {"an unknown entity", replaced(good, "TST_Port", "TST&nbsp;"), not_well_formed},
-    {"an attribute twice", replaced(good, "ID=\"42\"", "ID=\"42\" ID=\"43\""), not_well_formed},
     {"an unclosed element, very deep", repeated("<a>", 200000), not_valid},
-
-    {"a DOCTYPE", replaced(good, "<CIM", "<!DOCTYPE CIM SYSTEM \"file:///etc/passwd\"><CIM"), not_valid},
-    {"an entity bomb", replaced(good, "<CIM", "<!DOCTYPE CIM [<!ENTITY a \"aaaaaaaaaa\"><!ENTITY b \"&a;&a;&a;&a;&a;\">]><CIM"),
-     not_valid},
     {"other XML", "<html/>", not_valid},
-    {"another root with the versions", replaced(replaced(good, "<CIM ", "<XIM "), "</CIM>", "</XIM>"), not_valid},
-    {"a prefixed element", replaced(replaced(good, "<CIM ", "<p:CIM xmlns:p=\"u\" "), "</CIM>", "</p:CIM>"), not_valid},
     {"no message", "<CIM CIMVERSION=\"2.0\" DTDVERSION=\"2.0\"></CIM>", not_valid},
-    {"no message id", replaced(good, " ID=\"42\"", ""), not_valid},
-    {"no version", replaced(good, " CIMVERSION=\"2.0\"", ""), not_valid},
     {"a response", message("<SIMPLERSP></SIMPLERSP>"), not_valid},
     {"an export request", message("<SIMPLEEXPREQ></SIMPLEEXPREQ>"), not_valid},
     {"no call", message("<SIMPLEREQ></SIMPLEREQ>"), not_valid},
@@ -119,9 +103,6 @@ const Case cases[] = {
     {"an empty name space", replaced(good, name_space, "<LOCALNAMESPACEPATH/>"), not_valid},
     {"two name spaces", replaced(good, name_space, name_space + name_space), not_valid},
     {"the name space last", intrinsic("GetClass").replace(intrinsic("GetClass").find(name_space), 0, class_name("A")), not_valid},
-    {"no operation name", replaced(good, " NAME=\"GetClass\"", ""), not_valid},
-    {"a method's parameter", replaced(replaced(good, "<IPARAMVALUE", "<PARAMVALUE"), "</IPARAMVALUE", "</PARAMVALUE"), not_valid},
-    {"text between elements", replaced(good, "<SIMPLEREQ>", "<SIMPLEREQ>text"), not_valid},
     {"an element in a value", intrinsic("X", parameter("Y", "<VALUE><b/></VALUE>")), not_valid},
     {"two values", intrinsic("X", parameter("Y", "<VALUE>1</VALUE><VALUE>2</VALUE>")), not_valid},
     {"more keys than any class has",
@@ -133,13 +114,7 @@ const Case cases[] = {
      intrinsic("X", parameter("Y", "<VALUE><![CDATA[<!--]]></VALUE>") + "<Z" + repeated(" a=''", 300) + "/>"), not_valid},
     {"very many elements", intrinsic("X", parameter("Y", "<VALUE.ARRAY>" + repeated("<VALUE/>", 50000) + "</VALUE.ARRAY>")),
      not_valid},
-
     {"a batch", message("<MULTIREQ></MULTIREQ>"), "501 multiple-requests-unsupported"},
-    {"another CIM version", replaced(good, "CIMVERSION=\"2.0\"", "CIMVERSION=\"3.0\""), "501 unsupported-cim-version"},
-    {"a malformed version", replaced(good, "CIMVERSION=\"2.0\"", "CIMVERSION=\"2.\""), "501 unsupported-cim-version"},
-    {"another DTD version", replaced(good, "DTDVERSION=\"2.0\"", "DTDVERSION=\"1.0\""), "501 unsupported-dtd-version"},
-    {"another protocol version", replaced(good, "PROTOCOLVERSION=\"1.0\"", "PROTOCOLVERSION=\"2.0\""),
-     "501 unsupported-protocol-version"},
 };
 
 } // namespace
@@ -148,6 +123,13 @@ TEST(request_reader, gives_each_odd_request_its_refusal)
 {
     for (const Case& row : cases)
         EXPECT_EQ(outcome_of(row.body), row.outcome) << row.what;
+    for (const auto& row : rows_of("cimxml/odd_requests.txt"))
+    {
+        std::string body = good;
+        for (std::size_t i = 3; i < row.size(); i += 2)
+            body = replaced(body, row[i - 1], row[i]);
+        EXPECT_EQ(outcome_of(body), row[0]) << row.at(1);
+    }
 }
 
 TEST(request_reader, reads_names_with_references)

@@ -2,45 +2,19 @@
 #include "alert_module.h"
 
 #include "cmpi/registration.h"
+#include "schema/TST_Alert.h"
+#include "schema/TST_Disk.h"
 
 #include <cmpift.h>
-
-#include <iterator>
 
 using namespace zmlr;
 
 namespace
 {
 
-extern const Meta_Repository repository;
-
-constexpr Meta_Property property(const char* name, Type type, sint16 subscript = 0)
-{
-    return {{{0}, Flag_Property | Flag_Read, name, nullptr, 0}, static_cast<uint16>(type), subscript, 0, nullptr};
-}
-
-constexpr Meta_Property properties[] = {
-    property("Text", STRING),    property("Number", SINT64), property("Size", UINT64),      property("Ratio", REAL64),
-    property("Urgent", BOOLEAN), property("Time", DATETIME), property("Texts", STRING, -1),
-};
-constexpr const Meta_Feature* features[] = {&properties[0], &properties[1], &properties[2], &properties[3],
-                                            &properties[4], &properties[5], &properties[6]};
-
-constexpr Meta_Class make_class(const char* name, uint32 flags, const Meta_Class* super)
-{
-    return {{{{0}, Flag_Class | flags, name, nullptr, 0}, features, std::size(features), 0}, nullptr, super, 0, &repository};
-}
-
-constexpr Meta_Class event = make_class("TST_Event", Flag_Indication | Flag_Abstract, nullptr);
-constexpr Meta_Class alert = make_class("TST_Alert", Flag_Indication, &event);
-constexpr Meta_Class disk = make_class("TST_Disk", 0, nullptr);
-constexpr const Meta_Class* classes[] = {&event, &alert, &disk};
-constexpr Meta_Repository repository = {classes, std::size(classes)};
-
-int no_operation(const Registration*, int, void*, void*, void*, void*, void*, void*, void*, void*) { return -1; }
-
-constexpr Registration disk_registration = {"alert_module", "TST_Disk_Provider", no_operation, &disk, nullptr};
-constexpr Registration registration = {"alert_module", "TST_Alert_Provider", no_operation, &alert, &disk_registration};
+constexpr Registration disk_registration = {"alert_module", "TST_Disk_Provider", nullptr, &TST_Disk::static_meta_class, nullptr};
+constexpr Registration registration = {"alert_module", "TST_Alert_Provider", nullptr, &TST_Alert::static_meta_class,
+                                       &disk_registration};
 
 test::Recorded_Calls recorded;
 

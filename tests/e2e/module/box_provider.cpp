@@ -1,3 +1,4 @@
+#include "cmpi/cimom.h"
 #include "elements.h"
 #include "providers/TST_Box_Provider_Skeleton.h"
 
@@ -91,6 +92,17 @@ public:
     Invoke_Method_Status Fail(const Class*, const Property<uint32>& Status, Property<uint32>&) override
     {
         return static_cast<Invoke_Method_Status>(Status.value);
+    }
+
+    Invoke_Method_Status CountItems(const Class*, Property<uint32>& return_value) override
+    {
+        const Ref<TST_Item> model(create<TST_Item>(false));
+        Instance_Enumerator items;
+        uint32 count = 0;
+        for (cimom::enum_instances("root/zemlar", model.ptr(), items); items; ++items)
+            ++count;
+        return_value.set(count);
+        return INVOKE_METHOD_OK;
     }
 
     Invoke_Method_Status Ring(const Class*, const Property<uint32>& Times, const Property<String>& Text,

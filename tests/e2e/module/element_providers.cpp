@@ -1,6 +1,9 @@
 #include "elements.h"
+#include "providers/TST_Broken_Provider_Skeleton.h"
 #include "providers/TST_Item_Provider_Skeleton.h"
+#include "providers/TST_Keyed_Provider_Skeleton.h"
 #include "providers/TST_Refusal_Provider_Skeleton.h"
+#include "runtime/model_path.h"
 
 #include <cstdlib>
 
@@ -39,9 +42,39 @@ private:
     }
 };
 
+class TST_Keyed_Provider final : public TST_Keyed_Provider_Skeleton
+{
+public:
+    Get_Instance_Status get_instance(const Class* model, Class*& instance) override
+    {
+        String path;
+        instance_to_model_path(model, path);
+        instance = clone(model);
+        instance->Path.set(path);
+        return GET_INSTANCE_OK;
+    }
+
+    Enum_Instances_Status enum_instances(const Class*, Enum_Instances_Handler<Class>& handler) override
+    {
+        handler.handle(static_cast<Class*>(static_cast<Instance*>(make_box("red"))));
+        return ENUM_INSTANCES_OK;
+    }
+};
+
+class TST_Broken_Provider final : public TST_Broken_Provider_Skeleton
+{
+public:
+    Enum_Instances_Status enum_instances(const Class*, Enum_Instances_Handler<Class>&) override
+    {
+        return ENUM_INSTANCES_ACCESS_DENIED;
+    }
+};
+
 } // namespace
 
+TST_Broken_Provider_Skeleton* create_TST_Broken_Provider() { return new TST_Broken_Provider; }
 TST_Item_Provider_Skeleton* create_TST_Item_Provider() { return new TST_Item_Provider; }
+TST_Keyed_Provider_Skeleton* create_TST_Keyed_Provider() { return new TST_Keyed_Provider; }
 TST_Refusal_Provider_Skeleton* create_TST_Refusal_Provider() { return new TST_Refusal_Provider; }
 
 } // namespace zmlr
