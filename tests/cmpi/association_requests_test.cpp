@@ -206,19 +206,51 @@ TEST_F(Association_Requests, fetch_associated_instances_from_the_server)
 TEST_F(Association_Requests, leave_keys_to_the_path_when_a_list_is_given)
 {
     offer_links();
-    static_cast<TST_Pair*>(script.instances[0].ptr())->Note.set("note");
+    auto& pair = *static_cast<TST_Pair*>(script.instances[0].ptr());
+    pair.Note.set("note");
+    pair.Dependent->__name_space = "root/other";
     const char* list[] = {"Note", "Antecedent", nullptr};
     for (const char** properties : {static_cast<const char**>(nullptr), list})
     {
         EXPECT_EQ(references(a, properties), CMPI_RC_OK);
         EXPECT_THAT(found(), ElementsAre("a-b", "a-d"));
         EXPECT_EQ(text(result.instances.at(0).properties, "Note"), "note");
+        EXPECT_EQ(path_in(result.instances[0].path.keys, "Dependent").name_space, "root/other") << "a reference keeps its own";
         EXPECT_EQ(text(result.instances.at(1).properties, "Note"), "(null)");
     }
     const char* nothing[] = {nullptr};
     EXPECT_EQ(references(a, nothing), CMPI_RC_OK);
     EXPECT_THAT(found(), ElementsAre("a-b", "a-d"));
     EXPECT_THAT(result.instances.at(0).properties, SizeIs(2)) << "the two ends";
+}
+
+// What reaches the callback of a handle: the far ends until it has had enough, then the end, whatever the provider goes on with.
+TEST_F(Association_Requests, end_with_one_mark)
+{
+    using Names = std::vector<std::string>;
+    const auto receive = [](Instance* instance, auto, void* data)
+    {
+        const Ref<Instance> far_end(instance);
+        auto& received = *static_cast<Names*>(data);
+        received.emplace_back(instance ? static_cast<TST_Thing*>(instance)->Name.value.c_str() : "end");
+        return received.size() % 2 != 0; // enough after two
+    };
+    offer_links();
+    script.instances.emplace_back(linked("a", "e").steal());
+    Names received;
+    {
+        Provider_Handle handle(&link_registration);
+        const Ref<TST_Thing> source = thing("a");
+        for (const bool deaf : {false, true})
+        {
+            script.deaf = deaf;
+            handle.enum_associator_names(source.ptr(), "", "", "", receive, &received);
+            received.emplace_back(); // an even number
+        }
+        script.enum_associator_names = ENUM_ASSOCIATOR_NAMES_FAILED; // the provider answers itself
+        handle.enum_associator_names(source.ptr(), "", "", "", receive, &received);
+    }
+    EXPECT_THAT(received, ElementsAre("b", "d", "end", "", "b", "d", "end", "", "end"));
 }
 
 TEST_F(Association_Requests, stop_at_what_cannot_be_converted)

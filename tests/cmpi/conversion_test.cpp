@@ -52,65 +52,6 @@ protected:
     }
 };
 
-TEST_F(Conversion, gives_every_type_its_code_and_bits)
-{
-    const auto sent = to_cmpi(full_thing("full").ptr());
-    const auto properties = cimserver::object<Instance_Object>(sent.get()).model().properties;
-    std::vector<int> types;
-    for (const auto& property : properties)
-        types.push_back(property.value.type);
-    EXPECT_THAT(types,
-                ElementsAre(0x1600, 0x1600, 0x2, 0x80, 0xC0, 0x90, 0xD0, 0xA0, 0xE0, 0xB0, 0xF0, 0x8, 0xC, 0x3, 0x1800, // scalars
-                            0x2002, 0x2080, 0x20F0, 0x2003, 0x3600, 0x3800));
-    EXPECT_EQ(content<std::uint64_t>(properties, "Uint64Value"), 0xFFFFFFFFFFFFFFFF);
-    EXPECT_EQ(content<std::int64_t>(properties, "Sint8Value"), -128);
-    EXPECT_EQ(content<std::uint64_t>(properties, "Char16Value"), 0x20ACU);
-    EXPECT_EQ(std::get<std::string>(content<Values>(properties, "StringValues").at(2).content), "zw\xC3\xB6lf");
-}
-
-// Both ways through the interface of a provider. (Embedded objects are parameters only: the method requests carry them.)
-TEST_F(Conversion, carries_references_with_their_keys_and_name_spaces)
-{
-    const Ref<TST_Pair> original = linked("a", "b");
-    original->Dependent->__name_space = "root/other";
-    original->Dependent->Uint8Value.set(7);
-    script.instances.emplace_back(clone(static_cast<const Instance*>(original.ptr())));
-    script.create_instance = CREATE_INSTANCE_OK;
-    Recorded_Result result;
-    CMPIInstanceMI* mi = links();
-    const CMPIObjectPath* object_path = path("TST_Pair");
-
-    EXPECT_EQ(CMPI_Adapter::enumInstances(mi, request.context(), result.face(), object_path, nullptr).rc, CMPI_RC_OK);
-    const auto& properties = result.instances.at(0).properties;
-    EXPECT_EQ(value(properties, "Antecedent").type, CMPI_ref);
-    EXPECT_EQ(path_in(properties, "Dependent").name_space, "root/other");
-    EXPECT_EQ(name_in(path_in(properties, "Dependent")), "b");
-
-    const CMPIInstance* sent_back = make<Instance_Object>(result.instances[0]).face();
-    EXPECT_EQ(CMPI_Adapter::createInstance(mi, request.context(), result.face(), object_path, sent_back).rc, CMPI_RC_OK);
-    const auto& back = *cast<TST_Pair>(script.instance.ptr());
-    EXPECT_TRUE(key_eq(&back, original.ptr()));
-    EXPECT_TRUE(back.Dependent->Uint8Value.null) << "a reference holds keys only";
-}
-
-TEST_F(Conversion, takes_references_out_of_a_path)
-{
-    const auto key = reference("tst_disk", "b");
-    Ref<Instance> made;
-    cimserver::Object_Path link = {{}, name_space, "TST_Pair", {{"Dependent", key}, {"Note", key}, {"Unknown", key}}};
-    EXPECT_EQ(make_cimple_reference(broker.face(), &TST_Pair::static_meta_class, make<Path_Object>(link).face(), made),
-              CMPI_RC_OK);
-    const auto& taken = *cast<TST_Pair>(made.ptr());
-    EXPECT_FALSE(taken.Antecedent);
-    EXPECT_TRUE(taken.Note.null) << "no key";
-    ASSERT_TRUE(taken.Dependent);
-    EXPECT_EQ(taken.Dependent->meta_class, &TST_Disk::static_meta_class);
-    EXPECT_EQ(taken.Dependent->Name.value, "b");
-    EXPECT_TRUE(taken.Dependent->Uint8Value.null);
-    EXPECT_EQ(taken.__name_space, name_space);
-    EXPECT_EQ(taken.Dependent->__name_space, name_space);
-}
-
 TEST_F(Conversion, leaves_bad_items_null_and_says_why)
 {
     const std::string at_name = "Container: conversion error: TST_Thing.Name";

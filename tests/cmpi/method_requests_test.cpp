@@ -116,31 +116,23 @@ TEST_F(Method_Requests, fail_before_the_provider_is_asked)
 
 TEST_F(Method_Requests, leave_arguments_null_that_do_not_fit)
 {
-    const struct
-    {
-        cimserver::Named_Value argument;
-        std::vector<std::string> messages;
-    } cases[] = {
-        {{"Others", {CMPI_boolean, {}}}, {}}, // how servers deliver an untyped null
-        {{"Others", {CMPI_boolean, true}}, {}},
-        {{"Partner", {CMPI_boolean, {}}},
-         {"CMPI_Containers: type mismatch on Partner: instance/boolean", "Container: conversion error: Convert.Partner"}},
-        {{"Partner", reference("TST_Pair", "x")},
-         {"Container: unknown feature: TST_Pair.Name", "Value: failed to assign instance of TST_Pair to Convert.Partner",
-          "Container: conversion error: Convert.Partner"}},
-        {{"Level", {CMPI_uint16, std::uint64_t{1}}},
-         {"CMPI_Containers: type mismatch on Level: uint8/uint16", "Container: conversion error: Convert.Level"}},
-        {{"Unknown", {CMPI_uint16, std::uint64_t{1}}}, {"Container: unknown feature: Convert.Unknown"}},
-    };
     script.on_invoke = [](Instance* parameters)
     {
         const auto& p = *static_cast<TST_Disk_Convert_method*>(parameters);
         EXPECT_TRUE(p.Level.null && p.Others.null && !p.Partner);
     };
-    for (const auto& c : cases)
+    const std::pair<cimserver::Named_Value, std::size_t> cases[] = {
+        {{"Others", {CMPI_boolean, {}}}, 0}, // how servers deliver an untyped null
+        {{"Others", {CMPI_boolean, true}}, 0},
+        {{"Partner", {CMPI_boolean, {}}}, 2},
+        {{"Partner", reference("TST_Pair", "x")}, 3},
+        {{"Level", {CMPI_uint16, std::uint64_t{1}}}, 2},
+        {{"Unknown", {CMPI_uint16, std::uint64_t{1}}}, 1},
+    };
+    for (const auto& [argument, messages] : cases)
     {
-        in.args = {c.argument};
-        EXPECT_EQ(logged([&] { EXPECT_EQ(invoke("Convert", disk_path()), CMPI_RC_OK); }), c.messages) << c.argument.name;
+        in.args = {argument};
+        EXPECT_THAT(logged([&] { EXPECT_EQ(invoke("Convert", disk_path()), CMPI_RC_OK); }), SizeIs(messages)) << argument.name;
     }
 }
 
