@@ -7,16 +7,22 @@ namespace
 
 using Config_Lookup = Config_Model;
 
-TEST_F(Config_Lookup, finds_and_adds_by_wwn)
+TEST_F(Config_Lookup, finds_and_adds_by_wwn_and_by_mac)
 {
     EXPECT_EQ(hxal_config_ioc_lookup(0), -1) << "unused entries have an empty text, which converts to 0";
-    parse({"hxa1-port-wwn = 10:00:00:05:1E:10:0:1", "hxa4-port-wwn = none"});
+    EXPECT_EQ(hxal_config_ethioc_lookup({}), -1);
+    parse({"hxa1-port-wwn = 10:00:00:05:1E:10:0:1", "hxa4-port-wwn = none", "hxn1-port-mac = 00:05:1e:20:00:01:77",
+           "hxn2-port-mac = 00:05:1E:20:00:02"});
     EXPECT_EQ(hxal_config_ioc_lookup(port_wwn(0, 1)), 1);
     EXPECT_EQ(hxal_config_ioc_lookup(port_wwn(0, 0)), -1);
+    EXPECT_EQ(hxal_config_ethioc_lookup(eth_mac(0, 1)), 1);
+    EXPECT_EQ(hxal_config_ethioc_lookup(eth_mac(0, 2)), -1) << "a MAC is compared as text";
 
     hxal_config_ioc_add(port_wwn(0, 0));
-    hxal_config_ioc_add(port_wwn(0, 2));
+    hxal_config_ethioc_add(eth_mac(0, 0)); // shares entry 0
     EXPECT_STREQ(ioc(0).pwwn, "10:00:00:05:1e:10:00:00");
+    EXPECT_STREQ(ioc(0).mac, "00:05:1e:20:00:00");
+    hxal_config_ioc_add(port_wwn(0, 2));
     EXPECT_EQ(hxal_config_ioc_lookup(port_wwn(0, 2)), 2);
     EXPECT_EQ(hxal_config_ioc_get_num(), 4);
 
@@ -28,26 +34,13 @@ TEST_F(Config_Lookup, finds_and_adds_by_wwn)
     EXPECT_EQ(hxal_config_ioc_lookup(port_wwn(8, 8)), -1);
 
     for (uint8_t i = 0; i < 200; ++i)
+    {
         hxal_config_ioc_add(port_wwn(9, i));
+        hxal_config_ethioc_add(eth_mac(1, i));
+    }
     EXPECT_EQ(hxal_config_ioc_get_num(), 128);
     EXPECT_EQ(hxal_config_ioc_lookup(port_wwn(9, 123)), -1);
-}
-
-TEST_F(Config_Lookup, finds_and_adds_by_mac)
-{
-    EXPECT_EQ(hxal_config_ethioc_lookup({}), -1);
-    parse({"hxn1-port-mac = 00:05:1e:20:00:01:77", "hxn2-port-mac = 00:05:1E:20:00:02"});
-    EXPECT_EQ(hxal_config_ethioc_lookup(eth_mac(0, 1)), 1);
-    EXPECT_EQ(hxal_config_ethioc_lookup(eth_mac(0, 2)), -1) << "a MAC is compared as text";
-    hxal_config_ioc_add(port_wwn(0, 0)); // shares entry 0
-    hxal_config_ethioc_add(eth_mac(0, 0));
-    EXPECT_EQ(hxal_config_ethioc_lookup(eth_mac(0, 0)), 0);
-    EXPECT_STREQ(ioc(0).mac, "00:05:1e:20:00:00");
-    EXPECT_EQ(hxal_config_ioc_get_num(), 1);
-    for (uint8_t i = 0; i < 200; ++i)
-        hxal_config_ethioc_add(eth_mac(1, i));
-    EXPECT_EQ(hxal_config_ethioc_lookup(eth_mac(1, 124)), 127);
-    EXPECT_EQ(hxal_config_ethioc_lookup(eth_mac(1, 125)), -1);
+    EXPECT_EQ(hxal_config_ethioc_lookup(eth_mac(1, 199)), -1);
 }
 
 class Config_Names : public Library_Test

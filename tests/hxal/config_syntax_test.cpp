@@ -71,19 +71,4 @@ TEST(Config_Syntax, converts_numbers_lists_and_wwns)
     EXPECT_EQ(wwn_convert(nullptr), 0u);
 }
 
-TEST(Config_Syntax, comes_in_lines_that_fit_the_buffer)
-{
-    const std::unique_ptr<std::FILE, decltype(&std::fclose)> file(std::tmpfile(), std::fclose);
-    std::fwrite("ab\n\0\nabcdefg\nend", 1, 16, file.get());
-    std::rewind(file.get());
-    char line[6];
-    for (const std::string& expected : {std::string("ab\n"), std::string("\0\n", 2), std::string("abcde"), std::string("fg\n"),
-                                        std::string("end"), std::string()})
-    {
-        const int length = hxal_getline(line, sizeof line, file.get());
-        EXPECT_EQ(std::string(line, static_cast<std::size_t>(length)), expected);
-        EXPECT_EQ(line[length], '\0');
-    }
-}
-
 } // namespace

@@ -57,14 +57,15 @@ TEST_F(Fabric, lists_remote_ports_up_to_the_room)
 
 TEST_F(Fabric, takes_the_logical_port_0_for_the_base_port)
 {
-    const auto call_each = [this]
+    hxa_rport_attr_t attr{};
+    const auto call_each = [&]
     {
-        hxa_rport_attr_t attr{};
         hxa_rport_stats_t stats{};
         return std::array{hxal_rport_get_attr(ioc, 0, 0, disks, &attr), hxal_rport_get_stats(ioc, 0, 0, disks, &stats),
                           hxal_rport_reset_stats(ioc, 0, 0, disks)};
     };
     EXPECT_THAT(call_each(), testing::Each(HXA_STATUS_OK));
+    EXPECT_EQ(attr.pid, 0x040302u) << "as on the wire (FC-FS-2): domain, area, port";
     const auto sent = hxasim::take_requests();
     ASSERT_EQ(sent.size(), 6u);
     for (std::size_t i = 0; i < sent.size(); i += 2)

@@ -180,28 +180,4 @@ TEST_F(Scsi_Faults, bring_back_garbage)
     EXPECT_NE(answered.data[0], 0);
 }
 
-TEST_F(Faults, strike_a_recorded_request_when_it_is_sent_again)
-{
-    const auto ask_all = [&]
-    {
-        hxasim::take_requests();
-        instances(Open_File("/dev/hxa"), 'C');
-        for (int instance : {0, 1, 0})
-            outcome(static_cast<std::uint16_t>(instance));
-        return hxasim::take_requests();
-    };
-    const auto recorded = ask_all();
-    for (std::size_t i = 1; i < recorded.size(); ++i)
-    {
-        auto fault = hxasim::fault_at(recorded, i);
-        fault.error = EIO;
-        hxasim::inject(fault);
-        const auto again = ask_all();
-        for (std::size_t at = 0; at < recorded.size(); ++at)
-            EXPECT_EQ(again[at].error, at == i ? EIO : 0) << at;
-    }
-    EXPECT_FALSE(recorded[0].carries_status);
-    EXPECT_TRUE(recorded[1].carries_status);
-}
-
 } // namespace
