@@ -1,5 +1,3 @@
-#include "inventory/fchba_manager.h"
-#include "inventory/hdr_manager.h"
 #include "inventory/provider_init.h"
 #include "inventory/provider_util.h"
 #include "tests/inventory/inventory_fixture.h"
@@ -7,7 +5,6 @@
 #include <algorithm>
 #include <cstdlib>
 #include <map>
-#include <string_view>
 
 using namespace zmlr;
 using namespace std::string_literals;
@@ -62,31 +59,4 @@ TEST_F(Driver_Gate, is_what_the_probe_found)
     EXPECT_THAT(lines, IsSupersetOf({"INFO ProviderInit: hxal_libinit() returned  0 "s,
                                      "DBG ProviderInit: Adapter Count = " + std::to_string(probe().adapters), probe().line}));
     EXPECT_EQ(std::count(lines.begin(), lines.end(), "INFO ProviderInit: Inside ProviderInit Constructor."), 1);
-}
-
-TEST_F(Driver_Gate, closes_every_class_that_needs_the_adapters)
-{
-    // By identifier: n needs the driver, h has instances without it, - is not served.
-    constexpr std::string_view fchba = "-hnnnnnnn-------"
-                                       "-hnnnnnnnnnnn-nnnnnnn-",
-                               hdr = "---------n------n---------------------";
-    const auto check = [this](const char* manager, char expected, uint32 id, const Instance_Array& instances)
-    {
-        const std::string start = std::string(manager) + ": ";
-        const std::vector<std::string> lines = log();
-        const auto said = [&](const std::string& line) { return std::ranges::find(lines, line) != lines.end(); };
-        EXPECT_EQ(said("ERR " + start + "Driver is not installed or there is a hxal mismatch hence no instances returned"),
-                  expected == 'n' && !open())
-            << start << id;
-        EXPECT_EQ(said("INFO " + start + "Requested class is NOT supported."), expected == '-') << start << id;
-        EXPECT_TRUE(instances.empty() || expected == 'h' || (expected == 'n' && probe().status == DRIVER_GOOD)) << start << id;
-    };
-    for (uint32 id = 0; id <= MAXCLASSID + 1; id++)
-    {
-        const auto class_id = static_cast<classId_t>(id);
-        log();
-        check("FCHBAManager", fchba[id], id, FCHBAManager::getFCHBAManager().getInstances(class_id));
-        check("HDRManager", hdr[id], id, HDRManager::getHDRManager().getInstances(class_id));
-    }
-    EXPECT_STREQ(ProviderUtil::getClassName(static_cast<classId_t>(MAXCLASSID + 1)).c_str(), "INVALID CLASS");
 }

@@ -17,7 +17,7 @@ using namespace zmlr;
 namespace
 {
 
-constexpr const char* host = R"({"adapters": [
+constexpr const char* two_cards = R"({"adapters": [
     {"kind": "cna", "flash": [{"type": "optrom", "status": "good"}], "ports": [
         {"remote_ports": [{"pwwn": "2100000F00000001", "luns": {"count": 2, "vendor": "A", "product": "DISK"}},
                           {"pwwn": "2100000F00000002", "luns": {"count": 1, "vendor": "A", "product": "DISK"}}]}, {}]},
@@ -117,7 +117,7 @@ TEST_F(Fault_Sweep, costs_what_depends_on_the_request_and_nothing_else)
     const hxasim::Fault effects[] = {{.error = EIO}, {.status = HXA_STATUS_FAILED}, {.garbage = 1}};
     for (const Enumeration& row : enumerations)
     {
-        plug_text(host);
+        plug_text(two_cards);
         const Texts before = sorted_instances(row);
         const std::vector<hxasim::Request> sent = hxasim::take_requests();
         const Texts usual_log = log();

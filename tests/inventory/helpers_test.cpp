@@ -25,14 +25,6 @@ protected:
         const bool is_storage = id == CLASSID_StorageExtent || id == CLASSID_TapeDrive;
         return is_storage ? HDRManager::getHDRManager().getInstances(id) : FCHBAManager::getFCHBAManager().getInstances(id);
     }
-
-    std::vector<std::string> commands()
-    {
-        std::vector<std::string> names;
-        for (const hxasim::Request& request : hxasim::take_requests())
-            names.push_back(request.name);
-        return names;
-    }
 };
 
 } // namespace

@@ -89,6 +89,7 @@ TEST_F(Host, has_paths_files_and_a_node_name)
                  "//192.0.2.10/root/zemlar:ZEMLAR_FCPort.DeviceID=\"1\"");
     EXPECT_TRUE(ProviderUtil::IsFileExist("/"));
     EXPECT_FALSE(ProviderUtil::IsFileExist("/no/such/file"));
+    EXPECT_STREQ(ProviderUtil::getClassName(static_cast<classId_t>(MAXCLASSID + 1)).c_str(), "INVALID CLASS");
 
     EXPECT_STREQ(ProviderUtil::getHostName().c_str(), "storage-host");
     fake_host.name.reset();

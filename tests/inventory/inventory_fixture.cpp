@@ -7,7 +7,6 @@
 
 #include <cstdlib>
 #include <fstream>
-#include <regex>
 
 namespace zmlr
 {
@@ -47,8 +46,6 @@ void Inventory_Test::SetUp()
     scan();
 }
 
-void Inventory_Test::TearDown() { EXPECT_THAT(hxasim::violations(), testing::IsEmpty()); }
-
 void Inventory_Test::plug_text(const std::string& json)
 {
     hxasim::load_text(json);
@@ -62,14 +59,6 @@ void Inventory_Test::scan()
     log();
 }
 
-std::vector<std::string> Inventory_Test::requests()
-{
-    std::vector<std::string> texts;
-    for (const hxasim::Request& request : hxasim::take_requests())
-        texts.push_back(request.name + ' ' + request.node + ' ' + std::to_string(request.instance));
-    return texts;
-}
-
 std::vector<std::string> Inventory_Test::log()
 {
     static std::ifstream messages;
@@ -77,15 +66,16 @@ std::vector<std::string> Inventory_Test::log()
         messages.open(home().path(".cimple/messages"));
     messages.clear();
 
-    static const std::regex form(R"(\S+ \S+ (\w+): (\w+)\(\d+\): (.*))");
-    std::vector<std::string> lines;
+    std::vector<std::string> lines; // "date time LEVEL: Source(line): message"
     for (std::string line; std::getline(messages, line);)
     {
-        std::smatch part;
-        if (!std::regex_match(line, part, form))
+        const auto level = line.find(' ', line.find(' ') + 1) + 1, source = line.find(": ", level),
+                   number = line.find('(', source), end = line.find("): ", number);
+        const std::string message = end == line.npos ? line : line.substr(end + 3);
+        if (end == line.npos)
             lines.push_back(line);
-        else if (!part[3].str().starts_with("Entering: ") && !part[3].str().starts_with("Returning: "))
-            lines.push_back(part[1].str() + ' ' + part[2].str() + ": " + part[3].str());
+        else if (!message.starts_with("Entering: ") && !message.starts_with("Returning: "))
+            lines.push_back(line.substr(level, source - level) + line.substr(source + 1, number - source - 1) + ": " + message);
     }
     return lines;
 }
@@ -114,14 +104,6 @@ std::string describe(const Instance* instance)
         if (!value.empty())
             text += std::string("    ") + feature->name + " = " + value + '\n';
     }
-    return text;
-}
-
-std::string describe(const Instance_Array& instances)
-{
-    std::string text;
-    for (const Instance* instance : instances)
-        text += describe(instance);
     return text;
 }
 

@@ -2,10 +2,8 @@
 #pragma once
 
 #include "runtime/instance.h"
-#include "sim/hxasim.h"
 #include "tests/inventory/fake_host.h"
-
-#include <gmock/gmock.h>
+#include "tests/support/simulated_host.h"
 
 #include <string>
 #include <vector>
@@ -15,16 +13,14 @@ namespace zmlr
 
 // The program's log level is LL_DBG; its home is a new directory that is removed at the end. Its driver gate is what the scenario
 // in HXASIM_SCENARIO ("mixed" when unset) made it when the program was loaded.
-class Inventory_Test : public testing::Test
+class Inventory_Test : public Simulated_Host
 {
 protected:
     void SetUp() override;
-    void TearDown() override; // fails on requests that no driver would accept
 
     void plug_text(const std::string& json); // replaces the host ("mixed" at first) and scans it
 
-    std::vector<std::string> requests(); // "COMMAND node instance", since the last call
-    std::vector<std::string> log();      // "LEVEL Source: message", since the last call, without entries and exits
+    std::vector<std::string> log(); // "LEVEL Source: message", since the last call, without entries and exits
 
 private:
     void scan();
@@ -32,7 +28,6 @@ private:
 
 // The class name, then a line for each property that is not null, in the order of the class.
 std::string describe(const Instance* instance);
-std::string describe(const Instance_Array& instances);
 
 // A property in the form that describe() gives it; empty when it is null.
 std::string value_of(const Instance* instance, const char* property);

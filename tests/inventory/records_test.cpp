@@ -59,21 +59,13 @@ TEST(Records, trimmed_texts_and_addresses_from_package_tags)
         EXPECT_STREQ(ProviderUtil::getNodeMACOrWWNFromTag(tag, model).c_str(), expected) << tag << ' ' << model;
 }
 
-TEST(Records, texts_that_xml_can_carry)
+// What of other bytes no XML can carry, the server's writer shows: both call the same function.
+TEST(Records, texts_that_end_where_their_field_does)
 {
-    const std::pair<std::string, std::string> cases[] = {
-        // clang-format off
-        {"ends\0here"s, "ends"},
-        {"tab\tlf\ncr\r", "tab\tlf\ncr\r"}, {"\x01\x1F\x7F", "??\x7F"},
-        {"caf\xC3\xA9 \xE2\x82\xAC \xF0\x9F\x98\x80", "caf\xC3\xA9 \xE2\x82\xAC \xF0\x9F\x98\x80"},
-        {"\x80\xBF\xFE\xFF\xF5", "?????"},
-        {"\xC0\x80\xC1\xBF", "????"}, {"\xE0\x9F\xBF\xF0\x8F\xBF\xBF", "???????"}, // too long for their code points
-        {"\xED\xA0\x80|\xED\x9F\xBF", "???|\xED\x9F\xBF"}, // the first surrogate, and the code point below
-        {"\xEF\xBF\xBD|\xEF\xBF\xBE|\xEF\xBF\xBF", "\xEF\xBF\xBD|???|???"},
-        {"\xF4\x8F\xBF\xBF|\xF4\x90\x80\x80", "\xF4\x8F\xBF\xBF|????"},
-        {"cut \xE2\x82", "cut ??"}, {"\xE2\x82zz\xC3", "??zz?"},
-        // clang-format on
-    };
+    const std::pair<std::string, std::string> cases[] = {{"ends\0here"s, "ends"},
+                                                         {"tab\tlf\ncr\r", "tab\tlf\ncr\r"},
+                                                         {"\x01 caf\xC3\xA9", "? caf\xC3\xA9"},
+                                                         {"cut \xE2\x82", "cut ??"}};
     for (const auto& [field, expected] : cases)
         EXPECT_EQ(property_text(field.data(), field.size()).c_str(), expected);
 

@@ -8,7 +8,6 @@
 #include <span>
 #include <string>
 #include <strings.h>
-#include <tuple>
 
 namespace
 {
@@ -24,16 +23,6 @@ const Qualifier_Row* find(const char* class_name, const char* feature_name, cons
             !strcasecmp(row.parameter_name, parameter) && !strcasecmp(row.name, name))
             return &row;
     return nullptr;
-}
-
-std::string text_of(const char* class_name, const char* property, const std::string& code)
-{
-    const Qualifier_Row* codes = find(class_name, property, "ValueMap");
-    const Qualifier_Row* texts = find(class_name, property, "Values");
-    for (unsigned i = 0; codes && texts && i < codes->num_values; i++)
-        if (codes->values[i] == code)
-            return texts->values[i];
-    return "";
 }
 
 TEST(Qualifier_Table, is_sorted_without_duplicates)
@@ -65,15 +54,6 @@ TEST(Qualifier_Table, every_code_has_one_text)
         EXPECT_EQ(std::set<std::string>(row.values, row.values + row.num_values).size(), row.num_values);
     }
     EXPECT_GT(maps, 40u);
-}
-
-TEST(Qualifier_Table, reported_codes_have_their_texts)
-{
-    EXPECT_EQ(text_of("CIM_ManagedSystemElement", "OperationalStatus", "11"), "In Service");
-    EXPECT_EQ(text_of("CIM_ProtocolEndpoint", "OperationalStatus", "10"), "Stopped"); // an override has what it overrides
-    EXPECT_EQ(text_of("CIM_EnabledLogicalElement", "EnabledState", "6"), "Enabled but Offline");
-    EXPECT_EQ(text_of("CIM_FCPort", "PortType", "10"), "N");
-    EXPECT_EQ(text_of("CIM_EthernetPort", "PortType", "108"), "10GBase-LR");
 }
 
 // The meta-data's flag and the table's row go together: the one says that it is an instance, the other of which class.
