@@ -86,18 +86,17 @@ def program(mixed):
     return [arguments[0], "--module", arguments[arguments.index("--module") + 1], "--port", "0"]
 
 
+def certify(folder, *options):
+    """A certificate of 127.0.0.1 and its key."""
+    certificate, key = folder / "certificate.pem", folder / "key.pem"
+    command = ["openssl", "req", "-x509", "-nodes", "-subj", "/CN=test", "-addext", "subjectAltName=IP:127.0.0.1"]
+    subprocess.run([*command, *options, "-out", certificate, "-keyout", key], capture_output=True, check=True)
+    return certificate, key
+
+
 @pytest.fixture(scope="session")
 def identity(tmp_path_factory):
-    """A certificate of 127.0.0.1 and its key."""
-    folder = tmp_path_factory.mktemp("identity")
-    certificate, key = folder / "certificate.pem", folder / "key.pem"
-    subprocess.run(
-        ["openssl", "req", "-x509", "-newkey", "ec", "-pkeyopt", "ec_paramgen_curve:prime256v1", "-nodes", "-days", "2"]
-        + ["-subj", "/CN=test", "-addext", "subjectAltName=IP:127.0.0.1", "-out", certificate, "-keyout", key],
-        capture_output=True,
-        check=True,
-    )
-    return certificate, key
+    return certify(tmp_path_factory.mktemp("identity"), "-newkey", "ec", "-pkeyopt", "ec_paramgen_curve:prime256v1", "-days", "2")
 
 
 @pytest.fixture(scope="module")

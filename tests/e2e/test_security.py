@@ -12,7 +12,7 @@ import time
 
 import pytest
 import pywbem
-from conftest import post, wait_until
+from conftest import certify, post, wait_until
 
 from tools.wbemcli import Wbemcli, WbemcliError
 
@@ -195,17 +195,8 @@ def test_tls(start, users, identity, monkeypatch):
     assert server.stop() == 0
 
 
-def certify(folder, *options):
-    """A certificate of 127.0.0.1 and its key."""
-    folder.mkdir()
-    certificate, key = folder / "certificate.pem", folder / "key.pem"
-    command = ["openssl", "req", "-x509", "-nodes", "-subj", "/CN=test", "-addext", "subjectAltName=IP:127.0.0.1"]
-    subprocess.run([*command, *options, "-out", certificate, "-keyout", key], capture_output=True, check=True)
-    return certificate, key
-
-
 def test_tls_keeps_what_was_recorded_secret(start, users, tmp_path):
-    certificate, key = certify(tmp_path / "rsa", "-newkey", "rsa:2048", "-days", "2")
+    certificate, key = certify(tmp_path, "-newkey", "rsa:2048", "-days", "2")
     server = start("fc-hba", options=["--users", str(users), "--certificate", str(certificate), "--key", str(key)]).server
     client = ssl.create_default_context(cafile=certificate)
     client.maximum_version = ssl.TLSVersion.TLSv1_2
@@ -223,7 +214,7 @@ def test_certificates_are_reloaded_and_weak_ones_told(start, users, identity, tm
             place.write_bytes(file.read_bytes())
             place.chmod(0o600)
 
-    weak = certify(tmp_path / "weak", "-newkey", "rsa:1024")
+    weak = certify(users.parent, "-newkey", "rsa:1024")
     request = subprocess.run(["openssl", "x509", "-x509toreq", "-in", weak[0], "-signkey", weak[1]], capture_output=True, check=True)
     expired = ["openssl", "x509", "-req", "-signkey", weak[1], "-days", "-1", "-out", weak[0]]
     subprocess.run(expired, input=request.stdout, capture_output=True, check=True)
