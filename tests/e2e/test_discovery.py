@@ -40,7 +40,7 @@ def conforming(mixed):
     return found
 
 
-def test_profiles_lead_to_what_conforms_to_them(mixed, conforming):
+def test_profiles_lead_to_what_conforms_to_them(mixed, interop, conforming):
     subprofiles = [profile["InstanceID"] for profile in mixed.pywbem.EnumerateInstances("ZEMLAR_RegisteredSubProfile")]
     told = {name: [(path.namespace, path.classname) for path in paths] for name, paths in conforming.items()}
     host = [("root/zemlar", "ZEMLAR_ComputerSystem")]
@@ -53,6 +53,13 @@ def test_profiles_lead_to_what_conforms_to_them(mixed, conforming):
     assert [path["InstanceID"] for path in conforming["SMI-S"]] == subprofiles
     for path in sum(conforming.values(), []):
         assert mixed.pywbem.GetInstance(path)
+    further = {path.classname for path in mixed.pywbem.AssociatorNames(conforming["FC HBA"][0])}
+    assert {"ZEMLAR_PortController", "ZEMLAR_FCPort", "ZEMLAR_StorageExtent", "ZEMLAR_CIMXMLCommunicationMechanism"} <= further
+    for client in (interop, mixed.pywbem):
+        one = client.EnumerateInstances("CIM_ElementConformsToProfile")[0]
+        assert one["ConformantStandard"].namespace == client.default_namespace
+        assert one["ManagedElement"].namespace == "root/zemlar"
+        assert client.GetInstance(one.path) == one
 
 
 def test_the_object_manager_has_the_names_that_the_server_gives_itself(mixed, interop, conforming):

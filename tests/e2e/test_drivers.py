@@ -16,7 +16,7 @@ def test_without_a_driver_the_host_and_the_profiles_are_left(start, tmp_path, sc
     for needs_it in ("CIM_LogicalDevice", "CIM_PhysicalElement", "CIM_ProtocolEndpoint", "CIM_StatisticalData", "CIM_Product"):
         assert host.pywbem.EnumerateInstanceNames(needs_it) == []
     log = (tmp_path / ".cimple/messages").read_text(encoding="utf-8")
-    assert line in log and GATE in log
+    assert line in log and GATE in log and "Building association instance for profile : Server\n" in log
 
 
 def test_a_text_of_any_bytes_spoils_no_answer(start):

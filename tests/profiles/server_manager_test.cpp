@@ -6,6 +6,8 @@
 #include "schema/CIM_ObjectManager.h"
 #include "tests/inventory/inventory_fixture.h"
 
+#include <array>
+
 using namespace zmlr;
 using testing::ElementsAre;
 using testing::IsEmpty;
@@ -13,12 +15,7 @@ using testing::IsEmpty;
 namespace
 {
 
-struct Texts // of an object manager; without a text a property is null
-{
-    const char* name;
-    const char* element_name;
-    const char* description;
-};
+using Texts = std::array<const char*, 3>; // Name, ElementName and Description of an object manager; some may be null
 
 // A server whose module works for it on this thread. It passes every question on to the module before it answers.
 class Foreign_Server : public Thread_Context
@@ -39,14 +36,10 @@ public:
     Ref<Instance> instance_enumerator_get(const Instance_Enumerator_Rep*) override
     {
         Ref<CIM_ObjectManager> manager(CIM_ObjectManager::create());
-        const auto set = [](Property<String>& property, const char* text)
-        {
-            if (text)
-                property.set(text);
-        };
-        set(manager->Name, _managers.front().name);
-        set(manager->ElementName, _managers.front().element_name);
-        set(manager->Description, _managers.front().description);
+        Property<String>* const properties[] = {&manager->Name, &manager->ElementName, &manager->Description};
+        for (std::size_t i = 0; i < 3; i++)
+            if (const char* text = _managers.front()[i])
+                properties[i]->set(text);
         return Ref<Instance>(manager.steal());
     }
 
@@ -83,12 +76,12 @@ TEST_F(Profiles, name_the_object_manager_as_its_server_does)
         std::vector<Texts> managers;
         std::vector<std::string> expected; // Name, Caption, Description
     } servers[] = {
-        {false, {{"n", "e", "d"}}, {stand_in, stand_in, stand_in}},
+        {false, {Texts{"n", "e", "d"}}, {stand_in, stand_in, stand_in}},
         {true, {}, {stand_in, stand_in, stand_in}},
-        {true, {{"n", "e", "d"}, {"other", "other", "other"}}, {R"("n")", R"("e")", R"("d")"}},
-        {true, {{"n", nullptr, nullptr}}, {R"("n")", "", ""}},
-        {true, {{"", "", "d"}}, {stand_in, R"("")", R"("d")"}},
-        {true, {{nullptr, "e", "d"}}, {stand_in, R"("e")", R"("d")"}},
+        {true, {Texts{"n", "e", "d"}, Texts{"other", "other", "other"}}, {R"("n")", R"("e")", R"("d")"}},
+        {true, {Texts{"n", nullptr, nullptr}}, {R"("n")", "", ""}},
+        {true, {Texts{"", "", "d"}}, {stand_in, R"("")", R"("d")"}},
+        {true, {Texts{nullptr, "e", "d"}}, {stand_in, R"("e")", R"("d")"}},
     };
     const std::string question = "root/PG_InterOp CIM_ObjectManager\n";
     const Ref<ZEMLAR_ObjectManager> other(ZEMLAR_ObjectManager::create());
