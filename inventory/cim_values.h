@@ -45,6 +45,13 @@ enum Alarm_State : uint16
     ALARM_STATE_ALTERNATING = 3
 };
 
+// CIM_SoftwareInstallationService.InstallFromURI, InstallOptions, and what the service's capabilities tell of them
+enum Install_Option : uint16
+{
+    INSTALL_OPTION_INSTALL = 4,
+    INSTALL_OPTION_UPDATE = 5
+};
+
 // CIM_PortController.ControllerType
 enum Controller_Type : uint16
 {

@@ -27,7 +27,7 @@ Instance_Array dispatch(const char* log_source, std::span<const Route> routes, c
         ZMLR_LOG(LL_ERR, "Driver is not installed or there is a hxal mismatch hence no instances returned");
         return Instance_Array();
     }
-    return route->build ? route->build(id, request) : Instance_Array();
+    return route->build(id, request);
 }
 
 } // namespace zmlr

@@ -17,7 +17,7 @@ enum class Driver
     not_needed
 };
 
-// The classes first to last (both included) and their builder; null while nothing builds them: they have no instances then.
+// The classes first to last (both included) and their builder.
 struct Route
 {
     classId_t first;

@@ -1,5 +1,6 @@
 #include "inventory/fchba_manager.h"
 
+#include "inventory/access_point_helper.h"
 #include "inventory/adapter_helper.h"
 #include "inventory/common_helper.h"
 #include "inventory/dispatch.h"
@@ -7,6 +8,7 @@
 #include "inventory/physical_asset_helper.h"
 #include "inventory/port_helper.h"
 #include "inventory/served_above.h"
+#include "inventory/software_update_helper.h"
 #include "runtime/log.h"
 #include "runtime/trace.h"
 
@@ -23,25 +25,17 @@ Instance_Array common(classId_t id, const Inventory_Request& request)
     return CommonHelper::getCommonHelperObject().getComputerSystemInstances(id, request);
 }
 
-Instance_Array adapter(classId_t id, const Inventory_Request& request)
+template <auto helper> Instance_Array by_class(classId_t id, const Inventory_Request& request)
 {
-    return AdapterHelper::getAdapterHelperInstance().getInstancesByClass(id, request);
+    return helper().getInstancesByClass(id, request);
 }
 
-Instance_Array port(classId_t id, const Inventory_Request& request)
-{
-    return PortHelper::getPortHelperObject().getInstancesByClass(id, request);
-}
-
-Instance_Array ethernet_port(classId_t id, const Inventory_Request& request)
-{
-    return EthernetPortHelper::getEthernetPortHelperObject().getInstancesByClass(id, request);
-}
-
-Instance_Array physical_asset(classId_t id, const Inventory_Request& request)
-{
-    return PhysicalAssetHelper::getPhysicalAssetHelperObject().getInstancesByClass(id, request);
-}
+constexpr auto access_point = by_class<AccessPointHelper::getAccessPointHelperInstance>;
+constexpr auto adapter = by_class<AdapterHelper::getAdapterHelperInstance>;
+constexpr auto ethernet_port = by_class<EthernetPortHelper::getEthernetPortHelperObject>;
+constexpr auto physical_asset = by_class<PhysicalAssetHelper::getPhysicalAssetHelperObject>;
+constexpr auto port = by_class<PortHelper::getPortHelperObject>;
+constexpr auto software_update = by_class<SoftwareUpdateHelper::getSoftwareUpdateHelperInstance>;
 
 // clang-format off
 constexpr Route routes[] = {
@@ -50,8 +44,8 @@ constexpr Route routes[] = {
     {CLASSID_FCPort,                          CLASSID_FCPort,                                      Driver::needed,     port},
     {CLASSID_SCSIProtocolEndpoint,            CLASSID_FCPortStatistics,                            Driver::needed,     port},
     {CLASSID_PhysicalPackage,                 CLASSID_AdapterSoftwareIdentity,                     Driver::needed,     adapter},
-    {CLASSID_RemoteServiceAccessPoint,        CLASSID_RemoteServiceAccessPoint,                    Driver::not_needed, nullptr},
-    {CLASSID_HBASoftwareInstallationService,  CLASSID_HBASoftwareInstallationServiceCapabilities,  Driver::needed,     nullptr},
+    {CLASSID_RemoteServiceAccessPoint,        CLASSID_RemoteServiceAccessPoint,                    Driver::not_needed, access_point},
+    {CLASSID_HBASoftwareInstallationService,  CLASSID_HBASoftwareInstallationServiceCapabilities,  Driver::needed,     software_update},
     {CLASSID_EthernetPort,                    CLASSID_EthernetPort,                                Driver::needed,     ethernet_port},
     {CLASSID_MemoryDiagnosticTest,            CLASSID_DiagnosticCompletionRecord,                  Driver::needed,     diagnostic_instances},
     {CLASSID_LogicalPortGroup,                CLASSID_LogicalPortGroup,                            Driver::needed,     port},

@@ -1,6 +1,8 @@
 """The inventory as clients see it. Golden inventories hold all that is served on a scenario; script/golden rewrites them."""
 
 import difflib
+import shutil
+import subprocess
 from pathlib import Path
 
 import pytest
@@ -75,3 +77,24 @@ def test_the_beacon_of_a_mezzanine_card_is_not_supported(mixed):
     path = mixed.pywbem.EnumerateInstanceNames("ZEMLAR_AlarmDevice")[0]
     path["DeviceID"] = "100000051E100200"
     assert mixed.pywbem.InvokeMethod("SetAlarmState", path, State=pywbem.Uint16(3))[0] == 1
+
+
+def test_the_access_point_is_there_while_the_agent_runs(start, tmp_path):
+    (tmp_path / ".cimplerc").write_text("LOG_LEVEL = INFO\n", encoding="utf-8")
+    agent = tmp_path / "quillonagent"
+    shutil.copy(shutil.which("sleep"), agent)
+    host = start("no-driver", {"HOME": str(tmp_path)})
+
+    def addresses():
+        points = host.pywbem.EnumerateInstances("ZEMLAR_RemoteServiceAccessPoint")
+        return [(point["Name"], point["ElementName"], point["InfoFormat"], point["AccessInfo"]) for point in points]
+
+    assert addresses() == []
+    with subprocess.Popen([agent, "600"]) as process:
+        system = host.pywbem.EnumerateInstanceNames("ZEMLAR_ComputerSystem")[0]["Name"]
+        assert addresses() == [("Quillon Service", "Quillon Service Access Point", 200, f"https://{system}:34568/index.html")]
+        process.terminate()
+    assert addresses() == []
+    log = (tmp_path / ".cimple/messages").read_text(encoding="utf-8")
+    for line in ("The Quillon Agent is not running so no service available", "Warning: No service is available"):
+        assert log.count(line) == 2

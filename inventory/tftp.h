@@ -1,0 +1,36 @@
+// Files from TFTP servers (RFC 1350), fetched by the host's command line client.
+//
+// Both the server and the file are named by clients, and the commands run with the rights of the CIM server: nothing that the
+// shell, "rm" or "tftp" would read as something else than one server and one plain file name reaches them.
+#pragma once
+
+#include "runtime/string.h"
+
+#include <optional>
+
+namespace zmlr
+{
+
+struct Tftp_Address
+{
+    String server;
+    String file;
+};
+
+// The address in what follows "tftp://": a server of at least two characters, a slash, a file. None when a part is missing,
+// begins with '-' or holds a control character, when the file holds '/', ':' or "..", and when a command would be longer than
+// 1023 bytes.
+std::optional<Tftp_Address> parse_tftp_address(const String& text);
+
+namespace ProviderUtil
+{
+
+// Fetches the file into the working directory, where one of that name is removed first. The exit status of the transfer;
+// something else than 0 also when the old file stays, when what came is empty or no plain file, and for names that are no
+// address. The client does not tell all failures: a status of 0 without a file is one too. It gives up 25 s after the last sign
+// of life of the server; a transfer is ended after 5 minutes.
+int TftpGetFile(const char* server, const char* file);
+
+} // namespace ProviderUtil
+
+} // namespace zmlr
