@@ -1,6 +1,7 @@
 """The demonstration: what real clients see of a simulated host. Fails loudly when a step fails or the clients disagree."""
 
 import sys
+from dataclasses import dataclass, field
 
 import pywbem
 
@@ -200,6 +201,78 @@ def switch_a_beacon(clients):
         print(f"\nThe beacon of {path['DeviceID']} is {ALARM_STATES[seen]}.")
 
 
+@dataclass
+class Branch:
+    """What hangs on an object: the far ends of an association, how one is told (nothing: it is passed through), what hangs on them."""
+
+    association: str
+    role: str  # of the far ends
+    tell: object = None
+    branches: list = field(default_factory=list)
+    found: int = 0
+
+
+def adapter_line(adapter):
+    return f"{kind(adapter['OtherControllerType'])} {adapter['DeviceID']}, {enabled(adapter['EnabledState'])}"
+
+
+def port_line(port):
+    return f"FC port {port['DeviceID']}, {enabled(port['EnabledState'])}, {status(port['OperationalStatus'])}, speed {speed(port['Speed'])}"
+
+
+def module_line(module):
+    return f"module {module['Tag']}: {module['Model']} of {module['Manufacturer']}"
+
+
+def port_tree():
+    """What hangs on an FC port."""
+    units = Branch("ZEMLAR_SCSIInitiatorTargetLogicalUnitPath", "LogicalUnit", lambda unit: f"{unit['ElementName']}: {unit['Name']}")
+    targets = Branch("ZEMLAR_SCSIInitiatorTargetLogicalUnitPath", "Target", lambda end: f"target {end['Name'].split('_')[1]}", [units])
+    modules = Branch("ZEMLAR_EthernetPortRealizes", "Antecedent", module_line)
+    return [
+        Branch("ZEMLAR_ElementStatisticalData", "Stats", lambda counts: f"{counts['BytesTransmitted']} bytes sent, {counts['BytesReceived']} received"),
+        Branch("ZEMLAR_HostedDependency", "Antecedent", lambda port: f"on Ethernet port {port['DeviceID']}, {port['ElementName']}", [modules]),
+        Branch("ZEMLAR_DeviceSAPImplementation", "Dependent", None, [targets]),
+    ]
+
+
+def tree():
+    """What hangs on the host, down to the units behind its ports."""
+    modules = Branch("ZEMLAR_PhysicalConnectorContainer", "PartComponent", module_line)
+    of_adapter = [
+        Branch("ZEMLAR_ProductElementComponent", "GroupComponent", lambda product: f"product {product['ElementName']} of {product['Vendor']}"),
+        Branch("ZEMLAR_Realizes", "Antecedent", lambda card: f"card {card['Model']}, {card['SerialNumber']}", [modules]),
+        Branch("ZEMLAR_AdapterElementSoftwareIdentity", "Antecedent", lambda software: f"{software['Name']} {software['VersionString']}"),
+        Branch("ZEMLAR_ControlledBy", "Dependent", port_line, port_tree()),
+    ]
+    return Branch("ZEMLAR_PortControllerSystemDevice", "PartComponent", adapter_line, of_adapter)
+
+
+def climb(clients, path, branch, depth):
+    for instance in clients.pywbem.Associators(path, AssocClass=branch.association, ResultRole=branch.role):
+        branch.found += 1
+        if branch.tell:
+            print("  " * depth + branch.tell(instance))
+        for next_branch in branch.branches:
+            climb(clients, instance.path, next_branch, depth + bool(branch.tell))
+
+
+def require(branch):
+    if not branch.found:
+        raise SystemExit(f"demo: no {branch.role} was found through {branch.association}")
+    for next_branch in branch.branches:
+        require(next_branch)
+
+
+def show_the_tree(clients):
+    print("\nThe same by associators alone, from the host on\n")
+    host = clients.pywbem.EnumerateInstanceNames("ZEMLAR_ComputerSystem")[0]
+    print(f"  host {host['Name']}")
+    branch = tree()
+    climb(clients, host, branch, 2)
+    require(branch)
+
+
 def demonstrate(server):
     clients = Clients(server)
     print(f"The embedded CIM server runs on {server.url}, its host has the simulated adapters of scenario 'mixed'.")
@@ -208,6 +281,7 @@ def demonstrate(server):
         show_class(clients, title, class_name, columns)
     show_one_port(clients)
     switch_a_beacon(clients)
+    show_the_tree(clients)
 
 
 def main():
