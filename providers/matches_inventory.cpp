@@ -8,6 +8,7 @@
 #include "inventory/fchba_manager.h"
 #include "providers/joining.h"
 #include "providers/key_index.h"
+#include "runtime/ascii.h"
 #include "schema/CIM_LogicalDevice.h"
 #include "schema/ZEMLAR_SCSIInitiatorTargetLogicalUnitPath.h"
 
@@ -50,10 +51,11 @@ std::optional<int> cut_number(std::string_view& tag)
     const std::size_t line = tag.rfind('_');
     if (line == std::string_view::npos)
         return std::nullopt;
-    int number = 0;
     const char* end = tag.data() + tag.size();
-    const auto [stop, error] = std::from_chars(tag.data() + line + 1, end, number);
-    if (error != std::errc() || stop != end || number < 0)
+    const char* begin = tag.data() + line + 1;
+    int number = 0;
+    const auto [stop, error] = std::from_chars(begin, end, number);
+    if (error != std::errc() || stop != end || !ascii::is_digit(*begin))
         return std::nullopt;
     tag.remove_suffix(tag.size() - line);
     return number;

@@ -30,7 +30,7 @@ class Associations:
         def concerns(association):
             return any(association[name] == source and role in (None, name) for name in self.roles)
 
-        return [association for association in self.all if concerns(association)]
+        return list({association.path: association for association in filter(concerns, self.all)}.values())
 
     def far_ends(self, source, role=None, result_role=None, result_class=None):
         classes = subclasses(self.client, result_class)
