@@ -44,6 +44,7 @@ std::optional<Open_Adapter> open_adapter(const Walk_Row& row, int index)
     if (!handle)
     {
         say(row, row.not_opened, index);
+        say(row, row.not_opened_remark, index);
         return std::nullopt;
     }
     const Open_Adapter adapter = {handle, index, hxal_adapter_get_num_port(index), is_cna(index)};

@@ -46,10 +46,11 @@ struct Walk_Row
     Walk_Line no_cna = {}; // -; with it, adapters that are no CNA are passed over
 
     // Lines of each adapter that is opened.
-    Walk_Line not_opened = {};      // adapter
-    Walk_Line kind = {};            // "CNA" or "FC HBA"
-    Walk_Line no_ports = {};        // adapter, ports
-    Walk_Line no_ports_remark = {}; // -
+    Walk_Line not_opened = {};        // adapter
+    Walk_Line not_opened_remark = {}; // -
+    Walk_Line kind = {};              // "CNA" or "FC HBA"
+    Walk_Line no_ports = {};          // adapter, ports
+    Walk_Line no_ports_remark = {};   // -
 
     // Lines of each port.
     Walk_Line no_ethernet = {}; // adapter, port

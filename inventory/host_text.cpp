@@ -138,6 +138,11 @@ String ProviderUtil::updateNamespacePath(const String& path)
     const Scope_Trace trace(log_source);
     char host[name_size + 1] = {};
     getHostInfo(host, name_size);
+    return updateNamespacePath(path, host);
+}
+
+String ProviderUtil::updateNamespacePath(const String& path, const String& host)
+{
     return String("//") + host + "/root/zemlar:" + path;
 }
 

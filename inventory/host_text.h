@@ -24,8 +24,9 @@ String getHostName();
 // Writes the text by which the host is known in the model, cut to `len` bytes with its terminator.
 Host_Info getHostInfo(char* buf, int len);
 
-// "//" host "/root/zemlar:" path.
+// "//" host "/root/zemlar:" path. Without a host it is looked up.
 String updateNamespacePath(const String& path);
+String updateNamespacePath(const String& path, const String& host);
 
 } // namespace ProviderUtil
 

@@ -1,10 +1,12 @@
 """The demonstration: what real clients see of a simulated host. Fails loudly when a step fails or the clients disagree."""
 
+import queue
 import sys
 from dataclasses import dataclass, field
 
 import pywbem
 
+from tools.alerts import Subscription, line_of
 from tools.simulated_server import SimulatedServer
 from tools.wbemcli import Wbemcli
 
@@ -273,6 +275,24 @@ def show_the_tree(clients):
     require(branch)
 
 
+def pull_a_module(server, clients):
+    """Subscribes, pulls the module out of the first port of the HBA, shows the alert, puts it back and unsubscribes."""
+    alerts = queue.Queue()
+    wanted = "SELECT * FROM ZEMLAR_AlertIndication WHERE EventID = 'HXA_AEN_PORT_SFP_REMOVE'"
+    with Subscription(clients.pywbem, alerts.put, wanted) as subscription:
+        print(f"\nA listener on {subscription.url} subscribes for modules that are removed. One is pulled; the alert:\n")
+        server.hxasim("sfp", 1, 0, "remove")
+        try:
+            alert = alerts.get(timeout=10)
+        except queue.Empty:
+            raise SystemExit("demo: no alert came") from None
+        print("  " + line_of(alert))
+        print(f"  {alert['AlertingManagedElement']}")
+        server.hxasim("sfp", 1, 0, "insert")
+    if clients.pywbem.EnumerateInstanceNames("CIM_IndicationSubscription", namespace="root/PG_InterOp"):
+        raise SystemExit("demo: a subscription is left")
+
+
 def demonstrate(server):
     clients = Clients(server)
     print(f"The embedded CIM server runs on {server.url}, its host has the simulated adapters of scenario 'mixed'.")
@@ -282,6 +302,7 @@ def demonstrate(server):
     show_one_port(clients)
     switch_a_beacon(clients)
     show_the_tree(clients)
+    pull_a_module(server, clients)
 
 
 def main():

@@ -1,5 +1,6 @@
 """The embedded CIM server on a simulated host, as a context manager."""
 
+import json
 import os
 import re
 import signal
@@ -62,6 +63,14 @@ class SimulatedServer:
     def arguments(self):
         """The server's own command line, as the system knows it."""
         return Path(f"/proc/{self.pid}/cmdline").read_text(encoding="utf-8").split("\0")[:-1]
+
+    def hxasim(self, *words):
+        """Steers the simulated host by the tool of that name; its answer."""
+        socket, tool = re.search(r"HXASIM_CONTROL=(.+) (\S+/hxasim) status", "\n".join(self.lines)).groups()
+        asked = subprocess.run([tool, "--socket", socket, *map(str, words)], capture_output=True, text=True, check=False)
+        if asked.returncode != 0:
+            raise RuntimeError(f"hxasim {words}: {asked.stdout}{asked.stderr}")
+        return json.loads(asked.stdout)
 
     def send_signal(self, number):
         self._process.send_signal(number)

@@ -81,8 +81,10 @@ Members raise_event(Simulator& simulator, Json_Object& object)
     event.instance = static_cast<int>(object.number("instance", max_instances - 1, 0));
     event.level = static_cast<std::int16_t>(object.number("level", max_i16, 0));
     event.data = object.bytes("data", sizeof(hxa_aen_data_t));
+    const auto count = object.number("count", Event_Log::capacity, 1);
     object.done();
-    simulator.raise_event(event);
+    for (std::uint32_t raised = 0; raised < count; ++raised)
+        simulator.raise_event(event);
     return {};
 }
 

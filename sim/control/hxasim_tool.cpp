@@ -148,6 +148,7 @@ private:
         add_place(command);
         take(command, "--level", "level", "of a sfp-pom: 1 normal, 2 warning, 3 alarm");
         take_text(command, "--data", "data", "event data, hexadecimal, instead of the IOC's own");
+        take(command, "--count", "count", "raise it so many times");
     }
 
     void add_place(CLI::App* command)
