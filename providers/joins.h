@@ -8,6 +8,6 @@ namespace zmlr
 {
 
 // The row of an association class; without one the call does not compile.
-consteval const Join& join_of(const Meta_Class& meta_class) { return row_of(meta_class, inventory_joins, profile_joins); }
+constexpr const Join& join_of(const Meta_Class& meta_class) { return row_of(meta_class, inventory_joins, profile_joins); }
 
 } // namespace zmlr

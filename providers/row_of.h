@@ -9,7 +9,7 @@ namespace zmlr
 {
 
 // The row whose `meta_class` is the class, found by the compiler in one of the tables; without one the call does not compile.
-template <class Row, std::size_t... N> consteval const Row& row_of(const Meta_Class& meta_class, const Row (&... tables)[N])
+template <class Row, std::size_t... N> constexpr const Row& row_of(const Meta_Class& meta_class, const Row (&... tables)[N])
 {
     const Row* found = nullptr;
     const auto look = [&](const auto& rows)
