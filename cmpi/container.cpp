@@ -13,6 +13,16 @@ constexpr const char* log_source = "Container";
 
 bool selected(const Meta_Feature* feature, uint32 mask) { return mask == 0 || (feature->flags & mask) != 0; }
 
+// Keys stand among the first features: what follows the last of them is not looked at.
+std::span<const Meta_Feature* const> up_to_last_key(const Meta_Class* meta_class)
+{
+    const auto features = features_of(meta_class);
+    std::size_t size = 0;
+    for (uint32 left = meta_class->num_keys; left > 0 && size < features.size(); ++size)
+        left -= is_key(features[size]) ? 1U : 0U;
+    return features.first(size);
+}
+
 } // namespace
 
 int Container::convert(const Meta_Class* meta_class, uint32 mask, Ref<Instance>& instance)
@@ -63,18 +73,15 @@ int Container::convert(const Instance* instance, uint32 mask)
     }
     const Meta_Record* record = record_of(instance);
 
-    // Keys stand among the first features: what follows the last of them is not looked at.
-    uint32 left = mask == Flag_Key ? instance->meta_class->num_keys : record->num_meta_features;
+    const uint32 wanted = mask != 0 ? mask : Flag_Property | Flag_Reference;
     Value value;
-    for (uint32 i = 0; i < record->num_meta_features && left > 0; ++i)
+    for (const Meta_Feature* feature : mask == Flag_Key ? up_to_last_key(instance->meta_class) : features_of(record))
     {
-        const Meta_Feature* feature = record->meta_features[i];
-        if (!selected(feature, mask))
+        if (!(feature->flags & wanted) || is_method(feature) || is_null(instance, feature))
             continue;
-        --left;
-        if (is_method(feature) || is_null(instance, feature))
-            continue;
-        if (value.borrow(instance, feature) != 0)
+        if (const Meta_Property* property = to_property(feature))
+            value.borrow(type_of(property), address_of(instance, property->offset));
+        else if (value.borrow(instance, feature) != 0)
         {
             ZMLR_LOG(LL_WARN, "unexpected failure: %s.%s", record->name, feature->name);
             continue;

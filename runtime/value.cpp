@@ -49,10 +49,7 @@ std::size_t size_of(Value::Type type) { return is_array(type) ? sizeof(__Array_R
 Value::Type type_of(const Meta_Feature* feature)
 {
     if (const Meta_Property* property = to_property(feature))
-    {
-        const auto scalar = static_cast<Value::Type>(property->type);
-        return is_array(property) ? Value::array_of(scalar) : scalar;
-    }
+        return type_of(property);
     if (is_reference(feature))
         return is_array(as_reference(feature)) ? Value::INSTANCE_ARRAY : Value::INSTANCE;
     return Value::NONE;
@@ -142,22 +139,15 @@ void Value::set_null(Type type)
 int Value::borrow(const Instance* instance, const Meta_Feature* feature)
 {
     check_inst(instance);
-    clear();
-    _type = type_of(feature);
-    _owned = false;
-    if (_type == NONE)
-        return -1;
-    _null = is_null(instance, feature);
-    if (const Meta_Property* property = to_property(feature))
-        _elsewhere = address_of(instance, property->offset);
-    else if (const Meta_Reference* array = to_array_reference(feature))
-        _elsewhere = address_of(instance, array->offset);
-    else
-    {
-        // The record's field is a pointer to its own class: only its value is taken.
-        const Instance* referenced = reference_of(instance, as_reference(feature));
-        std::memcpy(_held, &referenced, sizeof(referenced));
-    }
+    const Meta_Property* property = to_property(feature);
+    const Meta_Reference* array = property ? nullptr : to_array_reference(feature);
+    borrow(type_of(feature), property || array ? address_of(instance, property ? property->offset : array->offset) : nullptr);
+    _null = _type == NONE || is_null(instance, feature);
+    if (_type != INSTANCE)
+        return _type == NONE ? -1 : 0;
+    // The record's field is a pointer to its own class: only its value is taken.
+    const Instance* referenced = reference_of(instance, as_reference(feature));
+    std::memcpy(_held, &referenced, sizeof(referenced));
     return 0;
 }
 

@@ -106,6 +106,16 @@ public:
     // instance is not one that the value itself holds.)
     int borrow(const Instance* instance, const Meta_Feature* feature);
 
+    // The same of a property, known not to be null, that lies there.
+    void borrow(Type type, const void* place) noexcept
+    {
+        drop();
+        _type = type;
+        _null = false;
+        _owned = false;
+        _elsewhere = place;
+    }
+
     // Stores the value into a property or reference; -1 and a warning when instance, type or referenced class do not fit. An
     // instance stored gets one more reference; a null value unsets a reference.
     int get(Instance* instance, const Meta_Feature* feature) const;
@@ -157,7 +167,12 @@ template <class T> struct Value::Code<Array<T>>
 };
 
 Value::Type type_of(const Meta_Feature* feature); // NONE for a method
-const char* name_of(Value::Type type);            // "none", "boolean" ... "instance", "boolean_array" ... "instance_array"
-const char* _type_name(Value::Type type);         // "NONE", "BOOLEAN" ... "INSTANCE_ARRAY"
+inline Value::Type type_of(const Meta_Property* property)
+{
+    const auto scalar = static_cast<Value::Type>(property->type);
+    return property->subscript != 0 ? Value::array_of(scalar) : scalar;
+}
+const char* name_of(Value::Type type);    // "none", "boolean" ... "instance", "boolean_array" ... "instance_array"
+const char* _type_name(Value::Type type); // "NONE", "BOOLEAN" ... "INSTANCE_ARRAY"
 
 } // namespace zmlr

@@ -49,6 +49,8 @@ Character first_character(std::string_view text)
 
 std::size_t xml_character_size(std::string_view text)
 {
+    if (!text.empty() && text[0] >= ' ' && text[0] <= '~') // most are
+        return 1;
     const Character character = first_character(text);
     return is_xml_character(character.code) ? character.size : 0;
 }

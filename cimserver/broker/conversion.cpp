@@ -13,35 +13,6 @@ template <class T, class Convert> Value from_object(CMPIType type, const typenam
     return {type, convert(object<T>(face))};
 }
 
-Value from_pointer(const CMPIValue& value, CMPIType type)
-{
-    switch (type)
-    {
-    case CMPI_string:
-        return from_object<String_Object>(type, value.string, [](const String_Object& string) { return string.text; });
-    case CMPI_dateTime:
-        return from_object<Datetime_Object>(type, value.dateTime, [](const Datetime_Object& datetime) { return datetime.text; });
-    case CMPI_ref:
-        return from_object<Path_Object>(type, value.ref,
-                                        [](const Path_Object& path) { return std::make_shared<const Object_Path>(path.path); });
-    case CMPI_instance:
-        return from_object<Instance_Object>(
-            type, value.inst, [](const Instance_Object& instance) { return std::make_shared<const Instance>(instance.model()); });
-    default:
-        throw Failure{CMPI_RC_ERR_INVALID_DATA_TYPE};
-    }
-}
-
-std::uint64_t unsigned_in(const CMPIValue& value, unsigned bits)
-{
-    return bits == 8 ? value.uint8 : bits == 16 ? value.uint16 : bits == 32 ? value.uint32 : value.uint64;
-}
-
-std::int64_t signed_in(const CMPIValue& value, unsigned bits)
-{
-    return bits == 8 ? value.sint8 : bits == 16 ? value.sint16 : bits == 32 ? value.sint32 : value.sint64;
-}
-
 // A signed number has the same bits.
 void put_integer(CMPIValue& value, std::uint64_t number, unsigned bits)
 {
@@ -55,21 +26,45 @@ void put_integer(CMPIValue& value, std::uint64_t number, unsigned bits)
         value.uint64 = number;
 }
 
-Value from_scalar(const CMPIValue& value, const Cim_Type& type)
+Value from_scalar(const CMPIValue& value, CMPIType type)
 {
-    if (type.bits > 0)
-        return {type.code,
-                type.is_signed ? Value::Content(signed_in(value, type.bits)) : Value::Content(unsigned_in(value, type.bits))};
-    switch (type.code)
+    switch (type)
     {
     case CMPI_boolean:
-        return {type.code, value.boolean != 0};
+        return {type, value.boolean != 0};
+    case CMPI_uint8:
+        return {type, std::uint64_t{value.uint8}};
+    case CMPI_uint16:
+    case CMPI_char16:
+        return {type, std::uint64_t{value.uint16}};
+    case CMPI_uint32:
+        return {type, std::uint64_t{value.uint32}};
+    case CMPI_uint64:
+        return {type, std::uint64_t{value.uint64}};
+    case CMPI_sint8:
+        return {type, std::int64_t{value.sint8}};
+    case CMPI_sint16:
+        return {type, std::int64_t{value.sint16}};
+    case CMPI_sint32:
+        return {type, std::int64_t{value.sint32}};
+    case CMPI_sint64:
+        return {type, std::int64_t{value.sint64}};
     case CMPI_real32:
-        return {type.code, static_cast<double>(value.real32)};
+        return {type, double{value.real32}};
     case CMPI_real64:
-        return {type.code, value.real64};
+        return {type, value.real64};
+    case CMPI_string:
+        return from_object<String_Object>(type, value.string, [](const String_Object& string) { return string.text; });
+    case CMPI_dateTime:
+        return from_object<Datetime_Object>(type, value.dateTime, [](const Datetime_Object& datetime) { return datetime.text; });
+    case CMPI_ref:
+        return from_object<Path_Object>(type, value.ref,
+                                        [](const Path_Object& path) { return std::make_shared<const Object_Path>(path.path); });
+    case CMPI_instance:
+        return from_object<Instance_Object>(
+            type, value.inst, [](const Instance_Object& instance) { return std::make_shared<const Instance>(instance.model()); });
     default:
-        return from_pointer(value, type.code);
+        throw Failure{CMPI_RC_ERR_INVALID_DATA_TYPE};
     }
 }
 
@@ -133,11 +128,11 @@ Value from_cmpi(const CMPIValue* value, CMPIType type)
         return {CMPI_string, value ? Value::Content(std::string(reinterpret_cast<const char*>(value))) : Value::Content()};
     if (type == array_of(CMPI_chars))
         type = array_of(CMPI_string);
-    if (!is_scalar(element_of(type)))
+    if (value && (type & CMPI_ARRAY) == 0)
+        return from_scalar(*value, type);
+    if (!find_type(type))
         throw Failure{CMPI_RC_ERR_INVALID_DATA_TYPE};
-    if (!value)
-        return {type, {}};
-    return (type & CMPI_ARRAY) != 0 ? from_array(value->array, type) : from_scalar(*value, *find_type(type));
+    return value ? from_array(value->array, type) : Value{type, {}};
 }
 
 CMPIData to_cmpi(const Value& value)

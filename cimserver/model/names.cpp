@@ -16,7 +16,7 @@ constexpr char lower(char c) { return c >= 'A' && c <= 'Z' ? static_cast<char>(c
 
 bool equal_names(std::string_view a, std::string_view b)
 {
-    return std::equal(a.begin(), a.end(), b.begin(), b.end(), [](char x, char y) { return lower(x) == lower(y); });
+    return a == b || std::equal(a.begin(), a.end(), b.begin(), b.end(), [](char x, char y) { return lower(x) == lower(y); });
 }
 
 std::string lower_name(std::string_view name)
@@ -26,21 +26,21 @@ std::string lower_name(std::string_view name)
     return result;
 }
 
-// FNV-1a.
+// FNV-1a, of both cases of a letter alike.
 std::size_t Name_Hash::operator()(std::string_view name) const
 {
     std::uint64_t hash = 0xcbf29ce484222325;
     for (const char c : name)
-        hash = (hash ^ static_cast<unsigned char>(lower(c))) * 0x100000001b3;
+        hash = (hash ^ static_cast<unsigned char>(c | ('a' - 'A'))) * 0x100000001b3;
     return static_cast<std::size_t>(hash);
 }
 
-void put(std::vector<Named_Value>& list, const std::string& name, Value value)
+void put(std::vector<Named_Value>& list, std::string name, Value value)
 {
     if (Named_Value* found = find_named(list, name))
         found->value = std::move(value);
     else
-        list.push_back({name, std::move(value)});
+        list.push_back({std::move(name), std::move(value)});
 }
 
 } // namespace cimserver

@@ -53,7 +53,7 @@ struct Instance
 };
 
 // Adds a value to a list, in the place of one of the same name.
-void put(std::vector<Named_Value>& list, const std::string& name, Value value); // names.cpp
+void put(std::vector<Named_Value>& list, std::string name, Value value); // names.cpp
 
 // A list of property names a client asked for; absent: all.
 using Property_List = std::optional<std::vector<std::string>>;
