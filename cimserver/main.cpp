@@ -42,7 +42,7 @@ void show_identity_of(const Options& options)
     show_identity(std::move(identity));
 }
 
-// What is wrong with new files is told, and the old ones count on.
+// What is wrong with new files is told. The old certificate counts on; with users that cannot be read nobody is let in.
 void reload(const Options& options, Credentials* credentials)
 try
 {
@@ -113,7 +113,7 @@ void serve(const Options& options)
     const Http_Endpoint endpoint = endpoint_of(options);
     const auto credentials = credentials_of(options);
     const auto store = options.state.empty() ? nullptr : std::make_unique<const Subscription_Store>(options.state);
-    Module module(options.module);
+    Module module(options.module, options.provider_timeout);
     Delivery delivery(options.delivery);
     Subscriptions subscriptions(module, delivery, options.indication_order, store.get());
     Server_Name_Spaces name_spaces(module);

@@ -120,6 +120,7 @@ std::variant<Options, int> read_options(int argc, char** argv)
     Options options;
     app.set_version_flag("--version", std::string("zmlr-cimserver ") + version());
     app.add_option("--module", options.module, "the provider module to serve (a shared library)")->type_name("FILE");
+    add_seconds(app, "--provider-timeout", options.provider_timeout, 0.1, "that a request waits for a provider that hangs");
     declare_access(app, options);
     declare_limits(app, options.limits);
     declare_indications(app, options);

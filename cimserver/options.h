@@ -1,6 +1,7 @@
 // The command line of zmlr-cimserver.
 #pragma once
 
+#include "cimserver/broker/module.h"
 #include "cimserver/cimxml/http_server.h"
 #include "cimserver/indications/delivery.h"
 #include "cimserver/indications/indication_providers.h"
@@ -20,6 +21,7 @@ struct Options
     bool no_auth = false;
 
     std::string module;
+    std::chrono::milliseconds provider_timeout = Module::usual_patience;
     std::string address = "127.0.0.1";
     std::optional<std::uint16_t> port; // the protocol's own (HTTP 5988, HTTPS 5989) unless given
     std::string certificate;           // both or none: TLS

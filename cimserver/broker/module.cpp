@@ -48,10 +48,13 @@ const zmlr::Registration* Module::registrations(const Library& library, const st
     return head;
 }
 
-Module::Module(const std::string& file) : _library(open(file)), _repository(registrations(_library, file)), _broker(_repository)
+Module::Module(const std::string& file, std::chrono::milliseconds patience)
+    : _library(open(file))
+    , _repository(registrations(_library, file))
+    , _broker(_repository)
 {
     for (const Class_Entry* entry : _repository.served())
-        _providers.emplace(entry, std::make_unique<Provider>());
+        _providers.emplace(entry, std::make_unique<Provider>(patience));
 }
 
 Module::~Module()

@@ -27,8 +27,11 @@ namespace cimserver
 class Module
 {
 public:
+    // How long a request waits for a provider that others keep busy, unless told otherwise.
+    static constexpr std::chrono::seconds usual_patience{30};
+
     // Throws std::runtime_error that tells the file and why it cannot be loaded, or why it is no module.
-    explicit Module(const std::string& file);
+    explicit Module(const std::string& file, std::chrono::milliseconds patience = usual_patience);
     ~Module();
     Module(const Module&) = delete;
     Module& operator=(const Module&) = delete;
@@ -74,6 +77,8 @@ private:
     // recursive because a factory may call back into the server.
     struct Provider
     {
+        explicit Provider(std::chrono::milliseconds patience) : turns(patience) {}
+
         std::recursive_mutex mutex;
         std::atomic<CMPIInstanceMI*> instance_mi = nullptr;
         std::atomic<CMPIAssociationMI*> association_mi = nullptr;

@@ -14,10 +14,10 @@ Provider_Turn::Provider_Turn(Provider_Turns& turns, const std::string& class_nam
     if (_nested)
         return;
     while (_turns._inside.size() >= Provider_Turns::at_once)
-        if (_turns._left.wait_until(lock, _turns._last_change + Provider_Turns::patience) == std::cv_status::timeout &&
-            std::chrono::steady_clock::now() >= _turns._last_change + Provider_Turns::patience)
+        if (_turns._left.wait_until(lock, _turns._last_change + _turns._patience) == std::cv_status::timeout &&
+            std::chrono::steady_clock::now() >= _turns._last_change + _turns._patience)
             throw Cim_Error(CIM_ERR_FAILED, class_name + " does not answer: earlier requests have kept it busy for " +
-                                                std::to_string(Provider_Turns::patience.count()) + " s");
+                                                std::to_string(_turns._patience / std::chrono::seconds(1)) + " s");
     _turns._inside.push_back(std::this_thread::get_id());
     _turns._last_change = std::chrono::steady_clock::now();
 }

@@ -19,11 +19,13 @@ class Provider_Turns
 {
 public:
     static constexpr std::size_t at_once = 2;
-    static constexpr std::chrono::seconds patience{30};
+
+    explicit Provider_Turns(std::chrono::milliseconds patience) : _patience(patience) {}
 
 private:
     friend class Provider_Turn;
 
+    const std::chrono::milliseconds _patience;
     std::mutex _mutex;
     std::condition_variable _left;
     std::vector<std::thread::id> _inside;

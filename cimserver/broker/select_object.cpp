@@ -1,10 +1,6 @@
 #include "cimserver/broker/not_offered.h"
 #include "cimserver/broker/objects.h"
 
-#include <cctype>
-#include <string_view>
-#include <strings.h>
-
 namespace cimserver
 {
 namespace

@@ -3,7 +3,7 @@
 #include <sys/socket.h>
 
 #include <iterator>
-#include <new>
+#include <utility>
 
 namespace cimserver
 {
@@ -19,6 +19,7 @@ struct Connection_Watch::Connection
     std::size_t answer_bytes;
     bool cut;
     std::list<Connection>::iterator self;
+    std::map<std::string, std::size_t>::iterator count; // of its address
 };
 
 Connection_Watch::Connection_Watch(const Limits& limits) : _limits(limits), _thread([this] { watch(); }) {}
@@ -33,41 +34,33 @@ Connection_Watch::~Connection_Watch()
     _thread.join();
 }
 
-Connection_Watch::Connection* Connection_Watch::add(int socket) noexcept
-try
+Connection_Watch::Connection* Connection_Watch::add(int socket, const std::string& address)
 {
     const std::lock_guard lock(_mutex);
     const Clock::time_point now = Clock::now();
-    _connections.push_back({socket, Phase::receiving, now, now + _limits.receive, 0, false, {}});
+    const auto count = _counts.try_emplace(address).first;
+    _connections.push_back({socket, Phase::receiving, now, now + _limits.receive, 0, false, {}, count});
     _connections.back().self = std::prev(_connections.end());
+    ++count->second;
     if (_connections.size() > _limits.connections)
-        if (Connection* one = slowest(false, nullptr))
+        if (Connection* one = in_the_way())
             cut(*one);
     _changed.notify_all();
     return &_connections.back();
 }
-catch (const std::bad_alloc&)
-{
-    shutdown(socket, SHUT_RDWR);
-    return nullptr;
-}
 
-void Connection_Watch::enter(Connection* connection, Phase phase, std::size_t answer_bytes)
+bool Connection_Watch::enter(Connection* connection, Phase phase, std::size_t answer_bytes)
 {
     if (!connection)
-        return;
+        return false;
     const std::lock_guard lock(_mutex);
     connection->phase = phase;
     connection->since = Clock::now();
     connection->deadline = connection->since + (phase == Phase::sending ? _limits.send : _limits.receive);
     hold(*connection, answer_bytes);
-    while (_answer_bytes > _limits.answer_bytes)
-    {
-        Connection* one = slowest(true, connection);
-        if (!one)
-            return;
+    while (Connection* one = _answer_bytes > _limits.answer_bytes ? slowest_taker(connection) : nullptr)
         cut(*one);
-    }
+    return !connection->cut;
 }
 
 void Connection_Watch::remove(Connection* connection)
@@ -76,6 +69,8 @@ void Connection_Watch::remove(Connection* connection)
         return;
     const std::lock_guard lock(_mutex);
     hold(*connection, 0);
+    if (--connection->count->second == 0)
+        _counts.erase(connection->count);
     _connections.erase(connection->self);
 }
 
@@ -111,20 +106,30 @@ void Connection_Watch::cut_expired()
 {
     const Clock::time_point now = Clock::now();
     for (Connection& connection : _connections)
-        if (!connection.cut && connection.phase != Phase::working && connection.deadline <= now)
+        if (!connection.cut && connection.phase != Phase::working && connection.phase != Phase::verifying &&
+            connection.deadline <= now)
             cut(connection);
 }
 
-// The one for which the server has waited longest; null when it waits for none.
-Connection_Watch::Connection* Connection_Watch::slowest(bool sending_only, const Connection* but_for)
+// Null when all that are not cut are worked for.
+Connection_Watch::Connection* Connection_Watch::in_the_way()
 {
     Connection* found = nullptr;
     for (Connection& connection : _connections)
-    {
-        const bool waited_for = connection.phase == Phase::sending || (connection.phase == Phase::receiving && !sending_only);
-        if (waited_for && !connection.cut && &connection != but_for && (!found || connection.since < found->since))
+        if (connection.phase != Phase::working && !connection.cut &&
+            (!found || std::pair(connection.count->second, found->since) > std::pair(found->count->second, connection.since)))
             found = &connection;
-    }
+    return found;
+}
+
+// Null when no other has an answer to take.
+Connection_Watch::Connection* Connection_Watch::slowest_taker(const Connection* but_for)
+{
+    Connection* found = nullptr;
+    for (Connection& connection : _connections)
+        if (connection.phase == Phase::sending && !connection.cut && &connection != but_for &&
+            (!found || connection.since < found->since))
+            found = &connection;
     return found;
 }
 

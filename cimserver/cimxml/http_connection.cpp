@@ -11,7 +11,6 @@
 
 namespace cimserver
 {
-
 namespace
 {
 

@@ -9,11 +9,13 @@
 #include "cimserver/security/tls_identity.h"
 
 #include <microhttpd.h>
+#include <sys/socket.h>
 
 #include <atomic>
 #include <cerrno>
 #include <condition_variable>
 #include <mutex>
+#include <new>
 #include <optional>
 #include <string_view>
 #include <system_error>
@@ -22,7 +24,6 @@
 
 namespace cimserver
 {
-
 namespace
 {
 
@@ -46,7 +47,7 @@ struct Exchange
 {
     Http_Request request;
     std::function<Http_Answer()> rest; // of the work
-    bool verifying = false;            // the login, while the connection is suspended
+    std::optional<Login> login;        // while it is verified
     std::size_t received = 0;          // bytes of the body, kept or not
     bool submitted = false;
     std::optional<Http_Answer> answer;
@@ -83,16 +84,18 @@ private:
     void start(const Http_Endpoint& endpoint);
     MHD_Result begin(MHD_Connection* connection, std::string_view method, void** context);
     void log_in(MHD_Connection* connection, Exchange& exchange);
-    void verify(MHD_Connection* connection, Exchange& exchange, const Login& login) noexcept;
-    MHD_Result receive(Exchange& exchange, std::string_view bytes);
     MHD_Result finish(MHD_Connection* connection, Exchange& exchange);
     void submit(MHD_Connection* connection, Exchange& exchange);
-    void handle(MHD_Connection* connection, Exchange& exchange) noexcept;
-    void work(MHD_Connection* connection, Exchange& exchange) noexcept;
-    bool pass_on(Worker_Pool& pool, MHD_Connection* connection, Exchange& exchange,
-                 void (Daemon::*step)(MHD_Connection*, Exchange&) noexcept) noexcept;
-    void enter(MHD_Connection* connection, Connection_Watch::Phase phase, std::size_t answer_bytes = 0);
-    void refuse_connections();
+
+    // What the pools' threads do for an exchange. False: another of them goes on.
+    using Step = bool (Daemon::*)(MHD_Connection*, Exchange&);
+    bool verify(MHD_Connection* connection, Exchange& exchange);
+    bool handle(MHD_Connection* connection, Exchange& exchange);
+    bool work(MHD_Connection* connection, Exchange& exchange);
+    Worker_Pool::Job job(MHD_Connection* connection, Exchange& exchange, Step step);
+    void hand_over(MHD_Connection* connection, Worker_Pool& pool, Worker_Pool::Job job, const std::string& whose = "");
+    void run(MHD_Connection* connection, Exchange& exchange, Step step) noexcept;
+    bool enter(MHD_Connection* connection, Connection_Watch::Phase phase, std::size_t answer_bytes = 0);
 
     const Http_Limits _limits;
     Credentials* const _credentials;
@@ -163,7 +166,10 @@ bool Http_Server::Daemon::stop(Clock::time_point deadline)
     if (!_http)
         return true;
     if (!_stopping.exchange(true))
-        refuse_connections();
+    {
+        MHD_quiesce_daemon(_http);
+        _listener.refuse();
+    }
     if (!_verifiers.stop(deadline) || !_handlers.stop(deadline) || !_pool.stop(deadline))
         return false;
     {
@@ -175,12 +181,6 @@ bool Http_Server::Daemon::stop(Clock::time_point deadline)
     return true;
 }
 
-void Http_Server::Daemon::refuse_connections()
-{
-    MHD_quiesce_daemon(_http);
-    _listener.refuse();
-}
-
 MHD_Result Http_Server::Daemon::on_request(void* self, MHD_Connection* connection, const char*, const char* method, const char*,
                                            const char* data, std::size_t* size, void** context) noexcept
 {
@@ -190,16 +190,17 @@ MHD_Result Http_Server::Daemon::on_request(void* self, MHD_Connection* connectio
         if (!*context)
             return daemon.begin(connection, method, context);
         auto& exchange = *static_cast<Exchange*>(*context);
-        const bool verified = std::exchange(exchange.verifying, false);
+        const bool verified = std::exchange(exchange.login, std::nullopt).has_value();
         if (verified)
             daemon.enter(connection, Connection_Watch::Phase::receiving);
         if (*size == 0)
             return verified ? MHD_YES : daemon.finish(connection, exchange);
-        return daemon.receive(exchange, {data, std::exchange(*size, 0)});
+        exchange.receive({data, std::exchange(*size, 0)}, daemon._limits.request_bytes);
+        return exchange.received <= max_excess * daemon._limits.request_bytes ? MHD_YES : MHD_NO; // which closes the connection
     }
     catch (...)
     {
-        return MHD_NO; // closes the connection
+        return MHD_NO;
     }
 }
 
@@ -220,11 +221,18 @@ void Http_Server::Daemon::on_completed(void* self, MHD_Connection* connection, v
 void Http_Server::Daemon::on_connection(void* self, MHD_Connection* connection, void** context,
                                         MHD_ConnectionNotificationCode code) noexcept
 {
-    auto& daemon = *static_cast<Daemon*>(self);
-    if (code == MHD_CONNECTION_NOTIFY_STARTED)
-        *context = daemon._watch.add(MHD_get_connection_info(connection, MHD_CONNECTION_INFO_CONNECTION_FD)->connect_fd);
-    else
-        daemon._watch.remove(static_cast<Connection_Watch::Connection*>(*context));
+    Connection_Watch& watch = static_cast<Daemon*>(self)->_watch;
+    if (code != MHD_CONNECTION_NOTIFY_STARTED)
+        return watch.remove(static_cast<Connection_Watch::Connection*>(*context));
+    const int socket = MHD_get_connection_info(connection, MHD_CONNECTION_INFO_CONNECTION_FD)->connect_fd;
+    try
+    {
+        *context = watch.add(socket, client_address(connection));
+    }
+    catch (const std::bad_alloc&)
+    {
+        shutdown(socket, SHUT_RDWR);
+    }
 }
 
 // The head of a request has arrived: refuse it, or go on to its body.
@@ -258,39 +266,24 @@ void Http_Server::Daemon::log_in(MHD_Connection* connection, Exchange& exchange)
     if (_credentials->remembers(*login))
         return;
 
-    Worker_Pool::Job job = [this, connection, &exchange, login] { verify(connection, exchange, *login); };
-    enter(connection, Connection_Watch::Phase::working);
-    MHD_suspend_connection(connection);
-    exchange.verifying = true;
-    if (_verifiers.submit(std::move(job), client_address(connection)))
-        return;
-    exchange.answer = {MHD_HTTP_SERVICE_UNAVAILABLE, "", ""};
-    MHD_resume_connection(connection);
+    exchange.login = login;
+    enter(connection, Connection_Watch::Phase::verifying);
+    hand_over(connection, _verifiers, job(connection, exchange, &Daemon::verify), client_address(connection));
 }
 
-void Http_Server::Daemon::verify(MHD_Connection* connection, Exchange& exchange, const Login& login) noexcept
+// A connection that was cut meanwhile costs no hash.
+bool Http_Server::Daemon::verify(MHD_Connection* connection, Exchange& exchange)
 {
-    try
+    if (!enter(connection, Connection_Watch::Phase::verifying))
+        return true;
+    if (_credentials->verify(*exchange.login))
     {
-        if (_stopping)
-            exchange.answer = {MHD_HTTP_SERVICE_UNAVAILABLE, "", ""};
-        else if (!_credentials->verify(login))
-        {
-            _refusals.tell("refused the login of \"" + printable_name(login.name) + "\" from " + client_address(connection));
-            exchange.answer = {MHD_HTTP_UNAUTHORIZED, "", ""};
-        }
+        exchange.answer.reset();
+        return true;
     }
-    catch (...)
-    {
-        exchange.answer = {MHD_HTTP_INTERNAL_SERVER_ERROR, "", ""};
-    }
-    MHD_resume_connection(connection);
-}
-
-MHD_Result Http_Server::Daemon::receive(Exchange& exchange, std::string_view bytes)
-{
-    exchange.receive(bytes, _limits.request_bytes);
-    return exchange.received <= max_excess * _limits.request_bytes ? MHD_YES : MHD_NO;
+    _refusals.tell("refused the login of \"" + printable_name(exchange.login->name) + "\" from " + client_address(connection));
+    exchange.answer = {MHD_HTTP_UNAUTHORIZED, "", ""};
+    return true;
 }
 
 // Called when the body is complete, and again when the answer is there.
@@ -307,69 +300,67 @@ MHD_Result Http_Server::Daemon::finish(MHD_Connection* connection, Exchange& exc
     return reply(connection, *exchange.answer);
 }
 
-// The connection is suspended first: a worker may resume it before submit() returns.
 void Http_Server::Daemon::submit(MHD_Connection* connection, Exchange& exchange)
 {
-    enter(connection, Connection_Watch::Phase::working);
-    MHD_suspend_connection(connection);
     exchange.submitted = true;
     {
         const std::lock_guard lock(_mutex);
         ++_unanswered;
     }
-    if (!pass_on(_handlers, connection, exchange, &Daemon::handle))
-        MHD_resume_connection(connection);
+    enter(connection, Connection_Watch::Phase::working);
+    hand_over(connection, _handlers, job(connection, exchange, &Daemon::handle));
 }
 
-// False when too much waits: the answer then says so.
-bool Http_Server::Daemon::pass_on(Worker_Pool& pool, MHD_Connection* connection, Exchange& exchange,
-                                  void (Daemon::*step)(MHD_Connection*, Exchange&) noexcept) noexcept
+bool Http_Server::Daemon::handle(MHD_Connection* connection, Exchange& exchange)
+{
+    Http_Work made = _handler(exchange.request);
+    exchange.rest = std::move(made.rest);
+    if (exchange.rest)
+        return !_pool.submit(job(connection, exchange, &Daemon::work));
+    exchange.answer = std::move(made.answer);
+    return true;
+}
+
+bool Http_Server::Daemon::work(MHD_Connection*, Exchange& exchange)
+{
+    exchange.answer = exchange.rest();
+    return true;
+}
+
+// When too much waits, or the server stops before the step is run, the answer says so.
+Worker_Pool::Job Http_Server::Daemon::job(MHD_Connection* connection, Exchange& exchange, Step step)
 {
     exchange.answer = {MHD_HTTP_SERVICE_UNAVAILABLE, "", ""};
-    return pool.submit([this, connection, &exchange, step] { (this->*step)(connection, exchange); });
+    return [this, connection, &exchange, step] { run(connection, exchange, step); };
 }
 
-void Http_Server::Daemon::handle(MHD_Connection* connection, Exchange& exchange) noexcept
+// The connection is suspended first: a worker may resume it before submit() returns.
+void Http_Server::Daemon::hand_over(MHD_Connection* connection, Worker_Pool& pool, Worker_Pool::Job job, const std::string& whose)
 {
-    bool passed_on = false;
-    try
-    {
-        if (!_stopping)
-        {
-            Http_Work made = _handler(exchange.request);
-            exchange.rest = std::move(made.rest);
-            if (exchange.rest)
-                passed_on = pass_on(_pool, connection, exchange, &Daemon::work);
-            else
-                exchange.answer = std::move(made.answer);
-        }
-    }
-    catch (...)
-    {
-        exchange.answer = {MHD_HTTP_INTERNAL_SERVER_ERROR, "", ""};
-    }
-    if (!passed_on)
+    MHD_suspend_connection(connection);
+    if (!pool.submit(std::move(job), whose))
         MHD_resume_connection(connection);
 }
 
-void Http_Server::Daemon::work(MHD_Connection* connection, Exchange& exchange) noexcept
+void Http_Server::Daemon::run(MHD_Connection* connection, Exchange& exchange, Step step) noexcept
 {
+    bool over = true;
     try
     {
-        if (!_stopping)
-            exchange.answer = exchange.rest();
+        over = _stopping || (this->*step)(connection, exchange);
     }
     catch (...)
     {
         exchange.answer = {MHD_HTTP_INTERNAL_SERVER_ERROR, "", ""};
     }
-    MHD_resume_connection(connection);
+    if (over)
+        MHD_resume_connection(connection);
 }
 
-void Http_Server::Daemon::enter(MHD_Connection* connection, Connection_Watch::Phase phase, std::size_t answer_bytes)
+bool Http_Server::Daemon::enter(MHD_Connection* connection, Connection_Watch::Phase phase, std::size_t answer_bytes)
 {
     void* context = MHD_get_connection_info(connection, MHD_CONNECTION_INFO_SOCKET_CONTEXT)->socket_context;
-    _watch.enter(static_cast<Connection_Watch::Connection*>(context), phase, answer_bytes);
+    return _watch.enter(static_cast<Connection_Watch::Connection*>(context), phase, answer_bytes);
 }
 
 Http_Server::Http_Server(const Http_Endpoint& endpoint, const Http_Limits& limits, Credentials* credentials, Http_Handler handler)

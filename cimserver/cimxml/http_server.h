@@ -2,7 +2,8 @@
 //
 // With credentials every request is asked for HTTP Basic, before its body is kept: 401 without a login or with a wrong one.
 // Logins that have to be verified by their hash wait apart from the requests of users who are known, so that nobody without a
-// password can take the workers from those; addresses take turns, so that wrong passwords delay none but those who send them.
+// password can take the workers from those; addresses take turns, so that wrong passwords delay none but those who send them. One
+// that waits is cut when there are too many connections and its address has most of them.
 // Without credentials what may come from a web page is refused: 403 (http_connection.h).
 //
 // One thread moves bytes for all connections, two run the handler, a few workers do what it leaves to be done, so neither a
@@ -37,7 +38,7 @@ struct Http_Limits
 {
     std::size_t request_bytes = std::size_t{1} << 20;
     std::size_t connections = 256;
-    std::size_t waiting_requests = 256;               // complete, not yet taken by a worker
+    std::size_t waiting_requests = 128;               // complete, not yet taken by a worker; fewer, so that others are heard
     std::size_t answer_bytes = std::size_t{64} << 20; // of all answers that clients have not taken
     unsigned workers = 8;
     std::chrono::milliseconds receive{30'000}; // for the head of a request, and again for its body

@@ -9,7 +9,6 @@
 
 namespace cimserver
 {
-
 namespace
 {
 

@@ -7,7 +7,6 @@
 
 namespace cimserver
 {
-
 namespace
 {
 

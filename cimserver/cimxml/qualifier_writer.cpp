@@ -10,7 +10,6 @@
 
 namespace cimserver
 {
-
 namespace
 {
 

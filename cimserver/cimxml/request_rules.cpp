@@ -8,7 +8,6 @@
 
 namespace cimserver
 {
-
 namespace
 {
 

@@ -5,7 +5,6 @@
 
 namespace cimserver
 {
-
 namespace
 {
 

@@ -15,7 +15,6 @@
 
 namespace cimserver
 {
-
 namespace
 {
 

@@ -12,7 +12,6 @@
 
 namespace cimserver
 {
-
 namespace
 {
 

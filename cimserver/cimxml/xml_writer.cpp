@@ -4,7 +4,6 @@
 
 namespace cimserver
 {
-
 namespace
 {
 

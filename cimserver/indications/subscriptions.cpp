@@ -159,7 +159,7 @@ void Subscriptions::save() const
 Subscriptions::Change Subscriptions::begin_change()
 {
     // By the wall clock: the thread sanitizer of clang 14 does not see a lock that is taken by the steady one.
-    Change change(_changes, std::chrono::system_clock::now() + Provider_Turns::patience);
+    Change change(_changes, std::chrono::system_clock::now() + Module::usual_patience);
     if (!change)
         throw Cim_Error(CIM_ERR_FAILED, "an earlier change of subscriptions does not end: a provider does not answer");
     return change;

@@ -3,9 +3,11 @@
 #include "cimserver/security/password_hash.h"
 
 #include <gnutls/crypto.h>
+#include <sys/stat.h>
 
 #include <cstdio>
 #include <stdexcept>
+#include <utility>
 
 namespace cimserver
 {
@@ -14,23 +16,14 @@ Credentials::Credentials(std::string file) : _file(std::move(file))
 {
     if (gnutls_rnd(GNUTLS_RND_KEY, _key.data(), _key.size()) != 0)
         throw std::runtime_error("cannot draw a random key");
-    struct stat status = {};
-    stat(_file.c_str(), &status); // before the file is read: a change in between is then seen
-    _users = checked_users(_file);
-    _stamp = stamp_of(status);
+    read(stamp_of(_file));
     _decoy = _users.begin()->second;
 }
 
-Users Credentials::checked_users(const std::string& file)
+Credentials::Stamp Credentials::stamp_of(const std::string& file)
 {
-    Users users = read_users(file);
-    if (users.empty())
-        throw std::runtime_error(file + " names no user");
-    return users;
-}
-
-Credentials::Stamp Credentials::stamp_of(const struct stat& status)
-{
+    struct stat status = {};
+    stat(file.c_str(), &status);
     return {static_cast<long long>(status.st_dev),
             static_cast<long long>(status.st_ino),
             status.st_size,
@@ -40,31 +33,34 @@ Credentials::Stamp Credentials::stamp_of(const struct stat& status)
             status.st_ctim.tv_nsec};
 }
 
-void Credentials::refresh()
+// The stamp is older than what is read: a change in between is then seen.
+void Credentials::read(const Stamp& stamp)
 {
-    struct stat status = {};
-    stat(_file.c_str(), &status);
-    const Stamp stamp = stamp_of(status);
-    if (stamp == _stamp)
-        return;
     _stamp = stamp;
     _verified.clear();
     _users.clear();
-    try
-    {
-        _users = checked_users(_file);
-    }
-    catch (const std::runtime_error& error)
-    {
-        std::fprintf(stderr, "zmlr-cimserver: %s; nobody is let in until this is mended\n", error.what());
-    }
+    Users users = read_users(_file);
+    if (users.empty())
+        throw std::runtime_error(_file + " names no user");
+    _users = std::move(users);
+}
+
+void Credentials::refresh()
+try
+{
+    const Stamp stamp = stamp_of(_file);
+    if (stamp != _stamp)
+        read(stamp);
+}
+catch (const std::runtime_error& error)
+{
+    std::fprintf(stderr, "zmlr-cimserver: %s; nobody is let in until this is mended\n", error.what());
 }
 
 void Credentials::reload()
 {
     const std::lock_guard lock(_mutex);
-    _stamp = {};
-    refresh();
+    read(stamp_of(_file));
 }
 
 Credentials::Digest Credentials::digest(const Login& login) const

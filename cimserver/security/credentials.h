@@ -12,8 +12,6 @@
 #include "cimserver/security/basic_login.h"
 #include "cimserver/security/user_file.h"
 
-#include <sys/stat.h>
-
 #include <array>
 #include <mutex>
 #include <set>
@@ -31,7 +29,8 @@ public:
     Credentials(const Credentials&) = delete;
     Credentials& operator=(const Credentials&) = delete;
 
-    void reload(); // reads the file again, whatever it looks like
+    // Reads the file again, whatever it looks like. Throws as the constructor does; nobody is let in then.
+    void reload();
 
     bool remembers(const Login& login); // quick
     bool verify(const Login& login);    // tens of milliseconds
@@ -40,9 +39,9 @@ private:
     using Digest = std::array<unsigned char, 32>;
     using Stamp = std::array<long long, 7>; // what tells one state of the file from another
 
-    static Stamp stamp_of(const struct stat& status);
-    static Users checked_users(const std::string& file);
+    static Stamp stamp_of(const std::string& file);
     Digest digest(const Login& login) const;
+    void read(const Stamp& stamp);
     void refresh();
 
     const std::string _file;

@@ -3,6 +3,7 @@
 import base64
 import os
 import pty
+import select
 import signal
 import socket
 import ssl
@@ -115,8 +116,24 @@ def test_wrong_passwords_keep_no_user_out(start, program, users):
     assert set(refusals) == {401}
 
 
+def test_a_flood_of_logins_delays_its_own_address_only(start, users):
+    port = start("fc-hba", options=["--users", str(users), "--max-connections", "40"]).server.port
+
+    def ask(address, password):
+        connection = socket.create_connection(("127.0.0.1", port), timeout=60, source_address=(address, 0))
+        head = f"POST / HTTP/1.1\r\nHost: x\r\nAuthorization: {basic('admin', password)}\r\nContent-Length: 0\r\n\r\n"
+        connection.sendall(head.encode())
+        return connection
+
+    flood = [ask("127.0.0.1", "wrong") for _ in range(60)]
+    assert ask("127.0.0.2", PASSWORD).recv(12) == b"HTTP/1.1 400", "known, heard and asking for nothing"
+    refused = [connection for connection in select.select(flood, [], [], 0)[0] if connection.recv(12) == b"HTTP/1.1 401"]
+    assert len(refused) < 20
+
+
 def test_a_change_of_the_file_counts_at_once(start, program, users):
-    port = start("fc-hba", options=["--users", str(users)]).server.port
+    server = start("fc-hba", options=["--users", str(users)]).server
+    port = server.port
     assert status(port, basic("admin", PASSWORD)) == 200
     add_user(program, users, "admin", "another")
     add_user(program, users, "second", "one more")
@@ -127,6 +144,13 @@ def test_a_change_of_the_file_counts_at_once(start, program, users):
     assert status(port, basic("admin", "another")) == 401, "nobody is let in by a file that others may read"
     users.chmod(0o600)
     assert status(port, basic("admin", "another")) == 200
+
+    sound = users.read_text(encoding="utf-8")
+    for text, told, answer in [("admin:plain", f"not reloaded: {users} line 1", 401), (sound, "cimserver: reloaded", 200)]:
+        users.write_text(text, encoding="utf-8")
+        server.send_signal(signal.SIGHUP)
+        wait_until(lambda told=told: told in "".join(server.lines))
+        assert status(port, basic("admin", "another")) == answer
     users.write_text("", encoding="utf-8")
     assert status(port, basic("admin", "another")) == 401
     users.unlink()
