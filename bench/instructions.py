@@ -1,5 +1,6 @@
 """Times benchmarks, and counts the instructions of one iteration under callgrind: instructions.py PROGRAM..."""
 
+import argparse
 import json
 import re
 import subprocess
@@ -91,13 +92,16 @@ def shares(program, benchmark):
 
 
 def main():
+    parser = argparse.ArgumentParser(description="Times benchmarks, and counts their instructions under callgrind.")
+    parser.add_argument("programs", metavar="PROGRAM", nargs="+", help="a built benchmark")
+    programs = parser.parse_args().programs
     print(f"\n{'benchmark':<24} {'instructions':>14} {'per unit':>12} {'ns':>10}  unit")
-    for program in sys.argv[1:]:
+    for program in programs:
         for benchmark, units, unit in MEASURED[Path(program).name]:
             time = nanoseconds(program, benchmark)
             total = instructions(program, benchmark)
             print(f"{benchmark:<24} {total:>14,} {total / units:>12,.1f} {time / units:>10,.1f}  {unit}")
-    for program in sys.argv[1:]:
+    for program in programs:
         if Path(program).name in SHARES:
             benchmark, units, unit = SHARES[Path(program).name]
             for share, count in shares(program, benchmark).items():

@@ -1,9 +1,9 @@
-"""Runs `inventory` (bench/inventory.cpp), then once more under callgrind, and prints its figures as tables: inventory_table.py PROGRAM [FILTER]"""
+"""Runs `inventory` (bench/inventory.cpp), then once more under callgrind, and prints its figures as tables."""
 
+import argparse
 import json
 import re
 import subprocess
-import sys
 import tempfile
 from pathlib import Path
 
@@ -85,7 +85,11 @@ def lun_rows(figures):
 
 
 def main():
-    figures = Figures(sys.argv[1], f"--benchmark_filter={sys.argv[2] if len(sys.argv) > 2 else '.'}")
+    parser = argparse.ArgumentParser(description=__doc__)
+    parser.add_argument("program", metavar="PROGRAM", help="the built benchmark")
+    parser.add_argument("filter", metavar="FILTER", nargs="?", default=".", help="an expression for the names of those to run")
+    options = parser.parse_args()
+    figures = Figures(options.program, f"--benchmark_filter={options.filter}")
     counts = [f"instructions at {adapters}" for adapters in ADAPTERS]
     ends = ["µs", "peak bytes", "with the server's answer"]
     head = ["class", "instances", "requests", *counts, "spread 4 to 64", *ends]

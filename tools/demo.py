@@ -1,5 +1,6 @@
 """The demonstration: what real clients see of a simulated host. Fails loudly when a step fails or the clients disagree."""
 
+import argparse
 import queue
 import sys
 from dataclasses import dataclass, field
@@ -306,6 +307,7 @@ def demonstrate(server):
 
 
 def main():
+    argparse.ArgumentParser(prog="tools.demo", description=__doc__).parse_args()
     server = SimulatedServer("mixed")
     try:
         demonstrate(server)

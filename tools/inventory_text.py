@@ -5,9 +5,9 @@ before. An association is a line: what it joins, by the keys that tell one insta
 machine that runs the simulation is put into angle brackets.
 """
 
+import argparse
 import re
 import socket
-import sys
 import textwrap
 
 import pywbem
@@ -88,5 +88,7 @@ def inventory_text(url):
 
 
 if __name__ == "__main__":
-    with SimulatedServer(sys.argv[1]) as running:
+    parser = argparse.ArgumentParser(prog="tools.inventory_text", description="Prints everything that a simulated host serves.")
+    parser.add_argument("scenario", metavar="SCENARIO", help="one of sim/scenarios, or a file")
+    with SimulatedServer(parser.parse_args().scenario) as running:
         print(inventory_text(running.url))

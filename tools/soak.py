@@ -227,11 +227,11 @@ def soak(server, options):
 
 
 def main():
-    parser = argparse.ArgumentParser(description="Keeps the embedded server busy and watches it.")
-    parser.add_argument("--seconds", type=int, default=60)
-    parser.add_argument("--clients", type=int, default=16)
-    parser.add_argument("--scenario", default="mixed")
-    parser.add_argument("--seed", type=int, default=1)
+    parser = argparse.ArgumentParser(prog="tools.soak", description="Keeps the embedded server busy and watches it.")
+    parser.add_argument("--seconds", type=int, default=60, help="how long [60]")
+    parser.add_argument("--clients", type=int, default=16, metavar="NUMBER", help="clients at once [16]")
+    parser.add_argument("--scenario", default="mixed", metavar="NAME", help="one of sim/scenarios, or a file [mixed]")
+    parser.add_argument("--seed", type=int, default=1, metavar="NUMBER", help="what the operations follow from [1]")
     options = parser.parse_args()
 
     server = SimulatedServer(options.scenario, environment={"HXASIM_JOURNAL": "0"})

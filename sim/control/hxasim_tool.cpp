@@ -101,7 +101,7 @@ public:
     Command_Line()
     {
         _app.require_subcommand(1);
-        _app.add_option("--socket", socket, "path of the control socket")->envname("HXASIM_CONTROL")->required();
+        _app.add_option("--socket", socket, "the control socket")->type_name("FILE")->envname("HXASIM_CONTROL")->required();
         add_event();
         add_adapter("unplug", "pull a card out");
         add_adapter("plug", "put a card back");
@@ -127,81 +127,86 @@ private:
         return command;
     }
 
-    CLI::Option* take(CLI::App* command, const std::string& option, const std::string& key, const std::string& help)
+    // `kind` is what help says of the value: its unit, or what it names.
+    CLI::Option* take(CLI::App* command, const std::string& option, const std::string& key, const std::string& kind,
+                      const std::string& help)
     {
-        return command->add_option_function<std::string>(
-            option, [this, key](const std::string& value) { question[key] = as_value(value); }, help);
+        const auto store = [this, key](const std::string& value) { question[key] = as_value(value); };
+        return command->add_option_function<std::string>(option, store, help)->type_name(kind);
     }
 
-    CLI::Option* take_text(CLI::App* command, const std::string& option, const std::string& key, const std::string& help)
+    CLI::Option* take_text(CLI::App* command, const std::string& option, const std::string& key, const std::string& kind,
+                           const std::string& help)
     {
-        return command->add_option_function<std::string>(
-            option, [this, key](const std::string& value) { question[key] = {value}; }, help);
+        const auto store = [this, key](const std::string& value) { question[key] = {value}; };
+        return command->add_option_function<std::string>(option, store, help)->type_name(kind);
     }
 
     void add_event()
     {
         auto* command = add("event", "raise an event");
-        take(command, "category", "category", "adapter, port, lport, rport, itnim, audit, ioc or ethport; or a number")
+        take(command, "category", "category", "NAME", "adapter, port, lport, rport, itnim, audit, ioc or ethport; or a number")
             ->required();
-        take(command, "event", "event", "online, sfp-pom, linkdown, ...; or a number")->required();
+        take(command, "event", "event", "NAME", "online, sfp-pom, linkdown, ...; or a number")->required();
         add_place(command);
-        take(command, "--level", "level", "of a sfp-pom: 1 normal, 2 warning, 3 alarm");
-        take_text(command, "--data", "data", "event data, hexadecimal, instead of the IOC's own");
-        take(command, "--count", "count", "raise it so many times");
+        take(command, "--level", "level", "NUMBER", "of a sfp-pom: 1 normal, 2 warning, 3 alarm");
+        take_text(command, "--data", "data", "BYTES", "event data, hexadecimal, instead of the IOC's own");
+        take(command, "--count", "count", "NUMBER", "raise it so many times");
     }
 
     void add_place(CLI::App* command)
     {
-        take_text(command, "--node", "node", "/dev/hxa or /dev/hxn");
-        take(command, "--instance", "instance", "of the IOC");
+        take_text(command, "--node", "node", "FILE", "/dev/hxa or /dev/hxn");
+        take(command, "--instance", "instance", "NUMBER", "of the IOC");
     }
 
     CLI::App* add_adapter(const std::string& name, const std::string& help)
     {
         auto* command = add(name, help);
-        take(command, "adapter", "adapter", "number in the scenario, from 0")->required();
+        take(command, "adapter", "adapter", "NUMBER", "number in the scenario, from 0")->required();
         return command;
     }
 
     void add_port(const std::string& name, const std::string& key, const std::string& help, std::vector<std::string> words)
     {
         auto* command = add_adapter(name, help);
-        take(command, "number", "port", "number on the card, from 0")->required();
-        take(command, key, key, "")->required()->check(CLI::IsMember(std::move(words)));
+        take(command, "number", "port", "NUMBER", "number on the card, from 0")->required();
+        take(command, key, key, "", "")->required()->check(CLI::IsMember(std::move(words)));
     }
 
     void add_fault()
     {
         auto* command = add("fault", "make requests go wrong");
-        take_text(command, "--command", "command", "IOCMD_...; without it every command");
+        take_text(command, "--command", "command", "NAME", "IOCMD_...; without it every command");
         add_place(command);
-        take_text(command, "--remote-port", "remote_port", "WWN of the remote port that the request names");
-        take(command, "--lun", "lun", "of a SCSI command");
-        take_text(command, "--cdb", "cdb", "hexadecimal, what the command block of a SCSI command begins with");
-        take(command, "--error", "error", "fail the call with this errno");
-        take(command, "--status", "status", "answer with this record status");
-        take(command, "--scsi-status", "scsi_status", "answer a SCSI command with this status");
-        take(command, "--garbage", "garbage", "answer random bytes; the number is their seed");
-        take(command, "--delay", "delay", "answer that many ms later");
-        take(command, "--skip", "skip", "let so many requests pass first");
-        take(command, "--times", "times", "then strike so many; without it all");
-        take_patches(command, "--answer", "answer", "OFFSET:HEX, bytes of the answer to overwrite");
-        take_patches(command, "--data", "data", "OFFSET:HEX, bytes of the data that come with it to overwrite");
+        take_text(command, "--remote-port", "remote_port", "WWN", "WWN of the remote port that the request names");
+        take(command, "--lun", "lun", "NUMBER", "of a SCSI command");
+        take_text(command, "--cdb", "cdb", "BYTES", "hexadecimal, what the command block of a SCSI command begins with");
+        take(command, "--error", "error", "ERRNO", "fail the call with this errno");
+        take(command, "--status", "status", "CODE", "answer with this record status");
+        take(command, "--scsi-status", "scsi_status", "CODE", "answer a SCSI command with this status");
+        take(command, "--garbage", "garbage", "SEED", "answer random bytes");
+        take(command, "--delay", "delay", "MILLISECONDS", "answer that much later");
+        take(command, "--skip", "skip", "NUMBER", "let so many requests pass first");
+        take(command, "--times", "times", "NUMBER", "then strike so many; without it all");
+        take_patches(command, "--answer", "answer", "bytes of the answer to overwrite, hexadecimal");
+        take_patches(command, "--data", "data", "bytes of the data that come with it to overwrite, hexadecimal");
     }
 
     void take_patches(CLI::App* command, const std::string& option, const std::string& key, const std::string& help)
     {
-        command->add_option_function<std::vector<std::string>>(
-            option,
-            [this, key](const std::vector<std::string>& patches)
-            {
-                Json_Value::List list;
-                for (const auto& patch : patches)
-                    list.push_back(as_patch(patch));
-                question[key] = {list};
-            },
-            help);
+        command
+            ->add_option_function<std::vector<std::string>>(
+                option,
+                [this, key](const std::vector<std::string>& patches)
+                {
+                    Json_Value::List list;
+                    for (const auto& patch : patches)
+                        list.push_back(as_patch(patch));
+                    question[key] = {list};
+                },
+                help)
+            ->type_name("OFFSET:BYTES");
     }
 
     CLI::App _app{"Steers the simulated drivers of a running process."};
