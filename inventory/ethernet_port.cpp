@@ -52,7 +52,7 @@ Ref<ZEMLAR_EthernetPort> getEthernetPortInstance(const _ethPortInfo& info)
     port->SystemCreationClassName.set(ProviderUtil::getClassName(CLASSID_ComputerSystem));
     port->SystemName.set(property_text(info.host));
     port->DeviceID.set(mac);
-    port->PermanentAddress.set(mac);
+    port->PermanentAddress.set(info.permanent_mac);
     port->NetworkAddresses.set({mac});
     port->LinkTechnology.set(LINK_TECHNOLOGY_ETHERNET);
     port->Capabilities.set({CAPABILITY_UNKNOWN});

@@ -30,6 +30,7 @@ void fill_ethernet_port(_ethPortInfo& info, const hxal_t* ethernet, const hxa_et
 {
     const mac_t mac = hxal_ioc_get_mac(ethernet);
     ProviderUtil::MAC2str(info.mac, &mac);
+    copy_text(info.permanent_mac, info.mac);
     copy_text(info.interface_name, sizeof info.interface_name, hxal_ioc_get_eth_name(ethernet), sizeof ethernet->eth_name);
     info.operational_status = getPortState(attributes.port_state);
     info.port_index = static_cast<uint16>(port_index);

@@ -14,9 +14,10 @@ struct _ethPortInfo
     char interface_name[64] = {};  // the host's network interface
     uint16 operational_status = 0; // CIM OperationalStatus
     char host[64] = {};            // a longer text is cut
-    uint16 port_type = 0;          // CIM Ethernet PortType
-    uint16 port_index = 0;         // on its adapter, from 0
-    uint32 mtu = 0;                // bytes
+    char permanent_mac[13] = {};
+    uint16 port_type = 0;  // CIM Ethernet PortType
+    uint16 port_index = 0; // on its adapter, from 0
+    uint32 mtu = 0;        // bytes
 };
 
 // Fills a new record but for host and type; name and MAC address are the library's, as the scan found them.

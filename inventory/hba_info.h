@@ -17,11 +17,11 @@ struct _hbaInfo
     char model[16] = {};
     char serial_number[64] = {};
     char manufacturer[16] = {};
+    char fru_number[17] = {};
     char fc_driver_name[16] = {};
     char fc_driver_version[64] = {};
     char eth_driver_name[16] = {};
     char eth_driver_version[64] = {};
-    char fru_number[17] = {};
     char firmware_version[64] = {};
     char boot_code_version[64] = {}; // only when it was asked for
     bool is_cna = false;

@@ -39,6 +39,7 @@ struct _hbaLunInfo
     char target_wwn[36] = {};
     char vendor[9] = {};
     char product[17] = {};
+    char rsvd[5] = {};
     char serial_number[130] = {};
     char identifier[67] = {}; // of page 83h: hex digits or text
     std::uint32_t identifier_type = IDENTIFIER_SERIAL_NUMBER;
@@ -46,6 +47,7 @@ struct _hbaLunInfo
     // Peripheral and flat addressing (SAM-3).
     int lun_number() const { return (lun[0] & 0x3F) * 256 + lun[1]; }
 };
+static_assert(sizeof(_hbaLunInfo) == 276);
 
 // True for a peripheral device that is a tape drive or a medium changer; all others count as disks.
 bool is_tape_device(const Inquiry_Data& data);

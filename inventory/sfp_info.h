@@ -18,6 +18,7 @@ struct _sfpInfo
     char media[32] = {}; // what it is made for; a longer text is cut
     char revision[6] = {};
 };
+static_assert(sizeof(_sfpInfo) == 132);
 
 // The record of the module in a port. `adapter` counts from 1, `port` from 0.
 _sfpInfo sfp_info(const sfp_mem_t& memory, bool is_cna, int adapter, int port);
