@@ -5,6 +5,7 @@
 An alert waits for the delivery cycle of 20 ms: 0 to 20 ms of the time, by chance.
 """
 
+import argparse
 import json
 import random
 import re
@@ -103,7 +104,9 @@ def cost_per_second(pid):
 
 
 def main():
-    samples = int(sys.argv[1]) if len(sys.argv) > 1 else 300
+    parser = argparse.ArgumentParser(description="Measures how long an event takes from the driver to a listener.")
+    parser.add_argument("samples", metavar="SAMPLES", nargs="?", type=int, default=300, help="how many events [300]")
+    samples = parser.parse_args().samples
     with SimulatedServer("fc-hba", {"HXASIM_JOURNAL": "0"}) as server, Listener() as listener:
         without = cost_per_second(server.pid)
         subscribe(server, listener)
