@@ -104,6 +104,7 @@ int hxal_adapter_scan(void)
 }
 
 hxal_adapter_t* hxal::adapter_list() { return adapters.head; }
+void hxal::keep_adapters() { adapters.is_kept = true; }
 
 unsigned hxal_adapter_get_num(void) { return static_cast<unsigned>(adapters.count); }
 unsigned hxal_adapter_get_count(void) { return hxal_adapter_get_num(); }

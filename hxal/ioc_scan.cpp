@@ -183,6 +183,8 @@ int hxal_ioc_get_inst_num(void)
     return static_cast<int>(instances.cnt);
 }
 
+void hxal::keep_iocs() { iocs.is_kept = true; }
+
 std::shared_ptr<Descriptor> hxal::descriptor_of(int fd)
 {
     hxal_s* ioc = first_that(iocs.head, [=](const hxal_s& each) { return each.fd == fd; });

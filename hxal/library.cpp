@@ -2,7 +2,9 @@
 
 #include "hxal/config/parser.h"
 #include "hxal/config/writer.h"
+#include "hxal/internal/adapter_list.h"
 #include "hxal/internal/application.h"
+#include "hxal/internal/ioc_list.h"
 
 #include <atomic>
 #include <cerrno>
@@ -45,6 +47,12 @@ int hxal_libinit(hxa_aen_app_t app)
 }
 
 void hxal_libexit(void) {}
+
+void hxal_libkeep(void)
+{
+    hxal::keep_iocs();
+    hxal::keep_adapters();
+}
 
 hxa_status_t hxal_libload(void) { return hxal_config_load(config_path); }
 void hxal_libsync(void) { hxal_config_sync(config_path); }

@@ -15,6 +15,10 @@ extern "C"
     // Ends the use of the library. There is nothing to release.
     void hxal_libexit(void);
 
+    // From now on the end of the process leaves the handles and adapters of the last scan alone: a thread that still runs then
+    // may use them. For a program, or a module that is never unloaded.
+    void hxal_libkeep(void);
+
     // The drivers' configuration file, "/etc/hxa.conf": reads it into the model (hxal/config/model.h), writes it from there,
     // ends the use of the model. A client scans, then loads, then changes settings and syncs;
     // whoever never syncs changes the drivers only. Loading answers HXA_STATUS_OK, also where there is no file. How writing went

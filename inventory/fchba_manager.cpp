@@ -83,4 +83,32 @@ Instance_Array FCHBAManager::getEthernetPortInstancesByAdapter(const String& mac
     return EthernetPortHelper::getEthernetPortHelperObject().getEthernetPortInstancesByAdapter(mac, request);
 }
 
+Instance_Array FCHBAManager::getAllDiagnosticTestInstances(const Inventory_Request& request) const
+{
+    const Scope_Trace trace(log_source);
+    return diagnostic_services(request);
+}
+
+Instance_Array FCHBAManager::getDiagnosticServicesForAdapter(const Inventory_Request& request) const
+{
+    const Scope_Trace trace(log_source);
+    return getInstances(CLASSID_MemoryDiagnosticTest, request);
+}
+
+Instance_Array FCHBAManager::getDiagnosticServicesForFCPort(const Inventory_Request& request) const
+{
+    const Scope_Trace trace(log_source);
+    Instance_Array tests = getInstances(CLASSID_LoopbackDiagnosticTest, request);
+    tests.adopt(getInstances(CLASSID_PCILoopbackDiagnosticTest, request));
+    return tests;
+}
+
+Instance_Array FCHBAManager::getDiagnosticServicesForEthernetPort(const Inventory_Request& request) const
+{
+    const Scope_Trace trace(log_source);
+    Instance_Array tests = getInstances(CLASSID_EthLoopbackDiagnosticTest, request);
+    tests.adopt(getInstances(CLASSID_PCILoopbackDiagnosticTest, request));
+    return tests;
+}
+
 } // namespace zmlr

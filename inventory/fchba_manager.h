@@ -24,6 +24,12 @@ public:
     // The ZEMLAR_EthernetPort instances of the adapter with this MAC address.
     Instance_Array getEthernetPortInstancesByAdapter(const String& mac, const Inventory_Request& request = {}) const;
 
+    // The tests: every one, also when there is no driver; and those that can be run on an adapter, an FC port, an Ethernet port.
+    Instance_Array getAllDiagnosticTestInstances(const Inventory_Request& request = {}) const;
+    Instance_Array getDiagnosticServicesForAdapter(const Inventory_Request& request = {}) const;
+    Instance_Array getDiagnosticServicesForFCPort(const Inventory_Request& request = {}) const;
+    Instance_Array getDiagnosticServicesForEthernetPort(const Inventory_Request& request = {}) const;
+
 private:
     FCHBAManager();
 };

@@ -11,5 +11,6 @@ namespace zmlr
 
 // The diagnostic tests, jobs, records and their associations: diagnostics/.
 Instance_Array diagnostic_instances(classId_t id, const Inventory_Request& request);
+Instance_Array diagnostic_services(const Inventory_Request& request); // every test
 
 } // namespace zmlr

@@ -29,6 +29,9 @@ public:
         return ENUM_INSTANCES_OK;
     }
 
+protected:
+    const char* name() const { return _name; }
+
 private:
     static constexpr const Enumeration& _row = row_of(Class::static_meta_class, enumerations);
 

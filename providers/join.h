@@ -62,14 +62,6 @@ void keys_within_its_own(Joining& joining); // equal_keys of the second and thir
 
 // ---- the parts of a row; they run in the compiler, but clang 14 knows no consteval function that calls another ----
 
-// A reference field takes a reference to the element.
-template <class T> void set_reference(T*& field, Instance* element)
-{
-    ref(element);
-    unref(field);
-    field = static_cast<T*>(element);
-}
-
 template <class T, class A> A association_of(T* A::*);
 template <class T, class A> T filled_by(T* A::*);
 template <class E> E owner_of(Instance_Array (*)(const E&, const Inventory_Request&));

@@ -1,6 +1,7 @@
 // All tables of joins, one of each subsystem.
 #pragma once
 
+#include "providers/joins_diagnostics.h"
 #include "providers/joins_inventory.h"
 #include "providers/joins_profiles.h"
 
@@ -8,6 +9,9 @@ namespace zmlr
 {
 
 // The row of an association class; without one the call does not compile.
-constexpr const Join& join_of(const Meta_Class& meta_class) { return row_of(meta_class, inventory_joins, profile_joins); }
+constexpr const Join& join_of(const Meta_Class& meta_class)
+{
+    return row_of(meta_class, inventory_joins, profile_joins, diagnostic_joins);
+}
 
 } // namespace zmlr

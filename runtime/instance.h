@@ -126,6 +126,14 @@ private:
     T* _ptr = nullptr;
 };
 
+// A reference field takes a reference to the instance, which is a T or unset.
+template <class T> void set_reference(T*& field, Instance* instance)
+{
+    ref(instance);
+    unref(field);
+    field = static_cast<T*>(instance);
+}
+
 // Instances that are owned together: what managers and helpers return. The elements may be null.
 class Instance_Array : public Array<Instance*>
 {

@@ -15,6 +15,7 @@ _KINDS = {  # interfaces of providers.def: base class, procedure template
 _ROW_PROVIDERS = {  # words of providers.def: the template that serves the class by its row of a table, and its header
     "ENUMERATED": ("Enumerating_Provider", "providers/enumerating_provider.h"),
     "JOINED": ("Joining_Provider", "providers/joining_provider.h"),
+    "DIAGNOSTIC_TEST": ("Diagnostic_Test_Provider", "providers/diagnostic_test_provider.h"),
 }
 
 _PROC_PARAMETERS = "const Registration* registration, int operation, " + ", ".join(f"void* arg{i}" for i in range(8))

@@ -3,6 +3,7 @@
 import argparse
 import queue
 import sys
+import time
 from dataclasses import dataclass, field
 
 import pywbem
@@ -25,6 +26,11 @@ STATUSES = {
     13: "Lost Communication",
 }
 ALARM_STATES = {1: "off", 3: "blinking"}
+JOB_STATES = {4: "Running", 7: "Completed"}
+COMPLETION_STATES = {2: "Passed", 5: "Failed"}
+
+STARTED = 4096  # what RunDiagnostic returns for a job that runs
+RUN_TIMEOUT = 60  # seconds
 
 
 class Clients:
@@ -176,6 +182,26 @@ TABLES = [
 ]
 
 
+# What a run leaves.
+RUN_TABLES = [
+    (
+        "The job",
+        "ZEMLAR_ConcreteJob",
+        [("Job", "InstanceID", str), ("State", "JobState", JOB_STATES.get), ("Done", "PercentComplete", "{} %".format)],
+    ),
+    (
+        "What the test did",
+        "ZEMLAR_DiagnosticServiceRecord",
+        [("Record", "InstanceID", str), ("Element", "ManagedElementName", str), ("Step", "RecordData", str)],
+    ),
+    (
+        "How it went",
+        "ZEMLAR_DiagnosticCompletionRecord",
+        [("Record", "InstanceID", str), ("State", "CompletionState", COMPLETION_STATES.get), ("Outcome", "RecordData", str)],
+    ),
+]
+
+
 def show_class(clients, title, class_name, columns):
     rows = clients.instances(class_name, [property_name for _, property_name, _ in columns])
     show(
@@ -294,6 +320,22 @@ def pull_a_module(server, clients):
         raise SystemExit("demo: a subscription is left")
 
 
+def run_a_test(clients):
+    port = clients.pywbem.EnumerateInstanceNames("ZEMLAR_FCPort")[0]
+    test = clients.pywbem.AssociatorNames(port, AssocClass="ZEMLAR_AvailableDiagnosticServiceForFCPort")[0]
+    code, out = clients.pywbem.InvokeMethod("RunDiagnostic", test, [("ManagedElement", port)])
+    if code != STARTED:
+        raise SystemExit(f"demo: RunDiagnostic gave {code}")
+    print(f"\n{test['Name']} runs on {port['DeviceID']}: job {out['Job']['InstanceID']}.", flush=True)
+    deadline = time.monotonic() + RUN_TIMEOUT
+    while not clients.pywbem.EnumerateInstanceNames("ZEMLAR_DiagnosticCompletionRecord"):
+        if time.monotonic() > deadline:
+            raise SystemExit("demo: the test has not completed")
+        time.sleep(0.1)
+    for title, class_name, columns in RUN_TABLES:
+        show_class(clients, title, class_name, columns)
+
+
 def demonstrate(server):
     clients = Clients(server)
     print(f"The embedded CIM server runs on {server.url}, its host has the simulated adapters of scenario 'mixed'.")
@@ -304,6 +346,7 @@ def demonstrate(server):
     switch_a_beacon(clients)
     show_the_tree(clients)
     pull_a_module(server, clients)
+    run_a_test(clients)
 
 
 def main():

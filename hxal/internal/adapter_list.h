@@ -9,4 +9,6 @@ namespace hxal
 // The first adapter of the last scan; none: null.
 hxal_adapter_t* adapter_list();
 
+void keep_adapters(); // for hxal_libkeep()
+
 } // namespace hxal

@@ -50,7 +50,11 @@ void list_free(hxal_adapter_t*& head);
 template <typename Node> struct List
 {
     List() = default;
-    ~List() { list_free(head); }
+    ~List()
+    {
+        if (!is_kept)
+            list_free(head);
+    }
 
     List& operator=(List&& other) noexcept
     {
@@ -61,6 +65,7 @@ template <typename Node> struct List
 
     Node* head = nullptr;
     int count = 0;
+    bool is_kept = false; // its own end leaves the nodes alone
 };
 
 } // namespace hxal

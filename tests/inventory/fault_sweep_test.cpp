@@ -117,6 +117,8 @@ TEST_F(Fault_Sweep, costs_what_depends_on_the_request_and_nothing_else)
     const hxasim::Fault effects[] = {{.error = EIO}, {.status = HXA_STATUS_FAILED}, {.garbage = 1}};
     for (const Enumeration& row : enumerations)
     {
+        if (row.id == CLASSID_DiagnosticSoftwareIdentity)
+            continue; // tells the version of whichever driver answers first
         plug_text(two_cards);
         const Texts before = sorted_instances(row);
         const std::vector<hxasim::Request> sent = hxasim::take_requests();
