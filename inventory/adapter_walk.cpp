@@ -14,7 +14,27 @@ template <class... Values> void say(const Walk_Row& row, const Walk_Line& line, 
         ZMLR_LOG(line.level, line.text, values...);
 }
 
-bool is_cna(int adapter) { return hxal_adapter_is_cna_capable(adapter) != HXA_FALSE; }
+hxal_adapter_t* open(const Walk_Row& row, int index)
+{
+    hxal_adapter_t* handle = hxal_adapter_open_idx(index);
+    if (!handle)
+    {
+        say(row, row.not_opened, index);
+        say(row, row.not_opened_remark, index);
+    }
+    return handle;
+}
+
+std::optional<Open_Adapter> with_ports(const Walk_Row& row, hxal_adapter_t& handle)
+{
+    const Open_Adapter adapter = {&handle, handle.id, handle.port_count, handle.cna_capable != HXA_FALSE};
+    say(row, row.kind, adapter.is_cna ? "CNA" : "FC HBA");
+    if (adapter.ports > 0)
+        return adapter;
+    say(row, row.no_ports, adapter.index, adapter.ports);
+    say(row, row.no_ports_remark, adapter.index);
+    return std::nullopt;
+}
 
 hxal_t* take_ethernet(const Walk_Row& row, const Open_Adapter& adapter, int port)
 {
@@ -40,22 +60,8 @@ hxal_t* take_fc(const Walk_Row& row, const Open_Adapter& adapter, int port)
 
 std::optional<Open_Adapter> open_adapter(const Walk_Row& row, int index)
 {
-    hxal_adapter_t* handle = hxal_adapter_open_idx(index);
-    if (!handle)
-    {
-        say(row, row.not_opened, index);
-        say(row, row.not_opened_remark, index);
-        return std::nullopt;
-    }
-    const Open_Adapter adapter = {handle, index, hxal_adapter_get_num_port(index), is_cna(index)};
-    say(row, row.kind, adapter.is_cna ? "CNA" : "FC HBA");
-    if (adapter.ports <= 0)
-    {
-        say(row, row.no_ports, index, adapter.ports);
-        say(row, row.no_ports_remark, index);
-        return std::nullopt;
-    }
-    return adapter;
+    hxal_adapter_t* handle = open(row, index);
+    return handle ? with_ports(row, *handle) : std::nullopt;
 }
 
 std::optional<Open_Port> open_port(const Walk_Row& row, const Open_Adapter& adapter, int index)
@@ -79,16 +85,20 @@ bool Adapter_Walk::next()
 {
     while (++_index <= _count)
     {
-        if (_row.no_cna.text && !is_cna(_index))
+        // They are listed in the order of their indexes.
+        _handle = _handle && _handle->next && _handle->next->id == _index ? _handle->next : open(_row, _index);
+        if (!_handle && _row.ends_at_unopened)
+            return false;
+        if (!_handle)
+            continue;
+        if (_row.no_cna.text && !_handle->cna_capable)
         {
             say(_row, _row.no_cna, _index);
             continue;
         }
-        _adapter = open_adapter(_row, _index);
+        _adapter = with_ports(_row, *_handle);
         if (_adapter)
             return true;
-        if (_row.ends_at_unopened && !hxal_adapter_open_idx(_index))
-            return false;
     }
     return false;
 }

@@ -100,6 +100,7 @@ private:
     const Walk_Row& _row;
     const int _count;
     int _index = 0;
+    hxal_adapter_t* _handle = nullptr; // of the index; null when it cannot be opened
     std::optional<Open_Adapter> _adapter;
 };
 

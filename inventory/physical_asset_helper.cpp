@@ -6,7 +6,7 @@
 #include "runtime/log.h"
 #include "runtime/trace.h"
 
-#include <cstdio>
+#include <charconv>
 
 namespace zmlr
 {
@@ -36,8 +36,12 @@ constexpr Builder<const _sfpInfo> builders[] = {
 // A connector's tag ends with the indexes of adapter and port.
 bool may_be_in(const Open_Port& port, const Wanted& wanted)
 {
-    char end[32];
-    std::snprintf(end, sizeof end, "_%d_%d", port.adapter, port.index);
+    if (wanted.is_all())
+        return true;
+    char end[32] = "_"; // and zeros
+    char* next = std::to_chars(end + 1, end + 12, port.adapter).ptr;
+    *next = '_';
+    std::to_chars(next + 1, next + 12, port.index);
     return wanted.may_end_with(end);
 }
 

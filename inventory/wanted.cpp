@@ -69,13 +69,7 @@ bool holds(const std::vector<std::uint64_t>& addresses, std::uint64_t address)
     return address != 0 && std::ranges::find(addresses, address) != addresses.end();
 }
 
-// True when a key is the text of the field, as a property would show it.
-template <std::size_t N> bool is_one_of(const std::vector<String>& keys, const char (&field)[N])
-{
-    const std::size_t size = ::strnlen(field, N);
-    return std::ranges::any_of(keys, [&](const String& key)
-                               { return size > 0 && key.size() == size && key.equali(property_text(field)); });
-}
+constexpr std::uint64_t size_bit(std::size_t size) { return size < 64 ? std::uint64_t{1} << size : 0; }
 
 } // namespace
 
@@ -95,6 +89,7 @@ Wanted::Wanted(const Instance* model)
         const std::vector<int> digits = digits_in(*key);
         append_addresses(_wwns, digits, sizeof(wwn_t));
         append_addresses(_macs, digits, sizeof(mac_t));
+        _sizes |= size_bit(key->size());
         _keys.push_back(*key);
     }
 }
@@ -112,17 +107,23 @@ bool Wanted::may_end_with(const char* text) const
                                            });
 }
 
-bool Wanted::may_be_of_ioc(const hxal_t* ioc) const
+template <std::size_t N> bool Wanted::has_key(const char (&field)[N]) const
 {
-    const mac_t mac = hxal_ioc_get_mac(ioc);
-    return holds(_wwns, hxal_ioc_get_pwwn(ioc)) || holds(_wwns, hxal_ioc_get_nwwn(ioc)) ||
-           holds(_macs, as_number(mac.mac, sizeof mac.mac)) || is_one_of(_keys, ioc->eth_name) ||
-           is_one_of(_keys, ioc->serialnum);
+    static_assert(N <= 64);
+    const std::size_t size = ::strnlen(field, N);
+    return (_sizes & size_bit(size)) != 0 &&
+           std::ranges::any_of(_keys, [&](const String& key) { return key.equali(property_text(field)); });
+}
+
+bool Wanted::may_be_of_ioc(const hxal_t& ioc) const
+{
+    return holds(_wwns, ioc.pwwn) || holds(_wwns, ioc.nwwn) || holds(_macs, as_number(ioc.mac.mac, sizeof ioc.mac.mac)) ||
+           has_key(ioc.eth_name) || has_key(ioc.serialnum);
 }
 
 bool Wanted::may_be_of(const Open_Port& port) const
 {
-    return is_all() || (port.fc && may_be_of_ioc(port.fc.get())) || (port.ethernet && may_be_of_ioc(port.ethernet.get()));
+    return is_all() || (port.fc && may_be_of_ioc(*port.fc)) || (port.ethernet && may_be_of_ioc(*port.ethernet));
 }
 
 } // namespace zmlr

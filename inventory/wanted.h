@@ -32,9 +32,13 @@ public:
     bool may_be_of(const Open_Port& port) const;
 
 private:
-    bool may_be_of_ioc(const hxal_t* ioc) const;
+    bool may_be_of_ioc(const hxal_t& ioc) const;
+
+    // True when a key is the text of the field, as a property would show it.
+    template <std::size_t N> bool has_key(const char (&field)[N]) const;
 
     std::vector<String> _keys;
+    std::uint64_t _sizes = 0;         // of the keys, a bit each
     std::vector<std::uint64_t> _wwns; // all that the digits in the keys may be, in memory order
     std::vector<std::uint64_t> _macs; // the same, 6 bytes each
 };
