@@ -9,6 +9,8 @@
 #include "providers/row_of.h"
 #include "runtime/trace.h"
 
+#include <utility>
+
 namespace zmlr
 {
 
@@ -20,11 +22,20 @@ public:
     // The name by which the provider logs.
     explicit Enumerating_Provider(const char* name) : _name(name) {}
 
+    // Left to the enumeration that follows with the same model: that one is for a single instance, whatever keys other
+    // enumerations come with.
+    Get_Instance_Status get_instance(const Class* model, Class*&) override
+    {
+        _wanted = model;
+        return GET_INSTANCE_UNSUPPORTED;
+    }
+
     // Always a success.
     Enum_Instances_Status enum_instances(const Class* model, Enum_Instances_Handler<Class>& handler) override
     {
         const Scope_Trace trace(_name, "enum_instances");
-        Instance_Array instances = instances_of(_row, model, _name);
+        const Class* wanted = std::exchange(_wanted, nullptr);
+        Instance_Array instances = instances_of(_row, wanted == model ? wanted : nullptr, _name);
         deliver(instances, handler);
         return ENUM_INSTANCES_OK;
     }
@@ -36,6 +47,7 @@ private:
     static constexpr const Enumeration& _row = row_of(Class::static_meta_class, enumerations);
 
     const char* _name;
+    const Class* _wanted = nullptr; // the model of a get_instance whose enumeration has not come yet
 };
 
 } // namespace zmlr

@@ -41,15 +41,15 @@ bool has(const Instance_Array& instances, const Instance* model)
     return std::ranges::any_of(instances, [model](const Instance* instance) { return key_eq(instance, model); });
 }
 
-Instance_Array read(const Enumeration& row, const Instance* model)
+Instance_Array read(const Enumeration& row, const Instance* wanted)
 {
     Inventory_Request request;
-    if (model && row.get_instances != server_manager) // which leaves nothing out, and need not be asked again
-        request.wanted = Wanted(model);
+    if (wanted && row.get_instances != server_manager) // which leaves nothing out, and need not be asked again
+        request.wanted = Wanted(wanted);
     if (!request.wanted.is_all())
     {
         Instance_Array instances = row.get_instances(row.id, request);
-        if (has(instances, model))
+        if (has(instances, wanted))
             return instances;
         request.wanted = Wanted();
     }
@@ -58,9 +58,9 @@ Instance_Array read(const Enumeration& row, const Instance* model)
 
 } // namespace
 
-Instance_Array instances_of(const Enumeration& row, const Instance* model, const char* log_source)
+Instance_Array instances_of(const Enumeration& row, const Instance* wanted, const char* log_source)
 {
-    Instance_Array instances = read(row, model);
+    Instance_Array instances = read(row, wanted);
     if (!instances.empty())
     {
         ZMLR_LOG(LL_DBG, "Returning instances");

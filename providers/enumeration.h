@@ -33,9 +33,9 @@ struct Enumeration
     Log_Row empty[2]; // what is logged when there is no instance
 };
 
-// The row's instances; the provider named `log_source` logs whether there are any. A model with all its keys asks for one
-// instance: what the library's memory shows to be another is not read. What that memory no longer knows is found all the same, by
-// reading everything.
-Instance_Array instances_of(const Enumeration& row, const Instance* model, const char* log_source);
+// The row's instances; the provider named `log_source` logs whether there are any. With the model of the one `wanted` instance,
+// what the library's memory shows to be another is not read. What that memory no longer knows is found all the same, by reading
+// everything.
+Instance_Array instances_of(const Enumeration& row, const Instance* wanted, const char* log_source);
 
 } // namespace zmlr

@@ -1,5 +1,6 @@
 // What requests answer on simulated adapters, and which driver requests they cost.
 
+#include "cimserver/operations/provider_call.h"
 #include "tests/module/loaded_module.h"
 
 #include <algorithm>
@@ -53,6 +54,25 @@ TEST_F(Requests, the_largest_host)
     auto sorted = ids;
     std::sort(sorted.begin(), sorted.end());
     EXPECT_EQ(std::adjacent_find(sorted.begin(), sorted.end()), sorted.end());
+}
+
+// Servers may pass any path on.
+TEST_F(Requests, an_enumeration_is_whole_whatever_keys_its_path_has)
+{
+    load("mixed");
+    const cimserver::Object_Path port = enumerate("ZEMLAR_FCPort").at(3).path;
+    const cimserver::Class_Entry& provider = *module().repository().find("ZEMLAR_FCPort");
+    CMPIInstanceMI* mi = module().instance_mi(provider);
+    cimserver::Path_Sink names(name_space);
+    cimserver::Provider_Call(module(), provider, "", port, names).run(mi, mi->ft->enumerateInstanceNames);
+    EXPECT_THAT(names.found, SizeIs(8));
+    cimserver::Instance_Sink instances(name_space, std::nullopt);
+    cimserver::Provider_Call(module(), provider, "", port, instances).run(mi, mi->ft->enumerateInstances, nullptr);
+    EXPECT_THAT(instances.found, SizeIs(8));
+
+    requests();
+    operations().get_instance(port, std::nullopt);
+    EXPECT_THAT(requests(), SizeIs(1)) << "that of the one port";
 }
 
 TEST_F(Requests, every_class_answers_on_every_host)
