@@ -103,13 +103,13 @@ void call_broker(const Port& port)
     CMPIObjectPath* path = CMNewObjectPath(broker, name_space, "ZEMLAR_FCPort", nullptr);
     for (const auto& key : port.wire.path.keys)
         with_value(broker, key.value,
-                   [&](const CMPIValue* value, CMPIType type) { CMAddKey(path, key.name.c_str(), value, type); });
+                   [&](const CMPIValue* value, CMPIType type) { CMAddKey(path, key.name.text().c_str(), value, type); });
     CMPIInstance* instance = CMNewInstance(broker, path, nullptr);
     for (const auto& property : port.wire.properties)
         if (!property.value.null())
             with_value(broker, property.value,
                        [&](const CMPIValue* value, CMPIType type)
-                       { CMSetProperty(instance, property.name.c_str(), value, type); });
+                       { CMSetProperty(instance, property.name.text().c_str(), value, type); });
     CMRelease(instance);
     CMRelease(path);
 }

@@ -7,8 +7,8 @@ namespace cimserver
 
 Request::Request(CMPIFlags flags) : _context(make<Context_Object>())
 {
-    _context.entries.push_back({CMPIInvocationFlags, {CMPI_uint32, std::uint64_t{flags}}});
-    _context.entries.push_back({CMPIPrincipal, {CMPI_string, Principal_Scope::current()}});
+    put(_context.entries, CMPIInvocationFlags, {CMPI_uint32, std::uint64_t{flags}});
+    put(_context.entries, CMPIPrincipal, {CMPI_string, Principal_Scope::current()});
 }
 
 } // namespace cimserver

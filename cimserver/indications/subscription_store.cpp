@@ -41,7 +41,7 @@ Json json_of(const std::vector<Named_Value>& values)
     Json json = Json::object();
     for (const auto& [name, value] : values)
         if (!value.null())
-            json[name] = json_of(value);
+            json[name.text()] = json_of(value);
     return json;
 }
 

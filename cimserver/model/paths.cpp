@@ -48,7 +48,7 @@ Object_Path normal_form(Object_Path path)
         if (auto* target = std::get_if<std::shared_ptr<const Object_Path>>(&key.value.content); target && *target)
             *target = std::make_shared<const Object_Path>(normal_form(**target));
     }
-    std::ranges::sort(path.keys, {}, &Named_Value::name);
+    std::ranges::sort(path.keys, {}, [](const Named_Value& key) { return std::string_view(key.name); });
     return path;
 }
 
@@ -60,7 +60,7 @@ std::string path_text(const Object_Path& path)
     char separator = '.';
     for (const Named_Value& key : path.keys)
     {
-        text += separator + key.name + '=' + key_text(key.value);
+        text += separator + key.name.text() + '=' + key_text(key.value);
         separator = ',';
     }
     return text;

@@ -20,7 +20,7 @@ class Property_Layout
 public:
     struct Slot
     {
-        std::string name;
+        Name name;
         CMPIType type;
         bool key;
     };

@@ -8,6 +8,7 @@
 #include <memory>
 #include <optional>
 #include <string>
+#include <string_view>
 #include <utility>
 #include <variant>
 #include <vector>
@@ -32,9 +33,25 @@ struct Value
     bool null() const { return content.index() == 0; }
 };
 
+// Copies share one text: the instances of a class hold the names of its properties once.
+class Name
+{
+public:
+    Name(std::string text = {}) : _text(std::make_shared<const std::string>(std::move(text))) {}
+    Name(const char* text) : Name(std::string(text)) {}
+
+    const std::string& text() const { return *_text; }
+    operator const std::string&() const { return *_text; }
+    operator std::string_view() const { return *_text; }
+    friend bool operator==(const Name& a, std::string_view b) { return *a._text == b; }
+
+private:
+    std::shared_ptr<const std::string> _text;
+};
+
 struct Named_Value
 {
-    std::string name;
+    Name name;
     Value value;
 };
 

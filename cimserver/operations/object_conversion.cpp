@@ -44,9 +44,9 @@ public:
             const zmlr::Meta_Feature* feature = find_value(*entry.meta_class, property.name);
             if (!feature)
                 throw Cim_Error(unknown_property,
-                                "class " + std::string(entry.meta_class->name) + " has no property " + property.name);
+                                "class " + std::string(entry.meta_class->name) + " has no property " + property.name.text());
             if (!seen.insert(feature).second)
-                throw Type_Error("property given twice: " + property.name);
+                throw Type_Error("property given twice: " + property.name.text());
             result.push_back({feature->name, value(*feature, property.value)});
         }
         return result;
@@ -101,7 +101,7 @@ void add_keys(Instance& instance)
         if (!property)
             instance.properties.push_back(key);
         else if (path_identity({"", "", "", {*property}}) != path_identity({"", "", "", {key}}))
-            throw Cim_Error(CIM_ERR_INVALID_PARAMETER, "the key " + key.name + " cannot be changed");
+            throw Cim_Error(CIM_ERR_INVALID_PARAMETER, "the key " + key.name.text() + " cannot be changed");
     }
 }
 
