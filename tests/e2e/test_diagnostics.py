@@ -141,6 +141,25 @@ def test_records_of_a_port_that_is_gone(start):
     assert host.pywbem.EnumerateInstanceNames("ZEMLAR_AffectedJobElement") == []
 
 
+def test_an_adapter_whose_ports_cannot_be_read_ends_what_is_available(start):
+    unreadable = [{"command": "IOCMD_PORT_GET_ATTR", "instance": 1, "error": "EIO"}]
+    host = start({"adapters": [{"kind": "cna", "ports": [{}]}, *[{"kind": "fc-hba", "ports": [{}]}] * 2], "faults": unreadable})
+    available = host.pywbem.EnumerateInstances("ZEMLAR_AvailableDiagnosticServiceForFCPort")
+    assert [instance["ServiceProvided"]["Name"][7:-4] for instance in available] == ["ExternalLoopback", "SerdesLoopback", "PCILoopback"]
+    assert len(host.pywbem.EnumerateInstanceNames("ZEMLAR_AvailableDiagnosticServiceForAdapter")) == 3
+
+
+def test_without_adapters_there_is_nothing_to_run(start, tmp_path):
+    (tmp_path / ".cimplerc").write_text("LOG_LEVEL=INFO\n", encoding="utf-8")
+    host = start({"adapters": []}, {"HOME": str(tmp_path)})
+    for superclass in ("CIM_DiagnosticTest", "CIM_SoftwareIdentity", "CIM_Job", "CIM_RecordForLog", "CIM_ServiceAvailableToElement"):
+        assert not [path for path in host.pywbem.EnumerateInstanceNames(superclass) if "Diagnostic" in str(path)]
+    assert host.pywbem.EnumerateInstanceNames("ZEMLAR_DiagnosticElementSoftwareIdentity") == []
+    log = (tmp_path / ".cimple/messages").read_text(encoding="utf-8")
+    assert "WARN: DiagnosticHelper" in log and "No adapters in the system for running diagnostics." in log
+    assert "No diagnostic softwares are installed." in log
+
+
 def test_wbemcli_runs_a_test(start):
     host = start(CARDS)
 
