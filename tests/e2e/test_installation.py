@@ -26,14 +26,13 @@ SERVICE = "ZEMLAR_HBASoftwareInstallationService"
 
 
 def archive():
-    members = {"boot.txt": b"IMAGE\nTYPE = L\nID = 13, 14, 17, 21\n", "overlay.bin": IMAGE}
-    with io.BytesIO() as buffer:
-        with tarfile.open(fileobj=buffer, mode="w", format=tarfile.USTAR_FORMAT) as tar:
-            for name, data in members.items():
-                member = tarfile.TarInfo(name)
-                member.size = len(data)
-                tar.addfile(member, io.BytesIO(data))
-        return buffer.getvalue()
+    buffer = io.BytesIO()
+    with tarfile.open(fileobj=buffer, mode="w", format=tarfile.USTAR_FORMAT) as tar:
+        for name, data in (("boot.txt", b"IMAGE\nTYPE = L\nID = 13, 14, 17, 21\n"), ("overlay.bin", IMAGE)):
+            member = tarfile.TarInfo(name)
+            member.size = len(data)
+            tar.addfile(member, io.BytesIO(data))
+    return buffer.getvalue()
 
 
 class Site:
@@ -61,7 +60,7 @@ class Site:
         return self.call(uri, target, options), self.lines()
 
     def lines(self):
-        """Level and message of the lines that are new, without the enumerations between."""
+        """Level and message of the lines that are new, without those of the enumerations."""
         lines = re.findall(r"^\S+ \S+ (\w+): (\w+)\(\d+\): (.*)$", self._log.read(), re.MULTILINE)
         return [(level, text) for level, source, text in lines if "Software" in source]
 
@@ -91,9 +90,11 @@ def remote(tmp_path):
     command = [shutil.which("in.tftpd", path="/usr/sbin:/usr/local/sbin"), "--foreground", "--secure", "--address", f"{ADDRESS}:69", folder]
     assert os.geteuid() == 0, "TFTP has port 69: run as root"
     with subprocess.Popen(command) as server:
-        wait_until(lambda: SOCKET in Path("/proc/net/udp").read_text(encoding="ascii"))
-        yield folder
-        server.terminate()
+        try:
+            wait_until(lambda: SOCKET in Path("/proc/net/udp").read_text(encoding="ascii"))
+            yield folder
+        finally:
+            server.terminate()
 
 
 def refused(error, *lines):

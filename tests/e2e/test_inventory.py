@@ -99,12 +99,13 @@ def test_the_access_point_is_there_while_the_agent_runs(start, tmp_path):
         points = host.pywbem.EnumerateInstances("ZEMLAR_RemoteServiceAccessPoint")
         return [(point["Name"], point["ElementName"], point["InfoFormat"], point["AccessInfo"]) for point in points]
 
-    assert addresses() == []
-    with subprocess.Popen([agent, "600"]) as process:
-        system = host.pywbem.EnumerateInstanceNames("ZEMLAR_ComputerSystem")[0]["Name"]
-        assert addresses() == [("Quillon Service", "Quillon Service Access Point", 200, f"https://{system}:34568/index.html")]
+    system = host.pywbem.EnumerateInstanceNames("ZEMLAR_ComputerSystem")[0]["Name"]
+    before = addresses()
+    with subprocess.Popen([agent, "60"]) as process:
+        during = addresses()
         process.terminate()
-    assert addresses() == []
+    service = ("Quillon Service", "Quillon Service Access Point", 200, f"https://{system}:34568/index.html")
+    assert (before, during, addresses()) == ([], [service], [])
     log = (tmp_path / ".cimple/messages").read_text(encoding="utf-8")
     for line in ("The Quillon Agent is not running so no service available", "Warning: No service is available"):
         assert log.count(line) == 2
