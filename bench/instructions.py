@@ -20,6 +20,11 @@ MEASURED = {
     ],
     "conversion": [("convert_fc_port", 100, "port"), ("bare_broker_calls", 100, "port")],
     "scsi": [(f"{name}/10000", 10_000, "LUN") for name in ["report_luns", "inquire_luns"]],
+    "joins": [
+        (f"{work}/ZEMLAR_{name}", 12_800, "unit")
+        for name in ["StorageResourcesSystemDevice", "SCSIInitiatorTargetLogicalUnitPath"]
+        for work in ["join", "sides"]
+    ],
     "log_call": [("suppressed_log_call", 100_000, "call")],
 }
 
@@ -95,12 +100,12 @@ def main():
     parser = argparse.ArgumentParser(description="Times benchmarks, and counts their instructions under callgrind.")
     parser.add_argument("programs", metavar="PROGRAM", nargs="+", help="a built benchmark")
     programs = parser.parse_args().programs
-    print(f"\n{'benchmark':<24} {'instructions':>14} {'per unit':>12} {'ns':>10}  unit")
+    print(f"\n{'benchmark':<48} {'instructions':>14} {'per unit':>12} {'ns':>10}  unit")
     for program in programs:
         for benchmark, units, unit in MEASURED[Path(program).name]:
             time = nanoseconds(program, benchmark)
             total = instructions(program, benchmark)
-            print(f"{benchmark:<24} {total:>14,} {total / units:>12,.1f} {time / units:>10,.1f}  {unit}")
+            print(f"{benchmark:<48} {total:>14,} {total / units:>12,.1f} {time / units:>10,.1f}  {unit}")
     for program in programs:
         if Path(program).name in SHARES:
             benchmark, units, unit = SHARES[Path(program).name]

@@ -1,5 +1,6 @@
 // The inventory through the broker, for every class that has instances: all of them, and one by its path, on hosts of 1 to 64
-// adapters; then the units behind one target. Driver requests, memory above idle and time, each per instance.
+// adapters; all that is associated with one controller and with the host; then the units behind one target. Driver requests,
+// memory above idle and time, each per instance.
 //
 // Under callgrind each benchmark dumps its instructions by its name; inventory_table.py makes a table of all of it.
 
@@ -54,7 +55,12 @@ Instances get(cimserver::Operations& operations, const cimserver::Object_Path& p
     return {operations.get_instance(path, std::nullopt)};
 }
 
-// What is measured: an operation of the server, and the provider's function behind it.
+Instances traverse(cimserver::Operations& operations, const cimserver::Object_Path& path)
+{
+    return operations.associators(path, {}, std::nullopt);
+}
+
+// What is measured: an operation of the server, and the provider's function behind it if it is one.
 struct Work
 {
     Instances (*ask)(cimserver::Operations&, const cimserver::Object_Path&);
@@ -64,6 +70,7 @@ struct Work
 
 constexpr Work enumeration = {enumerate, &CMPIInstanceMIFT::enumerateInstances, false};
 constexpr Work one_by_path = {get, &CMPIInstanceMIFT::getInstance, true};
+constexpr Work traversal = {traverse, nullptr, true};
 
 // A server that keeps nothing of what it is given.
 class Passing_Sink : public cimserver::Result_Sink
@@ -117,7 +124,8 @@ void measure(benchmark::State& state, const std::string& name, const std::string
     state.counters["requests"] = static_cast<double>(requests);
     state.counters["requests/instance"] = per_instance(requests);
     state.counters["peak/instance"] = per_instance(peak);
-    state.counters["module peak/instance"] = per_instance(module_peak(host.module(), path, work));
+    if (work.function)
+        state.counters["module peak/instance"] = per_instance(module_peak(host.module(), path, work));
     state.counters["time/instance"] = benchmark::Counter(
         static_cast<double>(instances), benchmark::Counter::kIsIterationInvariantRate | benchmark::Counter::kInvert);
 }
@@ -154,6 +162,8 @@ int main(int argc, char** argv)
         add("enumerate/" + name, name, host_of_adapters, enumeration, {1, 4, 16, 64});
     for (const std::string& name : classes)
         add("get/" + name, name, host_of_adapters, one_by_path, {1, 4, 16, 64});
+    for (const char* name : {"ZEMLAR_PortController", "ZEMLAR_ComputerSystem"})
+        add(std::string("associators/") + name, name, host_of_adapters, traversal, {1, 4, 16, 64});
     add("enumerate_luns", "ZEMLAR_StorageExtent", host_of_luns, enumeration, {10, 1000, 10000});
     add("get_lun", "ZEMLAR_StorageExtent", host_of_luns, one_by_path, {10, 1000, 10000});
 

@@ -2,6 +2,7 @@
 
 import argparse
 import json
+import math
 import re
 import subprocess
 import tempfile
@@ -77,6 +78,21 @@ def class_rows(figures, kind, requests):
         ]
 
 
+def exponent(sizes, totals):
+    """Of the size, by least squares: 1 where twice the size costs twice as much."""
+    logs = [(math.log(size), math.log(total)) for size, total in zip(sizes, totals)]
+    mean_size, mean_total = (sum(values) / len(logs) for values in zip(*logs))
+    slope = sum((size - mean_size) * (total - mean_total) for size, total in logs)
+    return slope / sum((size - mean_size) ** 2 for size, _ in logs)
+
+
+def traversal_rows(figures):
+    for name in figures.names("associators"):
+        totals = [figures.counts[f"{name}/{size}"] for size in ADAPTERS]
+        found = figures.of(name, ADAPTERS, "instances")
+        yield [f"`{name.split('_')[1]}`", fold(found), fold(figures.of(name, ADAPTERS, "requests")), *totals, f"{exponent(ADAPTERS, totals):.2f}"]
+
+
 def lun_rows(figures):
     for name in ["enumerate_luns", "get_lun"]:
         for size, count in zip(LUNS, figures.instructions(name, LUNS)):
@@ -95,6 +111,8 @@ def main():
     head = ["class", "instances", "requests", *counts, "spread 4 to 64", *ends]
     print_table("All instances; each figure per instance", head, class_rows(figures, "enumerate", "requests/instance"))
     print_table("One instance by its path", head, class_rows(figures, "get", "requests"))
+    head = ["of", "associators", "requests", *counts, "exponent"]
+    print_table("Associators through all association classes", head, traversal_rows(figures))
     if "enumerate_luns/10" in figures.rows:
         head = ["units", "instances", "requests", "instructions per instance", *ends]
         print_table("Units of two equal targets", head, lun_rows(figures))

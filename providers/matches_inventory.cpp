@@ -28,14 +28,6 @@ std::string_view view(const String& text) { return {text.c_str(), text.size()}; 
 std::string_view view(const Property<String>& text) { return text.null ? std::string_view() : view(text.value); }
 String text_of(std::string_view text) { return String(text.data(), text.size()); }
 
-// The text before the first "_", which is cut off with it.
-std::string_view cut_first(std::string_view& text)
-{
-    const std::string_view first = text.substr(0, text.find('_'));
-    text.remove_prefix(std::min(text.size(), first.size() + 1));
-    return first;
-}
-
 // ---- connectors ----
 
 // Where a connector is.
@@ -76,8 +68,8 @@ constexpr std::size_t longest_name = 63;
 
 std::string_view name_of(const ZEMLAR_AdapterSoftwareIdentity& software)
 {
-    std::string_view id = view(software.InstanceID).substr(0, longest_name);
-    return cut_first(id);
+    const std::string_view id = view(software.InstanceID).substr(0, longest_name);
+    return id.substr(0, id.find('_'));
 }
 
 bool is_driver(const ZEMLAR_AdapterSoftwareIdentity& software)
@@ -100,27 +92,39 @@ bool runs_on(const ZEMLAR_AdapterSoftwareIdentity& software, const ZEMLAR_PortCo
 
 // ---- units ----
 
-Instance* first_endpoint(const Joining& joining, const Key_Index& by_name, const String& name)
+// What a unit's identifier begins with: the names of its initiator and of its target.
+std::string_view names_in(std::string_view id)
 {
-    const std::vector<uint32>& positions = by_name.at(name);
-    return positions.empty() ? nullptr : joining[2][positions.front()];
+    const std::size_t line = id.find('_');
+    return line == std::string_view::npos ? std::string_view() : id.substr(0, id.find('_', line + 1));
 }
 
-// False when the match is to end.
-bool add_path(Joining& joining, const Key_Index& by_name, Instance* unit, const String& unit_id)
+// The ends of the path to a unit; null where there are none.
+struct Ends
 {
-    std::string_view id = view(unit_id);
-    const String initiator_name = text_of(cut_first(id));
-    Instance* initiator = first_endpoint(joining, by_name, initiator_name);
-    Instance* target = first_endpoint(joining, by_name, initiator_name + "_" + text_of(cut_first(id)));
-    if (!initiator || !target)
-        return true;
+    std::string_view names;
+    Instance* initiator = nullptr;
+    Instance* target = nullptr;
+};
 
+// Endpoints are named by the initiator, or by initiator and target.
+Ends ends_of(std::string_view names, const Instance_Array& endpoints, const Key_Index& by_name)
+{
+    const auto first = [&](std::string_view name)
+    {
+        const std::vector<uint32>& positions = by_name.at(name);
+        return positions.empty() ? nullptr : endpoints[positions.front()];
+    };
+    return {names, first(names.substr(0, names.find('_'))), first(names)};
+}
+
+Ref<Instance> path_to(Instance* unit, const Ends& ends)
+{
     Ref<ZEMLAR_SCSIInitiatorTargetLogicalUnitPath> path(ZEMLAR_SCSIInitiatorTargetLogicalUnitPath::create());
-    set_reference(path->Initiator, initiator);
-    set_reference(path->Target, target);
+    set_reference(path->Initiator, ends.initiator);
+    set_reference(path->Target, ends.target);
     set_reference(path->LogicalUnit, unit);
-    return joining.deliver(Ref<Instance>(path.steal()));
+    return Ref<Instance>(path.steal());
 }
 
 } // namespace
@@ -260,12 +264,16 @@ void paths_to_units(Joining& joining)
     joining.say_building();
 
     const Key_Index by_name = index_of(joining, endpoints);
+    Ends ends; // units come target by target
     for (const std::size_t side : {extents, tapes})
     {
         for (uint32 i = 0; i < joining[side].size(); i++)
         {
-            Instance* unit = joining[side][i];
-            if (unit && !add_path(joining, by_name, unit, joining.key(side, i)))
+            Instance* unit = joining[side][i]; // holds the text that key() shares
+            const std::string_view names = unit ? names_in(view(joining.key(side, i))) : std::string_view();
+            if (names != ends.names)
+                ends = ends_of(names, joining[endpoints], by_name);
+            if (ends.initiator && ends.target && !joining.deliver(path_to(unit, ends)))
                 return;
         }
     }
