@@ -64,16 +64,25 @@ class Figures:
         return [row["real_time"] / row["instances"], row["module peak/instance"], row["peak/instance"]]
 
 
+def increments(totals, sizes):
+    """What one more costs, from each size to the next."""
+    return [(after - before) / (more - less) for before, after, less, more in zip(totals, totals[1:], sizes, sizes[1:])]
+
+
 def class_rows(figures, kind, requests):
     for name in figures.names(kind):
         counts = figures.instructions(name, ADAPTERS)
+        instances = figures.of(name, ADAPTERS, "instances")
+        totals = [count * number for count, number in zip(counts, instances)]
+        sizes = instances if len(set(instances)) == len(ADAPTERS) else ADAPTERS
         spread = 100 * (max(counts[1:]) / min(counts[1:]) - 1)
         yield [
             f"`{name.split('_')[1]}`",
-            fold(figures.of(name, ADAPTERS, "instances")),
+            fold(instances),
             fold(figures.of(name, ADAPTERS, requests)),
             *counts,
             f"{spread:.1f} %",
+            " / ".join(f"{more:,.0f}" for more in increments(totals[1:], sizes[1:])),
             *figures.last(name, ADAPTERS[-1]),
         ]
 
@@ -108,9 +117,11 @@ def main():
     figures = Figures(options.program, f"--benchmark_filter={options.filter}")
     counts = [f"instructions at {adapters}" for adapters in ADAPTERS]
     ends = ["µs", "peak bytes", "with the server's answer"]
-    head = ["class", "instances", "requests", *counts, "spread 4 to 64", *ends]
-    print_table("All instances; each figure per instance", head, class_rows(figures, "enumerate", "requests/instance"))
-    print_table("One instance by its path", head, class_rows(figures, "get", "requests"))
+    head = ["class", "instances", "requests", *counts, "spread 4 to 64"]
+    head_of_all = [*head, "one more instance, to 16 / to 64", *ends]
+    print_table("All instances; each figure per instance", head_of_all, class_rows(figures, "enumerate", "requests/instance"))
+    head_of_one = [*head, "one more adapter, to 16 / to 64", *ends]
+    print_table("One instance by its path", head_of_one, class_rows(figures, "get", "requests"))
     head = ["of", "associators", "requests", *counts, "exponent"]
     print_table("Associators through all association classes", head, traversal_rows(figures))
     if "enumerate_luns/10" in figures.rows:
