@@ -364,6 +364,7 @@ TEST_F(Alerts, do_not_hold_up_the_end)
             start();
             raise(1, 200);
             sink.take(1);
+            std::filesystem::remove_all(_home.path("")); // nobody else does
             std::exit(0);
         },
         testing::ExitedWithCode(0), "");
