@@ -69,6 +69,17 @@ bool holds(const std::vector<std::uint64_t>& addresses, std::uint64_t address)
     return address != 0 && std::ranges::find(addresses, address) != addresses.end();
 }
 
+// Names and serial numbers that are counted up differ at their ends. A byte that may be shown as another is like any.
+bool ends_alike(const String& key, const char* field, std::size_t size)
+{
+    for (std::size_t i = size; i > 0; i--)
+    {
+        if (ascii::to_lower(field[i - 1]) != ascii::to_lower(key.c_str()[i - 1]))
+            return static_cast<signed char>(field[i - 1]) < ' ';
+    }
+    return true;
+}
+
 constexpr std::uint64_t size_bit(std::size_t size) { return size < 64 ? std::uint64_t{1} << size : 0; }
 
 } // namespace
@@ -111,8 +122,11 @@ template <std::size_t N> bool Wanted::has_key(const char (&field)[N]) const
 {
     static_assert(N <= 64);
     const std::size_t size = ::strnlen(field, N);
-    return (_sizes & size_bit(size)) != 0 &&
-           std::ranges::any_of(_keys, [&](const String& key) { return key.equali(property_text(field)); });
+    return (_sizes & size_bit(size)) != 0 && std::ranges::any_of(_keys,
+                                                                 [&](const String& key) {
+                                                                     return key.size() == size && ends_alike(key, field, size) &&
+                                                                            key.equali(property_text(field));
+                                                                 });
 }
 
 bool Wanted::may_be_of_ioc(const hxal_t& ioc) const
