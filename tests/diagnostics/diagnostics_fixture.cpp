@@ -23,6 +23,9 @@ struct Loaded
 
 std::unique_ptr<Loaded> loaded;
 
+// A sanitizer may have one of its own.
+const std::size_t idle_threads = sample::Resources().threads;
+
 cimserver::Operations& operations() { return loaded->name_spaces.at("root/zemlar", ""); }
 
 const Temporary_Folder& home()
@@ -108,7 +111,7 @@ Diagnostics::Answer Diagnostics::run(const std::string& test_class, const std::s
 
 void Diagnostics::wait_for_end()
 {
-    for (int i = 0; i < 60'000 && sample::Resources().threads > 1; ++i)
+    for (int i = 0; i < 60'000 && sample::Resources().threads > idle_threads; ++i)
         std::this_thread::sleep_for(std::chrono::milliseconds(1));
 }
 
