@@ -79,7 +79,7 @@ TEST_F(Conversion, leaves_bad_items_null_and_says_why)
     {
         Ref<TST_Thing> made;
         const auto convert = [&] { made = instance_of<TST_Thing>({c.item, {"Sint64Value", {CMPI_sint64, std::int64_t{5}}}}); };
-        EXPECT_EQ(logged(convert), c.messages) << c.item.name;
+        EXPECT_EQ(logged(convert), c.messages) << c.item.name.text();
         EXPECT_THAT(non_null_of(made.ptr()), ElementsAre("Sint64Value"));
     }
 }

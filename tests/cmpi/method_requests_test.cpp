@@ -132,7 +132,8 @@ TEST_F(Method_Requests, leave_arguments_null_that_do_not_fit)
     for (const auto& [argument, messages] : cases)
     {
         in.args = {argument};
-        EXPECT_THAT(logged([&] { EXPECT_EQ(invoke("Convert", disk_path()), CMPI_RC_OK); }), SizeIs(messages)) << argument.name;
+        EXPECT_THAT(logged([&] { EXPECT_EQ(invoke("Convert", disk_path()), CMPI_RC_OK); }), SizeIs(messages))
+            << argument.name.text();
     }
 }
 

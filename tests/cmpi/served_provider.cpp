@@ -101,7 +101,7 @@ const cimserver::Value& Served_Provider::value(const Items& items, const char* n
 {
     for (const auto& item : items)
     {
-        if (eqi(item.name.c_str(), name))
+        if (eqi(item.name.text().c_str(), name))
             return item.value;
     }
     ADD_FAILURE() << "no item " << name;
