@@ -9,6 +9,8 @@
 namespace zmlr
 {
 
+class Far_Ends;
+
 struct Answer
 {
     const CMPIBroker* broker;
@@ -16,7 +18,8 @@ struct Answer
     const CMPIResult* result;
     String name_space; // of the request's path
     Property_Filter properties = {};
-    CMPIrc rc = CMPI_RC_OK; // of the first object that could not be answered
+    Far_Ends* far_ends = nullptr; // of associators that are fetched one by one
+    CMPIrc rc = CMPI_RC_OK;       // of the first object that could not be answered
 };
 
 // The callback of an enumeration whose client data are an Answer: takes over each object and gives it to `send`, which

@@ -1,6 +1,7 @@
 // The association interface of an adapter.
 #include "cmpi/answer.h"
 #include "cmpi/converter.h"
+#include "cmpi/far_ends.h"
 #include "cmpi/request.h"
 #include "cmpi/status_to_rc.h"
 #include "runtime/features.h"
@@ -68,8 +69,12 @@ CMPIrc send_name(const Answer& answer, Instance* object)
     return CMPI_RC_OK;
 }
 
+// An answer has each far end once, however many associations lead to it: a repeated one is not worth another fetch, which may ask
+// the drivers. (Names cost nothing; servers drop those that are repeated, also across providers.)
 CMPIrc send_named_instance(const Answer& answer, Instance* object)
 {
+    if (!answer.far_ends->add(object))
+        return CMPI_RC_OK;
     CMPI_Ptr<CMPIObjectPath> path;
     if (make_name(answer, object, path) != CMPI_RC_OK)
         return CMPI_RC_ERR_FAILED;
@@ -167,6 +172,8 @@ CMPIrc answer_associators(const Association_Request& request)
                                                          answer_with<send_associator>, &answer);
     if (status != ENUM_ASSOCIATORS_UNSUPPORTED)
         return outcome(status, answer);
+    Far_Ends far_ends;
+    answer.far_ends = &far_ends;
     return outcome(request.adapter.enum_associator_names(source.ptr(), request.result_class, request.role, request.result_role,
                                                          answer_with<send_named_instance>, &answer),
                    answer);

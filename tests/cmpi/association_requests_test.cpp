@@ -13,12 +13,14 @@ using testing::SizeIs;
 namespace
 {
 
-std::string listed; // in the property list of the last instance that a provider asked the server for
+int fetched = 0;    // instances that a provider asked the server for
+std::string listed; // in the property list of the last one
 
 // The server finds a thing of every name but "gone".
 CMPIInstance* find_thing(const CMPIBroker* broker, const CMPIContext*, const CMPIObjectPath* path, const char** properties,
                          CMPIStatus* status)
 {
+    ++fetched;
     listed = properties && *properties ? *properties : "";
     const auto& name = cimserver::object<cimserver::Path_Object>(path).path.keys.at(0).value;
     const bool gone = std::get<std::string>(name.content) == "gone";
@@ -197,6 +199,23 @@ TEST_F(Association_Requests, fetch_associated_instances_from_the_server)
     EXPECT_EQ(associators(a, list), CMPI_RC_OK);
     EXPECT_THAT(found(), ElementsAre("b", "d"));
     EXPECT_EQ(listed, "Uint8Value");
+
+    offer_links(); // the same once more; then an instance that two links share, and one of its name in another name space
+    for (const char* of : {"root/other", ""})
+    {
+        const Ref<TST_Thing> shared = thing("e");
+        shared->__name_space = of;
+        for (int i = 0; i < 2; i++)
+        {
+            Ref<TST_Pair> link = linked("a", "e");
+            set_reference(link->Dependent, shared.ptr());
+            script.instances.emplace_back(link.steal());
+        }
+    }
+    fetched = 0;
+    EXPECT_EQ(associators(a), CMPI_RC_OK);
+    EXPECT_THAT(found(), ElementsAre("b", "d", "e", "e"));
+    EXPECT_EQ(fetched, 4) << "each far end once";
 
     script.instances.emplace(script.instances.begin() + 1, linked("a", "gone").steal());
     EXPECT_EQ(associators(a), CMPI_RC_ERR_FAILED) << "the server gives nothing";
