@@ -128,7 +128,7 @@ class Client(threading.Thread):
             [
                 lambda: self._cim.ExecQuery("WQL", f"SELECT * FROM {name}"),
                 lambda: self._cim.OpenEnumerateInstances(name),
-                lambda: self._cim.GetQualifier("Key"),
+                lambda: self._cim.DeleteQualifier("Key"),
             ]
         )()
         raise AssertionError("an operation that is not offered was answered")
