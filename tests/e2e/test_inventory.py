@@ -99,13 +99,21 @@ def test_the_access_point_is_there_while_the_agent_runs(start, tmp_path):
         points = host.pywbem.EnumerateInstances("ZEMLAR_RemoteServiceAccessPoint")
         return [(point["Name"], point["ElementName"], point["InfoFormat"], point["AccessInfo"]) for point in points]
 
-    system = host.pywbem.EnumerateInstanceNames("ZEMLAR_ComputerSystem")[0]["Name"]
+    def hosted(source, role, far_role):
+        return client.AssociatorNames(source, AssocClass="ZEMLAR_RemoteServiceHostedAccessPoint", Role=role, ResultRole=far_role)
+
+    client = host.pywbem
+    system_path = client.EnumerateInstanceNames("ZEMLAR_ComputerSystem")[0]
+    system = system_path["Name"]
     before = addresses()
     with subprocess.Popen([agent, "60"]) as process:
         during = addresses()
+        points = hosted(system_path, "Antecedent", "Dependent")
+        systems = hosted(points[0], "Dependent", "Antecedent") if points else []
         process.terminate()
     service = ("Quillon Service", "Quillon Service Access Point", 200, f"https://{system}:34568/index.html")
     assert (before, during, addresses()) == ([], [service], [])
+    assert ([point["Name"] for point in points], [found["Name"] for found in systems]) == (["Quillon Service"], [system])
     log = (tmp_path / ".cimple/messages").read_text(encoding="utf-8")
     for line in ("The Quillon Agent is not running so no service available", "Warning: No service is available"):
         assert log.count(line) == 2
