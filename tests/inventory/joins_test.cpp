@@ -1,13 +1,16 @@
 // The rows that join instances: which requests they cost, what they say of a side that is empty, and what their rules make of
 // keys that no adapter of ours has.
 #include "hxal/hxal.h"
+#include "inventory/adapter_lookup.h"
 #include "providers/joining.h"
-#include "providers/joins_inventory.h"
+#include "providers/joins.h"
 #include "tests/inventory/inventory_fixture.h"
 
 #include <algorithm>
-#include <cstring>
-#include <map>
+#include <fstream>
+#include <set>
+#include <span>
+#include <sstream>
 
 using namespace zmlr;
 using testing::ElementsAre;
@@ -17,12 +20,6 @@ namespace
 {
 
 using Texts = std::vector<std::string>;
-
-const Join& row_of_class(const char* name)
-{
-    return *std::ranges::find_if(inventory_joins,
-                                 [name](const Join& row) { return std::strcmp(row.meta_class->name + 7, name) == 0; });
-}
 
 // What tells an instance from others of its class.
 std::string name_of(const Instance* instance)
@@ -59,7 +56,7 @@ Texts joined(const Join& row, std::size_t enough = 1000)
 }
 
 // What is asked for in the tests' own rows.
-std::vector<Ref<Instance>> sides[3];
+std::vector<Ref<Instance>> sides[max_sides];
 
 template <int i> Instance_Array given(const Inventory_Request&)
 {
@@ -67,6 +64,39 @@ template <int i> Instance_Array given(const Inventory_Request&)
     for (const Ref<Instance>& instance : sides[i])
         instances.adopt(instance);
     return instances;
+}
+
+template <int i> Instance_Array given_to(const Instance*, const Inventory_Request& request) { return given<i>(request); }
+
+// Gives a side as many elements as it needs, and more where it may have them.
+void give_side(const Join& row, std::size_t side, std::size_t count)
+{
+    sides[side].clear();
+    const char* const names[] = {"FC HBA", "Server", "SMI-S"};
+    for (std::size_t i = 0; i < count; i++)
+    {
+        Instance* element = create(row.sides[side].meta_class, true);
+        sides[side].emplace_back(element);
+        if (element->meta_class == &ZEMLAR_RegisteredProfile::static_meta_class)
+            static_cast<ZEMLAR_RegisteredProfile*>(element)->RegisteredName.set(names[i]);
+    }
+}
+
+void give_side(const Join& row, std::size_t side) { give_side(row, side, row.sides[side].need == Need::exactly_one ? 1 : 3); }
+
+// The row, with sides that are given.
+Join with_given_sides(Join row)
+{
+    constexpr decltype(Side::ask) asks[] = {given<0>, given<1>, given<2>, given<3>};
+    constexpr decltype(Side::ask_of) asks_of[] = {given_to<0>, given_to<1>, given_to<2>, given_to<3>};
+    for (std::size_t side = 0; side < max_sides && row.sides[side].meta_class; side++)
+    {
+        row.sides[side].ask = asks[side];
+        if (row.sides[side].ask_of)
+            row.sides[side].ask_of = asks_of[side];
+        give_side(row, side);
+    }
+    return row;
 }
 
 template <class T> void give(int i, Property<String> T::*key, std::initializer_list<const char*> texts)
@@ -83,28 +113,67 @@ template <class T> void give(int i, Property<String> T::*key, std::initializer_l
     sides[i].emplace_back(ZEMLAR_ComputerSystem::create());
 }
 
-using Joins = Inventory_Test;
+class Joins : public Inventory_Test
+{
+protected:
+    static Instance_Array all_instances_of(const Meta_Class* meta_class)
+    {
+        const auto* row = std::ranges::find(enumerations, meta_class, &Enumeration::meta_class);
+        return row == std::end(enumerations) ? Instance_Array() : row->get_instances(row->id, {});
+    }
+
+    Texts requests_for_addresses_of_adapters_with_connectors()
+    {
+        std::set<int> adapters; // whose index is the last but one part of a tag
+        for (const std::string& tag : values_of(all_instances_of(&ZEMLAR_PhysicalConnector::static_meta_class), "Tag"))
+            adapters.insert(std::stoi(tag.substr(tag.rfind('_', tag.rfind('_') - 1) + 1)));
+        requests();
+        for (const int adapter : adapters)
+            ProviderUtil::getAddrByAdapterId(adapter);
+        return requests();
+    }
+
+    // How many associations a row makes, and what it logs.
+    std::string said_by(const Join& row)
+    {
+        log();
+        std::string text = std::to_string(joined(row).size()) + '\n';
+        for (const std::string& line : log())
+            if (line.find(" Test_Provider: ") != line.npos)
+                text += '|' + line + "|\n";
+        return text;
+    }
+};
 
 } // namespace
 
 TEST_F(Joins, cost_the_requests_of_their_sides)
 {
-    for (const Join& row : inventory_joins)
+    for (const char* scenario : {"fc-hba", "cna", "mixed", "odd"})
     {
-        SCOPED_TRACE(row.meta_class->name);
-        requests();
-        joined(row);
-        Texts sent = requests();
-        for (const Side& side : row.sides)
-            if (side.meta_class) // the ports of all adapters are all ports
-                if (const auto* all = std::ranges::find(enumerations, side.meta_class, &Enumeration::meta_class))
-                    all->get_instances(all->id, {});
-        Texts expected = requests();
-        if (row.match == connectors_in_packages) // a CNA's address
-            expected.insert(expected.end(), {"IOCMD_IOC_GET_INFO /dev/hxa 0", "IOCMD_IOC_GET_INFO /dev/hxa 4"});
-        std::ranges::sort(sent);
-        std::ranges::sort(expected);
-        EXPECT_EQ(sent, expected);
+        hxasim::load(scenario);
+        hxal_adapter_scan();
+        std::vector<Join> rows(std::begin(inventory_joins), std::end(inventory_joins));
+        rows.insert(rows.end(), std::begin(diagnostic_joins), std::end(diagnostic_joins));
+        for (const Join& row : rows)
+        {
+            SCOPED_TRACE(std::string(scenario) + ' ' + row.meta_class->name);
+            requests();
+            const bool is_without_units = joined(row).empty() && row.match == paths_to_units;
+            Texts sent = requests();
+            for (const Side& side : row.sides)
+                if (side.meta_class && !(is_without_units && side.meta_class == &ZEMLAR_SCSIProtocolEndpoint::static_meta_class))
+                    all_instances_of(side.meta_class); // the ports of all adapters are all ports
+            Texts expected = requests();
+            if (row.match == connectors_in_packages)
+            {
+                const Texts asked = requests_for_addresses_of_adapters_with_connectors();
+                expected.insert(expected.end(), asked.begin(), asked.end());
+            }
+            std::ranges::sort(sent);
+            std::ranges::sort(expected);
+            EXPECT_EQ(sent, expected);
+        }
     }
 }
 
@@ -117,56 +186,34 @@ TEST_F(Joins, end_when_the_client_has_enough)
     }
 }
 
+// The file holds for each row how many associations it makes of the elements given and what it logs; then the same without the
+// elements of each side in turn, and with another number of them, where that changes what it logs. In bars.
 TEST_F(Joins, say_what_is_missing)
 {
-    const std::map<std::string, Texts> without_adapters = {
-        {"AdapterElementSoftwareIdentity", {}},
-        {"AssociatedAlarm", {"No FC Ports Found!"}},
-        {"ControlledBy", {}},
-        {"DeviceSAPImplementation", {"Error: No FCPort found!"}},
-        {"ElementStatisticalData", {"No FC Ports Found"}},
-        {"EthernetPortControlledBy", {}},
-        {"EthernetPortRealizes", {"No Connector Found"}},
-        {"EthernetPortSystemDevice", {"Invalid mapping information"}},
-        {"FCPortSystemDevice", {"Error: Invalid mapping information"}},
-        {"HostedAccessPoint", {"Error: Invalid mapping information"}},
-        {"HostedCollection", {"No Logical Port Groups found!"}},
-        {"HostedDependency", {}},
-        {"HostedLANEndpoint", {"No Ethernet Port Found"}},
-        {"InstalledSoftwareIdentity", {"Error: Invalid mapping information"}},
-        {"LANEndpointDeviceSAPImplementation", {"No Ethernet Port Found"}},
-        {"MemberOfCollection", {"No FC Ports Found!"}},
-        {"PhysicalConnectorContainer", {"No Connectors retrieved"}},
-        {"PortControllerSystemDevice", {"Error: Invalid mapping information"}},
-        {"ProductElementComponent", {"Invalid mapping information."}},
-        {"ProductPhysicalComponent", {"Error: Improper Product Information!"}},
-        {"Realizes", {"Error: Invalid number of instances returned!"}},
-        {"RemoteServiceHostedAccessPoint", {"Warning: No service is available"}},
-        {"SCSIInitiatorTargetLogicalUnitPath", {"Error: Invalid number of instances returned!"}},
-        {"StorageResourcesSystemDevice", {}},
-    };
-    const auto said_by = [&](const Join& row)
+    std::ostringstream said;
+    for (const std::span<const Join> rows : {std::span<const Join>(inventory_joins), {profile_joins}, {diagnostic_joins}})
     {
-        log();
-        EXPECT_THAT(joined(row), IsEmpty());
-        Texts said;
-        for (const std::string& line : log())
-            if (line.starts_with("ERR Test_Provider: "))
-                said.push_back(line.substr(19));
-        return said;
-    };
-    plug_text(R"({"adapters": []})");
-    for (const auto& [name, lines] : without_adapters)
-        EXPECT_EQ(said_by(row_of_class(name.c_str())), lines) << name;
-
-    plug_text(R"({"adapters": [{"kind": "fc-hba", "ports": [{}]}, {"kind": "fc-hba", "ports": [{}]}]})");
-    EXPECT_EQ(said_by(row_of_class("HostedDependency")), Texts(2, "There are no ETHPORT instances returned"));
-
-    plug_text(R"({"adapters": [{"kind": "cna"}]})");
-    Join row = row_of_class("LANEndpointDeviceSAPImplementation");
-    sides[1].clear();
-    row.sides[1].ask = given<1>;
-    EXPECT_THAT(said_by(row), ElementsAre("Error: Invalid mapping information!", "Invalid number of EndPoint instances "));
+        for (const Join& row : rows)
+        {
+            const Join given_row = with_given_sides(row);
+            const std::string with_all = said_by(given_row);
+            said << row.meta_class->name << ": " << with_all;
+            for (std::size_t side = 0; side < max_sides && row.sides[side].meta_class; side++)
+            {
+                for (const std::size_t count : {0U, 2U})
+                {
+                    give_side(row, side, count);
+                    const std::string without = said_by(given_row);
+                    if (without.substr(without.find('\n')) != with_all.substr(with_all.find('\n')))
+                        said << "- " << count << ' ' << row.sides[side].meta_class->name << ": " << without;
+                }
+                give_side(row, side);
+            }
+        }
+    }
+    std::ostringstream expected;
+    expected << std::ifstream(JOINS_FILE).rdbuf();
+    EXPECT_EQ(said.str(), expected.str());
 }
 
 TEST_F(Joins, need_one_service_and_take_its_capabilities)
