@@ -22,7 +22,7 @@ public:
     ~Ending()
     {
         if (::getpid() == _process && !_jobs.end(patience))
-            ZMLR_LOG(LL_ERR, "The process ends while a diagnostic test runs; what it tests may be left out of service");
+            ZMLR_LOG(LL_ERR, "The process ends while a diagnostic test runs; what it took out of service stays out");
     }
 
     Ending(const Ending&) = delete;
