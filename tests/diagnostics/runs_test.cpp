@@ -23,6 +23,7 @@ struct Case
     const char* element_class;
     std::size_t element;
     Faults faults = {};
+    const char* named_by = nullptr; // another class: the path carries the DeviceID of its element with this number
 };
 
 constexpr const char* FC = "ZEMLAR_FCPort";
@@ -61,13 +62,19 @@ const Case cases[] = {
     {"MemoryTest", "by tlapnpsf1t", ADAPTER, disabled_hba, {answers("MEMTEST", 90, 16, memory_result(16))}},
     {"MemoryTest", "by who knows what", ADAPTER, disabled_hba, {answers("MEMTEST", 90, 16, memory_result(4))}},
     {"MemoryTest", "of an adapter half of which refuses to stop", ADAPTER, cna, {refuses("IOC_DISABLE", "/dev/hxn")}},
+    {"MemoryTest", "of a CNA that refuses to stop", ADAPTER, cna, {refuses("IOC_DISABLE", "/dev/hxa")}},
+    {"MemoryTest", "of an HBA that refuses to stop", ADAPTER, hba, {refuses("IOC_DISABLE", "/dev/hxa")}},
 
     {"InternalLoopbackTest", "of an HBA's port", FC, hba_port},
     {"InternalLoopbackTest", "of an HBA's disabled port", FC, hba_port_out},
     {"ExternalLoopbackTest", "of an HBA's port", FC, hba_port},
+    {"ExternalLoopbackTest", "of an HBA's disabled port", FC, hba_port_out},
     {"ExternalLoopbackTest", "of a CNA's port", FC, cna_port},
     {"ExternalLoopbackTest", "of a CNA's disabled port", FC, cna_port_out},
     {"SerdesLoopbackTest", "of a CNA's port", FC, cna_port},
+    {"SerdesLoopbackTest", "of a CNA's port by its MAC address", FC, cna_port, {}, ETHERNET},
+    {"SerdesLoopbackTest", "of an HBA's port", FC, hba_port},
+    {"SerdesLoopbackTest", "of an HBA's disabled port", FC, hba_port_out},
     {"SerdesLoopbackTest", "with a bad frame header", FC, hba_port_out, {answers("LOOPBACK", 48, 24, frames)}},
     {"SerdesLoopbackTest", "with a bad frame size", FC, cna_port, {answers("LOOPBACK", 49, 24, frames)}},
     {"SerdesLoopbackTest", "that the driver refuses", FC, hba_port, {answers("LOOPBACK", HXA_STATUS_DIAG_BUSY)}},
@@ -80,14 +87,21 @@ const Case cases[] = {
     {"ExternalEthLoopbackTest", "of a disabled port", ETHERNET, cna_port_out},
     {"SerdesEthLoopbackTest", "of a port", ETHERNET, cna_port},
     {"SerdesEthLoopbackTest", "with a bad frame header", ETHERNET, cna_port, {answers("LL_LOOPBACK", 48, 20, frames)}},
+    {"SerdesEthLoopbackTest", "with a bad frame size", ETHERNET, cna_port, {answers("LL_LOOPBACK", 49, 20, frames)}},
     {"SerdesEthLoopbackTest", "that the driver refuses", ETHERNET, cna_port_out, {answers("LL_LOOPBACK", HXA_STATUS_DIAG_BUSY)}},
     {"SerdesEthLoopbackTest", "with a bad result", ETHERNET, cna_port_out, {answers("LL_LOOPBACK", 0, 20, frames)}},
     {"SerdesEthLoopbackTest", "with an unknown failure", ETHERNET, cna_port_out, {answers("LL_LOOPBACK", 0, 40, {1})}},
     {"SerdesEthLoopbackTest", "of a port whose FC side refuses to go", ETHERNET, cna_port, {refuses("PORT_DISABLE", "/dev/hxa")}},
+    {"SerdesEthLoopbackTest",
+     "of a port whose Ethernet side refuses to go",
+     ETHERNET,
+     cna_port,
+     {refuses("PORT_DISABLE", "/dev/hxn")}},
 
     {"PCILoopbackTest", "of an HBA's port", FC, hba_port},
     {"PCILoopbackTest", "of a CNA's disabled port", FC, cna_port_out},
     {"PCILoopbackTest", "of an Ethernet port", ETHERNET, cna_port},
+    {"PCILoopbackTest", "of a disabled Ethernet port", ETHERNET, cna_port_out},
     {"PCILoopbackTest", "that fails", ETHERNET, cna_port, {answers("FWPING", HXA_STATUS_DATACORRUPTED)}},
 };
 
@@ -168,27 +182,34 @@ protected:
         return text.str().substr(0, 35);
     }
 
+    static std::string pause_before(const hxasim::Request& request)
+    {
+        const auto slept = std::chrono::duration_cast<std::chrono::seconds>(request.slept).count();
+        return slept > 0 ? "    after " + std::to_string(slept) + " s " : "    ";
+    }
+
     static std::string sent()
     {
         std::string text;
         for (const auto& request : hxasim::take_requests())
         {
-            const auto slept =
-                std::chrono::duration_cast<std::chrono::seconds>(request.slept).count(); // the test's own waits are less
-            text += slept > 0 ? "    after " + std::to_string(slept) + " s " : "    ";
-            text += request.name.substr(6) + ' ' + request.node.substr(5) + ' ' + std::to_string(request.instance);
+            text += pause_before(request) + request.name.substr(6) + ' ' + request.node.substr(5) + ' ' +
+                    std::to_string(request.instance);
             if (request.name.starts_with("IOCMD_DIAG_") && request.name != "IOCMD_DIAG_LB_STAT")
                 text += " with " + parameters(request.sent);
             text += '\n';
         }
-        return text;
+        enumerate(FC);
+        return text + pause_before(hxasim::take_requests().at(0)) + "the end\n";
     }
 
     static std::string sees(const Case& each)
     {
         static int next_number = 1;
         const std::string before = states();
-        const auto element = path(each.element_class, each.element);
+        auto element = path(each.element_class, each.element);
+        if (each.named_by)
+            cimserver::put(element.keys, "DeviceID", {CMPI_string, value(enumerate(each.named_by).at(each.element), "DeviceID")});
         for (const Fault& fault : each.faults)
             hxasim::inject(fault);
         hxasim::take_requests();
