@@ -49,10 +49,11 @@ struct Commands
 // Whether a command takes the word for what it is.
 bool is_plain(const String& word) { return !word.empty() && word[0] != '-' && !has_control_character(word); }
 
-// The client takes what stands before a ':' for another server, and stores "folder/file" as "file".
+// The client takes what stands before a ':' for another server, and stores "folder/file" as "file". Where the working directory
+// is somebody's home, files that begin with '.' are run at the next start of a shell.
 bool is_file_name(const String& word)
 {
-    return is_plain(word) && !std::strpbrk(word.c_str(), "/:") && !std::strstr(word.c_str(), "..");
+    return is_plain(word) && word[0] != '.' && !std::strpbrk(word.c_str(), "/:") && !std::strstr(word.c_str(), "..");
 }
 
 bool is_address(const Tftp_Address& address)

@@ -122,7 +122,7 @@ REFUSALS = [
 ]
 SERVER = ADDRESS + "/"
 ADDRESSES = ["", ADDRESS, "/f", "h/f", SERVER, "-h/f", "h\x7fh/f", SERVER + "d/f", SERVER + "/f", SERVER + "127.0.0.1:f"]
-ADDRESSES += [SERVER + name for name in ("..", "f..", "-f", "f\n", "\u0085f", "f" * 1000, "'" * 300)]
+ADDRESSES += [SERVER + name for name in (".", ".f", "..", "f..", "-f", "f\n", "\u0085f", "f" * 1000, "'" * 300)]
 REFUSALS += [("tftp://" + address, GOOD, [4], refused("malformed tftp URI")) for address in ADDRESSES]
 
 
