@@ -3,6 +3,7 @@
 #include <fcntl.h>
 #include <poll.h>
 #include <sys/resource.h>
+#include <sys/stat.h>
 #include <sys/wait.h>
 #include <unistd.h>
 
@@ -118,6 +119,7 @@ void limit_files()
         _exit(1);
     take_default_signals();
     limit_files();
+    umask(S_IRWXG | S_IRWXO);
 
     const pid_t shell = fork();
     if (shell == 0)

@@ -16,8 +16,9 @@ struct First_Line
 // Runs the command by "/bin/sh -c" and waits until it ends, at most for `limit`; then it is killed with all that it started. Its
 // exit status; -1 when it has none: it could not be started, a signal ended it, it took too long.
 //
-// The command reads nothing, inherits no descriptor, no blocked or ignored signal, and may write files of at most 128 MiB. What
-// it prints is thrown away but for the first line, when one is asked for: behind it nobody reads, and SIGPIPE may end it.
+// The command reads nothing, inherits no descriptor, no blocked or ignored signal, and may write files of at most 128 MiB, which
+// only the user of the process may open. What it prints is thrown away but for the first line, when one is asked for: behind it
+// nobody reads, and SIGPIPE may end it.
 // Whatever the process does with SIGCHLD, its handler included, the status is known. Any thread may call it.
 int run_shell_command(const char* command, std::chrono::seconds limit, First_Line* first_line = nullptr);
 

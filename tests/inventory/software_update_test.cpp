@@ -83,6 +83,7 @@ TEST_F(Software_Update, runs_commands_apart_from_the_process)
         {"printf 'one\\ntwo\\n'", 0, "one"},
         {"printf '%200s' | tr ' ' x", 0, std::string(128, 'x')},
         {"read line", 1, ""},
+        {"umask", 0, "0077"},
         {"cd /proc/self/fd; echo *", 0, "0 1 2 3"}, // 3: the folder
         {"grep -c 'Sig\\(Blk\\|Ign\\):.0*$' /proc/self/status", 0, "2"},
         {nap + " & " + nap, -1, ""}, // longer than its limit
