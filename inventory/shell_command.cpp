@@ -209,10 +209,12 @@ int run_shell_command(const char* command, std::chrono::seconds limit, First_Lin
     if (first_line)
         read_first_line(output.in, *first_line, deadline);
     output.in.close();
-    const std::optional<int> ended = read_status(status.in, deadline);
-    // While it has not told, it lives, and so its number is still its own.
-    if (!ended)
+    const bool in_time = wait_for_bytes(status.in, deadline);
+    // While nothing came and the pipe has not ended either, the supervisor lives: its number is its own. Behind the end of the
+    // pipe the number may be a stranger's, where a handler of SIGCHLD waits for all children.
+    if (!in_time)
         kill(-supervisor, SIGKILL);
+    const std::optional<int> ended = in_time ? read_status(status.in, deadline) : std::nullopt;
     wait_for_child(supervisor);
     return ended && WIFEXITED(*ended) ? WEXITSTATUS(*ended) : -1;
 }

@@ -13,8 +13,10 @@ struct First_Line
     char text[129] = {};
 };
 
-// Runs the command by "/bin/sh -c" and waits until it ends, at most for `limit`; then it is killed with all that it started. Its
-// exit status; -1 when it has none: it could not be started, a signal ended it, it took too long.
+// Runs the command by "/bin/sh -c" and waits until it ends, at most for `limit`; then it is killed with all that it started, but
+// for what left its process group. What runs in the background when the command ends in time is left running. Its exit status;
+// -1 when it has none: it could not be started, a signal ended it, it took too long, or somebody killed the process between this
+// one and the command, which then may go on.
 //
 // The command reads nothing, inherits no descriptor, no blocked or ignored signal, and may write files of at most 128 MiB, which
 // only the user of the process may open. What it prints is thrown away but for the first line, when one is asked for: behind it
