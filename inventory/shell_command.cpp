@@ -188,6 +188,9 @@ pid_t start_supervisor(const char* command, const Pipe& status, const Pipe& outp
     const pid_t child = fork();
     if (child == 0)
         supervise(command, status.out.number, output.out.number);
+    // The child does it too: whoever comes first, neither the command nor a kill comes before the group.
+    if (child > 0)
+        setpgid(child, child);
     return child;
 }
 
