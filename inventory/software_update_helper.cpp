@@ -39,11 +39,9 @@ constexpr Builder<const _hbaInfo> builders[] = {
     {CLASSID_HBASoftwareInstallationServiceCapabilities, append_capabilities},
 };
 
-hxa_status_t update(hxal_t* first_ioc, const char* file)
+hxa_status_t update_through(hxal_t* first_ioc, const char* file)
 {
     const Ioc_Handle ioc(first_ioc);
-    if (!ioc)
-        return HXA_STATUS_NO_ADAPTER;
     ZMLR_LOG(LL_INFO, "calling hxal_boot_fwupdate() file=%s\n", log_text(file).c_str());
     const hxa_status_t status = hxal_boot_fwupdate(ioc.get(), file, 0);
     ZMLR_LOG(LL_INFO, "return from hxal_boot_fwupdate() - %d\n", static_cast<int>(status));
@@ -100,7 +98,10 @@ int SoftwareUpdateHelper::UpdatePortControllerSoftware(const ZEMLAR_PortControll
     ZMLR_LOG(LL_INFO, "UpdatePortControllerSoftware portType=%d deviceid=%s file=%s", controller.ControllerType.value,
              address.c_str(), log_text(file).c_str());
     const hxal_adapter_t* adapter = hxal_adapter_open_idx(ProviderUtil::getAdapterId(address));
-    const hxa_status_t status = update(hxal_adapter_get_first_ioc(adapter), file);
+    hxal_t* first_ioc = hxal_adapter_get_first_ioc(adapter);
+    if (!first_ioc)
+        return HXA_STATUS_NO_ADAPTER;
+    const hxa_status_t status = update_through(first_ioc, file);
     ZMLR_LOG(LL_INFO, "status=%d\n", static_cast<int>(status));
     return status;
 }

@@ -14,7 +14,9 @@
 using namespace zmlr;
 using namespace std::chrono_literals;
 using testing::Contains;
+using testing::HasSubstr;
 using testing::IsEmpty;
+using testing::Not;
 
 namespace
 {
@@ -52,7 +54,9 @@ TEST_F(Software_Update, writes_the_image_to_the_card_of_the_controller)
     char read[8] = {};
     hxal_flash_read_part(hxal_adapter_get_port(2), HXA_FLASH_PART_FWCFG, 1, read, sizeof read, HXA_FALSE);
     EXPECT_EQ(Bytes(read, std::end(read)), image);
+    log();
     EXPECT_EQ(update("200000051EFFFFFF", file), HXA_STATUS_NO_ADAPTER);
+    EXPECT_THAT(log(), Not(Contains(HasSubstr("status="))));
     unlink(file.c_str());
 }
 
