@@ -5,6 +5,7 @@
 #include "runtime/trace.h"
 
 #include <sys/stat.h>
+#include <unistd.h>
 
 #include <cstdio>
 #include <cstring>
@@ -94,8 +95,18 @@ int ProviderUtil::TftpGetFile(const char* server, const char* file)
     run_shell_command(commands.remove, removal_limit);
     if (stands_there(file))
         return no_transfer;
-    const int status = run_shell_command(commands.get, transfer_limit);
-    return status == 0 && is_empty_or_no_file(file) ? no_transfer : status;
+    int status = run_shell_command(commands.get, transfer_limit);
+    if (status == 0 && is_empty_or_no_file(file))
+        status = no_transfer;
+    if (status != 0)
+        unlink(file);
+    return status;
+}
+
+Fetched_File::~Fetched_File()
+{
+    if (!name.empty())
+        unlink(name.c_str());
 }
 
 } // namespace zmlr

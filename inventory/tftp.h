@@ -29,8 +29,21 @@ namespace ProviderUtil
 // something else than 0 also when the old file stays, when what came is empty or no plain file, and for names that are no
 // address. The client does not tell all failures: a status of 0 without a file is one too. It gives up 25 s after the last sign
 // of life of the server; a transfer is ended after 5 minutes.
+//
+// The file is the caller's to remove; a transfer that fails leaves none.
 int TftpGetFile(const char* server, const char* file);
 
 } // namespace ProviderUtil
+
+// Removes a fetched file at the end of its life.
+struct Fetched_File
+{
+    Fetched_File() = default;
+    ~Fetched_File();
+    Fetched_File(const Fetched_File&) = delete;
+    Fetched_File& operator=(const Fetched_File&) = delete;
+
+    String name; // empty while nothing was fetched
+};
 
 } // namespace zmlr

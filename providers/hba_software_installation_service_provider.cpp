@@ -52,17 +52,19 @@ Error use_local_file(const String& path)
     return path.empty() ? "malformed file URI" : nullptr;
 }
 
-Error fetch(const String& text, String& path)
+Error fetch(const String& text, Fetched_File& file)
 {
     const std::optional<Tftp_Address> address = parse_tftp_address(text);
     if (!address)
         return "malformed tftp URI";
-    path = address->file;
-    return ProviderUtil::TftpGetFile(address->server.c_str(), path.c_str()) == 0 ? nullptr : "tftp command failed";
+    if (ProviderUtil::TftpGetFile(address->server.c_str(), address->file.c_str()) != 0)
+        return "tftp command failed";
+    file.name = address->file;
+    return nullptr;
 }
 
 // Finds the file that the URI names, fetching it first when it is elsewhere.
-Error find_file(const String& uri, String& path)
+Error find_file(const String& uri, Fetched_File& fetched, String& path)
 {
     constexpr uint32 scheme_size = 7;
     const auto has_scheme = [&](const char* scheme) { return std::strncmp(uri.c_str(), scheme, scheme_size) == 0; };
@@ -73,7 +75,10 @@ Error find_file(const String& uri, String& path)
         error = use_local_file(path);
     }
     else if (has_scheme("tftp://"))
-        error = fetch(uri.substr(scheme_size), path);
+    {
+        error = fetch(uri.substr(scheme_size), fetched);
+        path = fetched.name;
+    }
     else
         error = refuse("malformed uri. Throw error", "malformed URI");
     if (error)
@@ -126,10 +131,11 @@ private:
     static Error install(const Property<String>& uri, const CIM_ManagedElement* target, const Property<Array<uint16>>& options)
     try
     {
+        Fetched_File fetched;
         String path;
         Error error = check(uri, target, options);
         if (!error)
-            error = find_file(uri.value, path);
+            error = find_file(uri.value, fetched, path);
         return error ? error : update(target, path.c_str());
     }
     catch (...)
