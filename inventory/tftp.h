@@ -27,8 +27,12 @@ namespace ProviderUtil
 
 // Fetches the file into the working directory, where one of that name is removed first. The exit status of the transfer;
 // something else than 0 also when the old file stays, when what came is empty or no plain file, and for names that are no
-// address. The client does not tell all failures: a status of 0 without a file is one too. It gives up 25 s after the last sign
-// of life of the server; a transfer is ended after 5 minutes.
+// address. The client does not tell all failures: a status of 0 without a file is one too. By its own default it gives up 25 s
+// after the last sign of life of the server; ours is that a transfer is ended after 5 minutes.
+//
+// By its default, too, the client asks for "netascii" and turns CR LF into LF and CR NUL into CR in whatever comes. The server
+// has to send it in that form: a server that sends the bytes of the file as they are spoils an image with such pairs in it, and
+// in the last image of an archive, which may become shorter, nobody notices.
 //
 // The file is the caller's to remove; a transfer that fails leaves none.
 int TftpGetFile(const char* server, const char* file);
