@@ -21,7 +21,20 @@ using testing::Not;
 namespace
 {
 
-using Software_Update = Inventory_Test;
+class Software_Update : public Inventory_Test
+{
+protected:
+    ~Software_Update() override
+    {
+        signal(SIGCHLD, SIG_DFL);
+        signal(SIGUSR1, SIG_DFL);
+        unlink(_file.c_str());
+        close(_inherited);
+    }
+
+    const std::string _file = testing::TempDir() + "update-" + std::to_string(getpid());
+    int _inherited = -1;
+};
 
 int update(const char* address, const std::string& file)
 {
@@ -42,22 +55,20 @@ void reap_all(int)
 
 TEST_F(Software_Update, writes_the_image_to_the_card_of_the_controller)
 {
-    const std::string file = testing::TempDir() + "boot-" + std::to_string(getpid());
     const Bytes image = {1, 2, 3, 4, 5, 6, 7, 8};
     Archive()
         .add("boot.txt", bytes_of("IMAGE\nTYPE = C\nPORT = 1\nID = 13, 14, 17, 21\n"))
         .add("configuration", image)
-        .save(file);
+        .save(_file);
     plug_text(R"({"adapters": [{"kind": "cna"}, {"kind": "fc-hba"}]})");
 
-    EXPECT_EQ(update("200000051E100100", file), HXA_STATUS_OK);
+    EXPECT_EQ(update("200000051E100100", _file), HXA_STATUS_OK);
     char read[8] = {};
     hxal_flash_read_part(hxal_adapter_get_port(2), HXA_FLASH_PART_FWCFG, 1, read, sizeof read, HXA_FALSE);
     EXPECT_EQ(Bytes(read, std::end(read)), image);
     log();
-    EXPECT_EQ(update("200000051EFFFFFF", file), HXA_STATUS_NO_ADAPTER);
+    EXPECT_EQ(update("200000051EFFFFFF", _file), HXA_STATUS_NO_ADAPTER);
     EXPECT_THAT(log(), Not(Contains(HasSubstr("status="))));
-    unlink(file.c_str());
 }
 
 TEST_F(Software_Update, has_no_access_point_on_a_host_without_a_name)
@@ -69,12 +80,11 @@ TEST_F(Software_Update, has_no_access_point_on_a_host_without_a_name)
 
 TEST_F(Software_Update, runs_commands_apart_from_the_process)
 {
-    const int inherited = dup(STDOUT_FILENO); // as a server that forgets to close on exec leaves them
-    ASSERT_GT(inherited, STDERR_FILENO);
+    _inherited = dup(STDOUT_FILENO); // as a server that forgets to close on exec leaves them
+    ASSERT_GT(_inherited, STDERR_FILENO);
     ASSERT_TRUE(std::freopen("/proc/self/status", "r", stdin));
     signal(SIGUSR1, SIG_IGN);
     const std::string nap = "sleep 60." + std::to_string(getpid());
-    const std::string big = testing::TempDir() + "big-" + std::to_string(getpid());
     const struct
     {
         std::string command;
@@ -92,7 +102,7 @@ TEST_F(Software_Update, runs_commands_apart_from_the_process)
         {"grep -c 'Sig\\(Blk\\|Ign\\):.0*$' /proc/self/status", 0, "2"},
         {nap + " & " + nap, -1, ""}, // longer than its limit
         {"sleep 0.2; pgrep -fx '" + nap + "'", 1, ""},
-        {"truncate -s 200M " + big, 153, ""},
+        {"truncate -s 200M " + _file, 153, ""},
         // clang-format on
     };
     for (const sighandler_t handler : {SIG_DFL, SIG_IGN, static_cast<sighandler_t>(reap_all)})
@@ -109,7 +119,4 @@ TEST_F(Software_Update, runs_commands_apart_from_the_process)
         EXPECT_EQ(run_shell_command("exit 3", 50s), 3);
         EXPECT_LT(std::chrono::steady_clock::now() - start, 40s);
     }
-    signal(SIGCHLD, SIG_DFL);
-    unlink(big.c_str());
-    close(inherited);
 }
