@@ -1,10 +1,7 @@
 #include "hxal/internal/boot_archive.h"
 
-#include "hxal/internal/descriptor.h"
+#include "hxal/internal/regular_file.h"
 #include "hxal/internal/tar_archive.h"
-
-#include <optional>
-#include <sys/stat.h>
 
 namespace hxal
 {
@@ -17,12 +14,6 @@ constexpr const char* temporary_path = "./zmlrtmpfile";
 constexpr size_t max_description_size = 1024 * 1024;
 
 bool is_description(const Tar_Member& member) { return member.name.find(description_name) != member.name.npos; }
-
-bool is_regular(int fd)
-{
-    struct stat status;
-    return ::fstat(fd, &status) == 0 && S_ISREG(status.st_mode);
-}
 
 bool rewind(int fd) { return ::lseek(fd, 0, SEEK_SET) == 0; }
 
@@ -96,21 +87,20 @@ hxa_status_t populate_data_from_file(int fd, std::vector<HXAL_IMAGE_DATA_T>& ima
 }
 
 // Reads the first member, the description or an archive inside.
-hxa_status_t check_file_contains_tar(int fd, Tar_Member& first)
+hxa_status_t check_file_contains_tar(const Regular_File& file, Tar_Member& first)
 {
-    return is_regular(fd) ? Tar_Reader(fd).next(first) : HXA_STATUS_BAD_FILE;
+    if (file.exists() && !file.is_regular())
+        return HXA_STATUS_BAD_FILE;
+    return file.is_open() ? Tar_Reader(file.number()).next(first) : HXA_STATUS_FAILED;
 }
 
 } // namespace
 
 hxa_status_t read_boot_archive(const char* path, std::vector<HXAL_IMAGE_DATA_T>& images)
 {
-    // A pipe in place of the file must not hold the caller up.
-    const Descriptor file(path, O_RDONLY | O_NONBLOCK);
-    if (!file.is_open())
-        return HXA_STATUS_FAILED;
+    const Regular_File file(path);
     Tar_Member first;
-    if (const hxa_status_t read = check_file_contains_tar(file.number(), first); read != HXA_STATUS_OK)
+    if (const hxa_status_t read = check_file_contains_tar(file, first); read != HXA_STATUS_OK)
         return read;
     if (is_description(first))
         return rewind(file.number()) ? populate_data_from_file(file.number(), images) : HXA_STATUS_BAD_FILE;

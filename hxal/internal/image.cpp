@@ -1,10 +1,10 @@
 #include "hxal/internal/image.h"
 
 #include "hxal/internal/descriptor.h"
+#include "hxal/internal/regular_file.h"
 #include "hxal/internal/size_limit.h"
 
 #include <cerrno>
-#include <sys/stat.h>
 
 namespace hxal
 {
@@ -40,18 +40,14 @@ bool write_all(int fd, const void* from, size_t size)
 
 hxa_status_t read_image_file(const char* path, Image& image)
 {
-    struct stat status;
-    if (::stat(path, &status) != 0)
+    const Regular_File file(path);
+    if (!file.is_regular() || file.size() == 0)
         return HXA_STATUS_FAILED;
-    // A pipe in place of the file must not hold the caller up.
-    const Descriptor file(path, O_RDONLY | O_NONBLOCK);
     if (!file.is_open())
         return HXA_STATUS_EFOPEN;
-    if (::fstat(file.number(), &status) != 0 || !S_ISREG(status.st_mode) || status.st_size == 0)
-        return HXA_STATUS_FAILED;
-    if (static_cast<uint64_t>(status.st_size) > max_image_size)
+    if (static_cast<uint64_t>(file.size()) > max_image_size)
         return HXA_STATUS_ENOMEM;
-    image.resize(static_cast<size_t>(status.st_size));
+    image.resize(static_cast<size_t>(file.size()));
     return read_all(file.number(), image.data(), image.size()) ? HXA_STATUS_OK : HXA_STATUS_FAILED;
 }
 
