@@ -29,9 +29,11 @@ extern "C"
 {
 #endif
 
-    // Starts the event thread. HXA_STATUS_OK, also when it runs already, and without starting one for an application that
-    // queues no events (hxa_aen_app_tessik). Else the status of the error that creating the thread met. Called from a callback
-    // it takes back an hxal_aen_exit() of a callback; HXA_STATUS_FAILED when another thread waits for the end.
+    // Starts the event thread. After a round in which readable drivers delivered nothing it rests: an IOC whose fetch keeps
+    // failing delays the events of the others by up to 1 s. HXA_STATUS_OK, also when it runs already, and without starting one
+    // for an application that queues no events (hxa_aen_app_tessik). Else the status of the error that creating the thread met.
+    // Called from a callback it takes back an hxal_aen_exit() of a callback; HXA_STATUS_FAILED when another thread waits for the
+    // end.
     hxa_status_t hxal_aen_init(void);
 
     // Ends the event thread and waits until it is gone: at once when it is idle, else as long as a callback or a request takes.

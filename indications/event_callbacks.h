@@ -1,5 +1,6 @@
-// What the access library calls for each event of an adapter, an FC port, its audit trail or an Ethernet port. Each turns one
-// event into an alert and leaves it with the IndicationHelper.
+// What the access library calls for each event of an adapter, an FC port, its audit trail or an Ethernet port. The last
+// three turn one event into an alert and leave it with the IndicationHelper. The adapter's only traces: cards that come and go
+// make no alert.
 //
 // The library calls them on its event thread, one at a time. An event that the message table does not know makes no alert, nor
 // does one that is not supported, or that there is no memory for; the log tells.

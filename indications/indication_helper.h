@@ -14,8 +14,8 @@ class IndicationHelper
 public:
     static IndicationHelper& getIndicationHelperInstance();
 
-    // From now on events become alerts, until it is unsubscribed. False, and nothing has changed, when there is no adapter or
-    // the events' thread cannot be started.
+    // From now on events become alerts, until it is unsubscribed. False, and nothing stays registered, when there is no adapter
+    // or the events' thread cannot be started.
     bool subscribeForEventNotifications();
 
     // When it returns no event becomes an alert any more; those that wait stay. False when something remained registered.
