@@ -67,11 +67,16 @@ def free_port(address):
 
 
 def line_of(alert):
-    """An alert in one line; the action only where there is something to do."""
-    when = alert["EventTime"].datetime.strftime("%Y-%m-%d %H:%M:%S")
-    severity = SEVERITIES.get(alert["PerceivedSeverity"], str(alert["PerceivedSeverity"]))
-    actions = [action for action in alert["RecommendedActions"] or [] if action != "No action required."]
-    return "  ".join([when, severity.ljust(11), str(alert["MessageID"]).ljust(10), str(alert["Message"]), *actions])
+    """What there is of an alert, in one line; the action only where there is something to do."""
+    when, severity = alert.get("EventTime"), alert.get("PerceivedSeverity")
+    fields = [
+        when.datetime.strftime("%Y-%m-%d %H:%M:%S") if when else "",
+        "" if severity is None else SEVERITIES.get(severity, str(severity)).ljust(11),
+        (alert.get("MessageID") or alert.get("EventID") or "").ljust(10),
+        alert.get("Message") or "",
+        *(action for action in alert.get("RecommendedActions") or [] if action != "No action required."),
+    ]
+    return "  ".join(field for field in fields if field.strip())
 
 
 def main():
