@@ -81,17 +81,35 @@ catch (const std::runtime_error& error)
     throw std::runtime_error(std::string(error.what()) + " (--add-user NAME adds a user to the file)");
 }
 
-// From now on clients can subscribe, and the module's indications go to their listeners.
-void offer(Subscriptions& subscriptions, Server_Name_Spaces& name_spaces, Module& module)
+// While it exists clients can subscribe, and the module's indications go to their listeners. The module may raise them on a
+// thread of its own: however the server ends, they are disabled before what takes them is gone.
+class Offer
 {
-    for (const Subscription_Kind kind :
-         {Subscription_Kind::filter, Subscription_Kind::destination, Subscription_Kind::subscription})
-        name_spaces.own().serve({class_of(kind), [&subscriptions, kind] { return subscriptions.list(kind); },
-                                 [&subscriptions, kind](const Instance& instance)
-                                 { return subscriptions.create(kind, instance); },
-                                 [&subscriptions, kind](const Object_Path& path) { subscriptions.remove(kind, path); }});
-    module.broker().set_indication_sink(&subscriptions);
-}
+public:
+    Offer(Subscriptions& subscriptions, Server_Name_Spaces& name_spaces, Module& module)
+        : _subscriptions(subscriptions)
+        , _module(module)
+    {
+        for (const Subscription_Kind kind :
+             {Subscription_Kind::filter, Subscription_Kind::destination, Subscription_Kind::subscription})
+            name_spaces.own().serve({class_of(kind), [&subscriptions, kind] { return subscriptions.list(kind); },
+                                     [&subscriptions, kind](const Instance& instance)
+                                     { return subscriptions.create(kind, instance); },
+                                     [&subscriptions, kind](const Object_Path& path) { subscriptions.remove(kind, path); }});
+        module.broker().set_indication_sink(&subscriptions);
+    }
+    ~Offer()
+    {
+        _subscriptions.stop();
+        _module.broker().set_indication_sink(nullptr);
+    }
+    Offer(const Offer&) = delete;
+    Offer& operator=(const Offer&) = delete;
+
+private:
+    Subscriptions& _subscriptions;
+    Module& _module;
+};
 
 // The rest of the work is done for the user who asked.
 Http_Work for_user(const std::string& user, Http_Work work)
@@ -117,7 +135,7 @@ void serve(const Options& options)
     Delivery delivery(options.delivery);
     Subscriptions subscriptions(module, delivery, options.indication_order, store.get());
     Server_Name_Spaces name_spaces(module);
-    offer(subscriptions, name_spaces, module);
+    const Offer offer(subscriptions, name_spaces, module);
     subscriptions.restore();
     Service service(name_spaces);
     Http_Server server(endpoint, options.limits, credentials.get(),

@@ -2,6 +2,7 @@
 
 import json
 import re
+import socket
 import ssl
 import subprocess
 import threading
@@ -337,6 +338,10 @@ def test_subscriptions_survive_a_restart(serve, listen, tmp_path, order):
     assert (second.returncode, "another process uses it" in second.stderr) == (1, True)
 
     host.server.stop()
+    with socket.create_server(("127.0.0.1", 0)) as taken:
+        elsewhere = [str(taken.getsockname()[1]) if word == "0" else word for word in command]
+        third = subprocess.run(elsewhere, capture_output=True, text=True, timeout=TIMEOUT, check=False)
+        assert (third.returncode, "cannot listen on" in third.stderr) == (1, True), "the stored subscriptions are taken back"
     host = serve("--state", state, "--indication-order", order)
     again = host.pywbem.GetInstance(before.path)
     assert again == before
