@@ -178,35 +178,6 @@ TEST_F(Events, are_written_to_the_caller_and_nothing_behind_them)
     munmap(memory, 2 * page);
 }
 
-TEST_F(Events, tell_of_the_objects_of_their_IOC)
-{
-    hxasim::load_text(host_with_targets);
-    Open_File hxa("/dev/hxa");
-    Open_File hxn("/dev/hxn");
-    sync(hxa, 'C', hxa_aen_app_cim);
-    sync(hxn, 'D', hxa_aen_app_cim);
-    const auto data = [&](std::uint32_t category, std::size_t size, const char* path = "/dev/hxa")
-    {
-        hxasim::raise_event({.node = path, .category = category, .type = 1, .level = 2});
-        return digits_of(fetch(std::string(path) == "/dev/hxa" ? hxa : hxn, 0, 2).at(0).aen_data).substr(0, 2 * size);
-    };
-    const std::string pwwn = "100000051E100000", target = "210000051F000000", no_wwn(16, '0');
-    const std::string fcoe_mac = "00051E300000", mac = "00051E200000";
-    EXPECT_EQ(data(HXA_AEN_CAT_ADAPTER, 24), "5A4D4330303030303031000001000000" + pwwn) << "ZMC0000001, 1 port";
-    EXPECT_EQ(data(HXA_AEN_CAT_PORT, 32), pwwn + "100000051EF000000000000002000200" + fcoe_mac + "0000");
-    EXPECT_EQ(data(HXA_AEN_CAT_PORT, 32, "/dev/hxn"), no_wwn + no_wwn + "0000000003000200" + mac + "0000");
-    EXPECT_EQ(data(HXA_AEN_CAT_LPORT, 24), "0000010000000000" + pwwn + pwwn);
-    EXPECT_EQ(data(HXA_AEN_CAT_RPORT, 40), no_wwn + pwwn + pwwn + target + no_wwn);
-    EXPECT_EQ(data(HXA_AEN_CAT_ITNIM, 32), no_wwn + pwwn + pwwn + target);
-    EXPECT_EQ(data(HXA_AEN_CAT_AUDIT, 8), pwwn);
-    EXPECT_EQ(data(HXA_AEN_CAT_IOC, 16), pwwn + "0200" + fcoe_mac);
-    EXPECT_EQ(data(HXA_AEN_CAT_ETHPORT, 12, "/dev/hxn"), mac + "000002000000");
-    hxasim::raise_event({.category = HXA_AEN_CAT_PORT, .type = 1, .data = {1, 2}});
-    EXPECT_EQ(digits_of(fetch(hxa, 0, 2).at(0).aen_data), "0102" + std::string(76, '0'));
-    EXPECT_THROW(hxasim::raise_event({.instance = 9}), std::runtime_error);
-    EXPECT_THROW(hxasim::raise_event({.data = std::vector<std::uint8_t>(41)}), std::runtime_error);
-}
-
 // What one step on instance 0 of either node makes the drivers say there.
 TEST_F(Events, follow_the_state_of_ports_and_IOCs)
 {
