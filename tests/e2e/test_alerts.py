@@ -82,8 +82,9 @@ def expected(row, system):
     }
 
 
-def test_every_event_makes_its_alert_or_none(served):
-    host, received = served(), []
+def test_every_event_makes_its_alert_or_none(served, tmp_path):
+    (tmp_path / ".cimplerc").write_text("LOG_LEVEL = INFO\n", encoding="utf-8")
+    host, received = served(environment={"HOME": str(tmp_path)}), []
     system = host.pywbem.EnumerateInstances("ZEMLAR_ComputerSystem")[0]["Name"]
     with subscribed(host, received):
         for event in NO_ALERTS:
@@ -98,6 +99,10 @@ def test_every_event_makes_its_alert_or_none(served):
             assert abs(datetime.datetime.now(datetime.timezone.utc) - times[0].datetime) < datetime.timedelta(seconds=TIMEOUT)
     assert len(received) == len(EVENTS)
     assert host.server.hxasim("status")["violations"] == []
+    log = (tmp_path / ".cimple/messages").read_text(encoding="utf-8")
+    unheard = re.findall(r"(Not supported .*event|\w+ event callback invoked with event id not)", log)
+    words = {word: sum(line.startswith(word) for line in unheard) for word in ("Not", "Port", "Audit", "EthPort")}
+    assert words == {"Not": 1, "Port": 6, "Audit": 3, "EthPort": 4}, "an event without a message is not one without support"
 
 
 def test_queries_choose_by_class_severity_and_event(served):
@@ -194,14 +199,15 @@ def test_the_log_tells_of_a_subscription_step_by_step(served, tmp_path):
 def test_script_alerts_shows_them_until_it_is_interrupted(served):
     host = served()
     kinds = ["CIM_IndicationFilter", "CIM_ListenerDestination", "CIM_IndicationSubscription"]
-    for number in (signal.SIGINT, signal.SIGTERM):
-        with subprocess.Popen([ROOT / "script/alerts", "--url", host.server.url], stdout=-1, stderr=-1, text=True) as script:
+    everything = f" Warning      ZMLR131077  SFP removed: WWN/MAC = {WWN}.  Check whether SFP is inserted properly."
+    one_property = ["--query", "SELECT EventID FROM ZEMLAR_AlertIndication"]
+    for number, query, told in ((signal.SIGINT, [], everything), (signal.SIGTERM, one_property, "HXA_AEN_PORT_SFP_REMOVE")):
+        command = [ROOT / "script/alerts", "--url", host.server.url, *query]
+        with subprocess.Popen(command, stdout=-1, stderr=-1, text=True) as script:
             assert host.server.url in script.stderr.readline()
             host.server.hxasim("event", "port", "sfp-remove")
             line = script.stdout.readline().rstrip("\n")
-            assert re.sub(r"^\S+ \S+ ", "", line) == (
-                f" Warning      ZMLR131077  SFP removed: WWN/MAC = {WWN}.  Check whether SFP is inserted properly."
-            )
+            assert re.sub(r"^\S+ \S+ ", "", line) == told
             script.send_signal(number)
             assert script.wait(TIMEOUT) == 0
         left = [name for kind in kinds for name in host.pywbem.EnumerateInstanceNames(kind, namespace="root/PG_InterOp")]
