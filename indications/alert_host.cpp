@@ -2,6 +2,8 @@
 
 #include "inventory/property_text.h"
 
+#include <algorithm>
+
 namespace zmlr
 {
 
@@ -13,7 +15,7 @@ String Alert_Host::text()
     _host = Host_Text();
     String text = property_text(_host.text());
     const Clock::time_point end = Clock::now();
-    _good_until = end + holds * (end - begin);
+    _good_until = end + std::min<Clock::duration>(holds * (end - begin), longest_hold);
     return text;
 }
 
