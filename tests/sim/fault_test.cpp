@@ -49,35 +49,6 @@ TEST_F(Faults, strike_after_the_skipped_requests_and_so_many_times)
     EXPECT_THAT(outcomes(4), ElementsAre(-13, -13, 0, 0)) << "in the order of injection";
 }
 
-TEST_F(Faults, put_a_status_where_the_record_keeps_it)
-{
-    hxasim::inject({.status = 70}); // instance requests carry no status: they go on
-    Open_File hxa("/dev/hxa");
-    EXPECT_EQ(instances(hxa, 'C').first, 2U);
-    hxa_ioctl_aen_t record{};
-    EXPECT_EQ(send(*hxa, "IOCMD_AEN_SYNC", 'C', record), 0);
-    EXPECT_EQ(record.status, HXA_STATUS_VERSION_FAIL);
-    EXPECT_EQ(record.hxad_num, 0);
-}
-
-TEST_F(Faults, overwrite_bytes_of_the_answer)
-{
-    hxasim::load_text(R"({
-        "adapters": [{"kind": "cna"}],
-        "faults": [
-            {"command": "IOCMD_IOC_GET_INST", "node": "/dev/hxn", "answer": {"offset": 0, "bytes": "81000000"}},
-            {"command": "IOCMD_IOC_GET_INFO", "status": 1, "times": 1,
-             "answer": [{"offset": 8, "bytes": "58595A"}, {"offset": "0x207", "bytes": "ff"}]}
-        ]})");
-    EXPECT_EQ(instances(Open_File("/dev/hxa"), 'C').first, 2U);
-    EXPECT_EQ(instances(Open_File("/dev/hxn"), 'D').first, 129U);
-    auto patched = info(Open_File("/dev/hxa"), 'C', 0);
-    EXPECT_EQ(patched.status, HXA_STATUS_FAILED);
-    EXPECT_EQ(text_of(patched.serialnum), "XYZ");
-    EXPECT_EQ(patched.rsvd1[2], 0xFF00);
-    EXPECT_EQ(hxasim::take_requests().back().answered[0x207], 0xFF);
-}
-
 TEST_F(Faults, delay_an_answer_without_holding_up_others)
 {
     using std::chrono::milliseconds;
@@ -150,18 +121,6 @@ TEST_F(Scsi_Faults, choose_a_remote_port_a_unit_and_a_command)
         EXPECT_EQ(struck, expected);
         hxasim::clear_faults();
     }
-}
-
-TEST_F(Scsi_Faults, set_the_status_and_overwrite_the_data)
-{
-    hxasim::inject({.times = 1, .scsi_status = 8});
-    const auto busy = inquire();
-    EXPECT_EQ(std::tuple(busy.record.status, busy.record.scsi_status, busy.record.snssz), std::tuple(HXA_STATUS_OK, 8, 0U));
-    EXPECT_THAT(busy.data, testing::Each(0));
-    hxasim::inject({.data = {{4, {0xFF, 0xFE}}, {35, {'Z', 'Z'}}, {1000, {1}}}});
-    const auto patched = inquire().data;
-    EXPECT_EQ(std::string(patched.begin() + 4, patched.begin() + 14), std::string("\xFF\xFE\0\2ZEMLAR", 10));
-    EXPECT_EQ(patched[35], 'Z');
 }
 
 TEST_F(Scsi_Faults, bring_back_garbage)
