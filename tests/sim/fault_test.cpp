@@ -8,8 +8,6 @@
 namespace
 {
 
-using hxasim::Fault;
-using Wwn = std::array<std::uint8_t, 8>;
 using ::testing::ElementsAre;
 
 class Faults : public Raw_Host
@@ -68,7 +66,6 @@ TEST_F(Faults, delay_an_answer_without_holding_up_others)
     EXPECT_THAT(order, ElementsAre(0, 1));
 }
 
-// Two targets of two units each.
 class Scsi_Faults : public Faults
 {
 protected:
@@ -79,15 +76,13 @@ protected:
         std::array<std::uint8_t, 36> data;
     };
 
-    // Sends INQUIRY, for a page unless it is 0.
-    Answer inquire(std::uint8_t target = 1, std::uint8_t lun = 0, std::uint8_t page = 0)
+    Answer inquire()
     {
         Answer answer{};
         auto& record = answer.record;
         record.lpwwn = 0x01'00'00'00'00'00'00'10;
-        record.rpwwn = std::uint64_t{target} << 56 | 0x21;
-        record.lun = std::uint64_t{lun} << 8;
-        record.cdb = {{0x12, page != 0, page, 0, 36}};
+        record.rpwwn = 0x01'00'00'00'00'00'00'21;
+        record.cdb = {{0x12, 0, 0, 0, 36}};
         record.iosz = answer.data.size();
         record.snssz = 18;
         record.iobuf_ptr = reinterpret_cast<std::uintptr_t>(answer.data.data());
@@ -98,30 +93,9 @@ protected:
 
 private:
     Open_File _hxa{node_on(R"({"adapters": [{"kind": "fc-hba", "ports": [{"pwwn": "1000000000000001", "remote_ports": [
-        {"pwwn": "2100000000000001", "luns": {"count": 2}}, {"pwwn": "2100000000000002", "luns": {"count": 2}}]}]}]})")};
+        {"pwwn": "2100000000000001"}]}]}]})")};
     std::array<std::uint8_t, 18> _sense{};
 };
-
-TEST_F(Scsi_Faults, choose_a_remote_port_a_unit_and_a_command)
-{
-    const Wwn second{0x21, 0, 0, 0, 0, 0, 0, 2};
-    const std::pair<Fault, std::vector<int>> cases[] = {
-        {{.remote_port = second, .error = EIO}, {4, 5, 6, 7}},
-        {{.lun = 1, .error = EIO}, {2, 3, 6, 7}},
-        {{.cdb = {0x12, 1, 0x83}, .error = EIO}, {1, 3, 5, 7}},
-        {{.remote_port = second, .lun = 0, .cdb = {0x12, 0}, .error = EIO}, {4}},
-    };
-    for (const auto& [fault, expected] : cases)
-    {
-        hxasim::inject(fault);
-        std::vector<int> struck;
-        for (std::uint8_t i = 0; i < 8; ++i)
-            if (inquire(i < 4 ? 1 : 2, i >> 1 & 1, i % 2 == 0 ? 0 : 0x83).error == EIO)
-                struck.push_back(i);
-        EXPECT_EQ(struck, expected);
-        hxasim::clear_faults();
-    }
-}
 
 TEST_F(Scsi_Faults, bring_back_garbage)
 {
