@@ -175,14 +175,19 @@ protected:
     // Until all of so many events at the first port have been made alerts: the next port is asked.
     static void wait_until_heard(int count)
     {
-        for (bool next = false; count > 0 || !next;)
+        const auto deadline = std::chrono::steady_clock::now() + std::chrono::seconds(100);
+        for (bool next = false; count > 0 || !next; poll(nullptr, 0, 1))
+        {
+            ASSERT_LT(std::chrono::steady_clock::now(), deadline) << count << " events are left";
             for (const auto& request : hxasim::take_requests())
             {
+                ASSERT_EQ(request.name, "IOCMD_AEN_GET");
                 std::int32_t delivered = 0;
                 std::memcpy(&delivered, &request.answered.at(4), sizeof delivered);
                 count -= request.instance == 0 ? delivered : 0;
                 next = request.instance == 1 || (next && delivered == 0);
             }
+        }
     }
 
     sample::Home _home;
