@@ -51,10 +51,17 @@ template <std::size_t N> String trimmed(const char (&field)[N])
     return property_text(text);
 }
 
+// One after the other: compilers differ in the order of operands, and trimming is logged.
+String vendor_and_product(const _hbaLunInfo& lun, const char* between)
+{
+    const String vendor = trimmed(lun.vendor);
+    return vendor + between + trimmed(lun.product);
+}
+
 String name_of(const _hbaLunInfo& lun)
 {
     if (lun.identifier_type == IDENTIFIER_SERIAL_NUMBER)
-        return trimmed(lun.vendor) + "+" + trimmed(lun.product) + "+" + trimmed(lun.serial_number);
+        return vendor_and_product(lun, "+") + "+" + trimmed(lun.serial_number);
     if (lun.identifier_type == IDENTIFIER_UNAVAILABLE)
         return "Unable To Fetch";
     return kind_of(lun) ? property_text(lun.identifier) : String();
@@ -62,8 +69,7 @@ String name_of(const _hbaLunInfo& lun)
 
 String device_id(const _hbaPortInfo& port, const _hbaLunInfo& lun)
 {
-    return String(port.port_wwn) + "_" + lun.target_wwn + "_" + trimmed(lun.vendor) + "_" + trimmed(lun.product) + "_" +
-           lun_text(lun);
+    return String(port.port_wwn) + "_" + lun.target_wwn + "_" + vendor_and_product(lun, "_") + "_" + lun_text(lun);
 }
 
 // What disks and tapes have in common.
