@@ -187,9 +187,9 @@ def test_wbemcli_runs_a_test(start):
 )
 def test_the_server_stops_in_the_middle_of_a_run(start, tmp_path, command, delay, seconds, told):
     (tmp_path / ".cimplerc").write_text("LOG_LEVEL=INFO\n", encoding="utf-8")
-    slow = [{"command": command, "delay": delay}]
     leaks = {"ASAN_OPTIONS": "detect_leaks=0"}  # nobody can look for them while a thread runs on
-    host = start({**CARDS, "faults": slow}, {"HOME": str(tmp_path), "HXASIM_TIME_SCALE": "0.9", **leaks})
+    slow = {**CARDS, "faults": [{"command": command, "delay": delay}]}
+    host = start(slow, {"HOME": str(tmp_path), "HXASIM_TIME_SCALE": "0.9", **leaks})
     assert run(host, path_of_test(host, "Loopback", "SerdesLoopback"), element_path(host, FC, CNA_PORT))[0] == STARTED
     time.sleep(2.5 if told else 1)
     begin = time.monotonic()

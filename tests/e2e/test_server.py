@@ -82,8 +82,7 @@ def test_a_hung_driver_stops_only_its_provider(start, tmp_path):
     assert len(told) == 298, "two are with the provider"
     waited = [answer for answer in told if b"ZEMLAR_FCPort does not answer: earlier requests have kept it busy for 3 s" in answer]
     assert len(waited) > 100
-    cut = told.count(b"")  # to make room for those behind them
-    assert len(waited) + sum(answer.startswith(b"HTTP/1.1 503") for answer in told) + cut == 298
+    assert len(waited) + sum(answer == b"" or answer.startswith(b"HTTP/1.1 503") for answer in told) == 298, "cut or told"
     assert len(host.pywbem.EnumerateInstances("ZEMLAR_ComputerSystem")) == 1, "another provider"
     begin = time.monotonic()
     assert host.server.stop() == 0

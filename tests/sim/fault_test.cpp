@@ -8,8 +8,6 @@
 namespace
 {
 
-using ::testing::ElementsAre;
-
 class Faults : public Raw_Host
 {
 protected:
@@ -37,14 +35,14 @@ protected:
 TEST_F(Faults, strike_after_the_skipped_requests_and_so_many_times)
 {
     hxasim::inject({.command = "IOCMD_PORT_GET_ATTR", .error = EIO, .skip = 1, .times = 2});
-    EXPECT_THAT(outcomes(5), ElementsAre(0, EIO, EIO, 0, 0));
+    EXPECT_THAT(outcomes(5), testing::ElementsAre(0, EIO, EIO, 0, 0));
     hxasim::inject({.error = EINTR});
-    EXPECT_THAT(outcomes(3), ElementsAre(EINTR, EINTR, EINTR));
+    EXPECT_THAT(outcomes(3), testing::ElementsAre(EINTR, EINTR, EINTR));
     hxasim::clear_faults();
     hxasim::inject({.node = "/dev/hxn", .error = EIO});
     hxasim::inject({.status = 13, .times = 2});
     hxasim::inject({.error = ENXIO, .times = 0});
-    EXPECT_THAT(outcomes(4), ElementsAre(-13, -13, 0, 0)) << "in the order of injection";
+    EXPECT_THAT(outcomes(4), testing::ElementsAre(-13, -13, 0, 0)) << "in the order of injection";
 }
 
 TEST_F(Faults, delay_an_answer_without_holding_up_others)
@@ -63,7 +61,7 @@ TEST_F(Faults, delay_an_answer_without_holding_up_others)
     std::vector<int> order;
     for (const auto& request : hxasim::take_requests())
         order.push_back(request.instance);
-    EXPECT_THAT(order, ElementsAre(0, 1));
+    EXPECT_THAT(order, testing::ElementsAre(0, 1));
 }
 
 class Scsi_Faults : public Faults
