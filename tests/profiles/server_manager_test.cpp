@@ -2,9 +2,9 @@
 #include "profiles/server_manager.h"
 #include "providers/enumerations.h"
 #include "providers/row_of.h"
-#include "runtime/thread_context.h"
 #include "schema/CIM_ObjectManager.h"
 #include "tests/inventory/inventory_fixture.h"
+#include "tests/runtime/silent_context.h"
 
 #include <array>
 
@@ -18,7 +18,7 @@ namespace
 using Texts = std::array<const char*, 3>; // Name, ElementName and Description of an object manager; some may be null
 
 // A server whose module works for it on this thread. It passes every question on to the module before it answers.
-class Foreign_Server : public Thread_Context
+class Foreign_Server : public Silent_Context
 {
 public:
     Foreign_Server(bool answers, std::vector<Texts> managers) : _answers(answers), _managers(std::move(managers)) { push(this); }
@@ -42,19 +42,6 @@ public:
                 properties[i]->set(text);
         return Ref<Instance>(manager.steal());
     }
-
-    Thread_Context* thread_create_hook(void*) override { return nullptr; }
-    void thread_start_hook() noexcept override {}
-    void thread_exit_hook() noexcept override {}
-    void instance_enumerator_destroy(Instance_Enumerator_Rep*) override {}
-    void instance_enumerator_next(Instance_Enumerator_Rep*) override {}
-    Ref<Instance> get_instance(const char*, const Instance*) override { return {}; }
-    int create_instance(const char*, const Instance*) override { return -1; }
-    int delete_instance(const char*, const Instance*) override { return -1; }
-    int modify_instance(const char*, const Instance*) override { return -1; }
-    int invoke_method(const char*, const Instance*, Instance*) override { return -1; }
-    void allow_unload(bool) override {}
-    bool get_username(String&) override { return false; }
 
     std::vector<std::string> asked;
 

@@ -1,6 +1,6 @@
 #include "runtime/thread.h"
-#include "runtime/thread_context.h"
 #include "runtime/time.h"
+#include "tests/runtime/silent_context.h"
 
 #include <gtest/gtest.h>
 
@@ -22,7 +22,7 @@ namespace
 using Events = std::string;
 
 // Serves threads; there is no server behind it.
-class Recording_Context : public Thread_Context
+class Recording_Context : public Silent_Context
 {
 public:
     explicit Recording_Context(Events& events, Thread_Context* child = nullptr) : _events(events), _child(child) {}
@@ -35,19 +35,6 @@ public:
     }
     void thread_start_hook() noexcept override { _events += top() == this ? "start " : "start-elsewhere "; }
     void thread_exit_hook() noexcept override { _events += top() == this ? "exit " : "exit-elsewhere "; }
-
-    int instance_enumerator_create(const char*, const Instance*, Instance_Enumerator_Rep*&) override { return -1; }
-    void instance_enumerator_destroy(Instance_Enumerator_Rep*) override {}
-    bool instance_enumerator_more(const Instance_Enumerator_Rep*) override { return false; }
-    void instance_enumerator_next(Instance_Enumerator_Rep*) override {}
-    Ref<Instance> instance_enumerator_get(const Instance_Enumerator_Rep*) override { return {}; }
-    Ref<Instance> get_instance(const char*, const Instance*) override { return {}; }
-    int create_instance(const char*, const Instance*) override { return -1; }
-    int delete_instance(const char*, const Instance*) override { return -1; }
-    int modify_instance(const char*, const Instance*) override { return -1; }
-    int invoke_method(const char*, const Instance*, Instance*) override { return -1; }
-    void allow_unload(bool) override {}
-    bool get_username(String&) override { return false; }
 
 private:
     Events& _events;
