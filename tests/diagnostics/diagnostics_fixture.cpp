@@ -57,7 +57,7 @@ void Diagnostics::load()
     static const bool first = []
     {
         if (wants_log)
-            home().file(".cimplerc", "LOG_LEVEL=INFO\n");
+            home().file(".cimplerc", "LOG_LEVEL=DBG\n");
         setenv("HOME", home().path("").c_str(), 1);
         hxasim::load_text(host);
         return true;
@@ -140,7 +140,11 @@ std::vector<std::string> Diagnostics::new_log()
     std::vector<std::string> lines;
     std::smatch part;
     for (std::string line; std::getline(messages, line);)
-        if (std::regex_match(line, part, form) && !part[2].str().starts_with("Requested Class"))
+    {
+        if (!std::regex_match(line, part, form) || part[2].str().starts_with("Requested Class"))
+            continue;
+        if (part[1] != "DBG" || part[2] == "Entering: updateJobState") // the job completes
             lines.push_back(part[1].str() + ' ' + part[2].str());
+    }
     return lines;
 }

@@ -40,8 +40,9 @@ protected:
 
     static void wait_for_end(); // until the run's thread is gone
 
-    static std::string states();               // of all adapters and ports, as the model tells them
-    static std::vector<std::string> new_log(); // "LEVEL text" of the diagnostics, from LL_INFO up, since the last call
+    static std::string states(); // of all adapters and ports, as the model tells them
+    static std::vector<std::string>
+    new_log(); // "LEVEL text" of the diagnostics since the last call, from LL_INFO up, and where a job completes
 
     static void unload();
     static void load(); // does nothing while it is loaded
