@@ -140,11 +140,8 @@ std::vector<std::string> Diagnostics::new_log()
     std::vector<std::string> lines;
     std::smatch part;
     for (std::string line; std::getline(messages, line);)
-    {
-        if (!std::regex_match(line, part, form) || part[2].str().starts_with("Requested Class"))
-            continue;
-        if (part[1] != "DBG" || part[2] == "Entering: updateJobState") // the job completes
+        if (std::regex_match(line, part, form) && !part[2].str().starts_with("Requested Class") &&
+            (part[1] != "DBG" || part[2] == "Entering: updateJobState")) // the job completes
             lines.push_back(part[1].str() + ' ' + part[2].str());
-    }
     return lines;
 }
