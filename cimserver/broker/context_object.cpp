@@ -1,4 +1,4 @@
-#include "cimserver/broker/conversion.h"
+#include "cimserver/broker/cmpi_values.h"
 #include "cimserver/broker/not_offered.h"
 #include "cimserver/broker/objects.h"
 

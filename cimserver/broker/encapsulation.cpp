@@ -1,6 +1,6 @@
 // The broker's encapsulation table: makes the objects that travel between server and module.
 #include "cimserver/broker/broker.h"
-#include "cimserver/broker/conversion.h"
+#include "cimserver/broker/cmpi_values.h"
 #include "cimserver/broker/not_offered.h"
 #include "cimserver/broker/objects.h"
 

@@ -1,6 +1,6 @@
 // The broker's own table: attaching threads, and what providers read through the server.
 #include "cimserver/broker/broker.h"
-#include "cimserver/broker/conversion.h"
+#include "cimserver/broker/cmpi_values.h"
 #include "cimserver/broker/not_offered.h"
 #include "cimserver/broker/objects.h"
 #include "cimserver/broker/return_code.h"

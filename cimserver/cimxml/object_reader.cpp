@@ -3,7 +3,7 @@
 #include "cimserver/cimxml/http_message.h"
 #include "cimserver/cimxml/request_rules.h"
 #include "cimserver/model/names.h"
-#include "cimserver/model/value_conversion.h"
+#include "cimserver/model/value_reader.h"
 
 namespace cimserver
 {

@@ -5,7 +5,7 @@
 #include "cimserver/interop/server_schema.h"
 #include "cimserver/model/names.h"
 #include "cimserver/model/paths.h"
-#include "cimserver/operations/object_conversion.h"
+#include "cimserver/operations/typed_objects.h"
 #include "cimserver/security/bounded_log.h"
 
 #include <algorithm>

@@ -3,7 +3,7 @@
 
 #include "cimserver/model/paths.h"
 #include "cimserver/operations/association_routing.h"
-#include "cimserver/operations/key_conversion.h"
+#include "cimserver/operations/typed_keys.h"
 
 #include <algorithm>
 

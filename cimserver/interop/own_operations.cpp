@@ -1,8 +1,8 @@
 #include "cimserver/interop/own_operations.h"
 
 #include "cimserver/interop/server_schema.h"
-#include "cimserver/operations/key_conversion.h"
-#include "cimserver/operations/object_conversion.h"
+#include "cimserver/operations/typed_keys.h"
+#include "cimserver/operations/typed_objects.h"
 
 #include <algorithm>
 #include <stdexcept>

@@ -15,7 +15,7 @@ namespace cimserver
 std::string path_text(const Object_Path& path);
 
 // A text that two paths share exactly when they name the same instance: the case of names and the order of keys do not count,
-// hosts neither (every object is on this one). Not for paths whose depth nobody has checked (key_conversion.h).
+// hosts neither (every object is on this one). Not for paths whose depth nobody has checked (typed_keys.h).
 std::string path_identity(const Object_Path& path);
 
 inline const Object_Path& path_of(const Object_Path& path) { return path; }

@@ -2,9 +2,9 @@
 #include "cimserver/operations/module_operations.h"
 
 #include "cimserver/model/meta_search.h"
-#include "cimserver/operations/key_conversion.h"
-#include "cimserver/operations/object_conversion.h"
 #include "cimserver/operations/provider_call.h"
+#include "cimserver/operations/typed_keys.h"
+#include "cimserver/operations/typed_objects.h"
 
 #include <algorithm>
 

@@ -1,9 +1,9 @@
 #include "cimserver/operations/module_operations.h"
 
-#include "cimserver/broker/conversion.h"
+#include "cimserver/broker/cmpi_values.h"
 #include "cimserver/model/paths.h"
-#include "cimserver/operations/key_conversion.h"
 #include "cimserver/operations/provider_call.h"
+#include "cimserver/operations/typed_keys.h"
 
 namespace cimserver
 {

@@ -1,5 +1,5 @@
 // The method interface as a server calls it.
-#include "cimserver/broker/conversion.h"
+#include "cimserver/broker/cmpi_values.h"
 #include "cimserver/broker/objects.h"
 #include "tests/cmpi/served_provider.h"
 

@@ -1,6 +1,6 @@
 #include "tests/cmpi/served_provider.h"
 
-#include "cimserver/broker/conversion.h"
+#include "cimserver/broker/cmpi_values.h"
 #include "cimserver/broker/objects.h"
 #include "tests/runtime/home.h"
 

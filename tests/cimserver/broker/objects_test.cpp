@@ -1,6 +1,6 @@
 // The broker's objects as a provider sees them: through their function tables.
 #include "cimserver/broker/broker.h"
-#include "cimserver/broker/conversion.h"
+#include "cimserver/broker/cmpi_values.h"
 #include "cimserver/broker/request.h"
 #include "cimserver/broker/return_code.h"
 #include "schema/TST_Thing.h"

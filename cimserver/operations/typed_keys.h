@@ -15,7 +15,7 @@ public:
     explicit Key_Error(std::string description) : Cim_Error(CIM_ERR_INVALID_PARAMETER, std::move(description)) {}
 };
 
-// The keys in class order. A value may come typed, or as a client's text (value_conversion.h). A reference is converted with
+// The keys in class order. A value may come typed, or as a client's text (value_reader.h). A reference is converted with
 // the class that it names, and takes the name space of the path it stands in when it has none.
 //
 // Throws Key_Error for a key that is missing, unknown, given twice, or no value of its type.

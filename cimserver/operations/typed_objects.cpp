@@ -1,12 +1,12 @@
-#include "cimserver/operations/object_conversion.h"
+#include "cimserver/operations/typed_objects.h"
 
 #include "cimserver/model/meta_search.h"
 #include "cimserver/model/operations.h"
 #include "cimserver/model/paths.h"
 #include "cimserver/model/repository.h"
-#include "cimserver/model/value_conversion.h"
+#include "cimserver/model/value_reader.h"
 #include "cimserver/model/value_text.h"
-#include "cimserver/operations/key_conversion.h"
+#include "cimserver/operations/typed_keys.h"
 
 #include <unordered_set>
 

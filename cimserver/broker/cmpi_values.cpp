@@ -1,4 +1,4 @@
-#include "cimserver/broker/conversion.h"
+#include "cimserver/broker/cmpi_values.h"
 
 namespace cimserver
 {

@@ -1,4 +1,4 @@
-#include "cimserver/model/value_conversion.h"
+#include "cimserver/model/value_reader.h"
 
 #include "cimserver/model/names.h"
 #include "cimserver/model/value_text.h"

@@ -1,7 +1,7 @@
-#include "cimserver/operations/key_conversion.h"
+#include "cimserver/operations/typed_keys.h"
 
 #include "cimserver/model/meta_search.h"
-#include "cimserver/model/value_conversion.h"
+#include "cimserver/model/value_reader.h"
 #include "cimserver/model/value_text.h"
 
 namespace cimserver
