@@ -1,0 +1,27 @@
+"""Files that are there whole or not at all."""
+
+import os
+import tempfile
+from pathlib import Path
+
+
+def write_atomically(path, content):
+    """Replaces a file by `content` (bytes); whoever reads it meanwhile sees the old or the new one. Raises OSError."""
+    path = Path(path)
+    descriptor, temporary = tempfile.mkstemp(prefix=f".{path.name}.", dir=path.parent)
+    try:
+        with os.fdopen(descriptor, "wb") as file:
+            file.write(content)
+            os.fchmod(file.fileno(), 0o666 & ~_umask())  # as a file that is simply created: others may have to read it
+            file.flush()
+            os.fsync(file.fileno())
+        os.replace(temporary, path)
+    except BaseException:
+        os.unlink(temporary)
+        raise
+
+
+def _umask():
+    mask = os.umask(0o077)
+    os.umask(mask)
+    return mask

@@ -1,0 +1,131 @@
+"""The program zmlr-inventory: reads hosts and shows what they have."""
+
+import os
+import sys
+
+from . import credentials, hosts, parallel
+from .files import write_atomically
+from .hosts import UsageError
+from .json_text import json_text
+from .model import Failure, Inventory
+from .openmetrics import openmetrics_text
+from .options import parse
+from .tree import Style, tree_text
+from .values import visible
+
+# The exit codes, as in the manual page.
+WELL, PARTLY, USAGE, NOTHING, NO_PYWBEM, NOT_WRITTEN, INTERRUPTED = 0, 1, 2, 3, 4, 5, 130
+
+
+def say(text):
+    print(f"zmlr-inventory: {visible(text)}", file=sys.stderr, flush=True)
+
+
+def main(arguments=None):
+    for stream in (sys.stdout, sys.stderr):
+        stream.reconfigure(errors="backslashreplace")
+    options = parse(arguments)
+    try:
+        urls = hosts.urls_of(options.host, options.hosts, options.plain_http)
+        logins = credentials.Credentials(options.credentials, credentials.ask(options.user) if options.user else None)
+    except UsageError as error:
+        say(str(error))
+        return USAGE
+    except KeyboardInterrupt:
+        return INTERRUPTED
+    try:
+        import pywbem  # noqa: F401
+    except ImportError:
+        say("the Python package pywbem is missing: install it beside this program with `pipx install zmlr-inventory`, or make the virtual environment of zmlr-inventory(1)")
+        return NO_PYWBEM
+    if options.insecure:
+        say("warning: the identity of servers is not checked; whoever sits between can read and change everything, passwords too")
+
+    def connect(url):
+        return hosts.connect(url, options, logins)
+
+    try:
+        if options.watch:
+            from .watch import watch
+
+            return watch(urls, connect, options, say)
+        inventory = read(urls, connect, options.parallel)
+        return show(inventory, options)
+    except KeyboardInterrupt:
+        return INTERRUPTED
+    except BrokenPipeError:
+        os.dup2(os.open(os.devnull, os.O_WRONLY), sys.stdout.fileno())  # nobody reads it any more; the flush at the end shall not fail
+        return NOT_WRITTEN
+
+
+def read(urls, connect, at_once):
+    """All hosts; what fails is told as it comes."""
+    import pywbem
+
+    from .reading import read_host
+
+    progress = parallel.Progress(sys.stderr, len(urls))
+
+    def read_one(url):
+        with_progress = lambda name, number, count: progress.step(hosts.name_of(url), f"{name} ({number} of {count})")  # noqa: E731
+        return read_host(connect(url), with_progress)
+
+    found, failures = {}, {}
+    for url, host, error in parallel.each(read_one, urls, at_once, progress.show):
+        progress.finish(hosts.name_of(url))
+        progress.clear()
+        if error is None:
+            found[url] = host
+            for text in host.unread:
+                say(f"{url}: {text}")
+        elif isinstance(error, (pywbem.Error, OSError)):
+            failures[url] = Failure(url, reason(error))
+            say(f"{url}: {failures[url].reason}")
+        else:
+            raise error
+    return Inventory([found[url] for url in urls if url in found], [failures[url] for url in urls if url in failures])
+
+
+def reason(error):
+    """Why a host told nothing, in a line."""
+    import pywbem
+
+    if isinstance(error, pywbem.AuthError):
+        return f"{error}; give a login with --credentials FILE or --user NAME"
+    if isinstance(error, pywbem.CIMError):
+        return f"{error.status_code_name}: {error.status_description}"
+    return " ".join(str(error).split())
+
+
+def show(inventory, options):
+    """Prints or writes what was asked for; the exit code."""
+    if not inventory.hosts and not options.json:
+        return NOTHING
+    try:
+        if options.svg:
+            from .topology import svg
+
+            write_atomically(options.svg, svg(inventory))
+        if options.openmetrics:
+            write_atomically(options.openmetrics, openmetrics_text(inventory).encode())
+    except OSError as error:
+        say(str(error))
+        return NOT_WRITTEN
+    if options.json:
+        print(json_text(inventory))
+    elif not options.svg and not options.openmetrics:
+        print(tree_text(inventory, style_of(sys.stdout), options.all))
+    sys.stdout.flush()
+    if not inventory.hosts:
+        return NOTHING
+    return PARTLY if inventory.failures or any(host.unread for host in inventory.hosts) else WELL
+
+
+def style_of(stream):
+    """Colours on a terminal whose owner has nothing against them, lines where the character set has them."""
+    coloured = stream.isatty() and not os.environ.get("NO_COLOR") and os.environ.get("TERM") != "dumb"
+    try:
+        "├─└│".encode(stream.encoding)
+    except UnicodeEncodeError:
+        return Style(coloured, ascii_only=True)
+    return Style(coloured)
