@@ -9,6 +9,7 @@ extern "C"
 {
 #endif
 
+    // Reads the port's state and speeds, and the largest payload of a frame (bytes).
     hxa_status_t hxal_ethport_get_attr(const hxal_t* ioc, hxa_ethport_attr_t* attr);
 
     // What the network driver and the two halves of its function count; prints a message when the request fails.

@@ -17,7 +17,7 @@ extern "C"
     // One request: the partition list. The driver's `npart` may exceed the array.
     hxa_status_t hxal_flash_get_attr(const hxal_t* ioc, hxa_flash_attr_t* attr);
 
-    // One request.
+    // One request: erases a partition. It stays erased until an image is written to it.
     hxa_status_t hxal_flash_erase_part(const hxal_t* ioc, hxa_flash_part_type_t type, uint8_t instance);
 
     // One request: reads the first `size` bytes of a partition. With `bfile` false `dest` is a buffer of `size` bytes; with

@@ -16,7 +16,8 @@
 // counts an IOC that its bitmap of instances lacks: then hxal_ioc_get_num() is more than the handles of hxal_ioc_get_list(),
 // which can be used all the same.
 //
-// README.md beside this file tells how to compile and link a client, and how to try it without hardware.
+// An installed library is compiled and linked with as `pkg-config --cflags --libs hxal` prints. Without hardware the simulated
+// drivers answer; hxal/README.md of the sources tells how to try that.
 //
 // Statuses.  A request returns HXA_STATUS_OK or says what failed: the call to the driver (a status mapped from errno; the
 //            caller's buffer is untouched, but for hxal_ioc_get_info()'s) or the driver itself (its own status, unchanged;

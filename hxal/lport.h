@@ -12,6 +12,7 @@ extern "C"
 {
 #endif
 
+    // Reads the attributes: state, FC address, how it is configured, the fabric that it is logged in to.
     hxa_status_t hxal_lport_get_attr(const hxal_t* ioc, uint16_t vf_id, wwn_t pwwn, hxa_port_attr_t* attr);
 
     // Sets the counters of the logical port to 0; hxal_lport_get_stats() reads them.
