@@ -8,6 +8,8 @@ import sys
 
 import pytest
 
+from tools import class_reference
+
 ROOT = pathlib.Path(__file__).resolve().parents[2]
 BUILD = pathlib.Path(os.environ.get("ZMLR_BUILD_DIR", ROOT / "build/dev"))
 PAGES = sorted((ROOT / "packaging/man").glob("*.[1-9]"))
@@ -45,3 +47,7 @@ def test_every_option_is_in_the_manual_page_and_the_completion(page):
     completion = (ROOT / "packaging/completion" / page.stem).read_text()
     for text in (manual, completion):
         assert not options - set(re.findall(r"--[a-z][a-z-]+", text))
+
+
+def test_the_class_reference_is_what_script_golden_writes():
+    assert (ROOT / "docs/classes.md").read_text(encoding="utf-8") == class_reference.page()
