@@ -17,7 +17,7 @@ namespace cimserver
 struct Options
 {
     std::optional<std::string> add_user; // only add this user to the file
-    std::string users = "/etc/zmlr-cimserver/users";
+    std::string users = "/etc/zmlr/users";
     bool no_auth = false;
 
     std::string module;

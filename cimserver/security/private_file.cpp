@@ -103,6 +103,7 @@ public:
 
     void write_and_rename(const std::string& content, const std::string& target)
     {
+        take_group_of(target);
         write_all(_descriptor, content, target);
         if (fsync(_descriptor) != 0 || rename(_name.c_str(), target.c_str()) != 0)
             fail("cannot write " + target);
@@ -110,6 +111,15 @@ public:
     }
 
 private:
+    // Whoever could read the old file through its group can read the new one, unless this process may not give that group away.
+    void take_group_of(const std::string& target)
+    {
+        struct stat status = {};
+        if (stat(target.c_str(), &status) == 0 && (status.st_mode & S_IRGRP) != 0 &&
+            fchown(_descriptor, static_cast<uid_t>(-1), status.st_gid) == 0 && fchmod(_descriptor, 0640) != 0)
+            fail("cannot write " + target);
+    }
+
     std::string _name;
     Descriptor _descriptor;
     bool _renamed = false;

@@ -19,8 +19,8 @@ enum class File_Privacy
 // std::runtime_error that names the file and what is wrong with it, also when it holds more than max_bytes.
 std::string read_private_file(const std::string& file, std::size_t max_bytes, File_Privacy privacy = File_Privacy::owner_only);
 
-// Puts the content into the file, mode 0600: whoever reads it sees the old content or the new one, whole, also after a power
-// failure. Throws std::system_error that names the file; it is then as it was.
+// Puts the content into the file, mode 0600, or 0640 when the group of the old one could read it: whoever reads it sees the old
+// content or the new one, whole, also after a power failure. Throws std::system_error that names the file; it is then as it was.
 void write_private_file(const std::string& file, const std::string& content);
 
 // Removes what a write to the file left behind that was cut off by the end of its process. No other process may be writing it.

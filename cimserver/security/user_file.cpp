@@ -65,7 +65,10 @@ void check_password(const std::string& password)
         throw std::runtime_error("the password holds a control character");
 }
 
-Users read_users(const std::string& file) { return parse(read_private_file(file, max_user_file_bytes), file); }
+Users read_users(const std::string& file)
+{
+    return parse(read_private_file(file, max_user_file_bytes, File_Privacy::group_may_read), file);
+}
 
 void store_user(const std::string& file, const std::string& name, const std::string& password)
 {

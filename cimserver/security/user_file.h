@@ -1,4 +1,4 @@
-// The file of the users who may use the server: one "name:hash" a line (password_hash.h), mode 0600.
+// The file of the users who may use the server: one "name:hash" a line (password_hash.h), mode 0600 or 0640.
 #pragma once
 
 #include <map>

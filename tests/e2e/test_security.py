@@ -140,7 +140,7 @@ def test_a_change_of_the_file_counts_at_once(start, program, users):
     assert status(port, basic("admin", PASSWORD)) == 401
     assert status(port, basic("admin", "another")) == status(port, basic("second", "one more")) == 200
 
-    users.chmod(0o640)
+    users.chmod(0o644)
     assert status(port, basic("admin", "another")) == 401, "nobody is let in by a file that others may read"
     users.chmod(0o600)
     assert status(port, basic("admin", "another")) == 200
@@ -162,7 +162,11 @@ def test_add_user_keeps_a_private_file_of_hashes(program, users):
     assert users.parent.stat().st_mode & 0o777 == 0o700
     before = users.read_text(encoding="utf-8")
     assert before.startswith("admin:$y$") and PASSWORD not in before
+    users.chmod(0o640)
+    group = os.getgid() if os.geteuid() else 4711
+    os.chown(users, -1, group)
     add_user(program, users, "zoë", "x")
+    assert (users.stat().st_mode & 0o777, users.stat().st_gid) == (0o640, group)
     after = users.read_text(encoding="utf-8")
     assert after.startswith(before) and after.splitlines()[1].startswith("zoë:$y$")
     assert os.listdir(users.parent) == ["users"], "nothing temporary is left"
@@ -271,12 +275,12 @@ def test_refuses_to_start_unsafe(program, users, identity, tmp_path):
         return str(tmp_path / name)
 
     open_key = written("open.pem", identity[1].read_bytes(), 0o644)
-    shared = written("shared", users.read_bytes(), 0o640)
+    shared = written("shared", users.read_bytes(), 0o644)
     empty = written("empty", b"", 0o600)
     spoilt = written("spoilt", b"admin:secret\n", 0o600)
     for options, code, told in [
         (["--users", str(tmp_path / "missing")], 1, "--add-user"),
-        (["--users", shared], 1, "0600"),
+        (["--users", shared], 1, "0640"),
         (["--users", empty], 1, "names no user"),
         (["--users", spoilt], 1, "line 1"),
         (["--users", str(tmp_path)], 1, "no regular file"),
