@@ -72,11 +72,8 @@ class Reference:
         return "\n".join([*parts, *self._value_texts()]) + "\n"
 
     def _class(self, cls):
-        ancestors = []
-        while (ancestors or [cls])[-1].superclass:
-            ancestors.append((ancestors or [cls])[-1].superclass)
         yield f"\n### {cls.name}\n\n{cls.documentation['Description']}\n"
-        yield f"Superclasses: {', '.join(ancestor.name for ancestor in ancestors)}.\n"
+        yield f"Superclasses: {', '.join(self._ancestors(cls.name))}.\n"
         references = [feature for feature in cls.fields if feature.is_reference]
         if references:
             yield from self._association(cls, references)
@@ -87,13 +84,24 @@ class Reference:
                 yield "\nMethod: " + signature(method)
         yield from self._ways(cls)
 
+    def _ancestors(self, name):
+        superclass = self._classes[name].superclass
+        while superclass:
+            yield superclass.name
+            superclass = superclass.superclass
+
     def _association(self, cls, references):
         for reference in references:
-            ends = sorted(self._inventories.ends[cls.name][reference.name]) or [reference.type]
+            ends = sorted(self._inventories.ends[cls.name][reference.name]) or self._served_below(reference.type)
             yield f"- **{reference.name}**: {', '.join(map(link, ends))}"
         others = [feature.name for feature in cls.fields if not feature.is_reference]
         if others:
             yield f"- properties: {', '.join(others)}"
+
+    def _served_below(self, name):
+        """The served classes of a superclass of ours, or the only one of any; else the superclass."""
+        served = [own for names in self._themes.values() for own in names if own == name or name in self._ancestors(own)]
+        return served if name.startswith("ZEMLAR_") or len(served) == 1 else [name]
 
     def _properties(self, cls):
         examples = self._inventories.examples[cls.name]

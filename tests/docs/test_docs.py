@@ -51,3 +51,42 @@ def test_every_option_is_in_the_manual_page_and_the_completion(page):
 
 def test_the_class_reference_is_what_script_golden_writes():
     assert (ROOT / "docs/classes.md").read_text(encoding="utf-8") == class_reference.page()
+
+
+LITERAL = r'"((?:[^"\\]|\\.)*)"'
+# Their texts reach the log through a variable.
+SPEAKING = {"cmpi/cmpi_to_value.cpp", "cmpi/value_to_cmpi.cpp", "diagnostics/record_messages.cpp", "indications/event_callbacks.cpp",
+            "indications/event_registrations.cpp", "inventory/fru_number.cpp", "inventory/port_disabled.cpp", "inventory/target_helper.cpp",
+            "providers/diagnostic_runs.h", "providers/hba_software_installation_service_provider.cpp"}
+# What else those files say: to the subscribers of alerts, and inside another line.
+UNLOGGED = {"The network port %s has been enabled", "The network port %s has been disabled", "FC HBA"}
+
+
+def logged_texts():
+    for folder in ("runtime", "cmpi", "inventory", "profiles", "diagnostics", "indications", "providers", "hxal"):
+        for file in sorted((ROOT / folder).rglob("*.[ch]*")):
+            text = re.sub(r"^\s*//.*$", "", file.read_text(encoding="utf-8"), flags=re.MULTILINE)
+            call = r"std::printf\(" if folder == "hxal" else r"(?:\bLL_\w+, ?(?:[\w.]+, ?)*|warning\(\)\.invoke\(|, log_source, )"
+            texts = re.findall(call + LITERAL, text)
+            if str(file.relative_to(ROOT)) in SPEAKING:
+                texts += filter(re.compile(" ").search, re.findall(LITERAL, text))
+            yield from (" ".join(re.sub(r"\\[nt]", " ", found).split()) for found in texts)
+
+
+def test_the_page_of_messages_has_every_text_that_is_logged_and_no_other():
+    cells = re.findall(r"^\|[^|`]*\| (`.*?`) \|", (ROOT / "docs/messages.md").read_text(encoding="utf-8"), re.MULTILINE)
+    told = {text for cell in cells for text in re.findall(r"`([^`]+)`", cell)}
+    assert told == set(logged_texts()) - UNLOGGED - {"%s"}
+
+
+def test_links_between_pages_lead_somewhere():
+    """To a file, and in it to a heading."""
+    for page in subprocess.run(["git", "ls-files", "*.md"], cwd=ROOT, capture_output=True, text=True, check=True).stdout.split():
+        for target, _, heading in (link.partition("#") for link in re.findall(r"\]\(([^)\s]+)\)", (ROOT / page).read_text(encoding="utf-8"))):
+            if ":" in target:
+                continue
+            file = (ROOT / page).parent / target if target else ROOT / page
+            assert file.exists(), f"{page}: {target}"
+            if heading:
+                headings = re.findall(r"^#+ (.*)", file.read_text(encoding="utf-8"), re.MULTILINE)
+                assert heading in map(class_reference.anchor, headings), f"{page}: {target}#{heading}"
