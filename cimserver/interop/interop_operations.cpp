@@ -8,11 +8,10 @@ namespace cimserver
 namespace
 {
 
-// What clients look for in the interop name space besides the server itself: the profiles, what conforms to them, and the
-// software that implements them.
 constexpr std::string_view module_roots[] = {
-    "CIM_RegisteredProfile", "CIM_ElementConformsToProfile",   "CIM_SubProfileRequiresProfile",
-    "CIM_ReferencedProfile", "ZEMLAR_ProfileSoftwareIdentity", "ZEMLAR_ProfileElementSoftwareIdentity",
+#define ZMLR_INTEROP_ROOT(Class) #Class,
+#include "providers/interop_roots.def"
+#undef ZMLR_INTEROP_ROOT
 };
 
 } // namespace

@@ -1,0 +1,1 @@
+"""The CIM servers that the module can be registered with."""

@@ -1,0 +1,99 @@
+"""A host with the programs of CIM servers, and a small product to register with them."""
+
+import os
+import pathlib
+import shutil
+import subprocess
+import sys
+
+import pytest
+
+ROOT = pathlib.Path(__file__).resolve().parents[2]
+PROGRAM = ROOT / "packaging" / "registration"
+STAND_IN = pathlib.Path(__file__).with_name("stand_in")
+SERVERS = {
+    "openpegasus": ("cimmof", "cimprovider", "cimcli", "cimconfig"),
+    "sfcb": ("sfcbstage", "sfcbunstage", "sfcbrepos", "systemctl"),
+}
+STANDARD = "class CIM_ManagedElement { };\nclass CIM_Port : CIM_ManagedElement { };\nclass CIM_RegisteredProfile { };\n"
+PRODUCT = "".join(f'[Description("One.")]\nclass ZEMLAR_{name} : CIM_{name}\n{{\n}};\n\n' for name in ("Port", "RegisteredProfile"))
+PROVIDERS = "".join(f"ZMLR_PROVIDER(ZEMLAR_{name}, INSTANCE, SKELETON)\n" for name in ("Port", "RegisteredProfile"))
+START = "import os, pathlib, sys; os.geteuid = lambda: 0; from zmlr_register.main import main; " \
+        "sys.exit(main(sys.argv[2:], pathlib.Path(sys.argv[1])))"
+
+
+class Host:
+    """A folder that holds the servers' state, our program's notes and the product's data."""
+
+    def __init__(self, folder):
+        self.folder = folder
+        self.state = folder / "host"
+        for name in ("modules", "providers", "staging/regs", "staging/mofs", "repository", "served"):
+            (self.state / name).mkdir(parents=True)
+        (folder / "bin").mkdir()
+        self.make_name_space("root/PG_InterOp")
+        self.write_schema(STANDARD)
+        self.make_product("1.0.0")
+
+    def has(self, *servers):
+        for program in (program for server in servers for program in SERVERS[server]):
+            (self.folder / "bin" / program).symlink_to(STAND_IN)
+        return self
+
+    def make_name_space(self, name):
+        classes = self.state / name / "=classes"
+        classes.mkdir(parents=True)
+        for line in STANDARD.splitlines():
+            cls, _, superclass = line.removeprefix("class ").removesuffix(" { };").partition(" : ")
+            (classes / cls).write_text(superclass + "\n")
+
+    def write_schema(self, classes):
+        files = {"qualifiers.mof": "Qualifier Key : boolean = false, Scope(property);", "classes.mof": "/* class CIM_Gone */\n" + classes,
+                 "CIM_Schema.mof": '#pragma include ("qualifiers.mof")\n#pragma include ("classes.mof")\n'}
+        (self.folder / "schema").mkdir(exist_ok=True)
+        for name, text in files.items():
+            (self.folder / "schema" / name).write_text(text)
+
+    def make_product(self, version, mof=PRODUCT):
+        texts = {"cim.mof": STANDARD, "zemlar.mof": mof, "providers.def": PROVIDERS, "libzmlrprovider.so": "",
+                 "roots.def": "ZMLR_INTEROP_ROOT(CIM_RegisteredProfile)\n"}
+        for name, text in texts.items():
+            (self.folder / name).write_text(text)
+        subprocess.run([sys.executable, "-B", PROGRAM / "generate_registration.py", "--output", "data", "--version", version,
+                        "--module", "../libzmlrprovider.so", "--providers", "providers.def", "--interop-roots", "roots.def",
+                        ROOT / "schema" / "qualifiers.mof", "cim.mof", "zemlar.mof"], cwd=self.folder, check=True)
+
+    def register(self, *words, **faults):
+        """Runs zmlr-register; fault FAIL_AT or SIGNAL_AT: the number of the call that fails or sends a signal."""
+        (self.state / "calls").unlink(missing_ok=True)
+        options = ["--schema", self.folder / "schema/CIM_Schema.mof", "--state", self.folder / "notes",
+                   "--staging", self.state / "staging"]
+        if not (self.folder / "bin" / "cimconfig").exists() or "sfcb" in words:
+            options += ["--provider-folder", self.state / "providers"]
+        environment = {**os.environ, "PATH": f"{self.folder}/bin:{os.environ['PATH']}", "PYTHONPATH": str(PROGRAM),
+                       "STAND_IN": str(self.state), **{name: str(number) for name, number in faults.items()}}
+        return subprocess.run([sys.executable, "-B", "-c", START, self.folder / "data", *words, *options], env=environment,
+                              capture_output=True, text=True, timeout=60)
+
+    def calls(self):
+        return (self.state / "calls").read_text().splitlines()
+
+    def copy(self, source="host notes", target="host-before notes-before"):
+        for here, there in zip(source.split(), target.split()):
+            shutil.rmtree(self.folder / there, ignore_errors=True)
+            if (self.folder / here).exists():
+                shutil.copytree(self.folder / here, self.folder / there, symlinks=True)
+
+    def contents(self):
+        """Everything that a run may change: the texts of files, the targets of links, the name spaces."""
+        def text(path):
+            return os.readlink(path) if path.is_symlink() else path.read_text() if path.is_file() else ""
+
+        paths = [path for folder in (self.state, self.folder / "notes") for path in folder.rglob("*")]
+        return {str(path.relative_to(self.folder)): text(path) for path in paths
+                if path.name == "=classes" or path.name != "calls" and not path.is_dir()}
+
+
+@pytest.fixture
+def host(tmp_path):
+    return Host(tmp_path)

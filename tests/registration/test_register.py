@@ -1,0 +1,88 @@
+"""zmlr-register against stand-ins for the servers' programs, which record calls and fail on demand."""
+
+import itertools
+
+import pytest
+
+from conftest import PRODUCT, SERVERS, STANDARD
+
+
+@pytest.mark.parametrize("server", SERVERS)
+def test_installs_once_and_removes_everything(host, server):
+    host.has(server)
+    empty = host.contents()
+    assert host.register("--status").returncode == 7
+    assert host.register("--install", "--dry-run").returncode == 0
+    assert host.contents() == empty
+
+    installed = host.register("--install")
+    assert (installed.returncode, installed.stderr) == (0, "")
+    once = host.contents()
+    assert once["host/providers/libzmlrprovider.so"] == str(host.folder / "libzmlrprovider.so")
+    assert host.register("--status").returncode == 0
+    assert "adding" not in host.register("--install").stdout
+    assert host.contents() == once
+
+    assert host.register("--remove").returncode == 0
+    assert host.contents() == empty
+
+
+@pytest.mark.parametrize("server", SERVERS)
+@pytest.mark.parametrize("task, fault, status", [
+    ("--install", "FAIL_AT", 1), ("upgrade", "FAIL_AT", 1), ("--remove", "FAIL_AT", 1), ("upgrade", "SIGNAL_AT", 128 + 15)])
+def test_what_fails_on_the_way_is_undone(host, server, task, fault, status):
+    host.has(server)
+    if task != "--install":
+        host.register("--install")
+    if task == "upgrade":
+        host.make_product("2.0.0", PRODUCT.replace("One", "Another"))
+    before = host.contents()
+    host.copy()
+    for number in itertools.count(1):
+        result = host.register("--remove" if task == "--remove" else "--install", **{fault: number})
+        if result.returncode == 0 and number > len(host.calls()):
+            break
+        if result.returncode == 0:  # some answers may fail
+            host.copy("host-before notes-before", "host notes")
+        assert (result.returncode or status, host.contents()) == (status, before), f"{host.calls()[number - 1]}: {result.stderr}"
+    assert host.contents() != before
+
+
+def test_a_run_that_was_killed_is_resumed(host):
+    host.has("openpegasus").register("--install")
+    whole = host.contents()
+    for lost in ("host/modules/zmlrprovider_Module", "host/root/zemlar/=classes/ZEMLAR_Port", "notes/openpegasus.mof"):
+        (host.folder / lost).unlink()
+        assert host.register("--install").returncode == 0
+        assert host.contents() == whole
+
+
+@pytest.mark.parametrize("server", SERVERS)
+def test_classes_that_the_schema_lacks_are_told_and_left_out(host, server):
+    host.has(server).write_schema(STANDARD.replace("CIM_Port ", "CIM_Harbour "))
+    result = host.register("--install")
+    assert (result.returncode, result.stderr) == (
+        5, "zmlr-register: left out: ZEMLAR_Port in root/zemlar: the server has no CIM_Port\n")
+    texts = "".join(host.contents().values())
+    assert "ZEMLAR_RegisteredProfile" in texts and "ZEMLAR_Port" not in texts
+
+
+def test_an_administrators_schema_stays(host):
+    host.has("openpegasus").make_name_space("root/zemlar")
+    before = host.contents()
+    assert host.register("--install").returncode == 0
+    assert host.register("--remove").returncode == 0
+    assert host.contents() == before
+
+
+def test_chooses_no_server_by_itself_when_there_are_several(host):
+    assert host.register("--install").returncode == 4
+    host.has(*SERVERS)
+    assert "choose one with --server" in host.register("--install").stderr
+    assert host.register("--install", "--server", "sfcb").returncode == 0
+
+
+def test_what_cannot_be_undone_is_told(host):
+    (host.folder / "notes" / "openpegasus.mof").mkdir(parents=True)  # the note of the registration cannot be written
+    result = host.has("openpegasus").register("--install")
+    assert result.returncode == 3 and "could not undo: " in result.stderr
