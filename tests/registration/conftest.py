@@ -63,15 +63,15 @@ class Host:
                         "--module", "../libzmlrprovider.so", "--providers", "providers.def", "--interop-roots", "roots.def",
                         ROOT / "schema" / "qualifiers.mof", "cim.mof", "zemlar.mof"], cwd=self.folder, check=True)
 
-    def register(self, *words, **faults):
-        """Runs zmlr-register; fault FAIL_AT or SIGNAL_AT: the number of the call that fails or sends a signal."""
+    def register(self, *words, fault="", at=0):
+        """Runs zmlr-register; `fault` (FAIL, TERM, KILL) strikes at call number `at`."""
         (self.state / "calls").unlink(missing_ok=True)
         options = ["--schema", self.folder / "schema/CIM_Schema.mof", "--state", self.folder / "notes",
                    "--staging", self.state / "staging"]
         if not (self.folder / "bin" / "cimconfig").exists() or "sfcb" in words:
             options += ["--provider-folder", self.state / "providers"]
         environment = {**os.environ, "PATH": f"{self.folder}/bin:{os.environ['PATH']}", "PYTHONPATH": str(PROGRAM),
-                       "STAND_IN": str(self.state), **{name: str(number) for name, number in faults.items()}}
+                       "STAND_IN": str(self.state), "FAULT": fault, "FAULT_AT": str(at), "TMPDIR": str(self.folder)}
         return subprocess.run([sys.executable, "-B", "-c", START, self.folder / "data", *words, *options], env=environment,
                               capture_output=True, text=True, timeout=60)
 

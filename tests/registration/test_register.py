@@ -29,7 +29,7 @@ def test_installs_once_and_removes_everything(host, server):
 
 @pytest.mark.parametrize("server", SERVERS)
 @pytest.mark.parametrize("task, fault, status", [
-    ("--install", "FAIL_AT", 1), ("upgrade", "FAIL_AT", 1), ("--remove", "FAIL_AT", 1), ("upgrade", "SIGNAL_AT", 128 + 15)])
+    ("--install", "FAIL", 1), ("upgrade", "FAIL", 1), ("--remove", "FAIL", 1), ("upgrade", "TERM", 128 + 15)])
 def test_what_fails_on_the_way_is_undone(host, server, task, fault, status):
     host.has(server)
     if task != "--install":
@@ -39,7 +39,7 @@ def test_what_fails_on_the_way_is_undone(host, server, task, fault, status):
     before = host.contents()
     host.copy()
     for number in itertools.count(1):
-        result = host.register("--remove" if task == "--remove" else "--install", **{fault: number})
+        result = host.register("--remove" if task == "--remove" else "--install", fault=fault, at=number)
         if result.returncode == 0 and number > len(host.calls()):
             break
         if result.returncode == 0:  # some answers may fail
@@ -48,13 +48,15 @@ def test_what_fails_on_the_way_is_undone(host, server, task, fault, status):
     assert host.contents() != before
 
 
-def test_a_run_that_was_killed_is_resumed(host):
-    host.has("openpegasus").register("--install")
-    whole = host.contents()
-    for lost in ("host/modules/zmlrprovider_Module", "host/root/zemlar/=classes/ZEMLAR_Port", "notes/openpegasus.mof"):
-        (host.folder / lost).unlink()
-        assert host.register("--install").returncode == 0
-        assert host.contents() == whole
+@pytest.mark.parametrize("server", SERVERS)
+def test_a_run_that_was_killed_is_resumed(host, server):
+    host.has(server).copy()
+    host.register("--install")
+    whole, calls = host.contents(), host.calls()
+    for number, call in enumerate(calls, 1):
+        host.copy("host-before notes-before", "host notes")
+        assert host.register("--install", fault="KILL", at=number).returncode == -9
+        assert (host.register("--install").returncode, host.contents()) == (0, whole), call
 
 
 @pytest.mark.parametrize("server", SERVERS)

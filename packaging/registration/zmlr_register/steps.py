@@ -107,6 +107,7 @@ def carry_out(steps, tools):
         stuck = [words for words in map(_undo, reversed(begun)) if words]
         if stuck:
             raise Not_Undone("; ".join([str(error), *(f"could not undo: {words}" for words in stuck)])) from error
+        tools.say("undone: everything is as it was before")
         raise
 
 

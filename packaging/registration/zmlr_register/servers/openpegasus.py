@@ -64,9 +64,12 @@ class Open_Pegasus:
 
     def classes(self, name_space):
         """The names of the classes of a name space; none when there is no such name space."""
-        if not self.path_of(name_space):
+        try:
+            return self.tools.ask("cimcli", "nc", "-di", "-n", name_space).split()
+        except Failed:
+            if self.path_of(name_space):
+                raise
             return []
-        return self.tools.ask("cimcli", "nc", "-di", "-n", name_space).split()
 
     def path_of(self, name_space):
         """The object path of the name space in the interop name space; empty when there is none."""
