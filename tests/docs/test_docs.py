@@ -23,7 +23,8 @@ PROGRAMS = {
 
 
 def test_manual_pages_are_well_formed(tmp_path):
-    subprocess.run([sys.executable, "-B", ROOT / "packaging/man/header_pages.py", "--output", tmp_path, ROOT / "hxal"], check=True)
+    for program, output, source in (("header_pages.py", tmp_path, "hxal"), ("scenario_page.py", tmp_path / "hxasim-scenario.5", "sim/README.md")):
+        subprocess.run([sys.executable, "-B", ROOT / "packaging/man" / program, "--output", output, ROOT / source], check=True)
     lint = subprocess.run(["mandoc", "-T", "lint", "-W", "warning", *PAGES, *tmp_path.iterdir()], capture_output=True, text=True)
     assert lint.stdout + lint.stderr == ""
 
