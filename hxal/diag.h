@@ -20,7 +20,7 @@ extern "C"
     hxa_status_t hxal_diag_regread(const hxal_t* ioc, uint32_t off, int nwords, void* buffer);
     hxa_status_t hxal_diag_regwrite(const hxal_t* ioc, uint32_t off, uint32_t word);
 
-    // Reads the card's temperature sensor.
+    // Reads the card's temperature sensor: a number of the driver's, which does not say its unit.
     hxa_status_t hxal_diag_tsensor_query(const hxal_t* ioc, uint16_t* tsensor);
 
     // No driver offers the power-on self test or the optical monitoring: HXA_STATUS_CMD_NOTSUPP, always, without a request.

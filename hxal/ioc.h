@@ -109,7 +109,7 @@ extern "C"
     hxa_status_t hxal_ioc_get_stats(const hxal_t* ioc, hxa_ioc_stats_t* stats);
     hxa_status_t hxal_ioc_reset_stats(const hxal_t* ioc);
 
-    // Sets the power state.
+    // Sets the power state of the PCI function (PCI Power Management, D0 is on, D3 off).
     hxa_status_t hxal_ioc_set_power(const hxal_t* ioc, hxa_pm_ds_t state);
 
     // Names the port: at most 64 characters reach the driver. What it accepts becomes the handle's `port_name` (63
