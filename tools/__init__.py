@@ -1,0 +1,6 @@
+"""Helpers around the running system; they stand on the client."""
+
+import sys
+from pathlib import Path
+
+sys.path.insert(0, str(Path(__file__).resolve().parent.parent / "client"))

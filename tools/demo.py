@@ -8,9 +8,10 @@ from dataclasses import dataclass, field
 
 import pywbem
 
-from tools.alerts import Subscription, line_of
 from tools.simulated_server import SimulatedServer
 from tools.wbemcli import Wbemcli
+from zmlr_inventory.subscription import Subscription
+from zmlr_inventory.watch import line_of
 
 NAME_SPACE = "root/zemlar"
 

@@ -72,13 +72,15 @@ def connect(url, options, credentials):
     """A connection that has not asked anything yet."""
     import pywbem
 
-    return pywbem.WBEMConnection(
+    connection = pywbem.WBEMConnection(
         url,
         credentials.of(name_of(url)),
         ca_certs=options.ca or _system_certificates(),
         no_verification=options.insecure,
         timeout=options.timeout,
     )
+    connection.session.trust_env = False  # neither a login of ~/.netrc nor a proxy of the environment that nobody named here
+    return connection
 
 
 def _system_certificates():

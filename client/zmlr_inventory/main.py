@@ -2,8 +2,10 @@
 
 import os
 import sys
+from pathlib import Path
 
 from . import credentials, hosts, parallel
+from .exits import INTERRUPTED, NO_PYWBEM, NOTHING, NOT_WRITTEN, PARTLY, USAGE, WELL
 from .files import write_atomically
 from .hosts import UsageError
 from .json_text import json_text
@@ -12,9 +14,6 @@ from .openmetrics import openmetrics_text
 from .options import parse
 from .tree import Style, tree_text
 from .values import visible
-
-# The exit codes, as in the manual page.
-WELL, PARTLY, USAGE, NOTHING, NO_PYWBEM, NOT_WRITTEN, INTERRUPTED = 0, 1, 2, 3, 4, 5, 130
 
 
 def say(text):
@@ -36,7 +35,8 @@ def main(arguments=None):
     try:
         import pywbem  # noqa: F401
     except ImportError:
-        say("the Python package pywbem is missing: install it beside this program with `pipx install zmlr-inventory`, or make the virtual environment of zmlr-inventory(1)")
+        venv = Path(__file__).resolve().parent.parent / "venv"
+        say(f"pywbem, the CIM client that this needs, is missing; to have it for this program alone: python3 -m venv {venv} && {venv}/bin/pip install pywbem")
         return NO_PYWBEM
     if options.insecure:
         say("warning: the identity of servers is not checked; whoever sits between can read and change everything, passwords too")

@@ -4,6 +4,8 @@ import argparse
 
 from . import __version__
 
+QUERY = "SELECT * FROM ZEMLAR_AlertIndication"
+
 
 def parse(arguments):
     parser = argparse.ArgumentParser(
@@ -23,7 +25,7 @@ def parse(arguments):
     shown.add_argument("--watch", action="store_true", help="alerts as they come, until interrupted")
 
     alerts = parser.add_argument_group("alerts")
-    alerts.add_argument("--query", metavar="WQL", default="SELECT * FROM ZEMLAR_AlertIndication", help="which (default: %(default)s)")
+    alerts.add_argument("--query", metavar="WQL", default=QUERY, help="which (default: %(default)s)")
     alerts.add_argument("--listen", metavar="ADDRESS", help="of this machine, that servers shall send to (default: that which reaches them)")
     alerts.add_argument("--listen-port", metavar="N", type=int, default=0, help="of the first host; the next ones take the next ones (default: free ones)")
 

@@ -5,16 +5,15 @@ from itertools import groupby
 
 from .values import (
     BAD,
-    ENABLED_STATE,
     ETHERNET_PORT_TYPE,
     FC_PORT_TYPE,
     GOOD,
     IDLE,
-    OPERATIONAL_STATUS,
     colons,
     level,
     ranges,
     speed,
+    status_words,
     visible,
     word,
 )
@@ -22,7 +21,6 @@ from .values import (
 FEW = 8  # units of a kind that are told one by one
 
 COLOURS = {GOOD: "32", BAD: "1;31", IDLE: "33", "title": "1", "remark": "31"}
-PORT_ON = (2, 5, None)  # enabled, or nothing to enable
 UNTOLD_PORT_TYPES = (None, 0)
 
 
@@ -121,10 +119,7 @@ class _Drawing:
         return Node(_words("target " + visible(colons(target.wwn)), "" if target.luns else "no logical units"), children)
 
     def _status(self, status, state=None):
-        told = word(OPERATIONAL_STATUS, status)
-        if state not in PORT_ON:
-            told += f" ({word(ENABLED_STATE, state)})"
-        return self._paint(level(status) or "plain", told)
+        return self._paint(level(status), ", ".join(status_words(status, state)))
 
 
 def _module(module):

@@ -75,6 +75,7 @@ ETHERNET_PORT_TYPE = {
 PERCEIVED_SEVERITY = {0: "Unknown", 2: "Information", 3: "Warning", 4: "Minor", 5: "Major", 6: "Critical", 7: "Fatal"}
 
 GOOD, BAD, IDLE = "good", "bad", "idle"
+_SAYING_NOTHING = (None, 0, 1, 2, 5)  # unknown, other, enabled, not applicable
 _LEVELS = {2: GOOD, 11: GOOD, 17: GOOD, 6: BAD, 7: BAD, 12: BAD, 13: BAD, 14: BAD, 16: BAD, 9: IDLE, 10: IDLE, 15: IDLE}
 
 
@@ -86,6 +87,12 @@ def word(table, code):
 def level(status):
     """How an OperationalStatus looks at a glance: GOOD, BAD, IDLE (on purpose out of service), or None for anything else."""
     return _LEVELS.get(status)
+
+
+def status_words(status, state=None):
+    """What an element is at: its operational status, and its enabled state where that says more."""
+    words = [word(OPERATIONAL_STATUS, status)]
+    return words if state in _SAYING_NOTHING else [*words, word(ENABLED_STATE, state)]
 
 
 def speed(bits_per_second):

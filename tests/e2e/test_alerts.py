@@ -13,8 +13,8 @@ import pytest
 import pywbem
 from conftest import TIMEOUT, code_of, wait_until
 
-from tools.alerts import Subscription
 from tools.simulated_server import ROOT
+from zmlr_inventory.subscription import Subscription
 
 HERE = Path(__file__).parent
 EVENTS = [line.split("\t") for line in (HERE / "alerts.txt").read_text(encoding="utf-8").splitlines() if line[0] != "#"]
@@ -202,7 +202,7 @@ def test_script_alerts_shows_them_until_it_is_interrupted(served):
     everything = f" Warning      ZMLR131077  SFP removed: WWN/MAC = {WWN}.  Check whether SFP is inserted properly."
     one_property = ["--query", "SELECT EventID FROM ZEMLAR_AlertIndication"]
     for number, query, told in ((signal.SIGINT, [], everything), (signal.SIGTERM, one_property, "HXA_AEN_PORT_SFP_REMOVE")):
-        command = [ROOT / "script/alerts", "--url", host.server.url, *query]
+        command = [ROOT / "script/alerts", host.server.url, *query]
         with subprocess.Popen(command, stdout=-1, stderr=-1, text=True) as script:
             assert host.server.url in script.stderr.readline()
             host.server.hxasim("event", "port", "sfp-remove")
