@@ -27,12 +27,10 @@ fs::path library_folder()
     return dladdr(here, &info) != 0 && info.dli_fname ? fs::path(info.dli_fname).parent_path() : fs::path();
 }
 
-// The source folder comes first: who edits a shipped scenario there sees the change without a build.
 fs::path shipped(const std::string& name)
 {
     auto library = library_folder();
-    for (const fs::path& folder :
-         {fs::path(HXASIM_SCENARIO_FOLDER), library / "scenarios", library / "../share/hxasim/scenarios"})
+    for (const fs::path& folder : {library / "scenarios", library / HXASIM_INSTALLED_SCENARIOS})
     {
         auto path = folder / (name + ".json");
         std::error_code ignored;
