@@ -44,7 +44,11 @@ class Tools:
         self._undoing = True
 
     def say(self, text):
-        print(text, flush=True)
+        """Whether or not somebody still listens: a reader who left must not stop what is being undone."""
+        try:
+            print(text, flush=True)
+        except OSError:
+            sys.stdout = open(os.devnull, "w", encoding="utf-8")
 
     def find(self, program):
         """Its path, or None."""

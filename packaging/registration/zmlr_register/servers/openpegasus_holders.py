@@ -6,6 +6,7 @@ import re
 from ..catalogue import mof_blocks
 from ..schema_files import declared_classes
 from ..steps import Failed, Holder
+from .openpegasus_registration import providers_of
 
 
 class Module(Holder):
@@ -20,11 +21,21 @@ class Module(Holder):
     def _is_there(self):
         return self._server.catalogue.module in self._server.tools.ask("cimprovider", "-l").split()
 
+    def _missing(self, text):
+        """The providers of a registration that the server does not know."""
+        known = self._server.tools.ask("cimprovider", "-l", "-m", self._server.catalogue.module).split()
+        return [name for name in providers_of(text) if name not in known]
+
     def look(self):
-        return (self._server.store.read(self._FILE) or "") if self._is_there() else None
+        if not self._is_there():
+            return None
+        kept = self._server.store.read(self._FILE) or ""
+        return "" if self._missing(kept) else kept
 
     def put(self, text):
         self._server.load(self._server.interop, self._FILE, text)
+        if not self._server.tools.dry_run and self._missing(text):
+            raise Failed(f"the server did not take {', '.join(self._missing(text))}")
         self._server.store.write(self._FILE, text)
 
     def drop(self, text):
@@ -57,6 +68,9 @@ class Classes(Holder):
 
     def put(self, text):
         self._server.load(self._name_space, "zemlar.mof", text)
+        missing = mof_blocks(text).keys() - set(self._server.classes(self._name_space))
+        if missing and not self._server.tools.dry_run:
+            raise Failed(f"the server did not take {', '.join(sorted(missing))}")
         self._server.store.write(self._file, text)
 
     def drop(self, text):
@@ -98,7 +112,7 @@ class Schema(Holder):
     def put(self, text):
         self._server.store.write(self._FILE, text)  # first: also what was loaded in part is ours
         file = text.splitlines()[0]
-        self._server.tools.change("cimmof", "-n", self._name_space, "-I", pathlib.Path(file).parent, file)
+        self._server.tools.change("cimmof", "-aE", "-n", self._name_space, "-I", pathlib.Path(file).parent, file)
 
     def drop(self, text):
         """The name space too, when nothing else is left in it."""

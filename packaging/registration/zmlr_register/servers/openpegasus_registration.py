@@ -1,5 +1,7 @@
 """The instances that make OpenPegasus know the module: for its interop name space."""
 
+import re
+
 from ..catalogue import select_all
 
 # The values of PG_ProviderCapabilities.ProviderType and of PG_ProviderModule.UserContext.
@@ -47,6 +49,11 @@ def registration_mof(catalogue, selection):
                                       name_spaces=", ".join(f'"{name}"' for name in selection.name_spaces(cls)),
                                       kinds=", ".join(str(_KINDS[kind]) for kind in cls.kinds)))
     return "".join(texts)
+
+
+def providers_of(registration):
+    """The names of the providers of a registration."""
+    return re.findall(r'^    ProviderName +=  *"(\w+)"', registration, re.MULTILINE)
 
 
 def full_registration(catalogue):
