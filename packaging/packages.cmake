@@ -3,7 +3,7 @@
 
 # component  package         section   architecture  depends on, beside the shared libraries  recommends
 set(packages
-  "provider   |zmlr-provider  |admin    |any |procps, tftp-hpa                                 |"
+  "provider   |zmlr-provider  |admin    |any |procps, python3:any, tftp-hpa                    |"
   "library    |libhxal1       |libs     |any |                                                 |"
   "development|libhxal-dev    |libdevel |any |libhxal1 (= ${PROJECT_VERSION})                  |"
   "tools      |hxa            |admin    |any |                                                 |"
