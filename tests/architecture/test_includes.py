@@ -32,6 +32,7 @@ MAY_INCLUDE = {
     ],
     "cimserver": ["cmpi/standard", "cmpi/registration.h", "providers/interop_roots.def", "runtime/meta.h", "runtime/types.h", "text"],
     "sim": ["hxal/records", "hxal/commands.h"],
+    "cli": ["hxal", "text"],
 }
 
 # The floors inside a big folder: its sub-folder ("." is the folder itself): the sub-folders (or single files) of the same big
@@ -110,8 +111,14 @@ def test_every_sub_folder_has_a_floor(folder):
     assert sub_folders - FLOORS[folder].keys() == set()
 
 
-def test_one_source_of_the_simulator_sees_the_json_library():
-    sources = [path for path in (ROOT / "sim").rglob("*.*") if path.suffix in {".h", ".cpp"}]
+def test_command_line_sees_no_more_of_the_access_library_than_its_other_clients():
+    hidden = ("hxal/internal/", "hxal/config/internal/", "hxal/records/commands.h")
+    assert [f"{path}:{number}" for path, number, name in includes("cli") if name.startswith(hidden)] == []
+
+
+@pytest.mark.parametrize("folder", ["sim", "cli"])
+def test_one_source_sees_the_json_library(folder):
+    sources = [path for path in (ROOT / folder).rglob("*.*") if path.suffix in {".h", ".cpp"}]
     assert [path.name for path in sources if "<nlohmann/json.hpp>" in path.read_text(encoding="utf-8")] == ["json.cpp"]
 
 

@@ -1,0 +1,68 @@
+#include "cli/session.h"
+
+#include "cli/json.h"
+
+#include <fcntl.h>
+#include <unistd.h>
+
+#include <cerrno>
+#include <cstdio>
+#include <cstring>
+#include <iostream>
+
+namespace hxa
+{
+
+Session::Session(const Common_Options& options) : _options(options), _output(fcntl(STDOUT_FILENO, F_DUPFD_CLOEXEC, 3))
+{
+    std::setvbuf(stdout, nullptr, _IOLBF, BUFSIZ);
+    if (dup2(STDERR_FILENO, STDOUT_FILENO) < 0)
+        close(STDOUT_FILENO);
+}
+
+Session::~Session()
+{
+    std::fflush(stdout);
+    close(_output);
+}
+
+void Session::answer(const Value& tree, const std::string& text) { print(_options.json ? json_text(tree) : text); }
+
+void Session::answer_line(const Value& tree, const std::string& text) { print(_options.json ? json_line(tree) : text); }
+
+void Session::print(std::string_view text)
+{
+    while (!text.empty())
+    {
+        const auto written = write(_output, text.data(), text.size());
+        if (written < 0 && errno == EINTR)
+            continue;
+        if (written < 0)
+            throw Failure(Exit::refused, std::string("standard output: ") + std::strerror(errno));
+        text.remove_prefix(static_cast<std::size_t>(written));
+    }
+}
+
+void Session::confirm(const std::string& what_happens)
+{
+    if (_options.yes)
+        return;
+    if (!isatty(STDIN_FILENO) || !isatty(STDERR_FILENO))
+        throw Failure(Exit::not_confirmed, what_happens + " Nothing was done: there is no terminal to ask on, and no --yes.");
+    std::cerr << what_happens << " Go on? [y/N] " << std::flush;
+    std::string answer;
+    std::getline(std::cin, answer);
+    if (answer != "y" && answer != "Y" && answer != "yes")
+        throw Failure(Exit::not_confirmed, "Nothing was done.");
+}
+
+bool Session::accept(hxa_status_t status, const std::string& what)
+{
+    if (status == HXA_STATUS_OK)
+        return true;
+    std::cerr << "hxa: " << what << ": " << status_text(status) << '\n';
+    fail();
+    return false;
+}
+
+} // namespace hxa

@@ -1,0 +1,53 @@
+// What a command found out, as a tree: the same tree is printed as JSON and, through columns (report.h), as text.
+#pragma once
+
+#include <cstdint>
+#include <string>
+#include <string_view>
+#include <utility>
+#include <variant>
+#include <vector>
+
+namespace hxa
+{
+
+class Value;
+struct Member;
+
+using List = std::vector<Value>;
+using Object = std::vector<Member>; // in the order in which it is printed
+
+class Value
+{
+public:
+    using Data = std::variant<std::nullptr_t, bool, std::int64_t, std::uint64_t, double, std::string, List, Object>;
+
+    Value() = default; // nothing is known
+    Value(bool data) : _data(data) {}
+    Value(int data) : _data(std::int64_t{data}) {}
+    Value(unsigned data) : _data(std::uint64_t{data}) {}
+    Value(std::uint64_t data) : _data(data) {}
+    Value(double data) : _data(data) {}
+    Value(std::string data) : _data(std::move(data)) {}
+    Value(const char* data) : _data(std::string(data)) {}
+    Value(List data) : _data(std::move(data)) {}
+    Value(Object data) : _data(std::move(data)) {}
+
+    const Data& data() const { return _data; }
+    bool is_null() const { return _data.index() == 0; }
+
+    // The list, or the member of an object that a path like "fc.state" names; an empty one when there is none.
+    const List& list() const;
+    const Value& at(std::string_view path) const;
+
+private:
+    Data _data;
+};
+
+struct Member
+{
+    std::string key;
+    Value value;
+};
+
+} // namespace hxa
