@@ -69,10 +69,11 @@ class Tools:
         path = self.find(program)
         if not path:
             raise Failed(f"the program {program} is not there")
-        # A session of its own: a key pressed in the terminal must not cut a program in its middle.
+        # A session of its own: a key pressed in the terminal must not cut a program in its middle. Answers are read: no translations.
         try:
             result = subprocess.run([path, *map(str, words)], stdin=subprocess.DEVNULL, capture_output=True, text=True,
-                                    errors="replace", timeout=_TIME_LIMIT, start_new_session=True, check=False)
+                                    errors="replace", timeout=_TIME_LIMIT, start_new_session=True, check=False,
+                                    env={**os.environ, "LC_ALL": "C.UTF-8", "LANGUAGE": ""})
         except subprocess.TimeoutExpired as error:
             raise Failed(f"{program} {' '.join(map(str, words))}: no end after {_TIME_LIMIT} s") from error
         if result.returncode != 0:
