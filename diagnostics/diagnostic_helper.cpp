@@ -24,7 +24,7 @@ namespace
 
 constexpr const char* log_source = "DiagnosticHelper";
 
-Instance_Array tests(DiagnosticHelper&, classId_t id, const Inventory_Request& request)
+Instance_Array test_instances(DiagnosticHelper&, classId_t id, const Inventory_Request& request)
 {
     return getDiagnosticTestInstances(id, request);
 }
@@ -72,10 +72,10 @@ constexpr struct
     classId_t id;
     Instance_Array (*build)(DiagnosticHelper& helper, classId_t id, const Inventory_Request& request);
 } builders[] = {
-    {CLASSID_MemoryDiagnosticTest,             tests},
-    {CLASSID_LoopbackDiagnosticTest,           tests},
-    {CLASSID_PCILoopbackDiagnosticTest,        tests},
-    {CLASSID_EthLoopbackDiagnosticTest,        tests},
+    {CLASSID_MemoryDiagnosticTest,             test_instances},
+    {CLASSID_LoopbackDiagnosticTest,           test_instances},
+    {CLASSID_PCILoopbackDiagnosticTest,        test_instances},
+    {CLASSID_EthLoopbackDiagnosticTest,        test_instances},
     {CLASSID_DiagnosticSoftwareIdentity,       software_identity},
     {CLASSID_ConcreteJob,                      job},
     {CLASSID_DiagnosticServiceRecord,          service_records},

@@ -3,6 +3,7 @@
 #include "hxal/internal/adapter_list.h"
 #include "hxal/internal/aen_kinds.h"
 #include "hxal/internal/fixed_text.h"
+#include "hxal/internal/ioc_state.h"
 #include "hxal/internal/memory.h"
 
 #include <cstdio>
@@ -61,8 +62,6 @@ hxa_status_t delist(hxa_aen_category_t category, const void* cbhandle)
     return HXA_STATUS_FAILED;
 }
 
-bool is_ethernet(const hxal_t* ioc) { return ioc && ioc->ioc_type == HXA_IOC_TYPE_LL; }
-
 const hxal_t* first_ioc(const hxal_adapter_t* ad)
 {
     if (!ad)
@@ -86,7 +85,7 @@ hxa_status_t hxal_port_aen_register(const hxal_t* ioc, hxal_port_aen_cbfn_t cbfn
 {
     if (!data)
         return HXA_STATUS_EINVAL;
-    const Filter filter = is_ethernet(ioc) ? Filter{.mac = data->mac} : Filter{.wwn = data->pwwn};
+    const Filter filter = hxal::is_ethernet(ioc) ? Filter{.mac = data->mac} : Filter{.wwn = data->pwwn};
     return enlist(HXA_AEN_CAT_PORT, ioc, cbfn, userData, filter, cbhandle);
 }
 

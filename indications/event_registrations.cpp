@@ -20,7 +20,7 @@ constexpr uint32_t full_form = 2;
 constexpr const char* any_adapter = "any"; // stands for the serial number of what is yet to come
 
 constexpr Walk_Row all_adapters = {
-    .log_source = log_source,
+    .source = log_source,
     .iocs = Iocs::any,
     .count = {LL_INFO, "Number of adapters: %d"},
     .none = {LL_ERR, "No adapters are found! Registration did NOT happen."},

@@ -18,8 +18,8 @@ namespace
 
 constexpr const char* log_source = "AdapterHelper";
 
-constexpr Walk_Row walk = {
-    .log_source = log_source,
+constexpr Walk_Row adapter_walk = {
+    .source = log_source,
     .iocs = Iocs::of_card,
     .count = {LL_INFO, "Number of Adapters: %d"},
     .none = {LL_INFO, "No adapters in the system!"},
@@ -107,7 +107,7 @@ void append_software(Instance_Array& instances, Adapter_Reading& reading)
     instances.adopt(getAdapterSoftwareIdentityInstance(adapter.info, SOFTWARE_FIRMWARE, false));
 }
 
-constexpr Builder<Adapter_Reading> builders[] = {
+constexpr Builder<Adapter_Reading> adapter_builders[] = {
     {CLASSID_PortController, append_controller},
     {CLASSID_PhysicalPackage, append_package},
     {CLASSID_Product, append_product},
@@ -126,7 +126,7 @@ Instance_Array AdapterHelper::getInstancesByClass(classId_t id, const Inventory_
 {
     const Scope_Trace trace(log_source);
     Instance_Array instances;
-    Adapter_Walk adapters(walk);
+    Adapter_Walk adapters(adapter_walk);
     if (adapters.count() == 0)
         return instances;
 
@@ -134,14 +134,14 @@ Instance_Array AdapterHelper::getInstancesByClass(classId_t id, const Inventory_
     bool storage_driver_is_told = false;
     while (adapters.next())
     {
-        std::optional<Open_Port> port = open_port(walk, adapters.adapter(), 0);
+        std::optional<Open_Port> port = open_port(adapter_walk, adapters.adapter(), 0);
         if (!port || !request.wanted.may_be_of(*port))
             continue;
         std::optional<Hba_Reading> adapter = read_hba(adapters.adapter(), std::move(*port), request);
         if (!adapter)
             continue;
         Adapter_Reading reading = {*adapter, request.wanted, network_driver_is_told, storage_driver_is_told};
-        build(instances, builders, id, reading, log_source, "Default case . Other classes ");
+        build(instances, adapter_builders, id, reading, log_source, "Default case . Other classes ");
     }
     ZMLR_LOG(LL_INFO, "Number of instances: %d", static_cast<int>(instances.size()));
     return instances;

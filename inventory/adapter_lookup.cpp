@@ -17,16 +17,16 @@ constexpr const char* log_source = "ProviderUtil";
 
 constexpr Walk_Line not_opened = {LL_ERR, "Unable to open handle to Adapter id %d"};
 
-constexpr Walk_Row port_0_of_card = {.log_source = log_source, .iocs = Iocs::of_card, .not_opened = not_opened};
+constexpr Walk_Row port_0_of_card = {.source = log_source, .iocs = Iocs::of_card, .not_opened = not_opened};
 
-constexpr Walk_Row first_ioc = {.log_source = log_source, .iocs = Iocs::any, .not_opened = not_opened};
+constexpr Walk_Row first_ioc = {.source = log_source, .iocs = Iocs::any, .not_opened = not_opened};
 
-constexpr Walk_Row first_answer = {.log_source = log_source, .iocs = Iocs::any, .none = {LL_WARN, "No adapters in the system!"}};
+constexpr Walk_Row first_answer = {.source = log_source, .iocs = Iocs::any, .none = {LL_WARN, "No adapters in the system!"}};
 
 constexpr Walk_Row by_address(Iocs iocs)
 {
     return {
-        .log_source = log_source,
+        .source = log_source,
         .iocs = iocs,
         .ends_at_unopened = true,
         .none = {LL_WARN, "No adapters in the system!"},

@@ -9,7 +9,7 @@ namespace
 // The values that a line has no place for are left over.
 template <class... Values> void say(const Walk_Row& row, const Walk_Line& line, Values... values)
 {
-    const char* const log_source = row.log_source;
+    const char* const log_source = row.source;
     if (line.text)
         ZMLR_LOG(line.level, line.text, values...);
 }

@@ -36,7 +36,7 @@ enum class Iocs
 
 struct Walk_Row
 {
-    const char* log_source = nullptr;
+    const char* source = nullptr;
     Iocs iocs = Iocs::any;
     bool ends_at_unopened = false; // instead of going on with the next adapter
 

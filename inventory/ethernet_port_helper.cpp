@@ -17,8 +17,8 @@ namespace
 
 constexpr const char* log_source = "EthernetPortHelper";
 
-constexpr Walk_Row walk = {
-    .log_source = log_source,
+constexpr Walk_Row ethernet_walk = {
+    .source = log_source,
     .iocs = Iocs::ethernet,
     .none = {LL_INFO, "No adapters in the system. "},
     .no_cna = {LL_INFO, "Adapter is not of CNA type. Continuing with the next one."},
@@ -62,7 +62,7 @@ void append_endpoint(Instance_Array& instances, Ethernet_Reading& reading)
     instances.adopt(getLANEndpointInstance(reading.info));
 }
 
-constexpr Builder<Ethernet_Reading> builders[] = {
+constexpr Builder<Ethernet_Reading> ethernet_builders[] = {
     {CLASSID_EthernetPort, append_port},
     {CLASSID_LANEndpoint, append_endpoint},
 };
@@ -70,12 +70,12 @@ constexpr Builder<Ethernet_Reading> builders[] = {
 void append(Instance_Array& instances, classId_t id, const Open_Adapter& adapter, const Inventory_Request& request)
 {
     const Scope_Trace trace(log_source, "getInstancesByAdapterId");
-    for (Port_Walk ports(walk, adapter); ports.next();)
+    for (Port_Walk ports(ethernet_walk, adapter); ports.next();)
     {
         if (!request.wanted.may_be_of(ports.port()))
             continue;
         if (std::optional<Ethernet_Reading> reading = read_ethernet_port(ports.port(), request))
-            build(instances, builders, id, *reading, log_source, "Unhandled class support");
+            build(instances, ethernet_builders, id, *reading, log_source, "Unhandled class support");
     }
 }
 
@@ -91,7 +91,7 @@ Instance_Array EthernetPortHelper::getInstancesByClass(classId_t id, const Inven
 {
     const Scope_Trace trace(log_source);
     Instance_Array instances;
-    for (Adapter_Walk adapters(walk); adapters.next();)
+    for (Adapter_Walk adapters(ethernet_walk); adapters.next();)
         append(instances, id, adapters.adapter(), request);
     return instances;
 }
@@ -99,7 +99,7 @@ Instance_Array EthernetPortHelper::getInstancesByClass(classId_t id, const Inven
 Instance_Array EthernetPortHelper::getInstancesByAdapterId(int index, classId_t id, const Inventory_Request& request) const
 {
     Instance_Array instances;
-    if (const std::optional<Open_Adapter> adapter = open_adapter(walk, index))
+    if (const std::optional<Open_Adapter> adapter = open_adapter(ethernet_walk, index))
         append(instances, id, *adapter, request);
     return instances;
 }

@@ -12,14 +12,14 @@ namespace
 
 constexpr const char* log_source = "HDRManager";
 
-Instance_Array port(classId_t id, const Inventory_Request& request)
+Instance_Array storage(classId_t id, const Inventory_Request& request)
 {
     return PortHelper::getPortHelperObject().getInstancesByClass(id, request);
 }
 
-constexpr Route routes[] = {
-    {CLASSID_StorageExtent, CLASSID_StorageExtent, Driver::needed, port},
-    {CLASSID_TapeDrive, CLASSID_TapeDrive, Driver::needed, port},
+constexpr Route storage_routes[] = {
+    {CLASSID_StorageExtent, CLASSID_StorageExtent, Driver::needed, storage},
+    {CLASSID_TapeDrive, CLASSID_TapeDrive, Driver::needed, storage},
 };
 
 } // namespace
@@ -34,7 +34,7 @@ const HDRManager& HDRManager::getHDRManager()
 
 Instance_Array HDRManager::getInstances(classId_t id, const Inventory_Request& request) const
 {
-    return dispatch(log_source, routes, id, request);
+    return dispatch(log_source, storage_routes, id, request);
 }
 
 } // namespace zmlr

@@ -16,8 +16,8 @@ namespace
 
 constexpr const char* log_source = "PhysicalAssetHelper";
 
-constexpr Walk_Row walk = {
-    .log_source = log_source,
+constexpr Walk_Row module_walk = {
+    .source = log_source,
     .iocs = Iocs::of_card,
     .none = {LL_INFO, "No adapters in the system. "},
     .not_opened = {LL_ERR, "ERROR: Unable to open handle to Adapter id %d"},
@@ -29,7 +29,7 @@ constexpr Walk_Row walk = {
 
 void append_connector(Instance_Array& instances, const _sfpInfo& info) { instances.adopt(getPhysicalConnectorInstance(info)); }
 
-constexpr Builder<const _sfpInfo> builders[] = {
+constexpr Builder<const _sfpInfo> module_builders[] = {
     {CLASSID_PhysicalConnector, append_connector},
 };
 
@@ -45,7 +45,7 @@ bool may_be_in(const Open_Port& port, const Wanted& wanted)
     return wanted.may_end_with(end);
 }
 
-void append(Instance_Array& instances, classId_t id, const Open_Adapter& adapter, const Open_Port& port)
+void append_module(Instance_Array& instances, classId_t id, const Open_Adapter& adapter, const Open_Port& port)
 {
     sfp_mem_t memory = {};
     const hxal_t* ioc = port.ethernet ? port.ethernet.get() : port.fc.get();
@@ -55,7 +55,7 @@ void append(Instance_Array& instances, classId_t id, const Open_Adapter& adapter
         return;
     }
     const _sfpInfo info = sfp_info(memory, adapter.is_cna, adapter.index, port.index);
-    build(instances, builders, id, info, log_source, "Default case . Other classes ");
+    build(instances, module_builders, id, info, log_source, "Default case . Other classes ");
 }
 
 } // namespace
@@ -70,12 +70,12 @@ Instance_Array PhysicalAssetHelper::getInstancesByClass(classId_t id, const Inve
 {
     const Scope_Trace trace(log_source);
     Instance_Array instances;
-    for (Adapter_Walk adapters(walk); adapters.next();)
+    for (Adapter_Walk adapters(module_walk); adapters.next();)
     {
-        for (Port_Walk ports(walk, adapters.adapter()); ports.next();)
+        for (Port_Walk ports(module_walk, adapters.adapter()); ports.next();)
         {
             if (may_be_in(ports.port(), request.wanted))
-                append(instances, id, adapters.adapter(), ports.port());
+                append_module(instances, id, adapters.adapter(), ports.port());
         }
     }
     return instances;

@@ -14,7 +14,7 @@ namespace
 
 constexpr const char* log_source = "PortHelper";
 
-constexpr Walk_Row walk = {.log_source = log_source, .iocs = Iocs::of_card};
+constexpr Walk_Row disabled_walk = {.source = log_source, .iocs = Iocs::of_card};
 
 bool is_mac(const String& address) { return address.size() == ProviderUtil::mac_text_size - 1; }
 
@@ -90,10 +90,10 @@ bool isPortDisabled(const String& address)
         return false;
     }
     const int index = adapter_of(address);
-    const std::optional<Open_Adapter> adapter = index < 1 ? std::nullopt : open_adapter(walk, index);
+    const std::optional<Open_Adapter> adapter = index < 1 ? std::nullopt : open_adapter(disabled_walk, index);
     if (!adapter)
         return false;
-    for (Port_Walk ports(walk, *adapter); ports.next();)
+    for (Port_Walk ports(disabled_walk, *adapter); ports.next();)
     {
         if (has_address(ports.port(), address))
             return is_disabled(ports.port());

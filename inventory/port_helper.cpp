@@ -25,8 +25,8 @@ namespace
 
 constexpr const char* log_source = "PortHelper";
 
-constexpr Walk_Row walk = {
-    .log_source = log_source,
+constexpr Walk_Row port_walk = {
+    .source = log_source,
     .iocs = Iocs::fc,
     .none = {LL_INFO, "No adapters in the system. "},
     .not_opened = {LL_ERR, "ERROR: Unable to open handle to Adapter id %d"},
@@ -105,7 +105,7 @@ template <classId_t id> void append_units(Instance_Array& instances, const Port_
     instances.adopt(targets.getTargetInstances(reading.port.fc.get(), reading.info, id, reading.request));
 }
 
-constexpr Builder<const Port_Reading> builders[] = {
+constexpr Builder<const Port_Reading> port_builders[] = {
     {CLASSID_FCPort, append_port},
     {CLASSID_SCSIProtocolEndpoint, append_endpoints},
     {CLASSID_FCPortStatistics, append_statistics},
@@ -115,15 +115,15 @@ constexpr Builder<const Port_Reading> builders[] = {
     {CLASSID_AlarmDevice, append_alarm_device},
 };
 
-void append(Instance_Array& instances, classId_t id, const Open_Adapter& adapter, const Inventory_Request& request)
+void append_ports(Instance_Array& instances, classId_t id, const Open_Adapter& adapter, const Inventory_Request& request)
 {
     const Scope_Trace trace(log_source, "getInstancesByAdapterId");
-    for (Port_Walk ports(walk, adapter); ports.next();)
+    for (Port_Walk ports(port_walk, adapter); ports.next();)
     {
         if (!request.wanted.may_be_of(ports.port()))
             continue;
         if (const std::optional<Port_Reading> reading = read_port(adapter, ports.port(), request))
-            build(instances, builders, id, *reading, log_source, "Unhandled class support");
+            build(instances, port_builders, id, *reading, log_source, "Unhandled class support");
     }
 }
 
@@ -139,16 +139,16 @@ Instance_Array PortHelper::getInstancesByClass(classId_t id, const Inventory_Req
 {
     const Scope_Trace trace(log_source);
     Instance_Array instances;
-    for (Adapter_Walk adapters(walk); adapters.next();)
-        append(instances, id, adapters.adapter(), request);
+    for (Adapter_Walk adapters(port_walk); adapters.next();)
+        append_ports(instances, id, adapters.adapter(), request);
     return instances;
 }
 
 Instance_Array PortHelper::getInstancesByAdapterId(int index, classId_t id, const Inventory_Request& request) const
 {
     Instance_Array instances;
-    if (const std::optional<Open_Adapter> adapter = open_adapter(walk, index))
-        append(instances, id, *adapter, request);
+    if (const std::optional<Open_Adapter> adapter = open_adapter(port_walk, index))
+        append_ports(instances, id, *adapter, request);
     return instances;
 }
 

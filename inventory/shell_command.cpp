@@ -92,9 +92,9 @@ void take_default_signals()
 bool take_descriptors(int status, int output)
 {
     constexpr int out_of_the_way = status_descriptor + 1;
-    const int from = fcntl(status, F_DUPFD, out_of_the_way);
-    const int to = output < 0 ? -1 : fcntl(output, F_DUPFD, out_of_the_way);
-    const int null = fcntl(open("/dev/null", O_RDWR), F_DUPFD, out_of_the_way);
+    const int from = ::fcntl(status, F_DUPFD, out_of_the_way);
+    const int to = output < 0 ? -1 : ::fcntl(output, F_DUPFD, out_of_the_way);
+    const int null = ::fcntl(::open("/dev/null", O_RDWR), F_DUPFD, out_of_the_way);
     if (dup2(null, STDIN_FILENO) < 0 || dup2(output < 0 ? null : to, STDOUT_FILENO) < 0 || dup2(null, STDERR_FILENO) < 0 ||
         dup3(from, status_descriptor, O_CLOEXEC) < 0)
         return false;
@@ -152,7 +152,7 @@ std::size_t read_bytes(const Descriptor& pipe, void* out, std::size_t size, Cloc
 {
     if (!wait_for_bytes(pipe, deadline))
         return 0;
-    const ssize_t n = read(pipe.number, out, size);
+    const ssize_t n = ::read(pipe.number, out, size);
     return n > 0 ? static_cast<std::size_t>(n) : 0;
 }
 

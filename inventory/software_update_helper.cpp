@@ -34,7 +34,7 @@ void append_capabilities(Instance_Array& instances, const _hbaInfo& info)
     instances.adopt(getHBASoftwareInstallationServiceCapabilitiesInstance(info));
 }
 
-constexpr Builder<const _hbaInfo> builders[] = {
+constexpr Builder<const _hbaInfo> software_builders[] = {
     {CLASSID_HBASoftwareInstallationService, append_service},
     {CLASSID_HBASoftwareInstallationServiceCapabilities, append_capabilities},
 };
@@ -86,7 +86,7 @@ Instance_Array SoftwareUpdateHelper::getInstancesByClass(classId_t id, const Inv
     copy_text(info.host, request.host.text());
     const _hbaInfo& reading = info;
     Instance_Array instances;
-    build(instances, builders, id, reading, log_source, "Default case . Other classes ");
+    build(instances, software_builders, id, reading, log_source, "Default case . Other classes ");
     ZMLR_LOG(LL_INFO, "Number of instances: %d", static_cast<int>(instances.size()));
     return instances;
 }

@@ -14,14 +14,14 @@ namespace
 
 constexpr const char* log_source = "ServerManager";
 
-Instance_Array profiles(classId_t, const Inventory_Request&) { return getRegisteredProfileInstances(); }
-Instance_Array subprofiles(classId_t, const Inventory_Request&) { return getRegisteredSubProfileInstances(); }
+Instance_Array registered(classId_t, const Inventory_Request&) { return getRegisteredProfileInstances(); }
+Instance_Array subregistered(classId_t, const Inventory_Request&) { return getRegisteredSubProfileInstances(); }
 Instance_Array software(classId_t, const Inventory_Request&) { return getProfileSoftwareIdentityInstances(); }
 
 // clang-format off
 constexpr Route routes[] = {
-    {CLASSID_RegisteredProfile,            CLASSID_RegisteredProfile,            Driver::not_needed, profiles},
-    {CLASSID_RegisteredSubProfile,         CLASSID_RegisteredSubProfile,         Driver::not_needed, subprofiles},
+    {CLASSID_RegisteredProfile,            CLASSID_RegisteredProfile,            Driver::not_needed, registered},
+    {CLASSID_RegisteredSubProfile,         CLASSID_RegisteredSubProfile,         Driver::not_needed, subregistered},
     {CLASSID_Namespace,                    CLASSID_Namespace,                    Driver::not_needed, getNamespaceInstances},
     {CLASSID_ObjectManager,                CLASSID_ObjectManager,                Driver::not_needed, getObjectManagerInstance},
     {CLASSID_CIMXMLCommunicationMechanism, CLASSID_CIMXMLCommunicationMechanism, Driver::not_needed, getCIMXMLCommunicationMechanismInstance},

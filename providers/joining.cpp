@@ -29,7 +29,7 @@ void drop_others(Instance_Array& elements, const Meta_Class* meta_class)
 
 Joining::Joining(const Join& row, const char* log_source, Deliver deliver)
     : _row(row)
-    , _log_source(log_source)
+    , _source(log_source)
     , _deliver(std::move(deliver))
 {
 }
@@ -43,7 +43,7 @@ bool Joining::ask(std::size_t i, const Instance* owner)
     drop_others(elements, side.meta_class);
 
     if (is_several && side.several.text)
-        say({&side.several, 1}, _log_source);
+        say({&side.several, 1}, _source);
     else if (elements.empty() || is_several)
         say_none(i);
     return !is_several && (!elements.empty() || side.need == Need::any);
@@ -60,11 +60,11 @@ bool Joining::ask_all()
     return true;
 }
 
-void Joining::say_none(std::size_t side) const { say(_row.sides[side].none, _log_source); }
+void Joining::say_none(std::size_t side) const { say(_row.sides[side].none, _source); }
 
 void Joining::say_building() const
 {
-    const char* const log_source = _log_source;
+    const char* const log_source = _source;
     ZMLR_LOG(LL_DBG, "Building and returning association instances");
 }
 

@@ -38,11 +38,11 @@ public:
     bool pair(std::size_t side, Instance* element, std::size_t other_side, Instance* other);
     bool deliver(Ref<Instance> association) { return _deliver(association.steal()); }
 
-    const char* log_source() const { return _log_source; }
+    const char* source() const { return _source; }
 
 private:
     const Join& _row;
-    const char* _log_source;
+    const char* _source;
     Deliver _deliver;
     Inventory_Request _request;
     std::optional<Instance_Array> _elements[max_sides];

@@ -30,7 +30,7 @@ bool is_internal_loopback(const ZEMLAR_DiagnosticTest& test)
 // False when the match is to end.
 bool pair_with_tests(Joining& joining, const ZEMLAR_PortController& adapter, Instance* port)
 {
-    const char* const log_source = joining.log_source();
+    const char* const log_source = joining.source();
     for (uint32 i = 0; i < joining[tests].size(); i++)
     {
         auto* test = joining.at<ZEMLAR_DiagnosticTest>(tests, i);

@@ -178,8 +178,7 @@ void software_on_controllers(Joining& joining)
         for (const uint32 i : candidates)
         {
             auto* software = joining.at<ZEMLAR_AdapterSoftwareIdentity>(identities, i);
-            if (runs_on(*software, *controller, joining.log_source()) &&
-                !joining.pair(identities, software, controllers, controller))
+            if (runs_on(*software, *controller, joining.source()) && !joining.pair(identities, software, controllers, controller))
                 return;
         }
     }

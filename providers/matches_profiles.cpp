@@ -45,7 +45,7 @@ bool add_element(Joining& joining, ZEMLAR_RegisteredProfile* profile)
 
 void conforming_elements(Joining& joining)
 {
-    const char* const log_source = joining.log_source();
+    const char* const log_source = joining.source();
     if (!joining.ask(profiles))
         return;
     Instance* standard_profile = nullptr;

@@ -15,7 +15,7 @@ namespace zmlr
 namespace
 {
 
-constexpr uint32 min_capacity = 4096;
+constexpr uint32 min_buffer_capacity = 4096;
 
 } // namespace
 
@@ -25,7 +25,7 @@ void Buffer::reserve(std::size_t n)
 {
     if (_data && n <= _cap)
         return;
-    const std::size_t cap = _next_pow_2(n, min_capacity);
+    const std::size_t cap = _next_pow_2(n, min_buffer_capacity);
     auto* grown = static_cast<char*>(::operator new(cap + 1));
     if (_size > 0)
         std::memcpy(grown, _data, _size);

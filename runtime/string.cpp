@@ -17,7 +17,7 @@ namespace zmlr
 namespace
 {
 
-constexpr uint32 min_capacity = 32;
+constexpr uint32 min_text_capacity = 32;
 
 // The one representation of all empty strings. Its count of 2 marks it as shared, so that every change copies it, and is
 // never changed, so that threads do not contend for it.
@@ -28,20 +28,20 @@ struct Empty_Rep
 };
 static_assert(offsetof(Empty_Rep, terminator) == sizeof(__String_Rep));
 
-constinit Empty_Rep empty_rep = {{{2}, 0, 0}, {}};
+constinit Empty_Rep empty_text = {{{2}, 0, 0}, {}};
 
 bool is_shared(const __String_Rep* rep) { return Atomic_get(&rep->refs) > 1; }
 
 __String_Rep* acquire(__String_Rep* rep)
 {
-    if (rep != &empty_rep.rep)
+    if (rep != &empty_text.rep)
         Atomic_inc(&rep->refs);
     return rep;
 }
 
 void release(__String_Rep* rep)
 {
-    if (rep != &empty_rep.rep && Atomic_dec_and_test(&rep->refs))
+    if (rep != &empty_text.rep && Atomic_dec_and_test(&rep->refs))
         ::operator delete(rep);
 }
 
@@ -57,7 +57,7 @@ std::string_view view(const char* text) { return text ? std::string_view(text) :
 // A new representation of at least this capacity that holds the pieces in their order.
 __String_Rep* make_rep(std::size_t capacity, std::initializer_list<std::string_view> pieces)
 {
-    const uint32 cap = _next_pow_2(capacity, min_capacity);
+    const uint32 cap = _next_pow_2(capacity, min_text_capacity);
     auto* rep = new (::operator new (sizeof(__String_Rep) + std::size_t{cap} + 1)) __String_Rep{{1}, 0, cap};
 
     char* end = rep->data();
@@ -72,7 +72,7 @@ __String_Rep* join(std::initializer_list<std::string_view> pieces)
     std::size_t size = 0;
     for (std::string_view piece : pieces)
         size += piece.size();
-    return size == 0 ? &empty_rep.rep : make_rep(size, pieces);
+    return size == 0 ? &empty_text.rep : make_rep(size, pieces);
 }
 
 void replace(__String_Rep*& rep, __String_Rep* by)
@@ -91,9 +91,9 @@ bool equal_ignoring_case(std::string_view a, std::string_view b)
 
 } // namespace
 
-String::String() noexcept : _rep(&empty_rep.rep) {}
+String::String() noexcept : _rep(&empty_text.rep) {}
 String::String(const String& x) noexcept : _rep(acquire(x._rep)) {}
-String::String(String&& x) noexcept : _rep(std::exchange(x._rep, &empty_rep.rep)) {}
+String::String(String&& x) noexcept : _rep(std::exchange(x._rep, &empty_text.rep)) {}
 String::String(const char* text) : _rep(join({view(text)})) {}
 String::String(const char* text, std::size_t size) : _rep(join({{text, size}})) {}
 String::String(const char* s1, std::size_t n1, const char* s2, std::size_t n2) : _rep(join({{s1, n1}, {s2, n2}})) {}
@@ -158,7 +158,7 @@ void String::append(const char* text, std::size_t size)
         return;
 
     const std::size_t new_size = _rep->size + size;
-    if (is_shared(_rep) || _rep->cap < _next_pow_2(new_size, min_capacity))
+    if (is_shared(_rep) || _rep->cap < _next_pow_2(new_size, min_text_capacity))
         return replace(_rep, make_rep(new_size, {view(_rep), {text, size}}));
     std::memmove(_rep->data() + _rep->size, text, size);
     set_size(_rep, new_size);
@@ -191,7 +191,7 @@ String String::substr(uint32 pos, uint32 n) const
 void String::clear()
 {
     if (is_shared(_rep))
-        replace(_rep, &empty_rep.rep);
+        replace(_rep, &empty_text.rep);
     else
         set_size(_rep, 0);
 }

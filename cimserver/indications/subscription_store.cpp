@@ -17,7 +17,7 @@ namespace
 using Json = nlohmann::json;
 
 constexpr std::size_t max_file_bytes = std::size_t{64} << 20;
-constexpr int version = 1;
+constexpr int file_version = 1;
 constexpr const char* damaged = " is damaged: ";
 constexpr const char* remedy = " (move it away to start without subscriptions)";
 constexpr int max_depth = 8; // a subscription's reference has its keys at 5
@@ -115,7 +115,7 @@ bool refuse_deep(int depth, Json::parse_event_t, const Json&)
 
 Stored_Instances instances_of(const Json& json)
 {
-    if (json.at("version") != version)
+    if (json.at("version") != file_version)
         throw std::runtime_error("it is of another version");
     Stored_Instances stored;
     for (std::size_t kind = 0; kind < std::size(lists); ++kind)
@@ -166,7 +166,7 @@ Stored_Instances Subscription_Store::load() const
 // Texts are what a client sent, valid UTF-8 or not.
 void Subscription_Store::save(const Stored_Instances& instances) const
 {
-    Json json = {{"version", version}};
+    Json json = {{"version", file_version}};
     for (std::size_t kind = 0; kind < std::size(lists); ++kind)
     {
         Json& list = json[lists[kind].name] = Json::array();

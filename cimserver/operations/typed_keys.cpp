@@ -12,10 +12,10 @@ namespace
 // References in references: no class of any schema comes near this depth, a hostile request may.
 constexpr int max_depth = 8;
 
-class Converter
+class Key_Converter
 {
 public:
-    explicit Converter(const Repository& repository) : _repository(repository) {}
+    explicit Key_Converter(const Repository& repository) : _repository(repository) {}
 
     std::vector<Named_Value> keys(const Class_Entry& entry, const Object_Path& path)
     {
@@ -88,12 +88,12 @@ private:
 Value::Content typed_reference(const Repository& repository, const zmlr::Meta_Reference& reference, const Value& value,
                                const std::string& name_space)
 {
-    return Converter(repository).reference_content(value, reference, name_space);
+    return Key_Converter(repository).reference_content(value, reference, name_space);
 }
 
 std::vector<Named_Value> typed_keys(const Repository& repository, const Class_Entry& entry, const Object_Path& path)
 {
-    return Converter(repository).keys(entry, path);
+    return Key_Converter(repository).keys(entry, path);
 }
 
 } // namespace cimserver

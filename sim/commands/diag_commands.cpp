@@ -181,13 +181,13 @@ constexpr auto ping = [](auto& record) { return std::tie(record.cnt, record.patt
 constexpr auto queue = [](auto& record) { return std::tie(record.queue); };
 constexpr auto led_test = [](auto& record) { return std::tie(record.ledtest); };
 constexpr auto beacon = [](auto& record) { return std::tie(record.beacon, record.link_e2e_beacon, record.second); };
-constexpr auto buffers = [](const auto& record) {
+constexpr auto diag_buffers = [](const auto& record) {
     return std::vector{Buffer{record.buf_ptr, sizeof(std::uint32_t) * std::uint64_t{record.nwords}}};
 };
 
 // clang-format off
-constexpr Row rows[] = {
-    ioc_row<answer_register_read>(    "IOCMD_DIAG_REGREAD",     registers, buffers),
+constexpr Row diag_table[] = {
+    ioc_row<answer_register_read>(    "IOCMD_DIAG_REGREAD",     registers, diag_buffers),
     ioc_row<answer_register_write>(   "IOCMD_DIAG_REGWRITE",    register_word),
     ioc_row<answer_temperature>(      "IOCMD_DIAG_TEMP"),
     ioc_row<answer_memory_test>(      "IOCMD_DIAG_MEMTEST",     memory_test),
@@ -203,6 +203,6 @@ constexpr Row rows[] = {
 
 } // namespace
 
-std::span<const Row> diag_rows() { return rows; }
+std::span<const Row> diag_rows() { return diag_table; }
 
 } // namespace hxasim

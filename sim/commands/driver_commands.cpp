@@ -31,7 +31,7 @@ void answer_instances(Call& call, hxa_ioctl_ioc_get_inst_t& record)
 }
 
 // clang-format off
-constexpr Row rows[] = {
+constexpr Row driver_table[] = {
     driver_row<answer_version>(  "IOCMD_IOC_GET_VERSION"),
     driver_row<answer_instances>("IOCMD_IOC_GET_INST"),
 };
@@ -39,6 +39,6 @@ constexpr Row rows[] = {
 
 } // namespace
 
-std::span<const Row> driver_rows() { return rows; }
+std::span<const Row> driver_rows() { return driver_table; }
 
 } // namespace hxasim

@@ -7,7 +7,7 @@ namespace hxasim
 namespace
 {
 
-void answer_attributes(Call& call, hxa_ioctl_ethport_attr_t& record)
+void answer_ethport_attributes(Call& call, hxa_ioctl_ethport_attr_t& record)
 {
     const auto& ioc = *call.ioc;
     if (!ioc.adapter->converged())
@@ -22,7 +22,7 @@ void answer_attributes(Call& call, hxa_ioctl_ethport_attr_t& record)
     field.speed = field.port_state == HXA_PPORT_ST_LINKUP ? ioc.port->speed : std::uint32_t{HXA_PPORT_SPEED_UNKNOWN};
 }
 
-void answer_statistics(Call& call, hxa_ioctl_ethport_stats_t& record)
+void answer_ethport_statistics(Call& call, hxa_ioctl_ethport_stats_t& record)
 {
     if (!call.ioc->adapter->converged())
         record.status = HXA_STATUS_CMD_NOTSUPP;
@@ -31,14 +31,14 @@ void answer_statistics(Call& call, hxa_ioctl_ethport_stats_t& record)
 }
 
 // clang-format off
-constexpr Row rows[] = {
-    ioc_row<answer_attributes>("IOCMD_ETHPORT_GET_ATTR"),
-    ioc_row<answer_statistics>("IOCMD_ETHPORT_GET_STATS"),
+constexpr Row ethport_table[] = {
+    ioc_row<answer_ethport_attributes>("IOCMD_ETHPORT_GET_ATTR"),
+    ioc_row<answer_ethport_statistics>("IOCMD_ETHPORT_GET_STATS"),
 };
 // clang-format on
 
 } // namespace
 
-std::span<const Row> ethport_rows() { return rows; }
+std::span<const Row> ethport_rows() { return ethport_table; }
 
 } // namespace hxasim

@@ -50,7 +50,7 @@ constexpr auto application = [](auto& record) { return std::tie(record.app_id); 
 constexpr auto room = [](auto& record) { return std::tie(record.aen_count, record.app_id); };
 
 // clang-format off
-constexpr Row rows[] = {
+constexpr Row event_table[] = {
     driver_row<answer_sync>("IOCMD_AEN_SYNC", application),
     ioc_row<answer_fetch>(  "IOCMD_AEN_GET",  room),
 };
@@ -58,6 +58,6 @@ constexpr Row rows[] = {
 
 } // namespace
 
-std::span<const Row> event_rows() { return rows; }
+std::span<const Row> event_rows() { return event_table; }
 
 } // namespace hxasim

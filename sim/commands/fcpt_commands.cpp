@@ -108,16 +108,16 @@ constexpr auto frame = [](auto& record)
     return std::tie(record.vf_id, record.lpwwn, record.dpwwn, record.tsecs, record.cts, record.cos, record.fchs,
                     record.nport_nexus_needed, record.reqsz, record.rspsz, record.reqbuf_ptr, record.rspbuf_ptr);
 };
-constexpr auto buffers = [](const auto& record) { return std::vector{Buffer{record.rspbuf_ptr, record.rspsz}}; };
+constexpr auto fcpt_buffers = [](const auto& record) { return std::vector{Buffer{record.rspbuf_ptr, record.rspsz}}; };
 
 // clang-format off
-constexpr Row rows[] = {
-    ioc_row<answer_pass_through>("IOCMD_FCPT", frame, buffers),
+constexpr Row fcpt_table[] = {
+    ioc_row<answer_pass_through>("IOCMD_FCPT", frame, fcpt_buffers),
 };
 // clang-format on
 
 } // namespace
 
-std::span<const Row> fcpt_rows() { return rows; }
+std::span<const Row> fcpt_rows() { return fcpt_table; }
 
 } // namespace hxasim

@@ -31,7 +31,7 @@ Flash_Partition* partition_for_buffer(const Call& call, hxa_ioctl_flash_t& recor
     return nullptr;
 }
 
-void answer_attributes(Call& call, hxa_ioctl_flash_attr_t& record)
+void answer_flash_attributes(Call& call, hxa_ioctl_flash_attr_t& record)
 {
     const auto& partitions = call.ioc->adapter->flash.partitions;
     record.attr.npart = static_cast<std::uint32_t>(partitions.size());
@@ -93,24 +93,24 @@ void answer_optrom_disable(Call& call, hxa_ioctl_gen_t&) { call.ioc->adapter->fl
 constexpr auto partition = [](auto& record) { return std::tie(record.instance, record.type); };
 constexpr auto partition_data = [](auto& record) { return std::tie(record.instance, record.type, record.buf_ptr, record.bufsz); };
 constexpr auto block = [](auto& record) { return std::tie(record.mfg_block); };
-constexpr auto buffers = [](const auto& record) {
+constexpr auto flash_buffers = [](const auto& record) {
     return std::vector{Buffer{record.buf_ptr, record.bufsz > 0 ? static_cast<std::uint32_t>(record.bufsz) : 0}};
 };
 
 // clang-format off
-constexpr Row rows[] = {
-    ioc_row<answer_attributes>(    "IOCMD_FLASH_GET_ATTR"),
-    ioc_row<answer_erase>(         "IOCMD_FLASH_ERASE_PART",     partition),
-    ioc_row<answer_update>(        "IOCMD_FLASH_UPDATE_PART",    partition_data),
-    ioc_row<answer_read>(          "IOCMD_FLASH_READ_PART",      partition_data, buffers),
-    ioc_row<answer_manufacturing>( "IOCMD_FLASH_MFG_INFO",       block),
-    ioc_row<answer_optrom_enable>( "IOCMD_FLASH_ENABLE_OPTROM"),
-    ioc_row<answer_optrom_disable>("IOCMD_FLASH_DISABLE_OPTROM"),
+constexpr Row flash_table[] = {
+    ioc_row<answer_flash_attributes>("IOCMD_FLASH_GET_ATTR"),
+    ioc_row<answer_erase>(           "IOCMD_FLASH_ERASE_PART",     partition),
+    ioc_row<answer_update>(          "IOCMD_FLASH_UPDATE_PART",    partition_data),
+    ioc_row<answer_read>(            "IOCMD_FLASH_READ_PART",      partition_data, flash_buffers),
+    ioc_row<answer_manufacturing>(   "IOCMD_FLASH_MFG_INFO",       block),
+    ioc_row<answer_optrom_enable>(   "IOCMD_FLASH_ENABLE_OPTROM"),
+    ioc_row<answer_optrom_disable>(  "IOCMD_FLASH_DISABLE_OPTROM"),
 };
 // clang-format on
 
 } // namespace
 
-std::span<const Row> flash_rows() { return rows; }
+std::span<const Row> flash_rows() { return flash_table; }
 
 } // namespace hxasim

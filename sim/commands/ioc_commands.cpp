@@ -118,7 +118,7 @@ void answer_info(Call& call, hxa_ioctl_ioc_info_t& record)
     record.ioc_type = ioc.type;
 }
 
-void answer_attributes(Call& call, hxa_ioctl_ioc_attr_t& record)
+void answer_ioc_attributes(Call& call, hxa_ioctl_ioc_attr_t& record)
 {
     auto& ioc = *call.ioc;
     record.attr.ioc_type = ioc.type;
@@ -155,13 +155,13 @@ void answer_disable(Call& call, hxa_ioctl_gen_t& record)
     start(ioc, HXA_IOC_DISABLING, HXA_IOC_DISABLED);
 }
 
-void answer_statistics(Call& call, hxa_ioctl_ioc_stats_t& record)
+void answer_ioc_statistics(Call& call, hxa_ioctl_ioc_stats_t& record)
 {
     ++call.ioc->stats.fw_stats.stats_reqs;
     record.stats = call.ioc->stats;
 }
 
-void answer_reset_statistics(Call& call, hxa_ioctl_gen_t&) { call.ioc->stats = {}; }
+void answer_ioc_reset_statistics(Call& call, hxa_ioctl_gen_t&) { call.ioc->stats = {}; }
 
 void answer_power(Call&, hxa_ioctl_ioc_power_t& record)
 {
@@ -179,21 +179,21 @@ constexpr auto power = [](auto& record) { return std::tie(record.power); };
 constexpr auto name = [](auto& record) { return std::tie(record.name); };
 
 // clang-format off
-constexpr Row rows[] = {
-    ioc_row<answer_enable>(          "IOCMD_IOC_ENABLE"),
-    ioc_row<answer_disable>(         "IOCMD_IOC_DISABLE"),
-    ioc_row<answer_attributes>(      "IOCMD_IOC_GET_ATTR"),
-    ioc_row<answer_info>(            "IOCMD_IOC_GET_INFO"),
-    ioc_row<answer_statistics>(      "IOCMD_IOC_GET_STATS"),
-    ioc_row<answer_reset_statistics>("IOCMD_IOC_RESET_STATS"),
-    ioc_row<answer_power>(           "IOCMD_IOC_SET_POWER",        power),
-    ioc_row<answer_adapter_name>(    "IOCMD_IOC_SET_ADAPTER_NAME", name),
-    ioc_row<answer_port_name>(       "IOCMD_IOC_SET_PORT_NAME",    name),
+constexpr Row ioc_table[] = {
+    ioc_row<answer_enable>(              "IOCMD_IOC_ENABLE"),
+    ioc_row<answer_disable>(             "IOCMD_IOC_DISABLE"),
+    ioc_row<answer_ioc_attributes>(      "IOCMD_IOC_GET_ATTR"),
+    ioc_row<answer_info>(                "IOCMD_IOC_GET_INFO"),
+    ioc_row<answer_ioc_statistics>(      "IOCMD_IOC_GET_STATS"),
+    ioc_row<answer_ioc_reset_statistics>("IOCMD_IOC_RESET_STATS"),
+    ioc_row<answer_power>(               "IOCMD_IOC_SET_POWER",        power),
+    ioc_row<answer_adapter_name>(        "IOCMD_IOC_SET_ADAPTER_NAME", name),
+    ioc_row<answer_port_name>(           "IOCMD_IOC_SET_PORT_NAME",    name),
 };
 // clang-format on
 
 } // namespace
 
-std::span<const Row> ioc_rows() { return rows; }
+std::span<const Row> ioc_rows() { return ioc_table; }
 
 } // namespace hxasim

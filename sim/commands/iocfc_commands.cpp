@@ -31,7 +31,7 @@ constexpr hxa_iocfc_drvcfg_t driver{.num_reqq_elems = 1024,
                                     .delay_comp = HXA_FALSE,
                                     .rsvd = 0};
 
-void answer_attributes(Call& call, hxa_ioctl_iocfc_attr_t& record)
+void answer_iocfc_attributes(Call& call, hxa_ioctl_iocfc_attr_t& record)
 {
     record.attr = {.fwcfg = firmware, .drvcfg = driver, .intr_attr = call.ioc->interrupts};
 }
@@ -46,27 +46,27 @@ void answer_interrupts(Call& call, hxa_ioctl_iocfc_intr_t& record)
     ++call.ioc->fc_stats.ioc_stats.ic_reqs;
 }
 
-void answer_statistics(Call& call, hxa_ioctl_iocfc_stats_t& record)
+void answer_iocfc_statistics(Call& call, hxa_ioctl_iocfc_stats_t& record)
 {
     ++call.ioc->fc_stats.ioc_stats.stats_reqs;
     record.stats = call.ioc->fc_stats;
 }
 
-void answer_reset_statistics(Call& call, hxa_ioctl_gen_t&) { call.ioc->fc_stats = {}; }
+void answer_iocfc_reset_statistics(Call& call, hxa_ioctl_gen_t&) { call.ioc->fc_stats = {}; }
 
 constexpr auto interrupts = [](auto& record) { return std::tie(record.attr); };
 
 // clang-format off
-constexpr Row rows[] = {
-    ioc_row<answer_attributes>(      "IOCMD_IOCFC_GET_ATTR"),
-    ioc_row<answer_statistics>(      "IOCMD_IOCFC_GET_STATS"),
-    ioc_row<answer_reset_statistics>("IOCMD_IOCFC_RESET_STATS"),
-    ioc_row<answer_interrupts>(      "IOCMD_IOCFC_SET_INTR",    interrupts),
+constexpr Row iocfc_table[] = {
+    ioc_row<answer_iocfc_attributes>(      "IOCMD_IOCFC_GET_ATTR"),
+    ioc_row<answer_iocfc_statistics>(      "IOCMD_IOCFC_GET_STATS"),
+    ioc_row<answer_iocfc_reset_statistics>("IOCMD_IOCFC_RESET_STATS"),
+    ioc_row<answer_interrupts>(            "IOCMD_IOCFC_SET_INTR",    interrupts),
 };
 // clang-format on
 
 } // namespace
 
-std::span<const Row> iocfc_rows() { return rows; }
+std::span<const Row> iocfc_rows() { return iocfc_table; }
 
 } // namespace hxasim

@@ -8,7 +8,7 @@ namespace hxasim
 namespace
 {
 
-void answer_attributes(Call& call, hxa_ioctl_itnim_attr_t& record)
+void answer_itnim_attributes(Call& call, hxa_ioctl_itnim_attr_t& record)
 {
     const auto* target = target_of(call, record, record.lpwwn, record.rpwwn);
     if (!target)
@@ -23,13 +23,13 @@ void answer_attributes(Call& call, hxa_ioctl_itnim_attr_t& record)
     record.attr.io_latency = nexus.latency;
 }
 
-void answer_statistics(Call& call, hxa_ioctl_itnim_stats_t& record)
+void answer_itnim_statistics(Call& call, hxa_ioctl_itnim_stats_t& record)
 {
     if (const auto* target = target_of(call, record, record.lpwwn, record.rpwwn))
         record.stats = target->nexus.counters.read();
 }
 
-void answer_reset_statistics(Call& call, hxa_ioctl_itnim_reset_stats_t& record)
+void answer_itnim_reset_statistics(Call& call, hxa_ioctl_itnim_reset_stats_t& record)
 {
     if (auto* target = target_of(call, record, record.lpwwn, record.rpwwn))
         target->nexus.counters.reset();
@@ -38,15 +38,15 @@ void answer_reset_statistics(Call& call, hxa_ioctl_itnim_reset_stats_t& record)
 constexpr auto nexus = [](auto& record) { return std::tie(record.vf_id, record.lpwwn, record.rpwwn); };
 
 // clang-format off
-constexpr Row rows[] = {
-    ioc_row<answer_attributes>(      "IOCMD_ITNIM_GET_ATTR",    nexus),
-    ioc_row<answer_statistics>(      "IOCMD_ITNIM_GET_STATS",   nexus),
-    ioc_row<answer_reset_statistics>("IOCMD_ITNIM_RESET_STATS", nexus),
+constexpr Row itnim_table[] = {
+    ioc_row<answer_itnim_attributes>(      "IOCMD_ITNIM_GET_ATTR",    nexus),
+    ioc_row<answer_itnim_statistics>(      "IOCMD_ITNIM_GET_STATS",   nexus),
+    ioc_row<answer_itnim_reset_statistics>("IOCMD_ITNIM_RESET_STATS", nexus),
 };
 // clang-format on
 
 } // namespace
 
-std::span<const Row> itnim_rows() { return rows; }
+std::span<const Row> itnim_rows() { return itnim_table; }
 
 } // namespace hxasim

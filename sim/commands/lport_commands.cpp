@@ -30,7 +30,7 @@ void put_fabric(hxa_port_attr_t& field, const Ioc& ioc, const Logical_Port& logi
         put_address(field.fpma_mac, fabric_mac(logical.address));
 }
 
-void answer_attributes(Call& call, hxa_ioctl_lport_attr_t& record)
+void answer_lport_attributes(Call& call, hxa_ioctl_lport_attr_t& record)
 {
     const auto* logical = logical_port_of(call, record, record.pwwn);
     if (!logical)
@@ -47,7 +47,7 @@ void answer_attributes(Call& call, hxa_ioctl_lport_attr_t& record)
         put_fabric(field, *call.ioc, *logical);
 }
 
-void answer_reset_statistics(Call& call, hxa_ioctl_lport_reset_stats_t& record)
+void answer_lport_reset_statistics(Call& call, hxa_ioctl_lport_reset_stats_t& record)
 {
     if (auto* logical = logical_port_of(call, record, record.pwwn))
         logical->counters.reset();
@@ -69,22 +69,22 @@ void answer_remote_ports(Call& call, hxa_ioctl_lport_get_rports_t& record)
     record.nrports = static_cast<std::uint32_t>(wwns.size() / sizeof(wwn_t));
 }
 
-constexpr auto logical_port = [](auto& record) { return std::tie(record.vf_id, record.pwwn); };
+constexpr auto lport_key = [](auto& record) { return std::tie(record.vf_id, record.pwwn); };
 constexpr auto list = [](auto& record) { return std::tie(record.vf_id, record.pwwn, record.rbuf_ptr, record.nrports); };
-constexpr auto buffers = [](const auto& record) {
+constexpr auto lport_buffers = [](const auto& record) {
     return std::vector{Buffer{record.rbuf_ptr, sizeof(wwn_t) * std::uint64_t{record.nrports}}};
 };
 
 // clang-format off
-constexpr Row rows[] = {
-    ioc_row<answer_attributes>(      "IOCMD_LPORT_GET_ATTR",    logical_port),
-    ioc_row<answer_reset_statistics>("IOCMD_LPORT_RESET_STATS", logical_port),
-    ioc_row<answer_remote_ports>(    "IOCMD_LPORT_GET_RPORTS",  list, buffers),
+constexpr Row lport_table[] = {
+    ioc_row<answer_lport_attributes>(      "IOCMD_LPORT_GET_ATTR",    lport_key),
+    ioc_row<answer_lport_reset_statistics>("IOCMD_LPORT_RESET_STATS", lport_key),
+    ioc_row<answer_remote_ports>(          "IOCMD_LPORT_GET_RPORTS",  list, lport_buffers),
 };
 // clang-format on
 
 } // namespace
 
-std::span<const Row> lport_rows() { return rows; }
+std::span<const Row> lport_rows() { return lport_table; }
 
 } // namespace hxasim

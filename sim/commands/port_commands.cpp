@@ -24,7 +24,7 @@ void put_fibre_channel(hxa_pport_attr_t& field, const Port& port, bool link_up)
     field.pid = address_field(port.base_port.address);
 }
 
-void answer_attributes(Call& call, hxa_ioctl_port_attr_t& record)
+void answer_port_attributes(Call& call, hxa_ioctl_port_attr_t& record)
 {
     const auto& ioc = *call.ioc;
     const auto& port = *ioc.port;
@@ -42,7 +42,7 @@ void answer_attributes(Call& call, hxa_ioctl_port_attr_t& record)
         put_fibre_channel(field, port, link_up);
 }
 
-void answer_enable(Call& call, hxa_ioctl_gen_t& record)
+void answer_port_enable(Call& call, hxa_ioctl_gen_t& record)
 {
     const auto& port = *call.ioc->port;
     auto& state = own_state(*call.ioc);
@@ -56,7 +56,7 @@ void answer_enable(Call& call, hxa_ioctl_gen_t& record)
         state = port.link_state;
 }
 
-void answer_disable(Call& call, hxa_ioctl_gen_t& record)
+void answer_port_disable(Call& call, hxa_ioctl_gen_t& record)
 {
     auto& state = own_state(*call.ioc);
     if (*call.ioc->state != HXA_IOC_OPERATIONAL)
@@ -68,15 +68,15 @@ void answer_disable(Call& call, hxa_ioctl_gen_t& record)
 }
 
 // clang-format off
-constexpr Row rows[] = {
-    ioc_row<answer_enable>(    "IOCMD_PORT_ENABLE"),
-    ioc_row<answer_disable>(   "IOCMD_PORT_DISABLE"),
-    ioc_row<answer_attributes>("IOCMD_PORT_GET_ATTR"),
+constexpr Row port_table[] = {
+    ioc_row<answer_port_enable>(    "IOCMD_PORT_ENABLE"),
+    ioc_row<answer_port_disable>(   "IOCMD_PORT_DISABLE"),
+    ioc_row<answer_port_attributes>("IOCMD_PORT_GET_ATTR"),
 };
 // clang-format on
 
 } // namespace
 
-std::span<const Row> port_rows() { return rows; }
+std::span<const Row> port_rows() { return port_table; }
 
 } // namespace hxasim

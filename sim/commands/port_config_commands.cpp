@@ -30,7 +30,7 @@ void answer_topology(Call& call, hxa_ioctl_port_cfg_topo_t& record)
         configuration->topology = static_cast<std::uint8_t>(record.topo);
 }
 
-void answer_speed(Call& call, hxa_ioctl_port_cfg_speed_t& record)
+void answer_port_config_speed(Call& call, hxa_ioctl_port_cfg_speed_t& record)
 {
     auto* configuration = configuration_of(call, record);
     if (!configuration)
@@ -113,21 +113,21 @@ constexpr auto trunk = [](auto& record) { return std::tie(record.pp_bmap); };
 constexpr auto identity = [](auto& record) { return std::tie(record.info); };
 
 // clang-format off
-constexpr Row rows[] = {
-    ioc_row<answer_topology>(      "IOCMD_PORT_CFG_TOPO",      topology),
-    ioc_row<answer_speed>(         "IOCMD_PORT_CFG_SPEED",     speed),
-    ioc_row<answer_hard_address>(  "IOCMD_PORT_CFG_ALPA",      address),
-    ioc_row<answer_any_address>(   "IOCMD_PORT_CLR_ALPA"),
-    ioc_row<answer_frame_size>(    "IOCMD_PORT_CFG_MAXFRSZ",   frame_size),
-    ioc_row<answer_trunk>(         "IOCMD_PORT_TRUNK_ENABLE",  trunk),
-    ioc_row<answer_untrunk>(       "IOCMD_PORT_TRUNK_DISABLE"),
-    ioc_row<answer_identify>(      "IOCMD_PORT_CFG_RNID",      identity),
-    ioc_row<answer_identification>("IOCMD_PORT_GET_RNID"),
+constexpr Row port_config_table[] = {
+    ioc_row<answer_topology>(         "IOCMD_PORT_CFG_TOPO",      topology),
+    ioc_row<answer_port_config_speed>("IOCMD_PORT_CFG_SPEED",     speed),
+    ioc_row<answer_hard_address>(     "IOCMD_PORT_CFG_ALPA",      address),
+    ioc_row<answer_any_address>(      "IOCMD_PORT_CLR_ALPA"),
+    ioc_row<answer_frame_size>(       "IOCMD_PORT_CFG_MAXFRSZ",   frame_size),
+    ioc_row<answer_trunk>(            "IOCMD_PORT_TRUNK_ENABLE",  trunk),
+    ioc_row<answer_untrunk>(          "IOCMD_PORT_TRUNK_DISABLE"),
+    ioc_row<answer_identify>(         "IOCMD_PORT_CFG_RNID",      identity),
+    ioc_row<answer_identification>(   "IOCMD_PORT_GET_RNID"),
 };
 // clang-format on
 
 } // namespace
 
-std::span<const Row> port_config_rows() { return rows; }
+std::span<const Row> port_config_rows() { return port_config_table; }
 
 } // namespace hxasim

@@ -60,7 +60,7 @@ void answer_remove(Call& call, hxa_ioctl_rport_t& record)
         make_known(call, *logical_port_of(call, record, record.pwwn), *remote, false);
 }
 
-void answer_attributes(Call& call, hxa_ioctl_rport_attr_t& record)
+void answer_rport_attributes(Call& call, hxa_ioctl_rport_attr_t& record)
 {
     const auto* remote = remote_port_of(call, record, record.pwwn, record.rpwwn);
     if (!remote)
@@ -81,13 +81,13 @@ void answer_attributes(Call& call, hxa_ioctl_rport_attr_t& record)
     field.assigned_speed = remote->assigned_speed;
 }
 
-void answer_statistics(Call& call, hxa_ioctl_rport_stats_t& record)
+void answer_rport_statistics(Call& call, hxa_ioctl_rport_stats_t& record)
 {
     if (const auto* remote = remote_port_of(call, record, record.pwwn, record.rpwwn))
         record.stats = remote->counters.read();
 }
 
-void answer_reset_statistics(Call& call, hxa_ioctl_rport_reset_stats_t& record)
+void answer_rport_reset_statistics(Call& call, hxa_ioctl_rport_reset_stats_t& record)
 {
     if (auto* remote = remote_port_of(call, record, record.pwwn, record.rpwwn))
         remote->counters.reset();
@@ -103,7 +103,7 @@ void answer_scsi_address(Call& call, hxa_ioctl_rport_scsi_addr_t& record)
     }
 }
 
-void answer_speed(Call& call, hxa_ioctl_rport_set_speed_t& record)
+void answer_rport_speed(Call& call, hxa_ioctl_rport_set_speed_t& record)
 {
     auto* remote = remote_port_of(call, record, record.pwwn, record.rpwwn);
     if (!remote)
@@ -117,22 +117,22 @@ void answer_speed(Call& call, hxa_ioctl_rport_set_speed_t& record)
 }
 
 constexpr auto remote_port = [](auto& record) { return std::tie(record.vf_id, record.pwwn, record.rpwwn); };
-constexpr auto speed = [](auto& record) { return std::tie(record.vf_id, record.pwwn, record.rpwwn, record.speed); };
+constexpr auto rport_speed = [](auto& record) { return std::tie(record.vf_id, record.pwwn, record.rpwwn, record.speed); };
 
 // clang-format off
-constexpr Row rows[] = {
-    ioc_row<answer_add>(             "IOCMD_RPORT_ADD",           remote_port),
-    ioc_row<answer_remove>(          "IOCMD_RPORT_REMOVE",        remote_port),
-    ioc_row<answer_statistics>(      "IOCMD_RPORT_GET_STATS",     remote_port),
-    ioc_row<answer_reset_statistics>("IOCMD_RPORT_RESET_STATS",   remote_port),
-    ioc_row<answer_attributes>(      "IOCMD_RPORT_GET_ATTR",      remote_port),
-    ioc_row<answer_scsi_address>(    "IOCMD_RPORT_GET_SCSI_ADDR", remote_port),
-    ioc_row<answer_speed>(           "IOCMD_RPORT_SET_SPEED",     speed),
+constexpr Row rport_table[] = {
+    ioc_row<answer_add>(                   "IOCMD_RPORT_ADD",           remote_port),
+    ioc_row<answer_remove>(                "IOCMD_RPORT_REMOVE",        remote_port),
+    ioc_row<answer_rport_statistics>(      "IOCMD_RPORT_GET_STATS",     remote_port),
+    ioc_row<answer_rport_reset_statistics>("IOCMD_RPORT_RESET_STATS",   remote_port),
+    ioc_row<answer_rport_attributes>(      "IOCMD_RPORT_GET_ATTR",      remote_port),
+    ioc_row<answer_scsi_address>(          "IOCMD_RPORT_GET_SCSI_ADDR", remote_port),
+    ioc_row<answer_rport_speed>(           "IOCMD_RPORT_SET_SPEED",     rport_speed),
 };
 // clang-format on
 
 } // namespace
 
-std::span<const Row> rport_rows() { return rows; }
+std::span<const Row> rport_rows() { return rport_table; }
 
 } // namespace hxasim

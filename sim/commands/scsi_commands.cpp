@@ -60,18 +60,18 @@ constexpr auto command = [](auto& record)
     return std::tie(record.vf_id, record.lpwwn, record.rpwwn, record.lun, record.cdb, record.write, record.iosz, record.snssz,
                     record.iobuf_ptr, record.snsbuf_pt);
 };
-constexpr auto buffers = [](const auto& record) {
+constexpr auto scsi_buffers = [](const auto& record) {
     return std::vector{Buffer{record.iobuf_ptr, record.iosz}, Buffer{record.snsbuf_pt, record.snssz}};
 };
 
 // clang-format off
-constexpr Row rows[] = {
-    ioc_row<answer_command>("IOCMD_SCSI_CMND", command, buffers),
+constexpr Row scsi_table[] = {
+    ioc_row<answer_command>("IOCMD_SCSI_CMND", command, scsi_buffers),
 };
 // clang-format on
 
 } // namespace
 
-std::span<const Row> scsi_rows() { return rows; }
+std::span<const Row> scsi_rows() { return scsi_table; }
 
 } // namespace hxasim

@@ -29,7 +29,7 @@ constexpr Sense invalid_operation_code{0x05, 0x20, 0x00};
 constexpr Sense invalid_field_in_cdb{0x05, 0x24, 0x00};
 constexpr Sense unit_not_supported{0x05, 0x25, 0x00};
 
-Scsi_Answer refuse(const Sense& sense)
+Scsi_Answer refuse_with(const Sense& sense)
 {
     constexpr std::size_t sense_size = 18;
     Scsi_Answer answer{.status = check_condition, .sense = std::vector<std::uint8_t>(sense_size)};
@@ -77,11 +77,11 @@ Scsi_Answer inquire(const Scsi_Target& target, const Unit_Range* range, std::uin
     const auto page = cdb[2];
     const auto allocated = number_at(cdb + 3, 2);
     if (!vital)
-        return page == 0 ? deliver(standard_inquiry(range), allocated) : refuse(invalid_field_in_cdb);
+        return page == 0 ? deliver(standard_inquiry(range), allocated) : refuse_with(invalid_field_in_cdb);
     if (!range)
-        return refuse(unit_not_supported);
+        return refuse_with(unit_not_supported);
     auto data = vital_product_data(target, *range, number, page);
-    return data ? deliver(std::move(*data), allocated) : refuse(invalid_field_in_cdb);
+    return data ? deliver(std::move(*data), allocated) : refuse_with(invalid_field_in_cdb);
 }
 
 Scsi_Answer report_luns(const Scsi_Target& target, const std::uint8_t* cdb)
@@ -94,7 +94,7 @@ Scsi_Answer report_luns(const Scsi_Target& target, const std::uint8_t* cdb)
     };
     const auto selected = cdb[2];
     if (selected > all)
-        return refuse(invalid_field_in_cdb);
+        return refuse_with(invalid_field_in_cdb);
     if (!target.report_luns.empty())
         return deliver(target.report_luns, number_at(cdb + 6, 4));
     std::vector<std::uint8_t> list;
@@ -137,9 +137,9 @@ Scsi_Answer read_capacity(const Unit_Range& range, const std::uint8_t* cdb)
     constexpr std::uint8_t capacity_16_action = 0x10;
     const bool is_16 = cdb[0] == 0x9E;
     if (!has_blocks(range))
-        return refuse(invalid_operation_code);
+        return refuse_with(invalid_operation_code);
     if (is_16 && (cdb[1] & 0x1F) != capacity_16_action)
-        return refuse(invalid_field_in_cdb);
+        return refuse_with(invalid_field_in_cdb);
     return is_16 ? read_capacity_16(range, cdb) : read_capacity_10(range);
 }
 
@@ -147,9 +147,9 @@ Scsi_Answer read_capacity(const Unit_Range& range, const std::uint8_t* cdb)
 Scsi_Answer use_medium(const Unit_Range& range, const std::uint8_t* cdb)
 {
     if (range.state == Unit_State::not_ready)
-        return refuse(not_ready);
+        return refuse_with(not_ready);
     if (range.state == Unit_State::no_medium)
-        return refuse(medium_not_present);
+        return refuse_with(medium_not_present);
     const bool is_test = cdb[0] == 0x00;
     return is_test ? Scsi_Answer() : read_capacity(range, cdb);
 }
@@ -168,13 +168,13 @@ Scsi_Answer execute(const Scsi_Target& target, lun_t lun, const scsi_cdb_t& comm
     case 0x12: // INQUIRY
         return inquire(target, range, number.value_or(0), cdb);
     case 0xA0: // REPORT LUNS, which LUN 0 answers also where there is no such unit
-        return range || number == 0U ? report_luns(target, cdb) : refuse(unit_not_supported);
+        return range || number == 0U ? report_luns(target, cdb) : refuse_with(unit_not_supported);
     case 0x00: // TEST UNIT READY
     case 0x25: // READ CAPACITY (10)
     case 0x9E: // SERVICE ACTION IN (16)
-        return range ? use_medium(*range, cdb) : refuse(unit_not_supported);
+        return range ? use_medium(*range, cdb) : refuse_with(unit_not_supported);
     default:
-        return refuse(range ? invalid_operation_code : unit_not_supported);
+        return refuse_with(range ? invalid_operation_code : unit_not_supported);
     }
 }
 

@@ -29,7 +29,7 @@ void answer_media(Call& call, hxa_ioctl_sfp_media_t& record)
         record.media = call.ioc->port->sfp.media;
 }
 
-void answer_speed(Call& call, hxa_ioctl_sfp_speed_t& record)
+void answer_sfp_speed(Call& call, hxa_ioctl_sfp_speed_t& record)
 {
     const auto& module = call.ioc->port->sfp;
     record.status = refusal(*call.ioc);
@@ -39,18 +39,18 @@ void answer_speed(Call& call, hxa_ioctl_sfp_speed_t& record)
         record.status = HXA_STATUS_UNSUPP_SPEED;
 }
 
-constexpr auto speed = [](auto& record) { return std::tie(record.speed); };
+constexpr auto sfp_speed = [](auto& record) { return std::tie(record.speed); };
 
 // clang-format off
-constexpr Row rows[] = {
-    ioc_row<answer_memory>("IOCMD_DIAG_SFP"),
-    ioc_row<answer_media>( "IOCMD_SFP_MEDIA"),
-    ioc_row<answer_speed>( "IOCMD_SFP_SPEED", speed),
+constexpr Row sfp_table[] = {
+    ioc_row<answer_memory>(   "IOCMD_DIAG_SFP"),
+    ioc_row<answer_media>(    "IOCMD_SFP_MEDIA"),
+    ioc_row<answer_sfp_speed>("IOCMD_SFP_SPEED", sfp_speed),
 };
 // clang-format on
 
 } // namespace
 
-std::span<const Row> sfp_rows() { return rows; }
+std::span<const Row> sfp_rows() { return sfp_table; }
 
 } // namespace hxasim

@@ -56,11 +56,11 @@ void answer_lport(Call& call, hxa_ioctl_lport_stats_t& record)
 
 constexpr auto buffer = [](auto& record) { return std::tie(record.buf_size, record.buf_ptr); };
 constexpr auto logical_port = [](auto& record) { return std::tie(record.vf_id, record.pwwn); };
-constexpr auto buffers = [](const auto& record) { return std::vector{Buffer{record.buf_ptr, record.buf_size}}; };
+constexpr auto statistics_buffers = [](const auto& record) { return std::vector{Buffer{record.buf_ptr, record.buf_size}}; };
 
 // clang-format off
-constexpr Row rows[] = {
-    ioc_row<answer_port>(      "IOCMD_PORT_GET_STATS",   buffer, buffers),
+constexpr Row statistics_table[] = {
+    ioc_row<answer_port>(      "IOCMD_PORT_GET_STATS",   buffer, statistics_buffers),
     ioc_row<answer_port_reset>("IOCMD_PORT_RESET_STATS"),
     ioc_row<answer_fcoe>(      "IOCMD_FCOE_GET_STATS"),
     ioc_row<answer_fcoe_reset>("IOCMD_FCOE_RESET_STATS"),
@@ -70,6 +70,6 @@ constexpr Row rows[] = {
 
 } // namespace
 
-std::span<const Row> statistics_rows() { return rows; }
+std::span<const Row> statistics_rows() { return statistics_table; }
 
 } // namespace hxasim

@@ -13,7 +13,6 @@ namespace hxasim
 namespace
 {
 
-constexpr std::uint32_t max_u32 = std::numeric_limits<std::uint32_t>::max();
 constexpr std::uint32_t max_i16 = std::numeric_limits<std::int16_t>::max();
 
 constexpr std::array link_words{Choice{"down", false}, Choice{"up", true}};

@@ -140,7 +140,7 @@ void Control_Server::end()
             return;
         _stopping = true;
         const std::uint64_t one = 1;
-        [[maybe_unused]] auto woken = write(_wake, &one, sizeof(one));
+        [[maybe_unused]] auto woken = ::write(_wake, &one, sizeof(one));
     }
     pthread_join(_thread, nullptr);
     std::lock_guard lock(_mutex);

@@ -12,7 +12,10 @@ namespace hxasim
 namespace
 {
 
-[[noreturn]] void refuse(const std::string& place, const std::string& what) { throw std::runtime_error(place + ": " + what); }
+[[noreturn]] void refuse_fault(const std::string& place, const std::string& what)
+{
+    throw std::runtime_error(place + ": " + what);
+}
 
 bool fits(const Patch& patch, const Row& row)
 {
@@ -78,14 +81,14 @@ void check_fault(const Fault& fault, const std::string& place)
 {
     const Row* row = row_named(fault.command);
     if (!fault.command.empty() && !row)
-        refuse(place + ".command", "no such command: " + fault.command);
+        refuse_fault(place + ".command", "no such command: " + fault.command);
     if (!fault.node.empty() && !node_at(fault.node))
-        refuse(place + ".node", "no such node: " + fault.node);
+        refuse_fault(place + ".node", "no such node: " + fault.node);
     if (does_nothing(fault))
-        refuse(place, "needs an error, a status, a SCSI status, an answer, data, garbage or a delay");
+        refuse_fault(place, "needs an error, a status, a SCSI status, an answer, data, garbage or a delay");
     const auto found = row ? obstacle(fault, *row) : std::nullopt;
     if (found)
-        refuse(place + found->member, found->why);
+        refuse_fault(place + found->member, found->why);
 }
 
 std::optional<Fault> Fault_List::strike(const Row& row, Node node, int instance, std::span<const std::uint8_t> sent)

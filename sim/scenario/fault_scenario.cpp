@@ -48,14 +48,14 @@ Fault read_fault(Json_Object& object)
     fault.lun = object.number("lun", max_units - 1);
     fault.cdb = object.bytes("cdb", sizeof(scsi_cdb_t));
     fault.error = static_cast<int>(object.choice("error", errno_words, 4095, 0));
-    fault.status = object.number("status", std::numeric_limits<std::uint32_t>::max(), 0);
+    fault.status = object.number("status", max_u32, 0);
     fault.delay = static_cast<int>(object.number("delay", max_delay, 0));
     fault.skip = static_cast<int>(object.number("skip", max_requests, 0));
     fault.times = read_optional<int>(object, "times", max_requests).value_or(fault.times);
     fault.answer = read_patches(object, "answer", max_record_size);
     fault.scsi_status = read_optional<std::uint8_t>(object, "scsi_status", 255);
     fault.data = read_patches(object, "data", max_data);
-    fault.garbage = object.number("garbage", std::numeric_limits<std::uint32_t>::max());
+    fault.garbage = object.number("garbage", max_u32);
     object.done();
     return fault;
 }

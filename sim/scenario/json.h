@@ -2,7 +2,7 @@
 //
 //     Json_Document document(text);
 //     auto port = document.root("port");
-//     auto speed = port.choice("speed", speed_names, 0xFFFFFFFF, 8);
+//     auto speed = port.choice("speed", speed_names, max_u32, 8);
 //     port.done();                                 // throws for a key that nobody asked for
 //
 // Every function throws std::runtime_error with "PLACE: what is wrong" when the value is of the wrong type or out of
@@ -34,6 +34,8 @@ struct Choice
     std::string_view word;
     std::uint32_t value;
 };
+
+constexpr std::uint32_t max_u32 = 0xFFFFFFFF; // the largest of most numbers
 
 [[noreturn]] void refuse(const std::string& place, const std::string& what);
 

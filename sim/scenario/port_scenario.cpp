@@ -14,7 +14,6 @@ namespace hxasim
 namespace
 {
 
-constexpr std::uint32_t max_u32 = std::numeric_limits<std::uint32_t>::max();
 constexpr std::uint32_t max_address = 0xFFFFFF;
 constexpr std::size_t max_virtual_ports = 255;
 

@@ -7,7 +7,6 @@
 #include "sim/scenario/scenario_words.h"
 
 #include <bitset>
-#include <limits>
 
 namespace hxasim
 {
@@ -15,7 +14,6 @@ namespace hxasim
 namespace
 {
 
-constexpr std::uint32_t max_u32 = std::numeric_limits<std::uint32_t>::max();
 constexpr std::size_t max_ports = 8;
 constexpr std::uint32_t max_partition_size = 64 * 1024 * 1024;
 

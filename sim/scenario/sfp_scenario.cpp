@@ -3,15 +3,12 @@
 #include "sim/scenario/scenario_words.h"
 
 #include <cstring>
-#include <limits>
 
 namespace hxasim
 {
 
 namespace
 {
-
-constexpr std::uint32_t max_u32 = std::numeric_limits<std::uint32_t>::max();
 
 template <std::size_t size> void read_padded(Json_Object& object, std::string_view key, std::uint8_t (&field)[size])
 {

@@ -51,7 +51,7 @@ class Mark
 public:
     Mark(classId_t id, const hxasim::Request& request)
     {
-        constexpr Walk_Row row = {.log_source = "Mark", .iocs = Iocs::any};
+        constexpr Walk_Row row = {.source = "Mark", .iocs = Iocs::any};
         for (Adapter_Walk adapters(row); adapters.next();)
             for (Port_Walk ports(row, adapters.adapter()); ports.next();)
                 for (const hxal_t* ioc : {ports.port().fc.get(), ports.port().ethernet.get()})
