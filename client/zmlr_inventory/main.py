@@ -1,6 +1,7 @@
 """The program zmlr-inventory: reads hosts and shows what they have."""
 
 import os
+import re
 import sys
 from pathlib import Path
 
@@ -12,8 +13,12 @@ from .json_text import json_text
 from .model import Failure, Inventory
 from .openmetrics import openmetrics_text
 from .options import parse
+from .topology import svg
 from .tree import Style, tree_text
 from .values import visible
+
+
+HTTP_CLIENT = re.compile(r"HTTPS?Connection(Pool)?\([^)]*\): ")  # the host stands before the reason already
 
 
 def say(text):
@@ -91,29 +96,25 @@ def reason(error):
     import pywbem
 
     if isinstance(error, pywbem.AuthError):
-        return f"{error}; give a login with --credentials FILE or --user NAME"
+        return "the server wants another login; give it with --credentials FILE or --user NAME"
     if isinstance(error, pywbem.CIMError):
         return f"{error.status_code_name}: {error.status_description}"
-    return " ".join(str(error).split())
+    return " ".join(HTTP_CLIENT.sub("", str(error)).split())
 
 
 def show(inventory, options):
     """Prints or writes what was asked for; the exit code."""
-    if not inventory.hosts and not options.json:
-        return NOTHING
     try:
-        if options.svg:
-            from .topology import svg
-
-            write_atomically(options.svg, svg(inventory))
         if options.openmetrics:
             write_atomically(options.openmetrics, openmetrics_text(inventory).encode())
+        if options.svg and inventory.hosts:
+            write_atomically(options.svg, svg(inventory))
     except OSError as error:
         say(str(error))
         return NOT_WRITTEN
     if options.json:
         print(json_text(inventory))
-    elif not options.svg and not options.openmetrics:
+    elif inventory.hosts and not options.svg and not options.openmetrics:
         print(tree_text(inventory, style_of(sys.stdout), options.all))
     sys.stdout.flush()
     if not inventory.hosts:

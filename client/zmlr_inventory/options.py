@@ -1,6 +1,7 @@
 """The command line."""
 
 import argparse
+import os
 
 from . import __version__
 
@@ -32,7 +33,7 @@ def parse(arguments):
     asking = parser.add_argument_group("how hosts are asked")
     asking.add_argument("--user", metavar="NAME", help="who asks; the password is asked for")
     asking.add_argument("--credentials", metavar="FILE", help="users and passwords, in the form of netrc; only its owner may read it")
-    asking.add_argument("--ca", metavar="FILE", help="the certificates that vouch for servers (default: those that the system trusts)")
+    asking.add_argument("--ca", metavar="FILE", type=_existing, help="the certificates that vouch for servers (default: those that the system trusts)")
     asking.add_argument("--insecure", action="store_true", help="do not check who the servers are")
     asking.add_argument("--plain-http", action="store_true", help="allow unencrypted http to other machines")
     asking.add_argument("--timeout", metavar="SECONDS", type=_positive, default=60, help="for one answer (default: %(default)s)")
@@ -43,6 +44,12 @@ def parse(arguments):
     if options.watch and outputs:
         parser.error(f"--watch and --{outputs[0]} exclude each other")
     return options
+
+
+def _existing(path):
+    if not os.path.exists(path):
+        raise argparse.ArgumentTypeError(f"{path} is not there")
+    return path
 
 
 def _positive(text):
