@@ -2,30 +2,20 @@
 
 import argparse
 import queue
+import subprocess
 import sys
 import time
-from dataclasses import dataclass, field
 
 import pywbem
 
-from tools.simulated_server import SimulatedServer
+from tools.simulated_server import ROOT, SimulatedServer
 from tools.wbemcli import Wbemcli
 from zmlr_inventory.subscription import Subscription
+from zmlr_inventory.values import ENABLED_STATE, OPERATIONAL_STATUS, speed
 from zmlr_inventory.watch import line_of
 
 NAME_SPACE = "root/zemlar"
 
-ENABLED_STATES = {1: "Other", 2: "Enabled", 3: "Disabled", 4: "Shutting Down", 6: "Enabled but Offline", 9: "Starting"}
-STATUSES = {
-    0: "Unknown",
-    2: "OK",
-    6: "Error",
-    8: "Starting",
-    9: "Stopping",
-    10: "Stopped",
-    11: "In Service",
-    13: "Lost Communication",
-}
 ALARM_STATES = {1: "off", 3: "blinking"}
 JOB_STATES = {4: "Running", 7: "Completed"}
 COMPLETION_STATES = {2: "Passed", 5: "Failed"}
@@ -81,15 +71,7 @@ def show(title, columns, rows):
 
 
 def status(codes):
-    return STATUSES[codes[0]]
-
-
-def enabled(code):
-    return ENABLED_STATES[code]
-
-
-def speed(bits_per_second):
-    return f"{bits_per_second // 1_000_000_000} Gbit/s" if bits_per_second else "-"
+    return OPERATIONAL_STATUS[codes[0]]
 
 
 def kind(other_type):
@@ -118,7 +100,7 @@ TABLES = [
             ("Address", "DeviceID", str),
             ("Serial number", "Name", str),
             ("Kind", "OtherControllerType", kind),
-            ("State", "EnabledState", enabled),
+            ("State", "EnabledState", ENABLED_STATE.get),
             ("Status", "OperationalStatus", status),
         ],
     ),
@@ -144,8 +126,8 @@ TABLES = [
             ("Port WWN", "DeviceID", str),
             ("Port", "PortNumber", str),
             ("Status", "OperationalStatus", status),
-            ("State", "EnabledState", enabled),
-            ("Speed", "Speed", speed),
+            ("State", "EnabledState", ENABLED_STATE.get),
+            ("Speed", "Speed", lambda bits: speed(bits) or "-"),
             ("Symbolic name", "Caption", str),
         ],
     ),
@@ -231,76 +213,9 @@ def switch_a_beacon(clients):
         print(f"\nThe beacon of {path['DeviceID']} is {ALARM_STATES[seen]}.")
 
 
-@dataclass
-class Branch:
-    """What hangs on an object: the far ends of an association, how one is told (nothing: it is passed through), what hangs on them."""
-
-    association: str
-    role: str  # of the far ends
-    tell: object = None
-    branches: list = field(default_factory=list)
-    found: int = 0
-
-
-def adapter_line(adapter):
-    return f"{kind(adapter['OtherControllerType'])} {adapter['DeviceID']}, {enabled(adapter['EnabledState'])}"
-
-
-def port_line(port):
-    return f"FC port {port['DeviceID']}, {enabled(port['EnabledState'])}, {status(port['OperationalStatus'])}, speed {speed(port['Speed'])}"
-
-
-def module_line(module):
-    return f"module {module['Tag']}: {module['Model']} of {module['Manufacturer']}"
-
-
-def port_tree():
-    """What hangs on an FC port."""
-    units = Branch("ZEMLAR_SCSIInitiatorTargetLogicalUnitPath", "LogicalUnit", lambda unit: f"{unit['ElementName']}: {unit['Name']}")
-    targets = Branch("ZEMLAR_SCSIInitiatorTargetLogicalUnitPath", "Target", lambda end: f"target {end['Name'].split('_')[1]}", [units])
-    modules = Branch("ZEMLAR_EthernetPortRealizes", "Antecedent", module_line)
-    return [
-        Branch("ZEMLAR_ElementStatisticalData", "Stats", lambda counts: f"{counts['BytesTransmitted']} bytes sent, {counts['BytesReceived']} received"),
-        Branch("ZEMLAR_HostedDependency", "Antecedent", lambda port: f"on Ethernet port {port['DeviceID']}, {port['ElementName']}", [modules]),
-        Branch("ZEMLAR_DeviceSAPImplementation", "Dependent", None, [targets]),
-    ]
-
-
-def tree():
-    """What hangs on the host, down to the units behind its ports."""
-    modules = Branch("ZEMLAR_PhysicalConnectorContainer", "PartComponent", module_line)
-    of_adapter = [
-        Branch("ZEMLAR_ProductElementComponent", "GroupComponent", lambda product: f"product {product['ElementName']} of {product['Vendor']}"),
-        Branch("ZEMLAR_Realizes", "Antecedent", lambda card: f"card {card['Model']}, {card['SerialNumber']}", [modules]),
-        Branch("ZEMLAR_AdapterElementSoftwareIdentity", "Antecedent", lambda software: f"{software['Name']} {software['VersionString']}"),
-        Branch("ZEMLAR_ControlledBy", "Dependent", port_line, port_tree()),
-    ]
-    return Branch("ZEMLAR_PortControllerSystemDevice", "PartComponent", adapter_line, of_adapter)
-
-
-def climb(clients, path, branch, depth):
-    for instance in clients.pywbem.Associators(path, AssocClass=branch.association, ResultRole=branch.role):
-        branch.found += 1
-        if branch.tell:
-            print("  " * depth + branch.tell(instance))
-        for next_branch in branch.branches:
-            climb(clients, instance.path, next_branch, depth + bool(branch.tell))
-
-
-def require(branch):
-    if not branch.found:
-        raise SystemExit(f"demo: no {branch.role} was found through {branch.association}")
-    for next_branch in branch.branches:
-        require(next_branch)
-
-
-def show_the_tree(clients):
-    print("\nThe same by associators alone, from the host on\n")
-    host = clients.pywbem.EnumerateInstanceNames("ZEMLAR_ComputerSystem")[0]
-    print(f"  host {host['Name']}")
-    branch = tree()
-    climb(clients, host, branch, 2)
-    require(branch)
+def show_the_tree(server):
+    print("\nThe same, as zmlr-inventory shows it\n", flush=True)
+    subprocess.run([sys.executable, ROOT / "client/zmlr-inventory", server.url], check=True)
 
 
 def pull_a_module(server, clients):
@@ -345,7 +260,7 @@ def demonstrate(server):
         show_class(clients, title, class_name, columns)
     show_one_port(clients)
     switch_a_beacon(clients)
-    show_the_tree(clients)
+    show_the_tree(server)
     pull_a_module(server, clients)
     run_a_test(clients)
 

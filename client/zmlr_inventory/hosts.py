@@ -46,6 +46,11 @@ def name_of(url):
     return urlsplit(url).hostname
 
 
+def label_of(url):
+    """What is short and still tells a host from the others: the port only where it is not the usual one."""
+    return urlsplit(url).netloc.removesuffix(f":{HTTP_PORT}").removesuffix(f":{HTTPS_PORT}")
+
+
 def urls_of(arguments, hosts_file, plain_http):
     """The URLs of all hosts, each once, in the order in which they were named; this machine when none is."""
     named = list(arguments)

@@ -72,12 +72,14 @@ def read(urls, connect, at_once):
     progress = parallel.Progress(sys.stderr, len(urls))
 
     def read_one(url):
-        with_progress = lambda name, number, count: progress.step(hosts.name_of(url), f"{name} ({number} of {count})")  # noqa: E731
-        return read_host(connect(url), with_progress)
+        def on_class(name, number, count):
+            progress.step(hosts.label_of(url), f"reading {name} ({number} of {count} classes)")
+
+        return read_host(connect(url), on_class)
 
     found, failures = {}, {}
     for url, host, error in parallel.each(read_one, urls, at_once, progress.show):
-        progress.finish(hosts.name_of(url))
+        progress.finish(hosts.label_of(url))
         progress.clear()
         if error is None:
             found[url] = host

@@ -62,7 +62,7 @@ class _Drawing:
         self._paint, self._everything = style.paint, everything
 
     def host(self, host):
-        children = [Node("driver " + _words(driver.identity, driver.version)) for driver in host.software]
+        children = [Node(visible(_words(f"driver {driver.identity}", driver.version))) for driver in host.software]
         children += map(self._adapter, host.adapters)
         if not host.adapters:
             children.append(Node("no adapters"))

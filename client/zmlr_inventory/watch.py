@@ -30,7 +30,7 @@ def watch(urls, connect, options, say):
         say(f"{url}: {what}: {error}")
 
     def subscribe(url):
-        host = f"{hosts.name_of(url)}  " if len(urls) > 1 else ""
+        host = f"{hosts.label_of(url)}  " if len(urls) > 1 else ""
         port = options.listen_port + urls.index(url) if options.listen_port else 0
         show = _printer(host, ended)
         return Subscription(connect(url), show, options.query, options.listen, port).__enter__()
