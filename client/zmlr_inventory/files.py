@@ -7,7 +7,10 @@ from pathlib import Path
 
 def write_atomically(path, content):
     """Replaces a file by `content` (bytes); whoever reads it meanwhile sees the old or the new one. Raises OSError."""
-    path = Path(path)
+    if os.path.exists(path) and not os.path.isfile(path):
+        Path(path).write_bytes(content)  # a pipe or a terminal: nothing that could be replaced
+        return
+    path = Path(os.path.realpath(path))
     descriptor, temporary = tempfile.mkstemp(prefix=f".{path.name}.", dir=path.parent)
     try:
         with os.fdopen(descriptor, "wb") as file:

@@ -65,8 +65,6 @@ def main(arguments=None):
 
 def read(urls, connect, at_once):
     """All hosts; what fails is told as it comes."""
-    import pywbem
-
     from .reading import read_host
 
     progress = parallel.Progress(sys.stderr, len(urls))
@@ -78,18 +76,19 @@ def read(urls, connect, at_once):
         return read_host(connect(url), on_class)
 
     found, failures = {}, {}
-    for url, host, error in parallel.each(read_one, urls, at_once, progress.show):
-        progress.finish(hosts.label_of(url))
+    try:
+        for url, host, error in parallel.each(read_one, urls, at_once, progress.show):
+            progress.finish(hosts.label_of(url))
+            progress.clear()
+            if error:
+                failures[url] = Failure(url, reason(error))
+                say(f"{url}: {failures[url].reason}")
+            else:
+                found[url] = host
+                for text in host.unread:
+                    say(f"{url}: {text}")
+    finally:
         progress.clear()
-        if error is None:
-            found[url] = host
-            for text in host.unread:
-                say(f"{url}: {text}")
-        elif isinstance(error, (pywbem.Error, OSError)):
-            failures[url] = Failure(url, reason(error))
-            say(f"{url}: {failures[url].reason}")
-        else:
-            raise error
     return Inventory([found[url] for url in urls if url in found], [failures[url] for url in urls if url in failures])
 
 
@@ -101,7 +100,8 @@ def reason(error):
         return "the server wants another login; give it with --credentials FILE or --user NAME"
     if isinstance(error, pywbem.CIMError):
         return f"{error.status_code_name}: {error.status_description}"
-    return " ".join(HTTP_CLIENT.sub("", str(error)).split())
+    text = " ".join(HTTP_CLIENT.sub("", str(error)).split())
+    return text if isinstance(error, (pywbem.Error, OSError)) else f"its answer is not understood: {type(error).__name__}: {text}"
 
 
 def show(inventory, options):

@@ -248,7 +248,7 @@ class _Joining:
 
 
 def _text(instance, name):
-    value = instance.get(name)
+    value = instance.get(name)  # of an instance or a path
     return value if isinstance(value, str) else ""
 
 
@@ -260,9 +260,9 @@ def _number(instance, name):
 def _status(instance):
     """The first of the operational states, which is the main one."""
     states = instance.get("OperationalStatus")
-    return int(states[0]) if states and states[0] is not None else None
+    return int(states[0]) if isinstance(states, list) and states and isinstance(states[0], int) else None
 
 
 def _key(association, role, key):
     path = association.get(role)
-    return path.get(key, "") if isinstance(path, pywbem.CIMInstanceName) else ""
+    return _text(path, key) if isinstance(path, pywbem.CIMInstanceName) else ""

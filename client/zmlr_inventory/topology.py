@@ -1,7 +1,8 @@
 """The inventory as a picture: adapters with their ports on the left, remote targets with their units on the right.
 
 Units are drawn as the rows that their numbers make, so a target stays one small table however many it has. A target that several ports,
-also of several hosts, see is drawn once; where they see different units, each view has rows of its own.
+also of several hosts, see is drawn once; where they see different units, each view has rows of its own. Targets that the same ports see are drawn
+together, so the lines are as few as the ports where every port sees every target.
 """
 
 import html
@@ -51,9 +52,20 @@ def dot_text(inventory):
             for index, port in enumerate(adapter.ports):
                 for target in port.targets:
                     seen_by.setdefault(target.wwn, []).append((f"h{number}:a{row}p{index}:e", level(port.status), target))
-    for number, (wwn, seers) in enumerate(seen_by.items()):
-        lines += _target(f"t{number}", TARGET_COLOURS[number % len(TARGET_COLOURS)], wwn, seers)
+    for number, (ends, views_of) in enumerate(_together(seen_by)):
+        lines += _targets(f"t{number}", TARGET_COLOURS[number % len(TARGET_COLOURS)], ends, views_of)
     return "\n".join([*lines, "}", ""])
+
+
+def _together(seen_by):
+    """Targets that the same ports see, each with one view: a line from each port leads to all of them. (ends of the lines, views by WWN)"""
+    groups = {}
+    for wwn, seers in seen_by.items():
+        views = list(dict.fromkeys(_view(target) for _, _, target in seers))
+        several = len(views) > 1
+        ends = tuple((port, state, f"v{views.index(_view(target))}" if several else None) for port, state, target in seers)
+        groups.setdefault((wwn if several else None, ends), {})[wwn] = views
+    return [(ends, wwns) for (_, ends), wwns in groups.items()]
 
 
 def _legend():
@@ -107,17 +119,16 @@ def _status(port):
     return status_words(port.status, getattr(port, "state", None))
 
 
-def _target(node, colour, wwn, seers):
-    """A table: the target, and rows for the units of each different view; and the lines from the ports that have it."""
-    views = {}
-    for port, state, target in seers:
-        views.setdefault(_view(target), []).append((port, state))
-    head = f'<font color="white"><b>{_safe(colons(wwn))}</b></font>'
-    rows, lines = [f'<tr><td colspan="2" align="left" bgcolor="{colour}" port="head">{head}</td></tr>'], []
-    for number, (view, ports) in enumerate(views.items()):
-        rows += _view_rows(view, f' port="v{number}"')
-        end = "head" if len(views) == 1 else f"v{number}"
-        lines += [f'  {port} -> {node}:{end}:w [color="{colour}"{"" if state == GOOD else ", style=dashed"}]' for port, state in ports]
+def _targets(node, colour, ends, views_of):
+    """A table: the targets, each with rows for the units of its views; and the lines from the ports that have them."""
+    rows = []
+    for wwn, views in views_of.items():
+        rows.append(f'<tr><td colspan="2" align="left" bgcolor="{colour}"><font color="white"><b>{_safe(colons(wwn))}</b></font></td></tr>')
+        for number, view in enumerate(views):
+            rows += _view_rows(view, f' port="v{number}"' if len(views) > 1 else "")
+    lines = [
+        f'  {port} -> {node}{":" + view if view else ""}:w [color="{colour}"{"" if state == GOOD else ", style=dashed"}]' for port, state, view in ends
+    ]
     return [f"  {node} [label=<{_table(rows)}>]", *lines]
 
 

@@ -120,13 +120,16 @@ def harmless(inventory):
     return other
 
 
-def test_many_units_stay_a_small_table():
-    def port(wwn, luns):
-        units = [model.Lun(number, "disk", "M", "N", 2) for number in luns]
-        return model.Port(wwn, number=0, status=11, targets=[model.Target("50060E8000000001", units)])
+def test_many_units_and_targets_stay_few_rows_and_lines():
+    def targets(luns):
+        return [model.Target(f"50060E800000000{t}", [model.Lun(number, "disk", "M", "N", 2) for number in luns]) for t in range(2)]
 
-    ports = [port("1", range(200)), port("2", range(200)), port("3", range(0, 200, 2))]
-    dot = topology.dot_text(model.Inventory([model.Host("u", "h", adapters=[model.Adapter("a", "FC HBA", ports=ports)])]))
-    assert [line.split("[")[0].strip() for line in dot.splitlines() if "->" in line] == ["h0:a0p0:e -> t0:v0:w", "h0:a0p1:e -> t0:v0:w", "h0:a0p2:e -> t0:v1:w"]
-    assert dot.count("LUN 0-199<br") == 1 and "..." in dot and "100 disks" in dot
-    assert len(dot) < 6000
+    def lines_of(*views):
+        ports = [model.Port(str(n), number=n, status=11, targets=targets(luns)) for n, luns in enumerate(views)]
+        dot = topology.dot_text(model.Inventory([model.Host("u", "h", adapters=[model.Adapter("a", "FC HBA", ports=ports)])]))
+        assert len(dot) < 8000
+        return dot.count("LUN 0-199<br"), [line.split("[")[0].split(" -> ") for line in dot.splitlines() if "->" in line]
+
+    assert lines_of(range(200), range(200)) == (2, [["  h0:a0p0:e", "t0:w "], ["  h0:a0p1:e", "t0:w "]])
+    other = [[f"  h0:a0p{port}:e", f"t{target}:v{port}:w "] for target in (0, 1) for port in (0, 1)]
+    assert lines_of(range(200), range(0, 200, 2)) == (2, other)
