@@ -82,7 +82,8 @@ def fixture_tree(packages, tmp_path_factory):
 def test_lintian_misses_the_licence_only(packages):
     assert set(packages) == PACKAGES
     told = subprocess.run(["lintian", "--allow-root", *packages.values()], capture_output=True, text=True, check=False).stdout
-    assert set(told.splitlines()) - {"W: zmlr-inventory: no-manual-page [usr/bin/zmlr-inventory]"} == {f"E: {name}: no-copyright-file" for name in PACKAGES}
+    told = [line for line in told.splitlines() if not re.search("no-manual-page .*/(hxa|zmlr-inventory)]", line)]
+    assert set(told) == {f"E: {name}: no-copyright-file" for name in PACKAGES}
 
 
 def test_clients_in_c_and_cpp(tree, tmp_path):
@@ -118,7 +119,7 @@ def test_programs_run_where_they_are_installed(tree):
     programs = {path.name: path for folder in ("bin", "sbin") for path in (tree.root / "usr" / folder).iterdir()}
     assert set(programs) == {"hxasim", "zmlr-cimserver", "zmlr-inventory", "zmlr-register"} | TOOLS
     for name, program in programs.items():
-        assert name in run(program, "--help", PYTHONDONTWRITEBYTECODE="1")
+        assert name in run(program, "--help", LD_LIBRARY_PATH=str(tree.root / tree.libraries), PYTHONDONTWRITEBYTECODE="1")
 
 
 def test_the_unit_is_sound_and_keeps_the_server_in(tree):
