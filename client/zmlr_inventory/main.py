@@ -1,6 +1,5 @@
 """The program zmlr-inventory: reads hosts and shows what they have."""
 
-import os
 import re
 import sys
 from pathlib import Path
@@ -13,16 +12,11 @@ from .json_text import json_text
 from .model import Failure, Inventory
 from .openmetrics import openmetrics_text
 from .options import parse
+from .output import give_up_output, say, style_of
 from .topology import svg
-from .tree import Style, tree_text
-from .values import visible
-
+from .tree import tree_text
 
 HTTP_CLIENT = re.compile(r"HTTPS?Connection(Pool)?\([^)]*\): ")  # the host stands before the reason already
-
-
-def say(text):
-    print(f"zmlr-inventory: {visible(text)}", file=sys.stderr, flush=True)
 
 
 def main(arguments=None):
@@ -53,13 +47,13 @@ def main(arguments=None):
         if options.watch:
             from .watch import watch
 
-            return watch(urls, connect, options, say)
+            return watch(urls, connect, options)
         inventory = read(urls, connect, options.parallel)
         return show(inventory, options)
     except KeyboardInterrupt:
         return INTERRUPTED
     except BrokenPipeError:
-        os.dup2(os.open(os.devnull, os.O_WRONLY), sys.stdout.fileno())  # nobody reads it any more; the flush at the end shall not fail
+        give_up_output()
         return NOT_WRITTEN
 
 
@@ -122,13 +116,3 @@ def show(inventory, options):
     if not inventory.hosts:
         return NOTHING
     return PARTLY if inventory.failures or any(host.unread for host in inventory.hosts) else WELL
-
-
-def style_of(stream):
-    """Colours on a terminal whose owner has nothing against them, lines where the character set has them."""
-    coloured = stream.isatty() and not os.environ.get("NO_COLOR") and os.environ.get("TERM") != "dumb"
-    try:
-        "├─└│".encode(stream.encoding)
-    except UnicodeEncodeError:
-        return Style(coloured, ascii_only=True)
-    return Style(coloured)

@@ -8,6 +8,7 @@ import pywbem
 
 from . import hosts, parallel
 from .exits import NOTHING, PARTLY, WELL
+from .output import give_up_output, say
 from .subscription import Subscription
 from .values import PERCEIVED_SEVERITY, visible
 
@@ -15,12 +16,13 @@ ENDING = (signal.SIGINT, signal.SIGTERM, signal.SIGHUP)
 SEVERITY_WIDTH = max(map(len, PERCEIVED_SEVERITY.values()))
 
 
-def watch(urls, connect, options, say):
+def watch(urls, connect, options):
     """Subscribes at every host and prints what comes; the subscriptions go before it returns the exit code.
 
     A host that takes no subscription, or keeps it, costs its own part."""
     ended, failed, taken = threading.Event(), [], {}
-    for number in ENDING:
+    ending = [number for number in ENDING if signal.getsignal(number) is not signal.SIG_IGN]  # as nohup leaves them
+    for number in ending:
         signal.signal(number, lambda *_: ended.set())
 
     def fail(url, what, error):
@@ -45,7 +47,7 @@ def watch(urls, connect, options, say):
         say("Ctrl-C ends")
         ended.wait()
 
-    for number in ENDING:
+    for number in ending:
         signal.signal(number, signal.SIG_DFL)  # who does not want to wait for a dead host may end it at once
     for url, _, error in parallel.each(lambda url: taken[url].__exit__(), list(taken), options.parallel):
         if error:
@@ -58,6 +60,7 @@ def _printer(host, ended):
         try:
             print(visible(host + line_of(alert)), flush=True)
         except OSError:  # nobody reads it any more
+            give_up_output()
             ended.set()
 
     return show
