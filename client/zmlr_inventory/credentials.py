@@ -27,7 +27,10 @@ def ask(user):
     """The password of a user, from the terminal."""
     if not sys.stdin.isatty():
         raise UsageError(f"the password of {user!r} can only be typed on a terminal; use --credentials FILE")
-    return user, getpass.getpass(f"Password of {user}: ")
+    try:
+        return user, getpass.getpass(f"Password of {user}: ")
+    except EOFError:
+        raise UsageError("no password was typed") from None
 
 
 def read(path):
