@@ -35,7 +35,8 @@ def main(arguments=None):
         import pywbem  # noqa: F401
     except ImportError:
         venv = Path(__file__).resolve().parent.parent / "venv"
-        say(f"pywbem, the CIM client that this needs, is missing; to have it for this program alone: python3 -m venv {venv} && {venv}/bin/pip install pywbem")
+        install = f"python3 -m venv {venv} && {venv}/bin/pip install pywbem"
+        say(f"pywbem, the CIM client that this needs, is missing; to have it for this program alone: {install}")
         return NO_PYWBEM
     if options.insecure:
         say("warning: the identity of servers is not checked; whoever sits between can read and change everything, passwords too")

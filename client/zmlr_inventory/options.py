@@ -12,7 +12,8 @@ def parse(arguments):
     parser = argparse.ArgumentParser(
         prog="zmlr-inventory",
         description="Shows the Zemlar adapters of hosts, their ports, remote targets and logical units, as the hosts' CIM servers tell them.",
-        epilog="Exit status: 0 all well, 1 some hosts or parts failed, 2 wrong usage, 3 no host answered, 4 pywbem is missing, 5 a file could not be written.",
+        epilog="Exit status: 0 all well, 1 some hosts or parts failed, 2 wrong usage, 3 no host answered, 4 pywbem is missing, "
+        "5 a file could not be written.",
     )
     parser.add_argument("host", nargs="*", metavar="HOST", help="NAME, NAME:PORT or a URL of a CIM server (default: localhost)")
     parser.add_argument("--hosts", metavar="FILE", help="more hosts, one a line")
@@ -27,13 +28,19 @@ def parse(arguments):
 
     alerts = parser.add_argument_group("alerts")
     alerts.add_argument("--query", metavar="WQL", default=QUERY, help="which (default: %(default)s)")
-    alerts.add_argument("--listen", metavar="ADDRESS", help="of this machine, that servers shall send to (default: that which reaches them)")
-    alerts.add_argument("--listen-port", metavar="N", type=int, default=0, help="of the first host; the next ones take the next ones (default: free ones)")
+    alerts.add_argument(
+        "--listen", metavar="ADDRESS", help="of this machine, that servers shall send to (default: that which reaches them)"
+    )
+    alerts.add_argument(
+        "--listen-port", metavar="N", type=int, default=0, help="of the first host; the next ones take the next ones (default: free ones)"
+    )
 
     asking = parser.add_argument_group("how hosts are asked")
     asking.add_argument("--user", metavar="NAME", help="who asks; the password is asked for")
     asking.add_argument("--credentials", metavar="FILE", help="users and passwords, in the form of netrc; only its owner may read it")
-    asking.add_argument("--ca", metavar="FILE", type=_existing, help="the certificates that vouch for servers (default: those that the system trusts)")
+    asking.add_argument(
+        "--ca", metavar="FILE", type=_existing, help="the certificates that vouch for servers (default: those that the system trusts)"
+    )
     asking.add_argument("--insecure", action="store_true", help="do not check who the servers are")
     asking.add_argument("--plain-http", action="store_true", help="allow unencrypted http to other machines")
     asking.add_argument("--timeout", metavar="SECONDS", type=_positive, default=60, help="for one answer (default: %(default)s)")

@@ -63,7 +63,8 @@ class Progress:
         if now < self._next:
             return
         self._next = now + (TICK if self._live else LINE_EVERY)
-        text = "; ".join([f"{self._done} of {self._count} hosts read"] * (self._count > 1) + [f"{host}: {what}" for host, what in [*self._steps.items()]])
+        steps = [f"{host}: {what}" for host, what in list(self._steps.items())]
+        text = "; ".join([f"{self._done} of {self._count} hosts read", *steps] if self._count > 1 else steps)
         if self._live:
             print(f"\r\x1b[K{text[: shutil.get_terminal_size().columns - 1]}", end="", file=self._stream, flush=True)
         else:

@@ -196,7 +196,9 @@ class _Joining:
 
     def _add_modules(self):
         """A module sits in a card; the end of its tag is the number of its port there."""
-        cards = {_key(row, "PartComponent", "Tag"): _key(row, "GroupComponent", "Tag") for row in self._answers["PhysicalConnectorContainer"]}
+        cards = {
+            _key(row, "PartComponent", "Tag"): _key(row, "GroupComponent", "Tag") for row in self._answers["PhysicalConnectorContainer"]
+        }
         for found in self._answers["PhysicalConnector"]:
             module = Module(
                 tag=_text(found, "Tag"),

@@ -77,7 +77,9 @@ def _host(host):
     adapters = [f"<tr><td>{_adapter(row, adapter)}</td></tr>" for row, adapter in enumerate(host.adapters)]
     title = f'<tr><td><font point-size="16"><b>{_safe(host.name)}</b></font></td></tr>'
     rows = "".join([title, *(adapters or ["<tr><td>no adapters</td></tr>"])])
-    return f'<table border="1" style="rounded" cellborder="0" cellspacing="0" cellpadding="5" color="#b0b8c4" bgcolor="#f4f6f9">{rows}</table>'
+    return (
+        f'<table border="1" style="rounded" cellborder="0" cellspacing="0" cellpadding="5" color="#b0b8c4" bgcolor="#f4f6f9">{rows}</table>'
+    )
 
 
 def _adapter(row, adapter):
@@ -127,7 +129,8 @@ def _targets(node, colour, ends, views_of):
         for number, view in enumerate(views):
             rows += _view_rows(view, f' port="v{number}"' if len(views) > 1 else "")
     lines = [
-        f'  {port} -> {node}{":" + view if view else ""}:w [color="{colour}"{"" if state == GOOD else ", style=dashed"}]' for port, state, view in ends
+        f'  {port} -> {node}{":" + view if view else ""}:w [color="{colour}"{"" if state == GOOD else ", style=dashed"}]'
+        for port, state, view in ends
     ]
     return [f"  {node} [label=<{_table(rows)}>]", *lines]
 

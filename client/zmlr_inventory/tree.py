@@ -115,7 +115,9 @@ class _Drawing:
                 numbers = ranges(unit.number for unit in units)
                 children.append(Node(_words(f"LUN {numbers}", f"{len(units)} {kind}s", visible(model), self._status(status))))
             else:
-                children += [Node(_words(f"LUN {unit.number}", kind, visible(model), visible(unit.name), self._status(status))) for unit in units]
+                children += [
+                    Node(_words(f"LUN {unit.number}", kind, visible(model), visible(unit.name), self._status(status))) for unit in units
+                ]
         return Node(_words("target " + visible(colons(target.wwn)), "" if target.luns else "no logical units"), children)
 
     def _status(self, status, state=None):
