@@ -5,7 +5,7 @@ import sys
 from pathlib import Path
 
 from . import credentials, hosts, parallel
-from .exits import INTERRUPTED, NO_PYWBEM, NOTHING, NOT_WRITTEN, PARTLY, USAGE, WELL
+from .exits import INTERRUPTED, NO_PYWBEM, NOT_WRITTEN, NOTHING, PARTLY, USAGE, WELL
 from .files import write_atomically
 from .hosts import UsageError
 from .json_text import json_text

@@ -11,7 +11,17 @@ from urllib.parse import urlsplit
 
 import pywbem
 
-from .model import Adapter, EthernetPort, Host, Lun, Module, Port, Software, Statistics, Target
+from .model import (
+    Adapter,
+    EthernetPort,
+    Host,
+    Lun,
+    Module,
+    Port,
+    Software,
+    Statistics,
+    Target,
+)
 
 NAME_SPACE = "root/zemlar"
 

@@ -1,7 +1,6 @@
 """Alerts of several hosts as they come, until the program is interrupted."""
 
 import signal
-import sys
 import threading
 
 import pywbem
