@@ -67,7 +67,12 @@ private:
             ->expected(0, 1)
             ->type_name("SECONDS");
         app->add_option("--count", options->count, "so many times")->type_name("NUMBER");
-        app->add_option("--openmetrics", options->openmetrics, "write them to a file as OpenMetrics text")->type_name("FILE");
+        app->add_option("--openmetrics", options->openmetrics,
+                        "write states and counters of all ports to a file as OpenMetrics text")
+            ->type_name("FILE")
+            ->excludes("port")
+            ->excludes("--reset")
+            ->excludes("--watch");
     }
 
     // One second unless the words are a number.

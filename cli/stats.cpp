@@ -1,6 +1,7 @@
 #include "cli/commands.h"
 #include "cli/counters.h"
 #include "cli/field_text.h"
+#include "cli/openmetrics_reading.h"
 #include "cli/report.h"
 
 #include <chrono>
@@ -108,6 +109,12 @@ void watch(Session& session, const std::vector<Port>& ports, const Stats_Options
 void stats(Session& session, const Stats_Options& options)
 {
     const Host host;
+    if (!options.openmetrics.empty())
+    {
+        const auto samples = openmetrics::read_samples(session, host, std::time(nullptr));
+        openmetrics::write_file(options.openmetrics, openmetrics::text_of(samples, openmetrics::form_for(options.openmetrics)));
+        return;
+    }
     const auto ports = host.ports(options.port);
     if (options.reset)
     {

@@ -10,7 +10,7 @@ from .files import write_atomically
 from .hosts import UsageError
 from .json_text import json_text
 from .model import Failure, Inventory
-from .openmetrics import openmetrics_text
+from .openmetrics import write_openmetrics
 from .options import parse
 from .output import give_up_output, say, style_of
 from .topology import svg
@@ -103,7 +103,7 @@ def show(inventory, options):
     """Prints or writes what was asked for; the exit code."""
     try:
         if options.openmetrics:
-            write_atomically(options.openmetrics, openmetrics_text(inventory).encode())
+            write_openmetrics(options.openmetrics, inventory)
         if options.svg and inventory.hosts:
             write_atomically(options.svg, svg(inventory))
     except OSError as error:
