@@ -23,15 +23,15 @@ public:
     using Data = std::variant<std::nullptr_t, bool, std::int64_t, std::uint64_t, double, std::string, List, Object>;
 
     Value() = default; // nothing is known
-    Value(bool data) : _data(data) {}
-    Value(int data) : _data(std::int64_t{data}) {}
-    Value(unsigned data) : _data(std::uint64_t{data}) {}
-    Value(std::uint64_t data) : _data(data) {}
-    Value(double data) : _data(data) {}
-    Value(std::string data) : _data(std::move(data)) {}
-    Value(const char* data) : _data(std::string(data)) {}
-    Value(List data) : _data(std::move(data)) {}
-    Value(Object data) : _data(std::move(data)) {}
+    Value(bool data);
+    Value(int data);
+    Value(unsigned data);
+    Value(std::uint64_t data);
+    Value(double data);
+    Value(std::string data);
+    Value(const char* data);
+    Value(List data);
+    Value(Object data);
 
     const Data& data() const { return _data; }
     bool is_null() const { return _data.index() == 0; }
@@ -49,5 +49,16 @@ struct Member
     std::string key;
     Value value;
 };
+
+// Below, since clang wants a whole Member for them.
+inline Value::Value(bool data) : _data(data) {}
+inline Value::Value(int data) : _data(std::int64_t{data}) {}
+inline Value::Value(unsigned data) : _data(std::uint64_t{data}) {}
+inline Value::Value(std::uint64_t data) : _data(data) {}
+inline Value::Value(double data) : _data(data) {}
+inline Value::Value(std::string data) : _data(std::move(data)) {}
+inline Value::Value(const char* data) : _data(std::string(data)) {}
+inline Value::Value(List data) : _data(std::move(data)) {}
+inline Value::Value(Object data) : _data(std::move(data)) {}
 
 } // namespace hxa
