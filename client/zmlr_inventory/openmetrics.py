@@ -29,7 +29,8 @@ def write_openmetrics(path, inventory):
         return
     if os.path.lexists(path) and (os.path.islink(path) or not os.path.isfile(path)):
         raise FileExistsError(errno.EEXIST, "is no regular file", path)
-    write_atomically(path, openmetrics_text(inventory, str(path).endswith(COLLECTED)).encode())
+    text = openmetrics_text(inventory, str(path).endswith(COLLECTED))
+    write_atomically(path, text.encode(), mode=0o644)  # the collector is another user
 
 
 def openmetrics_text(inventory, for_collector):

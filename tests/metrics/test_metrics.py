@@ -2,6 +2,7 @@
 
 import csv
 import os
+import re
 import subprocess
 import sys
 from pathlib import Path
@@ -18,11 +19,9 @@ from tools.simulated_server import SimulatedServer  # noqa: E402
 from zmlr_inventory.main import main  # noqa: E402
 
 IS_SANITIZED = "ZMLR_SANITIZE:STRING=\n" not in (BUILD / "CMakeCache.txt").read_text(encoding="utf-8")
-SEEN_BY_BOTH = {
-    row["family"]
-    for row in csv.DictReader((ROOT / "metrics/families.tsv").open(encoding="utf-8"), delimiter="\t", quoting=csv.QUOTE_NONE)
-    if row["cim"] != "-" and {row["fc"], row["fcoe"]} != {"-"}
-}
+with (ROOT / "metrics/families.tsv").open(encoding="utf-8") as table:
+    FAMILIES = list(csv.DictReader(table, delimiter="\t", quoting=csv.QUOTE_NONE))
+SEEN_BY_BOTH = {row["family"] for row in FAMILIES if row["cim"] != "-" and {row["fc"], row["fcoe"]} != {"-"}}
 
 
 def hxa(scenario, path):
@@ -86,6 +85,8 @@ def test_hosts_are_told_apart_and_one_that_failed_is_down(tmp_path):
     path = tmp_path / "fleet.txt"
     with SimulatedServer("fc-hba") as server:
         assert main([server.url, "http://127.0.0.1:9", "--openmetrics", str(path)]) == 1
+        (tmp_path / "link").symlink_to(path)
+        assert main([server.url, "--openmetrics", str(tmp_path / "link")]) == 5
     told = series(path)
     here = ("host", server.url.removeprefix("http://"))
     assert (told["hxa_host_up", here], told["hxa_host_up", ("host", "127.0.0.1:9")], told["hxa_adapters", here]) == (1, 0, 1)
@@ -96,7 +97,11 @@ def test_alert_rules_fire_on_what_they_are_for():
     for arguments in (["check", "rules", ROOT / "metrics/hxa.rules.yml"], ["test", "rules", HERE / "hxa.rules.test.yml"]):
         checked = subprocess.run(["promtool", *arguments], capture_output=True, text=True, check=False)
         assert checked.returncode == 0, checked.stdout + checked.stderr
+
+
+def test_rules_and_page_speak_of_the_families_that_are_told():
     rules = (ROOT / "metrics/hxa.rules.yml").read_text(encoding="utf-8")
-    documented = (ROOT / "docs/openmetrics.md").read_text(encoding="utf-8")
-    alerts = [line.split()[-1] for line in rules.splitlines() if "- alert:" in line]
-    assert [name for name in [*alerts, *SEEN_BY_BOTH] if f"`{name}`" not in documented] == []
+    page = (ROOT / "docs/openmetrics.md").read_text(encoding="utf-8")
+    families = {row["family"] for row in FAMILIES}
+    assert set(re.findall(r"hxa_\w+", rules)) - families == set()
+    assert [name for name in families.union(re.findall(r"alert: (\w+)", rules)) if f"`{name}`" not in page] == []
