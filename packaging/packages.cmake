@@ -8,7 +8,7 @@ set(packages
   "development|libhxal-dev    |libdevel |any |libhxal1 (= ${PROJECT_VERSION})                  |"
   "tools      |hxa            |admin    |any |                                                 |"
   "server     |zmlr-cimserver |admin    |any |zmlr-provider (= ${PROJECT_VERSION}), systemd, udev|"
-  "inventory  |zmlr-inventory |admin    |all |python3:any, python3-pywbem                      |graphviz"
+  "inventory  |zmlr-inventory |admin    |all |python3:any                                      |graphviz, python3-pywbem"
   "simulator  |hxasim         |utils    |any |                                                 |")
 
 # Who answers for the packages is who builds them, or else who wrote the newest of these sources.
