@@ -5,13 +5,7 @@ import datetime
 import json
 
 from . import model
-from .values import (
-    ENABLED_STATE,
-    ETHERNET_PORT_TYPE,
-    FC_PORT_TYPE,
-    OPERATIONAL_STATUS,
-    word,
-)
+from .values import ENABLED_STATE, ETHERNET_PORT_TYPE, FC_PORT_TYPE, OPERATIONAL_STATUS, word
 
 FORMAT = 1  # of the document; raised when something goes or changes its meaning, not when something is added
 

@@ -11,17 +11,7 @@ from urllib.parse import urlsplit
 
 import pywbem
 
-from .model import (
-    Adapter,
-    EthernetPort,
-    Host,
-    Lun,
-    Module,
-    Port,
-    Software,
-    Statistics,
-    Target,
-)
+from .model import Adapter, EthernetPort, Host, Lun, Module, Port, Software, Statistics, Target
 
 NAME_SPACE = "root/zemlar"
 
