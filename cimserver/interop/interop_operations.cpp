@@ -10,7 +10,7 @@ namespace
 
 constexpr std::string_view module_roots[] = {
 #define ZMLR_INTEROP_ROOT(Class) #Class,
-#include "providers/interop_roots.def"
+#include "cimserver/interop/interop_roots.def"
 #undef ZMLR_INTEROP_ROOT
 };
 

@@ -30,7 +30,7 @@ MAY_INCLUDE = {
         "cmpi/status.h",
         "runtime",
     ],
-    "cimserver": ["cmpi/standard", "cmpi/registration.h", "providers/interop_roots.def", "runtime/meta.h", "runtime/types.h", "text"],
+    "cimserver": ["cmpi/standard", "cmpi/registration.h", "runtime/meta.h", "runtime/types.h", "text"],
     "sim": ["hxal/records", "hxal/commands.h"],
     "cli": ["hxal", "text", "metrics/families.h"],
 }
