@@ -59,7 +59,7 @@ void convert(const Port& port)
 template <class Set> void with_scalar(const CMPIBroker* broker, const Value& value, Set set)
 {
     CMPIValue data{};
-    if (const auto* text = std::get_if<std::string>(&value.content))
+    if (const auto* text = value.as<std::string>())
     {
         if (value.type == CMPI_dateTime)
         {
@@ -73,18 +73,18 @@ template <class Set> void with_scalar(const CMPIBroker* broker, const Value& val
         CMRelease(data.string);
         return;
     }
-    if (const auto* flag = std::get_if<bool>(&value.content))
+    if (const auto* flag = value.as<bool>())
         data.boolean = *flag;
-    else if (const auto* number = std::get_if<std::uint64_t>(&value.content))
+    else if (const auto* number = value.as<std::uint64_t>())
         data.uint64 = *number; // little-endian: the shorter types lie at its start
-    else if (const auto* signed_number = std::get_if<std::int64_t>(&value.content))
+    else if (const auto* signed_number = value.as<std::int64_t>())
         data.sint64 = *signed_number;
     set(&data, value.type);
 }
 
 template <class Set> void with_value(const CMPIBroker* broker, const Value& value, Set set)
 {
-    const auto* elements = std::get_if<std::vector<Value>>(&value.content);
+    const auto* elements = value.as<std::vector<Value>>();
     if (!elements)
         return with_scalar(broker, value, set);
     const auto element_type = static_cast<CMPIType>(value.type & ~CMPI_ARRAY);

@@ -24,18 +24,17 @@ std::vector<cimserver::Instance> all_of(Operations& operations, const std::strin
 // A run of this test leaves two service records. It is tried until the run before it has ended.
 void run_on(Operations& operations, const cimserver::Object_Path& test, const cimserver::Object_Path& port)
 {
-    const cimserver::Value element{CMPI_ref, std::make_shared<const cimserver::Object_Path>(port)};
+    const cimserver::Value element{CMPI_ref, port};
     std::uint64_t code = 0;
     while (code != 4096)
-        code = std::get<std::uint64_t>(
-            operations.invoke_method(test, "RunDiagnostic", {{"ManagedElement", element}}).return_value.content);
+        code = operations.invoke_method(test, "RunDiagnostic", {{"ManagedElement", element}}).return_value.get<std::uint64_t>();
 }
 
 bool is_job_running(Operations& operations)
 {
     for (const auto& [name, value] : all_of(operations, "ZEMLAR_ConcreteJob").at(0).properties)
         if (name == "JobState")
-            return std::get<std::uint64_t>(value.content) == 4;
+            return value.get<std::uint64_t>() == 4;
     return false;
 }
 

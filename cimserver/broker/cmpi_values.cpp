@@ -58,11 +58,9 @@ Value from_scalar(const CMPIValue& value, CMPIType type)
     case CMPI_dateTime:
         return from_object<Datetime_Object>(type, value.dateTime, [](const Datetime_Object& datetime) { return datetime.text; });
     case CMPI_ref:
-        return from_object<Path_Object>(type, value.ref,
-                                        [](const Path_Object& path) { return std::make_shared<const Object_Path>(path.path); });
+        return from_object<Path_Object>(type, value.ref, [](const Path_Object& path) { return path.path; });
     case CMPI_instance:
-        return from_object<Instance_Object>(
-            type, value.inst, [](const Instance_Object& instance) { return std::make_shared<const Instance>(instance.model()); });
+        return from_object<Instance_Object>(type, value.inst, [](const Instance_Object& instance) { return instance.model(); });
     default:
         throw Failure{CMPI_RC_ERR_INVALID_DATA_TYPE};
     }
@@ -85,13 +83,13 @@ CMPIValue to_pointer(const Value& value)
     switch (value.type)
     {
     case CMPI_string:
-        return {.string = make<String_Object>(std::get<std::string>(value.content)).face()};
+        return {.string = make<String_Object>(std::get<Shared<std::string>>(value.content)).face()};
     case CMPI_dateTime:
-        return {.dateTime = make<Datetime_Object>(std::get<std::string>(value.content)).face()};
+        return {.dateTime = make<Datetime_Object>(std::get<Shared<std::string>>(value.content)).face()};
     case CMPI_ref:
-        return {.ref = make<Path_Object>(*std::get<std::shared_ptr<const Object_Path>>(value.content)).face()};
+        return {.ref = make<Path_Object>(value.get<Object_Path>()).face()};
     case CMPI_instance:
-        return {.inst = make<Instance_Object>(*std::get<std::shared_ptr<const Instance>>(value.content)).face()};
+        return {.inst = make<Instance_Object>(value.get<Instance>()).face()};
     default:
         throw Failure{CMPI_RC_ERR_INVALID_DATA_TYPE};
     }
@@ -102,15 +100,15 @@ CMPIValue to_scalar(const Value& value)
     const Cim_Type* type = find_type(value.type);
     CMPIValue result{.uint64 = 0};
     if (type && type->is_signed)
-        put_integer(result, static_cast<std::uint64_t>(std::get<std::int64_t>(value.content)), type->bits);
+        put_integer(result, static_cast<std::uint64_t>(value.get<std::int64_t>()), type->bits);
     else if (type && type->bits > 0)
-        put_integer(result, std::get<std::uint64_t>(value.content), type->bits);
+        put_integer(result, value.get<std::uint64_t>(), type->bits);
     else if (value.type == CMPI_boolean)
-        result.boolean = std::get<bool>(value.content);
+        result.boolean = value.get<bool>();
     else if (value.type == CMPI_real32)
-        result.real32 = static_cast<CMPIReal32>(std::get<double>(value.content));
+        result.real32 = static_cast<CMPIReal32>(value.get<double>());
     else if (value.type == CMPI_real64)
-        result.real64 = std::get<double>(value.content);
+        result.real64 = value.get<double>();
     else
         return to_pointer(value);
     return result;
@@ -141,7 +139,7 @@ CMPIData to_cmpi(const Value& value)
     if (value.null())
         data.state = CMPI_nullValue;
     else if ((value.type & CMPI_ARRAY) != 0)
-        data.value.array = make<Array_Object>(element_of(value.type), std::get<std::vector<Value>>(value.content)).face();
+        data.value.array = make<Array_Object>(element_of(value.type), value.get<std::vector<Value>>()).face();
     else
         data.value = to_scalar(value);
     return data;
@@ -160,7 +158,7 @@ CMPIData data_at(const std::vector<Named_Value>& list, CMPICount index, CMPIStri
     if (index >= list.size())
         throw Failure{CMPI_RC_ERR_NOT_FOUND};
     if (name)
-        *name = make<String_Object>(list[index].name).face();
+        *name = make<String_Object>(list[index].name.text()).face();
     return to_cmpi(list[index].value);
 }
 

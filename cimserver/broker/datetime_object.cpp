@@ -8,9 +8,9 @@ namespace
 {
 
 // Any numbers in the form: a timestamp of all zeros is what many agents answer for an unset clock.
-std::string checked(std::string text)
+Shared<std::string> checked(Shared<std::string> text)
 {
-    if (!text::read_datetime(text))
+    if (!text::read_datetime(*text))
         throw Failure{CMPI_RC_ERR_INVALID_PARAMETER};
     return text;
 }
@@ -22,7 +22,7 @@ CMPIString* get_string_format(const CMPIDateTime* self, CMPIStatus* status) noex
 
 } // namespace
 
-Datetime_Object::Datetime_Object(std::string text_) : text(checked(std::move(text_))) {}
+Datetime_Object::Datetime_Object(Shared<std::string> text_) : text(checked(std::move(text_))) {}
 
 const CMPIDateTimeFT Datetime_Object::table = {
     .ftVersion = 100,

@@ -9,28 +9,29 @@ namespace cimserver
 namespace
 {
 
-const Class_Entry& known_class(const CMPIBroker* broker, const char* class_name)
-{
-    const Class_Entry* entry = broker_of(broker).repository().find(class_name);
-    if (!entry)
-        throw Failure{CMPI_RC_ERR_INVALID_CLASS};
-    return *entry;
-}
-
 CMPIInstance* new_instance(const CMPIBroker* broker, const CMPIObjectPath* self, CMPIStatus* status) noexcept
 {
     const auto body = [&]
     {
-        const Object_Path& path = object<Path_Object>(self).path;
-        return make<Instance_Object>(known_class(broker, path.class_name.c_str()).layout, path).face();
+        const Repository& classes = broker_of(broker).repository();
+        const auto& path = object<Path_Object>(self);
+        const Class_Entry* entry = path.class_entry ? path.class_entry : classes.find(path.path.class_name);
+        if (!entry)
+            throw Failure{CMPI_RC_ERR_INVALID_CLASS};
+        return make<Instance_Object>(entry->layout, path.path).face();
     };
     return answer<CMPIInstance*>(status, nullptr, body);
 }
 
-CMPIObjectPath* new_object_path(const CMPIBroker*, const char* name_space, const char* class_name, CMPIStatus* status) noexcept
+CMPIObjectPath* new_object_path(const CMPIBroker* broker, const char* name_space, const char* class_name,
+                                CMPIStatus* status) noexcept
 {
-    const auto path = [&] { return Object_Path{"", name_space ? name_space : "", required(class_name), {}}; };
-    return answer_new<Path_Object>(status, path);
+    const auto body = [&]
+    {
+        const Class_Entry* entry = broker_of(broker).repository().find(required(class_name));
+        return make<Path_Object>(Object_Path{"", name_space ? name_space : "", class_name, {}}, entry).face();
+    };
+    return answer<CMPIObjectPath*>(status, nullptr, body);
 }
 
 CMPIArgs* new_args(const CMPIBroker*, CMPIStatus* status) noexcept
@@ -40,7 +41,7 @@ CMPIArgs* new_args(const CMPIBroker*, CMPIStatus* status) noexcept
 
 CMPIString* new_string(const CMPIBroker*, const char* text, CMPIStatus* status) noexcept
 {
-    return answer_new<String_Object>(status, [&] { return required(text); });
+    return answer_new<String_Object>(status, [&] { return std::string(required(text)); });
 }
 
 CMPIArray* new_array(const CMPIBroker*, CMPICount size, CMPIType element_type, CMPIStatus* status) noexcept

@@ -4,7 +4,7 @@
 #pragma once
 
 #include "cimserver/broker/object.h"
-#include "cimserver/model/property_layout.h"
+#include "cimserver/model/repository.h"
 #include "cimserver/model/values.h"
 
 #include <memory>
@@ -20,9 +20,9 @@ class String_Object : public Handle<CMPIString, String_Object>
 public:
     static const Table table;
 
-    explicit String_Object(std::string text_) : text(std::move(text_)) {}
+    explicit String_Object(Shared<std::string> text_) : text(std::move(text_)) {}
 
-    const std::string text;
+    const Shared<std::string> text;
 };
 
 // An array of fixed size. Elements start null; a text array takes CMPI_chars too.
@@ -45,9 +45,9 @@ class Datetime_Object : public Handle<CMPIDateTime, Datetime_Object>
 public:
     static const Table table;
 
-    explicit Datetime_Object(std::string text_); // throws INVALID_PARAMETER when the text is no datetime
+    explicit Datetime_Object(Shared<std::string> text_); // throws INVALID_PARAMETER when the text is no datetime
 
-    const std::string text;
+    const Shared<std::string> text;
 };
 
 class Path_Object : public Handle<CMPIObjectPath, Path_Object>
@@ -55,9 +55,11 @@ class Path_Object : public Handle<CMPIObjectPath, Path_Object>
 public:
     static const Table table;
 
-    explicit Path_Object(Object_Path path_) : path(std::move(path_)) {}
+    // The keys that are added share the names of the class, if one is given.
+    explicit Path_Object(Object_Path path_, const Class_Entry* entry = nullptr) : path(std::move(path_)), class_entry(entry) {}
 
     Object_Path path;
+    const Class_Entry* class_entry;
 };
 
 // An instance of a class: one value per property of its layout, all null at first.

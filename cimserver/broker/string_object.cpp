@@ -7,7 +7,7 @@ namespace
 
 const char* get_char_ptr(const CMPIString* self, CMPIStatus* status) noexcept
 {
-    return answer<const char*>(status, nullptr, [&] { return object<String_Object>(self).text.c_str(); });
+    return answer<const char*>(status, nullptr, [&] { return (*object<String_Object>(self).text).c_str(); });
 }
 
 } // namespace

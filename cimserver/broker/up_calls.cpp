@@ -83,9 +83,9 @@ Property_List property_list(const char** properties)
 
 CMPIEnumeration* enumeration(std::vector<Instance> found)
 {
-    std::vector<Value> elements(found.size(), Value{CMPI_instance, {}});
-    for (std::size_t i = 0; i < found.size(); ++i)
-        elements[i].content = std::make_shared<const Instance>(std::move(found[i]));
+    std::vector<Value> elements;
+    for (Instance& instance : found)
+        elements.push_back({CMPI_instance, std::move(instance)});
     return make<Enumeration_Object>(CMPIType{CMPI_instance}, std::move(elements)).face();
 }
 

@@ -43,12 +43,13 @@ Value::Content next_content(unsigned type, const void*& data)
         return double{next<float>(data)};
     case zmlr::REAL64:
         return next<double>(data);
+    case zmlr::STRING:
+    case zmlr::DATETIME:
+        return std::string(next<const char*>(data));
     default:
         return std::monostate();
     }
 }
-
-bool is_text(unsigned type) { return type == zmlr::STRING || type == zmlr::DATETIME; }
 
 } // namespace
 
@@ -61,16 +62,12 @@ Value default_of(const zmlr::Meta_Property& property)
         return value;
 
     // A scalar text stands at the pointer itself, an array holds pointers to texts.
-    if (!array && is_text(property.type))
-    {
-        value.content = std::string(static_cast<const char*>(property.value->data));
-        return value;
-    }
+    const auto* const text = static_cast<const char*>(property.value->data);
+    const bool text_itself = !array && (type == CMPI_string || type == CMPI_dateTime);
+    const void* data = text_itself ? static_cast<const void*>(&text) : text;
     std::vector<Value> elements;
-    const void* data = property.value->data;
     for (unsigned i = 0; i < property.value->size; ++i)
-        elements.push_back({type, is_text(property.type) ? Value::Content(std::string(next<const char*>(data)))
-                                                         : next_content(property.type, data)});
+        elements.push_back({type, next_content(property.type, data)});
     if (array)
         value.content = std::move(elements);
     else if (!elements.empty())

@@ -32,7 +32,7 @@ Value read_key(const Xml_Element& element, const std::string& name_space)
 {
     if (element.name == "KEYVALUE")
         return read_key_value(element);
-    return Value{CMPI_ref, std::make_shared<const Object_Path>(read_path(element, name_space))};
+    return Value{CMPI_ref, read_path(element, name_space)};
 }
 
 void add_key(Object_Path& path, const Xml_Element& binding)
@@ -91,8 +91,6 @@ Value read_array(const Xml_Element& element, CMPIType element_type, const std::s
     return {static_cast<CMPIType>(element_type | CMPI_ARRAY), std::move(elements)};
 }
 
-Value instance_value(Instance instance) { return {CMPI_instance, std::make_shared<const Instance>(std::move(instance))}; }
-
 Named_Value read_property(const Xml_Element& element, const std::string& name_space)
 {
     Named_Value property{*element.attribute("NAME"), {}};
@@ -118,10 +116,10 @@ Value read_value(const Xml_Element& element, const std::string& name_space)
     if (element.name == "VALUE.REFARRAY")
         return read_array(element, CMPI_ref, name_space);
     if (element.name == "INSTANCE" || element.name == "VALUE.NAMEDINSTANCE")
-        return instance_value(read_instance(element, name_space));
+        return {CMPI_instance, read_instance(element, name_space)};
     if (element.name == "CLASS")
         fail("a class is no value here");
-    return {CMPI_ref, std::make_shared<const Object_Path>(read_path(element, name_space))};
+    return {CMPI_ref, read_path(element, name_space)};
 }
 
 Instance read_instance(const Xml_Element& element, const std::string& name_space)

@@ -12,8 +12,6 @@ namespace cimserver
 namespace
 {
 
-using Reference = std::shared_ptr<const Object_Path>;
-
 void write_local_name_space(Xml_Writer& writer, const std::string& name_space)
 {
     writer.start("LOCALNAMESPACEPATH");
@@ -40,29 +38,20 @@ void write_key_value(Xml_Writer& writer, const Value& value)
     // A key that clients could refuse as a datetime still names its instance as a text.
     if (text)
         writer.attribute("TYPE", cim_type_name(value.type)).text(*text);
-    else if (const auto* raw = std::get_if<std::string>(&value.content))
+    else if (const auto* raw = value.as<std::string>())
         writer.text(*raw);
     writer.end();
 }
 
 void write_key(Xml_Writer& writer, const Named_Value& key)
 {
-    const auto* reference = std::get_if<Reference>(&key.value.content);
-    if (key.value.null() || (reference && !*reference))
+    if (key.value.null())
         return;
     writer.start("KEYBINDING").attribute("NAME", key.name);
-    if (reference)
-        write_reference(writer, **reference);
+    if (const auto* reference = key.value.as<Object_Path>())
+        write_reference(writer, *reference);
     else
         write_key_value(writer, key.value);
-    writer.end();
-}
-
-void write_local_path(Xml_Writer& writer, const Object_Path& path)
-{
-    writer.start("LOCALINSTANCEPATH");
-    write_local_name_space(writer, path.name_space);
-    write_instance_name(writer, path);
     writer.end();
 }
 
@@ -94,53 +83,30 @@ void write_array(Xml_Writer& writer, const std::vector<Value>& elements, CMPITyp
     writer.end();
 }
 
-// What all three kinds of property begin with.
-void start_property(Xml_Writer& writer, const char* element, const Named_Value& property, const zmlr::Meta_Class* origins)
-{
-    writer.start(element).attribute("NAME", property.name);
-    if (property.value.type != CMPI_ref)
-        writer.attribute("TYPE", cim_type_name(property.value.type));
-    const zmlr::Meta_Class* origin = origins ? origin_of(*origins, property.name) : nullptr;
-    if (origin)
-        writer.attribute("CLASSORIGIN", origin->name);
-}
-
-void write_reference_property(Xml_Writer& writer, const Named_Value& property, const zmlr::Meta_Class* origins)
-{
-    const auto* reference = std::get_if<Reference>(&property.value.content);
-    start_property(writer, "PROPERTY.REFERENCE", property, origins);
-    if (reference && *reference)
-        write_reference(writer, **reference);
-    writer.end();
-}
-
 void write_property(Xml_Writer& writer, const Named_Value& property, const zmlr::Meta_Class* origins)
 {
     const CMPIType type = property.value.type;
     if (!cim_type_name(type) || type == (CMPI_ref | CMPI_ARRAY))
         return;
-    if (type == CMPI_ref)
-        return write_reference_property(writer, property, origins);
-    start_property(writer, (type & CMPI_ARRAY) != 0 ? "PROPERTY.ARRAY" : "PROPERTY", property, origins);
-    write_value(writer, property.value);
+    writer.start(type == CMPI_ref ? "PROPERTY.REFERENCE" : (type & CMPI_ARRAY) != 0 ? "PROPERTY.ARRAY" : "PROPERTY");
+    writer.attribute("NAME", property.name);
+    if (type != CMPI_ref)
+        writer.attribute("TYPE", cim_type_name(type));
+    if (const zmlr::Meta_Class* origin = origins ? origin_of(*origins, property.name) : nullptr)
+        writer.attribute("CLASSORIGIN", origin->name);
+    write_any_value(writer, property.value);
     writer.end();
-}
-
-const Object_Path* target_of(const Value& value)
-{
-    const auto* reference = std::get_if<Reference>(&value.content);
-    return reference ? reference->get() : nullptr;
 }
 
 // Nothing when an element is null: clients know no null inside an array.
 void write_reference_array(Xml_Writer& writer, const Value& value)
 {
-    const auto* elements = std::get_if<std::vector<Value>>(&value.content);
-    if (!elements || !std::ranges::all_of(*elements, target_of))
+    const auto* elements = value.as<std::vector<Value>>();
+    if (!elements || !std::ranges::all_of(*elements, &Value::as<Object_Path>))
         return;
     writer.start("VALUE.REFARRAY");
     for (const Value& element : *elements)
-        write_reference(writer, *target_of(element));
+        write_reference(writer, element.get<Object_Path>());
     writer.end();
 }
 
@@ -160,7 +126,12 @@ void write_reference(Xml_Writer& writer, const Object_Path& path)
     if (path.name_space.empty())
         write_instance_name(writer, path);
     else if (path.host.empty())
-        write_local_path(writer, path);
+    {
+        writer.start("LOCALINSTANCEPATH");
+        write_local_name_space(writer, path.name_space);
+        write_instance_name(writer, path);
+        writer.end();
+    }
     else
         write_instance_path(writer, path);
     writer.end();
@@ -193,7 +164,7 @@ void write_instance(Xml_Writer& writer, const Instance& instance, const zmlr::Me
 
 void write_value(Xml_Writer& writer, const Value& value)
 {
-    if (const auto* elements = std::get_if<std::vector<Value>>(&value.content))
+    if (const auto* elements = value.as<std::vector<Value>>())
         write_array(writer, *elements, value.type);
     else if (const std::optional<std::string> text = value_text(value))
         writer.element("VALUE", *text);
@@ -201,11 +172,8 @@ void write_value(Xml_Writer& writer, const Value& value)
 
 void write_any_value(Xml_Writer& writer, const Value& value)
 {
-    if (value.type == CMPI_ref)
-    {
-        if (const Object_Path* path = target_of(value))
-            write_reference(writer, *path);
-    }
+    if (const auto* path = value.as<Object_Path>())
+        write_reference(writer, *path);
     else if (value.type == (CMPI_ref | CMPI_ARRAY))
         write_reference_array(writer, value);
     else

@@ -36,16 +36,16 @@ Value* value_of(Instance& instance, std::string_view name)
 std::string text_of(const Instance& instance, std::string_view name)
 {
     const Named_Value* property = find_named(instance.properties, name);
-    const auto* text = property ? std::get_if<std::string>(&property->value.content) : nullptr;
+    const auto* text = property ? property->value.as<std::string>() : nullptr;
     return text ? *text : "";
 }
 
 std::size_t text_bytes(const Value& value)
 {
-    if (const auto* text = std::get_if<std::string>(&value.content))
+    if (const auto* text = value.as<std::string>())
         return text->size();
     std::size_t bytes = 0;
-    if (const auto* elements = std::get_if<std::vector<Value>>(&value.content))
+    if (const auto* elements = value.as<std::vector<Value>>())
         for (const Value& element : *elements)
             bytes += 1 + text_bytes(element);
     return bytes;
@@ -81,7 +81,7 @@ void complete_keys(Instance& instance)
     for (const auto& [name, otherwise] : keys)
     {
         const Named_Value* given = find_named(instance.path.keys, name);
-        const auto* text = given ? std::get_if<std::string>(&given->value.content) : nullptr;
+        const auto* text = given ? given->value.as<std::string>() : nullptr;
         const std::string value = text ? *text : otherwise;
         if (value.empty() || value.size() > max_name_bytes)
             refuse(instance, std::string(name) + " has 1 to " + std::to_string(max_name_bytes) + " bytes");
@@ -97,7 +97,7 @@ void complete_keys(Instance& instance)
 void allow_only(Instance& instance, const std::string& name, std::uint64_t value)
 {
     const Value* given = value_of(instance, name);
-    const auto* number = given ? std::get_if<std::uint64_t>(&given->content) : nullptr;
+    const auto* number = given ? given->as<std::uint64_t>() : nullptr;
     if (given && (!number || *number != value))
         refuse(instance, name + " can only be " + std::to_string(value), CIM_ERR_NOT_SUPPORTED);
     complete(instance, name, value);
@@ -109,9 +109,9 @@ std::vector<std::string> source_name_spaces(const Instance& filter)
     if (const std::string one = text_of(filter, "SourceNamespace"); !one.empty())
         names.push_back(one);
     const Named_Value* several = find_named(filter.properties, "SourceNamespaces");
-    if (const auto* list = several ? std::get_if<std::vector<Value>>(&several->value.content) : nullptr)
+    if (const auto* list = several ? several->value.as<std::vector<Value>>() : nullptr)
         for (const Value& element : *list)
-            if (const auto* text = std::get_if<std::string>(&element.content))
+            if (const auto* text = element.as<std::string>())
                 names.push_back(*text);
     return names;
 }

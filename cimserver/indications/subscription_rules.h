@@ -5,7 +5,6 @@
 #include "cimserver/model/event_query.h"
 #include "cimserver/model/repository.h"
 
-#include <memory>
 #include <string>
 #include <vector>
 

@@ -45,28 +45,28 @@ Json json_of(const std::vector<Named_Value>& values)
     return json;
 }
 
+Json json_of(std::monostate) { return nullptr; }
+Json json_of(const Instance&) { return nullptr; } // no property of these classes holds one
+
+Json json_of(const Object_Path& path)
+{
+    return {{"class", path.class_name}, {"name space", path.name_space}, {"keys", json_of(path.keys)}};
+}
+
+Json json_of(const std::vector<Value>& elements)
+{
+    Json list = Json::array();
+    for (const Value& element : elements)
+        list.push_back(json_of(element));
+    return list;
+}
+
+template <class T> Json json_of(const T& scalar) { return scalar; }
+template <class T> Json json_of(const Shared<T>& content) { return json_of(*content); }
+
 Json json_of(const Value& value)
 {
-    return std::visit(
-        [](const auto& content) -> Json
-        {
-            using Content = std::decay_t<decltype(content)>;
-            if constexpr (std::is_same_v<Content, std::shared_ptr<const Object_Path>>)
-                return {{"class", content->class_name}, {"name space", content->name_space}, {"keys", json_of(content->keys)}};
-            else if constexpr (std::is_same_v<Content, std::vector<Value>>)
-            {
-                Json list = Json::array();
-                for (const Value& element : content)
-                    list.push_back(json_of(element));
-                return list;
-            }
-            else if constexpr (std::is_same_v<Content, std::shared_ptr<const Instance>> ||
-                               std::is_same_v<Content, std::monostate>)
-                return nullptr; // no property of these classes holds an instance
-            else
-                return content;
-        },
-        value.content);
+    return std::visit([](const auto& content) { return json_of(content); }, value.content);
 }
 
 // What a damaged file makes throw is read before an aggregate is begun: g++ 12 destroys the members of an unfinished one twice.
@@ -102,7 +102,7 @@ Value value_of(const Json& json)
     path.name_space = json.at("name space");
     path.class_name = json.at("class");
     path.keys = values_of(json.at("keys"));
-    return {CMPI_ref, std::make_shared<const Object_Path>(std::move(path))};
+    return {CMPI_ref, std::move(path)};
 }
 
 // Readers of values call themselves.

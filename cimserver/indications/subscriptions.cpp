@@ -22,12 +22,12 @@ using Kind = Subscription_Kind;
 const Object_Path& reference(const Instance& subscription, const char* end)
 {
     const Named_Value* key = find_named(subscription.path.keys, end);
-    return *std::get<std::shared_ptr<const Object_Path>>(key->value.content);
+    return key->value.get<Object_Path>();
 }
 
 void set_reference(Instance& subscription, const char* end, const Object_Path& path)
 {
-    const Value value{CMPI_ref, std::make_shared<const Object_Path>(path)};
+    const Value value{CMPI_ref, path};
     find_named(subscription.path.keys, end)->value = value;
     find_named(subscription.properties, end)->value = value;
 }
@@ -101,7 +101,7 @@ Provider_Filter Subscriptions::provider_filter(const std::string& filter_id) con
 {
     const Entry& filter = table(Kind::filter).at(filter_id);
     const Named_Value* query = find_named(filter.instance.properties, "Query");
-    return {std::get<std::string>(query->value.content), filter.filter->query.class_name(), filter.filter->name_spaces};
+    return {query->value.get<std::string>(), filter.filter->query.class_name(), filter.filter->name_spaces};
 }
 
 void Subscriptions::insert(Kind kind, const std::string& id, Entry entry)
@@ -126,7 +126,7 @@ void Subscriptions::update_routes()
     for (const auto& [id, subscription] : table(Kind::subscription))
     {
         const Instance& destination = table(Kind::destination).at(subscription.destination_id).instance;
-        const auto& url = std::get<std::string>(find_named(destination.properties, "Destination")->value.content);
+        const auto& url = find_named(destination.properties, "Destination")->value.get<std::string>();
         Route& route = by_filter[subscription.filter_id];
         route.filter = table(Kind::filter).at(subscription.filter_id).filter;
         route.urls.push_back(url);

@@ -5,20 +5,10 @@
 #include "cimserver/operations/association_routing.h"
 #include "cimserver/operations/typed_keys.h"
 
-#include <algorithm>
-
 namespace cimserver
 {
 namespace
 {
-
-using Target = std::shared_ptr<const Object_Path>;
-
-const Target* reference_in(const Named_Value& property)
-{
-    const auto* reference = std::get_if<Target>(&property.value.content);
-    return reference && *reference ? reference : nullptr;
-}
 
 bool may_play(const Named_Value& property, const std::string& role) { return role.empty() || equal_names(property.name, role); }
 
@@ -59,8 +49,8 @@ std::vector<Own_Operations::Reference> Own_Operations::find_references(const Obj
         if (const Server_Class* server_class = answering(*entry))
             for (Instance& association : server_class->enumerate())
                 for (const Named_Value& property : association.properties)
-                    if (const Target* reference = reference_in(property);
-                        reference && may_play(property, filter.role) && identity_of(**reference) == source)
+                    if (const auto* reference = property.value.as<Object_Path>();
+                        reference && may_play(property, filter.role) && identity_of(*reference) == source)
                     {
                         std::string near = property.name;
                         found.push_back({*entry, std::move(association), std::move(near)});
@@ -76,12 +66,12 @@ std::vector<Object_Path> Own_Operations::associator_names(const Object_Path& pat
     for (const Reference& found : find_references(path, filter, Ends::both))
         for (const Named_Value& property : found.association.properties)
         {
-            const Target* reference = reference_in(property);
+            const auto* reference = property.value.as<Object_Path>();
             if (!reference || property.name == found.near || !may_play(property, filter.result_role))
                 continue;
-            const Class_Entry* far = _repository.find((*reference)->class_name);
+            const Class_Entry* far = _repository.find(reference->class_name);
             if (far && (!result_class || Repository::is_a(far->meta_class, result_class->meta_class)))
-                paths.push_back(**reference);
+                paths.push_back(*reference);
         }
     remove_duplicates(paths);
     return paths;

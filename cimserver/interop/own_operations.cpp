@@ -9,7 +9,6 @@
 
 namespace cimserver
 {
-
 namespace
 {
 
@@ -17,12 +16,11 @@ namespace
 void use_one_name(std::vector<Named_Value>& values)
 {
     for (Named_Value& value : values)
-        if (const auto* reference = std::get_if<std::shared_ptr<const Object_Path>>(&value.value.content);
-            reference && *reference && Own_Operations::is_name((*reference)->name_space))
+        if (const auto* reference = value.value.as<Object_Path>(); reference && Own_Operations::is_name(reference->name_space))
         {
-            Object_Path path = **reference;
+            Object_Path path = *reference;
             path.name_space = Own_Operations::name_space;
-            value.value.content = std::make_shared<const Object_Path>(std::move(path));
+            value.value.content = std::move(path);
         }
 }
 

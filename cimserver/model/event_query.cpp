@@ -17,11 +17,11 @@ bool is_number(CMPIType type) { return (type & (CMPI_INTEGER | CMPI_REAL)) != 0;
 
 std::optional<long double> number_of(const Value& value)
 {
-    if (const auto* number = std::get_if<std::uint64_t>(&value.content))
+    if (const auto* number = value.as<std::uint64_t>())
         return *number;
-    if (const auto* number = std::get_if<std::int64_t>(&value.content))
+    if (const auto* number = value.as<std::int64_t>())
         return *number;
-    if (const auto* number = std::get_if<double>(&value.content))
+    if (const auto* number = value.as<double>())
         return *number;
     return std::nullopt;
 }
@@ -39,10 +39,10 @@ template <class T> bool holds(const T& left, Relation relation, const T& right)
 std::optional<bool> compare(const Query_Condition& condition, const Value& value)
 {
     if (const auto* text = std::get_if<std::string>(&condition.literal))
-        if (const auto* mine = std::get_if<std::string>(&value.content))
+        if (const auto* mine = value.as<std::string>())
             return holds(*mine, condition.relation, *text);
     if (const auto* flag = std::get_if<bool>(&condition.literal))
-        if (const auto* mine = std::get_if<bool>(&value.content))
+        if (const auto* mine = value.as<bool>())
             return holds(*mine, condition.relation, *flag);
     if (const auto* number = std::get_if<long double>(&condition.literal))
         if (const auto mine = number_of(value))

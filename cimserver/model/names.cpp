@@ -35,7 +35,7 @@ std::size_t Name_Hash::operator()(std::string_view name) const
     return static_cast<std::size_t>(hash);
 }
 
-void put(std::vector<Named_Value>& list, std::string name, Value value)
+void put(std::vector<Named_Value>& list, Name name, Value value)
 {
     if (Named_Value* found = find_named(list, name))
         found->value = std::move(value);

@@ -23,18 +23,18 @@ std::string quoted(const std::string& text)
 
 std::string key_text(const Value& value)
 {
-    if (const auto* flag = std::get_if<bool>(&value.content))
+    if (const auto* flag = value.as<bool>())
         return *flag ? "TRUE" : "FALSE";
-    if (const auto* number = std::get_if<std::uint64_t>(&value.content))
+    if (const auto* number = value.as<std::uint64_t>())
         return std::to_string(*number);
-    if (const auto* number = std::get_if<std::int64_t>(&value.content))
+    if (const auto* number = value.as<std::int64_t>())
         return std::to_string(*number);
-    if (const auto* number = std::get_if<double>(&value.content))
+    if (const auto* number = value.as<double>())
         return std::to_string(*number);
-    if (const auto* text = std::get_if<std::string>(&value.content))
+    if (const auto* text = value.as<std::string>())
         return quoted(*text);
-    if (const auto* path = std::get_if<std::shared_ptr<const Object_Path>>(&value.content); path && *path)
-        return quoted(path_text(**path));
+    if (const auto* path = value.as<Object_Path>())
+        return quoted(path_text(*path));
     return "NULL";
 }
 
@@ -45,8 +45,8 @@ Object_Path normal_form(Object_Path path)
     for (Named_Value& key : path.keys)
     {
         key.name = lower_name(key.name);
-        if (auto* target = std::get_if<std::shared_ptr<const Object_Path>>(&key.value.content); target && *target)
-            *target = std::make_shared<const Object_Path>(normal_form(**target));
+        if (const auto* target = key.value.as<Object_Path>())
+            key.value.content = normal_form(*target);
     }
     std::ranges::sort(path.keys, {}, [](const Named_Value& key) { return std::string_view(key.name); });
     return path;

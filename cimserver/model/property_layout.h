@@ -8,7 +8,6 @@
 #include "runtime/meta.h"
 
 #include <cstddef>
-#include <memory>
 #include <optional>
 #include <string_view>
 

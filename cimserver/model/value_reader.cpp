@@ -15,12 +15,12 @@ namespace
 
 std::optional<text::Integer> integer_of(const Value& value)
 {
-    if (const auto* number = std::get_if<std::uint64_t>(&value.content))
+    if (const auto* number = value.as<std::uint64_t>())
         return text::Integer{false, *number};
-    if (const auto* number = std::get_if<std::int64_t>(&value.content))
+    if (const auto* number = value.as<std::int64_t>())
         return text::Integer{*number < 0,
                              *number < 0 ? 0 - static_cast<std::uint64_t>(*number) : static_cast<std::uint64_t>(*number)};
-    if (const auto* string = std::get_if<std::string>(&value.content))
+    if (const auto* string = value.as<std::string>())
         return text::read_integer(trimmed(*string));
     return std::nullopt;
 }
@@ -38,9 +38,9 @@ Value::Content integer_content(const Value& value, const Cim_Type& type)
 
 Value::Content boolean_content(const Value& value)
 {
-    if (const auto* flag = std::get_if<bool>(&value.content))
+    if (const auto* flag = value.as<bool>())
         return *flag;
-    const auto* string = std::get_if<std::string>(&value.content);
+    const auto* string = value.as<std::string>();
     const auto flag = string ? read_boolean_text(*string) : std::nullopt;
     return flag ? Value::Content(*flag) : Value::Content();
 }
@@ -71,9 +71,9 @@ std::optional<double> read_real(std::string_view text, CMPIType type)
 
 Value::Content real_content(const Value& value, CMPIType type)
 {
-    if (const auto* number = std::get_if<double>(&value.content))
+    if (const auto* number = value.as<double>())
         return *number;
-    const auto* string = std::get_if<std::string>(&value.content);
+    const auto* string = value.as<std::string>();
     const auto number = string ? read_real(trimmed(*string), type) : std::nullopt;
     return number ? Value::Content(*number) : Value::Content();
 }
@@ -81,7 +81,7 @@ Value::Content real_content(const Value& value, CMPIType type)
 // The one character of a text, when it is of the Basic Multilingual Plane.
 Value::Content char16_content(const Value& value, const Cim_Type& type)
 {
-    const auto* string = std::get_if<std::string>(&value.content);
+    const auto* string = value.as<std::string>();
     if (!string)
         return integer_content(value, type);
     const text::Character character = text::first_character(*string);
@@ -89,15 +89,11 @@ Value::Content char16_content(const Value& value, const Cim_Type& type)
     return fits ? Value::Content(std::uint64_t{character.code}) : Value::Content();
 }
 
-Value::Content text_content(const Value& value)
-{
-    const auto* string = std::get_if<std::string>(&value.content);
-    return string ? Value::Content(*string) : Value::Content();
-}
+Value::Content text_content(const Value& value) { return value.as<std::string>() ? value.content : Value::Content(); }
 
 Value::Content datetime_content(const Value& value)
 {
-    const auto* string = std::get_if<std::string>(&value.content);
+    const auto* string = value.as<std::string>();
     const std::string datetime(string ? trimmed(*string) : "");
     return is_readable_datetime(datetime) ? Value::Content(datetime) : Value::Content();
 }

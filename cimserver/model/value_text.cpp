@@ -63,15 +63,15 @@ std::optional<std::string> value_text(const Value& value)
     const Cim_Type* type = find_type(value.type);
     if (!type)
         return std::nullopt;
-    if (const auto* flag = std::get_if<bool>(&value.content))
+    if (const auto* flag = value.as<bool>())
         return *flag ? "true" : "false";
-    if (const auto* number = std::get_if<std::uint64_t>(&value.content))
+    if (const auto* number = value.as<std::uint64_t>())
         return integer_text(*type, *number);
-    if (const auto* number = std::get_if<std::int64_t>(&value.content))
+    if (const auto* number = value.as<std::int64_t>())
         return integer_text(*type, *number);
-    if (const auto* number = std::get_if<double>(&value.content))
+    if (const auto* number = value.as<double>())
         return real_text(value.type, *number);
-    if (const auto* string = std::get_if<std::string>(&value.content))
+    if (const auto* string = value.as<std::string>())
         if (value.type != CMPI_dateTime || is_readable_datetime(*string))
             return *string;
     return std::nullopt;

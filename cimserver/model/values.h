@@ -3,12 +3,13 @@
 
 #include <cmpidt.h>
 
+#include <atomic>
 #include <cstdint>
 #include <exception>
-#include <memory>
 #include <optional>
 #include <string>
 #include <string_view>
+#include <type_traits>
 #include <utility>
 #include <variant>
 #include <vector>
@@ -19,25 +20,76 @@ namespace cimserver
 struct Object_Path;
 struct Instance;
 
+// One pointer to a constant that its copies share, safe in several threads at once.
+template <class T> class Shared
+{
+public:
+    Shared(T value) : _held(new Held{std::move(value)}) {}
+    Shared(const Shared& x) : _held(x._held) { ++_held->owners; }
+    Shared(Shared&& x) noexcept : _held(std::exchange(x._held, nullptr)) {} // x may only be assigned to or end
+    ~Shared()
+    {
+        if (_held && --_held->owners == 0)
+            delete _held;
+    }
+    Shared& operator=(Shared x) noexcept
+    {
+        std::swap(_held, x._held);
+        return *this;
+    }
+
+    const T& operator*() const { return _held->value; }
+
+private:
+    struct Held
+    {
+        const T value;
+        std::atomic<std::size_t> owners = 1;
+    };
+
+    Held* _held;
+};
+
 // A CIM value. `type` is the CMPI type (with the array bit for an array); its content stands in the alternative that fits:
 // booleans bool, unsigned integers and char16 std::uint64_t, signed integers std::int64_t, reals double, strings and
-// datetimes (25-character text) std::string, references and embedded instances a pointer, arrays a vector of scalars.
+// datetimes (25-character text) std::string, references and embedded instances what they say, arrays a vector of scalars.
+// What is larger than a number is shared: an answer of many instances with many properties, most of them null, stays small.
 struct Value
 {
-    using Content = std::variant<std::monostate, bool, std::uint64_t, std::int64_t, double, std::string,
-                                 std::shared_ptr<const Object_Path>, std::shared_ptr<const Instance>, std::vector<Value>>;
+    using Content = std::variant<std::monostate, bool, std::uint64_t, std::int64_t, double, Shared<std::string>,
+                                 Shared<Object_Path>, Shared<Instance>, Shared<std::vector<Value>>>;
 
-    CMPIType type = CMPI_null;
-    Content content; // std::monostate: null
+    Value() = default;
+    Value(CMPIType type_, Content content_) : content(std::move(content_)), type(type_) {}
+
+    [[no_unique_address]] Content content; // std::monostate: null
+    CMPIType type = CMPI_null;             // in the room behind the content
 
     bool null() const { return content.index() == 0; }
+
+    // The content; null when it is no T.
+    template <class T> const T* as() const
+    {
+        if constexpr (std::is_arithmetic_v<T>)
+            return std::get_if<T>(&content);
+        else
+            return std::holds_alternative<Shared<T>>(content) ? &*std::get<Shared<T>>(content) : nullptr;
+    }
+
+    // The content; throws std::bad_variant_access when it is no T.
+    template <class T> const T& get() const
+    {
+        const T* found = as<T>();
+        return found ? *found : throw std::bad_variant_access();
+    }
 };
+static_assert(sizeof(Value) == 16);
 
 // Copies share one text: the instances of a class hold the names of its properties once.
 class Name
 {
 public:
-    Name(std::string text = {}) : _text(std::make_shared<const std::string>(std::move(text))) {}
+    Name(std::string text = {}) : _text(std::move(text)) {}
     Name(const char* text) : Name(std::string(text)) {}
 
     const std::string& text() const { return *_text; }
@@ -46,7 +98,7 @@ public:
     friend bool operator==(const Name& a, std::string_view b) { return *a._text == b; }
 
 private:
-    std::shared_ptr<const std::string> _text;
+    Shared<std::string> _text;
 };
 
 struct Named_Value
@@ -70,7 +122,7 @@ struct Instance
 };
 
 // Adds a value to a list, in the place of one of the same name.
-void put(std::vector<Named_Value>& list, std::string name, Value value); // names.cpp
+void put(std::vector<Named_Value>& list, Name name, Value value); // names.cpp
 
 // A list of property names a client asked for; absent: all.
 using Property_List = std::optional<std::vector<std::string>>;

@@ -34,15 +34,15 @@ public:
     // A reference may name the declared class, one derived from it, or a superclass that a client walked in through.
     Value::Content reference_content(const Value& value, const zmlr::Meta_Reference& reference, const std::string& name_space)
     {
-        const auto* target = std::get_if<std::shared_ptr<const Object_Path>>(&value.content);
-        const Class_Entry* entry = target && *target ? _repository.find((*target)->class_name) : nullptr;
+        const auto* target = value.as<Object_Path>();
+        const Class_Entry* entry = target ? _repository.find(target->class_name) : nullptr;
         if (!entry || !are_related(entry->meta_class, reference.meta_class))
             return {};
 
-        Object_Path result{(*target)->host, (*target)->name_space, entry->meta_class->name, keys(*entry, **target)};
+        Object_Path result{target->host, target->name_space, entry->meta_class->name, keys(*entry, *target)};
         if (result.name_space.empty())
             result.name_space = name_space;
-        return std::make_shared<const Object_Path>(std::move(result));
+        return result;
     }
 
 private:

@@ -63,7 +63,7 @@ private:
     // Null when one element is none of the type; an element that is null stays so.
     Value::Content array(const zmlr::Meta_Feature& feature, const Value& given)
     {
-        const auto* elements = std::get_if<std::vector<Value>>(&given.content);
+        const auto* elements = given.as<std::vector<Value>>();
         if (!elements)
             return {};
         const CMPIType type = cmpi_type(feature) & static_cast<CMPIType>(~CMPI_ARRAY);

@@ -136,7 +136,7 @@ TEST_F(Conversion, fails_when_the_server_cannot_count_and_fetches_each_item_once
     properties.getPropertyAt = [](const CMPIInstance*, CMPICount, CMPIString** name, CMPIStatus*)
     {
         ++fetched;
-        *name = make<cimserver::String_Object>("Uint8Value").face();
+        *name = make<cimserver::String_Object>(std::string("Uint8Value")).face();
         return CMPIData{CMPI_uint8, CMPI_goodValue, {.uint8 = 7}};
     };
     EXPECT_EQ(convert(), CMPI_RC_OK);

@@ -28,7 +28,7 @@ protected:
         const std::vector<cimserver::Named_Value> properties = {{"Name", string(name)},
                                                                 {"Uint8Value", {CMPI_uint8, std::uint64_t{3}}}};
         const cimserver::Instance instance = {{"", "", "TST_Thing", {}}, properties};
-        return {CMPI_instance, std::make_shared<const cimserver::Instance>(instance)};
+        return {CMPI_instance, instance};
     }
     CMPIObjectPath* disk_path() const { return thing_path("disk", "TST_Disk"); }
 
@@ -75,7 +75,7 @@ TEST_F(Method_Requests, carry_parameters_of_every_kind_there_and_back)
     EXPECT_EQ(cast<TST_Disk>(script.instance.ptr())->Name.value, "disk");
     ASSERT_THAT(result.data, SizeIs(1));
     EXPECT_EQ(result.data[0].type, CMPI_string);
-    EXPECT_EQ(std::get<std::string>(result.data[0].content), "done");
+    EXPECT_EQ(result.data[0].get<std::string>(), "done");
     EXPECT_EQ(result.done, 1);
 
     ASSERT_THAT(out.args, SizeIs(5)) << "neither the return value nor null outputs are arguments";

@@ -64,7 +64,7 @@ cimserver::Value string(const char* text) { return {CMPI_string, std::string(tex
 cimserver::Value reference(const char* class_name, const char* name)
 {
     const cimserver::Object_Path path = {"host", "root/elsewhere", class_name, {{"Name", string(name)}}};
-    return {CMPI_ref, std::make_shared<const cimserver::Object_Path>(path)};
+    return {CMPI_ref, path};
 }
 
 Recorded_Result::Recorded_Result() : _face{this, &result_table} {}
@@ -111,7 +111,7 @@ const cimserver::Value& Served_Provider::value(const Items& items, const char* n
 
 std::string Served_Provider::text(const Items& items, const char* name)
 {
-    const auto* content = std::get_if<std::string>(&value(items, name).content);
+    const auto* content = value(items, name).as<std::string>();
     return content ? *content : "(null)";
 }
 

@@ -68,13 +68,10 @@ protected:
     using Items = std::vector<cimserver::Named_Value>;
     static const cimserver::Value& value(const Items& items, const char* name);
     static std::string text(const Items& items, const char* name); // "(null)" for what is no text
-    template <class T> static const T& content(const Items& items, const char* name)
-    {
-        return std::get<T>(value(items, name).content);
-    }
+    template <class T> static const T& content(const Items& items, const char* name) { return value(items, name).get<T>(); }
     static const cimserver::Object_Path& path_in(const Items& items, const char* name)
     {
-        return *content<std::shared_ptr<const cimserver::Object_Path>>(items, name);
+        return content<cimserver::Object_Path>(items, name);
     }
     static std::string name_in(const cimserver::Object_Path& path) { return text(path.keys, "Name"); }
     static std::vector<std::string> names_of(const Items& items);

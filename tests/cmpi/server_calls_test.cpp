@@ -26,8 +26,7 @@ struct Server
     CMPIrc asked(const std::string& call, const CMPIObjectPath* to)
     {
         const auto& path = cimserver::object<cimserver::Path_Object>(to).path;
-        calls.push_back(call + " " + path.name_space + ":" + path.class_name + "." +
-                        std::get<std::string>(path.keys.at(0).value.content));
+        calls.push_back(call + " " + path.name_space + ":" + path.class_name + "." + path.keys.at(0).value.get<std::string>());
         return rc;
     }
 };
@@ -49,7 +48,7 @@ CMPIEnumeration* enumerate(B, C, O path, L, CMPIStatus* status)
     status->rc = server.asked("enumerate", path);
     std::vector<cimserver::Value> elements;
     for (const auto& instance : server.instances)
-        elements.push_back({CMPI_instance, std::make_shared<const cimserver::Instance>(instance)});
+        elements.push_back({CMPI_instance, instance});
     return cimserver::make<cimserver::Enumeration_Object>(CMPIType{CMPI_instance}, elements).face();
 }
 CMPIInstance* get(B, C, O path, L, CMPIStatus* status)
@@ -67,7 +66,7 @@ CMPIData invoke(B, C, O path, const char* method, const CMPIArgs* in, CMPIArgs* 
     status->rc = server.asked(method, path);
     server.arguments = cimserver::object<cimserver::Args_Object>(in).args;
     cimserver::object<cimserver::Args_Object>(out).args = {{"Count", {CMPI_sint64, std::int64_t{9}}}, {"Answer", string("yes")}};
-    return {CMPI_string, CMPI_goodValue, {.string = cimserver::make<cimserver::String_Object>("done").face()}};
+    return {CMPI_string, CMPI_goodValue, {.string = cimserver::make<cimserver::String_Object>(std::string("done")).face()}};
 }
 
 CMPIBrokerFT operations(CMPIBrokerFT table)

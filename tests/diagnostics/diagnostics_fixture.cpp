@@ -42,9 +42,9 @@ const Temporary_Folder& home()
 
 std::string text_of(const cimserver::Value& value)
 {
-    if (const auto* text = std::get_if<std::string>(&value.content))
+    if (const auto* text = value.as<std::string>())
         return *text;
-    const auto* number = std::get_if<std::uint64_t>(&value.content);
+    const auto* number = value.as<std::uint64_t>();
     return number ? std::to_string(*number) : "";
 }
 
@@ -107,11 +107,11 @@ Diagnostics::Answer Diagnostics::run(const std::string& test_class, const std::s
 {
     cimserver::Object_Path test = path(test_class, 0);
     cimserver::put(test.keys, "Name", {CMPI_string, "Zemlar:" + name});
-    const cimserver::Value reference{CMPI_ref, std::make_shared<const cimserver::Object_Path>(element)};
+    const cimserver::Value reference{CMPI_ref, element};
     const auto result = operations().invoke_method(test, "RunDiagnostic", {{"ManagedElement", reference}});
     Answer answer{text_of(result.return_value), ""};
     for (const auto& [parameter, value] : result.out)
-        answer.job = text_of(std::get<std::shared_ptr<const cimserver::Object_Path>>(value.content)->keys.at(0).value);
+        answer.job = text_of(value.as<cimserver::Object_Path>()->keys.at(0).value);
     return answer;
 }
 

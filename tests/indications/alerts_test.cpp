@@ -86,8 +86,8 @@ public:
         for (const auto& [name, value] : indication.properties)
             if (name == "MessageArguments")
             {
-                const auto& arguments = std::get<std::vector<cimserver::Value>>(value.content);
-                const auto number = std::stoul(std::get<std::string>(arguments.back().content), nullptr, 16);
+                const auto& arguments = value.get<std::vector<cimserver::Value>>();
+                const auto number = std::stoul(arguments.back().get<std::string>(), nullptr, 16);
                 std::unique_lock lock(_mutex);
                 _taken.push_back(where + '|' + std::to_string(number));
                 _changed.notify_all();

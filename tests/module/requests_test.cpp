@@ -22,7 +22,7 @@ protected:
     {
         std::vector<std::string> ids;
         for (const auto& instance : instances)
-            ids.push_back(std::get<std::string>(find_named(instance.properties, "DeviceID")->value.content));
+            ids.push_back(find_named(instance.properties, "DeviceID")->value.get<std::string>());
         return ids;
     }
 };

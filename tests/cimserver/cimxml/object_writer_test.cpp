@@ -87,7 +87,7 @@ TEST(value_text, passes_only_datetimes_that_clients_read)
 
 TEST(object_writer, writes_every_kind_of_property)
 {
-    const auto target = std::make_shared<const Object_Path>(path_to("", ""));
+    const auto target = path_to("", "");
     Instance instance;
     instance.path.class_name = "TST_Port";
     instance.properties = {

@@ -160,11 +160,11 @@ Value key_value(const std::string& keys) { return read_path(instance_name(keys),
 
 TEST(object_reader, reads_keys_of_every_kind)
 {
-    EXPECT_EQ(std::get<std::string>(key_value(key("string", " a ")).content), " a ");
-    EXPECT_EQ(std::get<bool>(key_value(key("boolean", " TRUE ")).content), true);
-    EXPECT_EQ(std::get<bool>(key_value(key("boolean", "false")).content), false);
+    EXPECT_EQ(key_value(key("string", " a ")).get<std::string>(), " a ");
+    EXPECT_EQ(key_value(key("boolean", " TRUE ")).get<bool>(), true);
+    EXPECT_EQ(key_value(key("boolean", "false")).get<bool>(), false);
     for (const char* number : {"0", "-12", "0x1F", "1.5e3", "18446744073709551616"})
-        EXPECT_EQ(std::get<std::string>(key_value(key("numeric", std::string(" ") + number)).content), number);
+        EXPECT_EQ(key_value(key("numeric", std::string(" ") + number)).get<std::string>(), number);
 
     const Object_Path unnamed = read_path(instance_name("<KEYVALUE>x</KEYVALUE>"), "n");
     EXPECT_EQ(unnamed.keys.at(0).name, "");
@@ -173,7 +173,7 @@ TEST(object_reader, reads_keys_of_every_kind)
         key_value("<KEYBINDING NAME=\"K\"><VALUE.REFERENCE><INSTANCEPATH><NAMESPACEPATH><HOST>h</HOST>" + name_space +
                   "</NAMESPACEPATH><INSTANCENAME CLASSNAME=\"B\"/></INSTANCEPATH>"
                   "</VALUE.REFERENCE></KEYBINDING>");
-    const auto& target = *std::get<std::shared_ptr<const Object_Path>>(reference.content);
+    const auto& target = reference.get<Object_Path>();
     EXPECT_EQ(target.host + " " + target.name_space + " " + target.class_name, "h root/test B");
 }
 

@@ -14,13 +14,13 @@ Value array_of_texts() { return {static_cast<CMPIType>(CMPI_string | CMPI_ARRAY)
 Instance alert()
 {
     return {{"", "root/test", "TST_Alert", {}},
-            {{"Text", {CMPI_string, "it's \"hot\""}},
+            {{"Text", {CMPI_string, std::string("it's \"hot\"")}},
              {"Number", {CMPI_sint64, std::int64_t{-5}}},
              {"Size", {CMPI_uint64, std::uint64_t{18446744073709551615U}}},
              {"Ratio", {CMPI_real64, 0.5}},
              {"Urgent", {CMPI_boolean, true}},
              {"Nothing", {CMPI_string, {}}},
-             {"Time", {CMPI_dateTime, "20260101000000.000000+000"}},
+             {"Time", {CMPI_dateTime, std::string("20260101000000.000000+000")}},
              {"Texts", array_of_texts()}}};
 }
 

@@ -36,7 +36,7 @@ Instance destination(const std::string& name, const std::string& url = "http://1
 
 Instance subscription(const Object_Path& its_filter, const Object_Path& handler)
 {
-    const auto reference = [](const Object_Path& path) { return Value{CMPI_ref, std::make_shared<const Object_Path>(path)}; };
+    const auto reference = [](const Object_Path& path) { return Value{CMPI_ref, path}; };
     return {{"", "", "CIM_IndicationSubscription", {{"Filter", reference(its_filter)}, {"Handler", reference(handler)}}}, {}};
 }
 
