@@ -95,9 +95,7 @@ void CMPI_Adapter::detach()
 
 const Meta_Class* CMPI_Adapter::requested_class(const CMPIObjectPath* path) const
 {
-    const Meta_Repository* repository = nullptr;
-    get_repository(repository);
-    const Meta_Class* requested = find_meta_class(repository, class_name_of(path).c_str());
+    const Meta_Class* requested = find_meta_class(mc, class_name_of(path).c_str());
     if (!requested || is_subclass(mc, requested))
         return requested;
     return is_subclass(requested, mc) ? mc : nullptr;

@@ -53,7 +53,7 @@ CMPIrc enumerate_names(CMPI_Adapter& adapter, const CMPIContext* context, const 
     if (rc != CMPI_RC_OK)
         return rc;
 
-    Answer answer{.broker = adapter.broker, .context = context, .result = result, .name_space = name_space_of(path)};
+    Answer answer{.broker = adapter.broker, .context = context, .result = result, .name_space = model->__name_space};
     const auto status = adapter.enum_instances(model.ptr(), answer_with<send_path>, &answer);
     rc = to_rc(status);
     if (rc == CMPI_RC_OK)
@@ -79,7 +79,7 @@ CMPIrc enumerate(CMPI_Adapter& adapter, const CMPIContext* context, const CMPIRe
     Answer answer{.broker = adapter.broker,
                   .context = context,
                   .result = result,
-                  .name_space = name_space_of(path),
+                  .name_space = model->__name_space,
                   .properties = properties};
     rc = to_rc(adapter.enum_instances(model.ptr(), answer_with<send_instance>, &answer));
     if (rc == CMPI_RC_OK)
@@ -106,7 +106,7 @@ CMPIrc get(CMPI_Adapter& adapter, const CMPIResult* result, const CMPIObjectPath
         return CMPI_RC_ERR_FAILED;
 
     CMPI_Ptr<CMPIInstance> cmpi_instance;
-    rc = make_cmpi_instance(adapter.broker, found.ptr(), name_space_of(path).c_str(), path, properties, cmpi_instance);
+    rc = make_cmpi_instance(adapter.broker, found.ptr(), model->__name_space.c_str(), path, properties, cmpi_instance);
     if (rc != CMPI_RC_OK)
         return rc;
     CMReturnInstance(result, cmpi_instance.get());

@@ -10,7 +10,7 @@
 
 #include <cerrno>
 #include <cstring>
-#include <vector>
+#include <memory>
 
 namespace zmlr
 {
@@ -41,8 +41,8 @@ public:
         for (std::size_t size = 1024; size <= size_limit; size *= 2)
         {
             int error = 0;
-            _memory.resize(size);
-            if (gethostbyname_r(host, &_entry, _memory.data(), size, &found, &error) != ERANGE)
+            _memory = std::make_unique_for_overwrite<char[]>(size);
+            if (gethostbyname_r(host, &_entry, _memory.get(), size, &found, &error) != ERANGE)
                 break;
             found = nullptr;
         }
@@ -52,14 +52,20 @@ public:
 
     bool empty() const { return !_next || !*_next; }
 
-    // Writes the next address in dotted form; false at the end.
-    bool next(char (&dotted)[dotted_size]) { return !empty() && inet_ntop(AF_INET, *_next++, dotted, dotted_size); }
+    // Writes the first address that is none of the loopback network in dotted form; false when there is none.
+    bool first_of_network(char (&dotted)[dotted_size])
+    {
+        constexpr char loopback = 127;
+        while (!empty() && **_next == loopback)
+            ++_next;
+        return !empty() && inet_ntop(AF_INET, *_next, dotted, dotted_size);
+    }
 
 private:
     static constexpr std::size_t size_limit = 64 * 1024;
 
     hostent _entry = {};
-    std::vector<char> _memory;
+    std::unique_ptr<char[]> _memory;
     char** _next = nullptr;
 };
 
@@ -125,11 +131,8 @@ Host_Info ProviderUtil::getHostInfo(char* buf, int len)
         return give_bare_name(buf, size, host);
 
     char dotted[dotted_size];
-    while (addresses.next(dotted))
-    {
-        if (std::strncmp(dotted, "127", 3) != 0)
-            return give(buf, size, dotted, HOST_IP_ADDRESS);
-    }
+    if (addresses.first_of_network(dotted))
+        return give(buf, size, dotted, HOST_IP_ADDRESS);
     return give_full_name(buf, size, host);
 }
 

@@ -2,13 +2,17 @@
 
 #include "cimserver/model/principal.h"
 
+#include <iterator>
+
 namespace cimserver
 {
 
 Request::Request(CMPIFlags flags) : _context(make<Context_Object>())
 {
-    put(_context.entries, CMPIInvocationFlags, {CMPI_uint32, std::uint64_t{flags}});
-    put(_context.entries, CMPIPrincipal, {CMPI_string, Principal_Scope::current()});
+    static const Name names[] = {CMPIInvocationFlags, CMPIPrincipal};
+    _context.entries.reserve(std::size(names));
+    _context.entries.push_back({names[0], {CMPI_uint32, std::uint64_t{flags}}});
+    _context.entries.push_back({names[1], {CMPI_string, Principal_Scope::current()}});
 }
 
 } // namespace cimserver

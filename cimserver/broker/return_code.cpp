@@ -35,7 +35,7 @@ constexpr bool is_shared(int code) { return code >= 1 && code < static_cast<int>
 
 } // namespace
 
-std::string outcome_text(const std::string& class_name, const std::string& action, CMPIrc rc)
+std::string outcome_text(const std::string& class_name, const char* action, CMPIrc rc)
 {
     if (rc == CMPI_RC_ERR_NOT_SUPPORTED)
         return class_name + " does not support " + action;

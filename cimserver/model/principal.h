@@ -1,6 +1,8 @@
 // The user for whom a thread calls the module: what the module reads as CMPIPrincipal.
 #pragma once
 
+#include "cimserver/model/values.h"
+
 #include <string>
 
 namespace cimserver
@@ -16,10 +18,10 @@ public:
     Principal_Scope& operator=(const Principal_Scope&) = delete;
 
     // Whom the calling thread works for; "root", the server itself, outside any scope.
-    static const std::string& current();
+    static const Shared<std::string>& current();
 
 private:
-    std::string _before;
+    Shared<std::string> _before;
 };
 
 } // namespace cimserver

@@ -30,6 +30,7 @@ Repository::Repository(const zmlr::Registration* head)
         _served.push_back(found->second);
     }
     std::reverse(_served.begin(), _served.end());
+    index_served();
 }
 
 void Repository::add(Entry entry)
@@ -54,6 +55,14 @@ Repository::Repository(const Repository& whole, std::span<const std::string_view
     }
     std::ranges::copy_if(whole._entries, std::back_inserter(_entries),
                          [&](const Entry& entry) { return find(entry->meta_class->name); });
+    index_served();
+}
+
+void Repository::index_served()
+{
+    for (const Class_Entry* entry : _served)
+        for (const zmlr::Meta_Class* meta_class = entry->meta_class; meta_class; meta_class = meta_class->super_meta_class)
+            _served_by_class[meta_class].push_back(entry);
 }
 
 // A class that is shown already brought what belongs to it along.
@@ -81,13 +90,11 @@ bool Repository::is_a(const zmlr::Meta_Class* meta_class, const zmlr::Meta_Class
     return meta_class != nullptr;
 }
 
-std::vector<const Class_Entry*> Repository::served(const Class_Entry& entry) const
+const std::vector<const Class_Entry*>& Repository::served(const Class_Entry& entry) const
 {
-    std::vector<const Class_Entry*> result;
-    for (const Class_Entry* candidate : _served)
-        if (is_a(candidate->meta_class, entry.meta_class))
-            result.push_back(candidate);
-    return result;
+    static const std::vector<const Class_Entry*> nobody;
+    const auto found = _served_by_class.find(entry.meta_class);
+    return found == _served_by_class.end() ? nobody : found->second;
 }
 
 // A class may derive from a root that is no CIM class and that the repository therefore does not list.

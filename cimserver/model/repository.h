@@ -11,6 +11,7 @@
 #include <memory>
 #include <span>
 #include <string_view>
+#include <unordered_map>
 #include <vector>
 
 namespace cimserver
@@ -42,7 +43,7 @@ public:
 
     // The served classes in the order of their registration: all, or those that are `entry`'s or derive from it.
     const std::vector<const Class_Entry*>& served() const { return _served; }
-    std::vector<const Class_Entry*> served(const Class_Entry& entry) const;
+    const std::vector<const Class_Entry*>& served(const Class_Entry& entry) const;
 
     // The direct subclasses of a class, or with `deep` all that derive from it; with a null parent those at the top.
     std::vector<const zmlr::Meta_Class*> subclasses(const zmlr::Meta_Class* parent, bool deep) const;
@@ -51,12 +52,14 @@ private:
     using Entry = std::shared_ptr<Class_Entry>;
 
     void add(Entry entry);
+    void index_served();
     void show(const Repository& whole, const zmlr::Meta_Class* meta_class);
     bool at_top(const zmlr::Meta_Class* meta_class) const;
 
     std::vector<Entry> _entries;
     Name_Map<Class_Entry*> _index;
     std::vector<const Class_Entry*> _served; // first registered first
+    std::unordered_map<const zmlr::Meta_Class*, std::vector<const Class_Entry*>> _served_by_class;
 };
 
 // Whether one of two classes is the other or derives from it.

@@ -100,7 +100,7 @@ const Class_Entry* Module_Operations::method_provider(const Class_Entry& named, 
 {
     if (named.registration)
         return &named;
-    const auto providers = _classes.served(named);
+    const auto& providers = _classes.served(named);
     if (providers.empty() || (path.keys.empty() && providers.size() > 1))
         return nullptr;
     return path.keys.empty() ? providers.front() : &target_of(path).provider;

@@ -52,7 +52,7 @@ std::vector<const zmlr::Meta_Class*> Module_Operations::enumerate_classes(const 
 std::vector<Object_Path> Module_Operations::enumerate_instance_names(const std::string& class_name)
 {
     const Module::Use use(_module);
-    const auto providers = _classes.served(known_class(class_name));
+    const auto& providers = _classes.served(known_class(class_name));
 
     Path_Sink sink(_name_space);
     for (const Class_Entry* provider : providers)
@@ -69,7 +69,7 @@ std::vector<Instance> Module_Operations::enumerate_instances(const std::string& 
 {
     const Module::Use use(_module);
     const Class_Entry& named = known_class(class_name);
-    const auto providers = _classes.served(named);
+    const auto& providers = _classes.served(named);
 
     Instance_Sink sink(_name_space, deep_inheritance ? properties : named.layout->names(properties));
     for (const Class_Entry* provider : providers)
@@ -91,7 +91,7 @@ Instance Module_Operations::get_instance(const Object_Path& path, const Property
 {
     const Module::Use use(_module);
     const Class_Entry& named = known_class(path.class_name);
-    const auto providers = _classes.served(named);
+    const auto& providers = _classes.served(named);
     if (providers.empty())
         typed_keys(_module.repository(), named, path);
 

@@ -6,10 +6,11 @@ namespace cimserver
 {
 Name_List::Name_List(const Property_List& properties, const Property_Layout* layout) : _absent(!properties)
 {
-    if (properties)
-        for (const std::string& name : *properties)
-            if (!layout || layout->find(name))
-                _names.push_back(name.c_str());
+    if (!properties)
+        return;
+    for (const std::string& name : *properties)
+        if (!layout || layout->find(name))
+            _names.push_back(name.c_str());
     _names.push_back(nullptr);
 }
 
@@ -39,23 +40,23 @@ void Instance_Sink::take_instance(const Instance_Object& instance)
             path.keys.push_back({slots[slot].name, instance.value(slot)});
 }
 
-void check_status(const Class_Entry& provider, const std::string& action, const CMPIStatus& status)
+void check_status(const Class_Entry& provider, const char* action, const CMPIStatus& status)
 {
     if (status.rc != CMPI_RC_OK)
         throw Cim_Error(cim_status(status.rc), outcome_text(provider.meta_class->name, action, status.rc));
 }
 
-void check_offered(const Class_Entry& provider, const std::string& action, bool offered)
+void check_offered(const Class_Entry& provider, const char* action, bool offered)
 {
     if (!offered)
         check_status(provider, action, {CMPI_RC_ERR_NOT_SUPPORTED, nullptr});
 }
 
-Provider_Call::Provider_Call(Module& module, const Class_Entry& provider, std::string action, Object_Path path, Result_Sink& sink,
+Provider_Call::Provider_Call(Module& module, const Class_Entry& provider, const char* action, Object_Path path, Result_Sink& sink,
                              CMPIFlags flags)
     : _module(module)
     , _provider(provider)
-    , _action(std::move(action))
+    , _action(action)
     , _request(flags)
     , _result(make<Result_Object>(sink).face())
     , _path(make<Path_Object>(std::move(path)).face())

@@ -67,16 +67,16 @@ public:
 };
 
 // Throws the Cim_Error that a provider's status other than OK means; the action is what it was asked for, as people call it.
-void check_status(const Class_Entry& provider, const std::string& action, const CMPIStatus& status);
+void check_status(const Class_Entry& provider, const char* action, const CMPIStatus& status);
 
 // Throws CIM_ERR_NOT_SUPPORTED when a provider's table has no function for the action.
-void check_offered(const Class_Entry& provider, const std::string& action, bool offered);
+void check_offered(const Class_Entry& provider, const char* action, bool offered);
 
 // The context, the result and the path of a call; what the provider makes lives as long as this.
 class Provider_Call
 {
 public:
-    Provider_Call(Module& module, const Class_Entry& provider, std::string action, Object_Path path, Result_Sink& sink,
+    Provider_Call(Module& module, const Class_Entry& provider, const char* action, Object_Path path, Result_Sink& sink,
                   CMPIFlags flags = 0);
 
     // Waits for a turn with the provider, and calls a function of its table with the interface, the context, the result, the path
@@ -92,7 +92,7 @@ public:
 private:
     Module& _module;
     const Class_Entry& _provider;
-    const std::string _action;
+    const char* const _action; // a literal or a method's name
     Request _request;
     CMPIResult* _result;
     CMPIObjectPath* _path;
