@@ -1,5 +1,6 @@
 #include "cli/session.h"
 
+#include "cli/field_text.h"
 #include "cli/json.h"
 
 #include <fcntl.h>
@@ -41,6 +42,14 @@ void Session::print(std::string_view text)
             throw Failure(Exit::refused, std::string("standard output: ") + std::strerror(errno));
         text.remove_prefix(static_cast<std::size_t>(written));
     }
+}
+
+void Session::answer_change(const char* kind, const std::string& element, const std::string& action, const std::string& value)
+{
+    Object tree{{kind, element}, {"action", action}};
+    if (!value.empty())
+        tree.push_back({"value", safe_text(value)});
+    answer(tree, std::string(kind) + ' ' + element + ": " + action + (value.empty() ? "" : ' ' + safe_text(value)) + ": done\n");
 }
 
 void Session::confirm(const std::string& what_happens)

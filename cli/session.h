@@ -35,6 +35,9 @@ public:
     void answer_line(const Value& tree, const std::string& text); // one of many: JSON on one line
     void print(std::string_view text);
 
+    // Tells that something was changed: {"port": "1/0", "action": "speed", "value": "8"}, or "port 1/0: speed 8: done".
+    void answer_change(const char* kind, const std::string& element, const std::string& action, const std::string& value = {});
+
     // Says on the terminal what is about to happen and returns when the answer is yes; "--yes" says it for all questions. Throws
     // when the answer is another one, and when standard input or standard error is no terminal: then nobody can be asked.
     void confirm(const std::string& what_happens);

@@ -1,9 +1,26 @@
 #include "cli/value.h"
 
 #include <algorithm>
+#include <utility>
 
 namespace hxa
 {
+
+Value::Value() = default;
+Value::Value(bool data) : _data(data) {}
+Value::Value(int data) : _data(std::int64_t{data}) {}
+Value::Value(unsigned data) : _data(std::uint64_t{data}) {}
+Value::Value(std::uint64_t data) : _data(data) {}
+Value::Value(double data) : _data(data) {}
+Value::Value(std::string data) : _data(std::move(data)) {}
+Value::Value(const char* data) : _data(std::string(data)) {}
+Value::Value(List data) : _data(std::move(data)) {}
+Value::Value(Object data) : _data(std::move(data)) {}
+Value::Value(const Value& other) = default;
+Value::Value(Value&& other) noexcept = default;
+Value& Value::operator=(const Value& other) = default;
+Value& Value::operator=(Value&& other) noexcept = default;
+Value::~Value() = default;
 
 const List& Value::list() const
 {

@@ -4,7 +4,6 @@
 #include <cstdint>
 #include <string>
 #include <string_view>
-#include <utility>
 #include <variant>
 #include <vector>
 
@@ -22,7 +21,7 @@ class Value
 public:
     using Data = std::variant<std::nullptr_t, bool, std::int64_t, std::uint64_t, double, std::string, List, Object>;
 
-    Value() = default; // nothing is known
+    Value(); // null: nothing is known
     Value(bool data);
     Value(int data);
     Value(unsigned data);
@@ -32,6 +31,13 @@ public:
     Value(const char* data);
     Value(List data);
     Value(Object data);
+
+    // Defined elsewhere: inline they would be in every place that builds a tree.
+    Value(const Value& other);
+    Value(Value&& other) noexcept;
+    Value& operator=(const Value& other);
+    Value& operator=(Value&& other) noexcept;
+    ~Value();
 
     const Data& data() const { return _data; }
     bool is_null() const { return _data.index() == 0; }
@@ -49,16 +55,5 @@ struct Member
     std::string key;
     Value value;
 };
-
-// Below, since clang wants a whole Member for them.
-inline Value::Value(bool data) : _data(data) {}
-inline Value::Value(int data) : _data(std::int64_t{data}) {}
-inline Value::Value(unsigned data) : _data(std::uint64_t{data}) {}
-inline Value::Value(std::uint64_t data) : _data(data) {}
-inline Value::Value(double data) : _data(data) {}
-inline Value::Value(std::string data) : _data(std::move(data)) {}
-inline Value::Value(const char* data) : _data(std::string(data)) {}
-inline Value::Value(List data) : _data(std::move(data)) {}
-inline Value::Value(Object data) : _data(std::move(data)) {}
 
 } // namespace hxa
