@@ -3,7 +3,6 @@
 #include "cli/field_text.h"
 #include "cli/report.h"
 #include "hxal/records/lport.h"
-#include "hxal/records/sfp.h"
 #include "hxal/value_names.h"
 
 #include <algorithm>
@@ -75,19 +74,11 @@ bool has_mac(const mac_t& mac)
     return std::any_of(std::begin(mac.mac), std::end(mac.mac), [](std::uint8_t byte) { return byte != 0; });
 }
 
+// Optical monitoring tells its events' level in numbers of their own: those of a module's health count from 2.
 std::string level_text(int level)
 {
-    switch (level)
-    {
-    case HXA_POM_HEALTH_NORMAL:
-        return "normal";
-    case HXA_POM_HEALTH_WARNING:
-        return "warning";
-    case HXA_POM_HEALTH_ALARM:
-        return "alarm";
-    default:
-        return "unknown";
-    }
+    constexpr const char* levels[] = {"unknown", "normal", "warning", "alarm"};
+    return levels[level >= 1 && level <= 3 ? level : 0];
 }
 
 std::string role_text(int roles)

@@ -10,6 +10,7 @@
 
 #include <deque>
 #include <mutex>
+#include <utility>
 
 namespace hxa
 {

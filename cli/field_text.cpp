@@ -63,7 +63,7 @@ std::string safe_text(std::string_view bytes)
         bytes.remove_prefix(std::max<std::size_t>(character.size, 1));
     }
     safe.erase(safe.find_last_not_of(' ') + 1);
-    return safe;
+    return safe.erase(0, safe.find_first_not_of(' '));
 }
 
 std::string hexadecimal(std::uint64_t number, int digits)

@@ -6,6 +6,7 @@
 #include <algorithm>
 #include <array>
 #include <cstring>
+#include <set>
 #include <span>
 
 namespace hxa
@@ -42,8 +43,7 @@ std::string text_at(const Bytes& bytes, std::size_t at, std::size_t size)
 {
     at = std::min(at, bytes.size());
     const std::string_view text(reinterpret_cast<const char*>(bytes.data()) + at, std::min(size, bytes.size() - at));
-    const auto first = text.find_first_not_of(' ');
-    return first == text.npos ? std::string() : safe_text(text.substr(first, text.substr(first).find('\0')));
+    return safe_text(text.substr(0, text.find('\0')));
 }
 
 // One remote port, asked through the base port.
@@ -158,8 +158,10 @@ List luns_of(Session& session, const Port& port, wwn_t remote_port)
     if (!session.accept(target.report_luns(list), "units of remote port " + wwn_text(remote_port)))
         return {};
     List trees;
+    std::set<std::uint64_t> seen; // a list that lies about its length goes on with LUN 0
     for (std::size_t at = list_head; at + list_entry <= list.size(); at += list_entry)
-        trees.push_back(lun_tree(target, std::span(list).subspan(at, list_entry)));
+        if (seen.insert(number_at(list, at, list_entry)).second)
+            trees.push_back(lun_tree(target, std::span(list).subspan(at, list_entry)));
     return trees;
 }
 

@@ -7,9 +7,9 @@
 namespace hxa
 {
 
-// A tree for each unit, in the order of REPORT LUNS. A list that cannot be read is told by Session::accept() and is empty; of a
-// unit that refuses a command the members are missing that it would tell. Requests: one or two for the list, then two a unit, and
-// for a disk one or two more.
+// A tree for each unit, in the order of REPORT LUNS, each LUN once. A list that cannot be read is told by Session::accept() and
+// is empty; of a unit that refuses a command the members are missing that it would tell. Requests: one or two for the list, then
+// two a unit, and for a disk one or two more.
 List luns_of(Session& session, const Port& port, wwn_t remote_port);
 
 } // namespace hxa

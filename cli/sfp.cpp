@@ -70,7 +70,7 @@ void add_identity(Object& tree, const sfp_mem_t& memory)
     for (auto& member :
          Object{{"identifier", unsigned{base.identifier}},
                 {"vendor", field_text(base.vendor_name)},
-                {"vendor_oui", hexadecimal(base.vendor_oui[0] << 16 | base.vendor_oui[1] << 8 | base.vendor_oui[2], 6)},
+                {"vendor_oui", hexadecimal(base.vendor_oui[0] * 0x10000u + base.vendor_oui[1] * 0x100u + base.vendor_oui[2], 6)},
                 {"part_number", field_text(base.vendor_pn)},
                 {"revision", field_text(base.vendor_rev)},
                 {"serial_number", field_text(more.vendor_sn)},
