@@ -66,14 +66,19 @@ void list(Session& session, const List_Options& options)
     List adapters, ports, iocs;
     for (const auto& adapter : host.adapters(options.adapter))
     {
-        adapters.push_back(adapter_tree(session, adapter));
-        for (const auto& port : adapters.back().at("ports").list())
+        List of_adapter;
+        for (const auto& port : ports_of(adapter))
         {
-            ports.push_back(port);
+            const auto tree = port_tree(session, port);
+            of_adapter.push_back(tree);
             for (const char* function : {"fc.ioc", "ethernet.ioc"})
-                if (!port.at(function).is_null())
-                    iocs.push_back(Object{{"port", port.at("port")}, {"ioc", port.at(function)}});
+                if (!tree.at(function).is_null())
+                    iocs.push_back(Object{{"port", tree.at("port")}, {"ioc", tree.at(function)}});
         }
+        ports.insert(ports.end(), of_adapter.begin(), of_adapter.end());
+        auto tree = adapter_tree(session, adapter);
+        tree.push_back({"ports", of_adapter});
+        adapters.push_back(tree);
     }
     session.answer(Object{{"adapters", adapters}},
                    table(adapters, adapter_columns) + '\n' + table(ports, port_columns) + '\n' + table(iocs, ioc_columns));

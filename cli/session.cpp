@@ -14,11 +14,26 @@
 namespace hxa
 {
 
+namespace
+{
+
+// A node that the library opens must not get the number of a standard descriptor that the caller has closed: messages would be
+// written to it.
+void hold_standard_descriptors()
+{
+    int descriptor = open("/dev/null", O_RDWR | O_CLOEXEC);
+    while (descriptor >= 0 && descriptor <= STDERR_FILENO)
+        descriptor = open("/dev/null", O_RDWR | O_CLOEXEC);
+    close(descriptor);
+}
+
+} // namespace
+
 Session::Session(const Common_Options& options) : _options(options), _output(fcntl(STDOUT_FILENO, F_DUPFD_CLOEXEC, 3))
 {
+    hold_standard_descriptors();
     std::setvbuf(stdout, nullptr, _IOLBF, BUFSIZ);
-    if (dup2(STDERR_FILENO, STDOUT_FILENO) < 0)
-        close(STDOUT_FILENO);
+    dup2(STDERR_FILENO, STDOUT_FILENO);
 }
 
 Session::~Session()

@@ -113,12 +113,6 @@ Value speed_value(std::uint32_t speed)
     return speed == HXA_PPORT_SPEED_AUTO ? Value("auto") : Value(speed);
 }
 
-std::string word(const char* text)
-{
-    std::string trimmed = text;
-    return trimmed.erase(trimmed.find_last_not_of(' ') + 1);
-}
-
 Value port_tree(Session& session, const Port& port)
 {
     return Object{{"port", port.name()},
@@ -130,7 +124,7 @@ Value port_tree(Session& session, const Port& port)
                   {"ethernet", port.ethernet ? ethernet_tree(session, port.name(), *port.ethernet) : Value()}};
 }
 
-Value adapter_tree(Session& session, const Adapter& adapter)
+Object adapter_tree(Session& session, const Adapter& adapter)
 {
     Object tree{{"adapter", adapter.number},
                 {"serial_number", field_text(adapter.handle->serial_num)},
@@ -155,10 +149,6 @@ Value adapter_tree(Session& session, const Adapter& adapter)
                    {"pcie_lanes", unsigned{card.pcie_lanes}},
                    {"mezzanine", card.is_mezz != 0}});
     }
-    List ports;
-    for (const auto& port : ports_of(adapter))
-        ports.push_back(port_tree(session, port));
-    tree.push_back({"ports", ports});
     return tree;
 }
 

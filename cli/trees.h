@@ -8,13 +8,10 @@ namespace hxa
 {
 
 // An answer that fails leaves its members out, and is told by Session::accept().
-Value adapter_tree(Session& session, const Adapter& adapter); // with its ports, as "ports"
+Object adapter_tree(Session& session, const Adapter& adapter);
 Value port_tree(Session& session, const Port& port);
 
 // A number of Gbit/s: null when it is unknown, "auto", or the number.
 Value speed_value(std::uint32_t speed);
-
-// A constant text of the library, without the blanks that pad some of them.
-std::string word(const char* text);
 
 } // namespace hxa
