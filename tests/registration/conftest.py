@@ -3,13 +3,19 @@
 import os
 import pathlib
 import shutil
-import subprocess
 import sys
+import tempfile
+import traceback
+from types import SimpleNamespace
 
 import pytest
 
 ROOT = pathlib.Path(__file__).resolve().parents[2]
-PROGRAM = ROOT / "packaging" / "registration"
+sys.path.insert(0, str(ROOT / "packaging" / "registration"))
+
+import generate_registration  # noqa: E402
+from zmlr_register.main import main  # noqa: E402
+
 STAND_IN = pathlib.Path(__file__).with_name("stand_in")
 SERVERS = {
     "openpegasus": ("cimmof", "cimprovider", "cimcli", "cimconfig"),
@@ -18,8 +24,6 @@ SERVERS = {
 STANDARD = "class CIM_ManagedElement { };\nclass CIM_Port : CIM_ManagedElement { };\nclass CIM_RegisteredProfile { };\n"
 PRODUCT = "".join(f'[Description("One.")]\nclass ZEMLAR_{name} : CIM_{name}\n{{\n}};\n\n' for name in ("Port", "RegisteredProfile"))
 PROVIDERS = "".join(f"ZMLR_PROVIDER(ZEMLAR_{name}, INSTANCE, SKELETON)\n" for name in ("Port", "RegisteredProfile"))
-START = "import os, pathlib, sys; os.geteuid = lambda: 0; from zmlr_register.main import main; " \
-        "sys.exit(main(sys.argv[2:], pathlib.Path(sys.argv[1])))"
 
 
 class Host:
@@ -34,6 +38,7 @@ class Host:
         self.make_name_space("root/PG_InterOp")
         self.write_schema(STANDARD)
         self.make_product("1.0.0")
+        self.places = ["--schema", str(folder / "schema/CIM_Schema.mof"), "--staging", str(self.state / "staging")]
 
     def has(self, *servers):
         for program in (program for server in servers for program in SERVERS[server]):
@@ -59,21 +64,38 @@ class Host:
                  "roots.def": "ZMLR_INTEROP_ROOT(CIM_RegisteredProfile)\n"}
         for name, text in texts.items():
             (self.folder / name).write_text(text)
-        subprocess.run([sys.executable, "-B", PROGRAM / "generate_registration.py", "--output", "data", "--version", version,
-                        "--module", "../libzmlrprovider.so", "--providers", "providers.def", "--interop-roots", "roots.def",
-                        ROOT / "schema" / "qualifiers.mof", "cim.mof", "zemlar.mof"], cwd=self.folder, check=True)
+        files = ["--output", "data", "--providers", "providers.def", "--interop-roots", "roots.def"]
+        words = [word if word.startswith("--") else str(self.folder / word) for word in [*files, "cim.mof", "zemlar.mof"]]
+        words.insert(-2, str(ROOT / "schema" / "qualifiers.mof"))
+        assert generate_registration.main(["--version", version, "--module", "../libzmlrprovider.so", *words]) == 0
 
     def register(self, *words, fault="", at=0):
         """Runs zmlr-register; `fault` (FAIL, TERM, KILL) strikes at call number `at`."""
         (self.state / "calls").unlink(missing_ok=True)
-        options = ["--schema", self.folder / "schema/CIM_Schema.mof", "--state", self.folder / "notes",
-                   "--staging", self.state / "staging"]
-        if not (self.folder / "bin" / "cimconfig").exists() or "sfcb" in words:
-            options += ["--provider-folder", self.state / "providers"]
-        environment = {**os.environ, "PATH": f"{self.folder}/bin:{os.environ['PATH']}", "PYTHONPATH": str(PROGRAM),
-                       "STAND_IN": str(self.state), "FAULT": fault, "FAULT_AT": str(at), "TMPDIR": str(self.folder)}
-        return subprocess.run([sys.executable, "-B", "-c", START, self.folder / "data", *words, *options], env=environment,
-                              capture_output=True, text=True, timeout=60)
+        options = [*words, "--state", str(self.folder / "notes"), *self.places]
+        if self.places and ("sfcb" in words or not (self.folder / "bin" / "cimconfig").exists()):
+            options += ["--provider-folder", str(self.state / "providers")]
+        environment = {"PATH": f"{self.folder}/bin:{os.environ['PATH']}", "STAND_IN": str(self.state), "FAULT": fault,
+                       "FAULT_AT": str(at)}
+        return self._run(options, environment)
+
+    def _run(self, options, environment):
+        """In a process of its own, which may be killed, but without the start of another interpreter."""
+        outputs = [self.folder / "stdout", self.folder / "stderr"]
+        process = os.fork()
+        if process == 0:
+            try:
+                for number, output in enumerate(outputs, 1):
+                    os.dup2(os.open(output, os.O_WRONLY | os.O_CREAT | os.O_TRUNC), number)
+                sys.stdout, sys.stderr = open(1, "w", encoding="utf-8"), open(2, "w", encoding="utf-8")
+                os.environ.update(environment)
+                os.geteuid, tempfile.tempdir = lambda: 0, str(self.folder)
+                os._exit(main(options, self.folder / "data"))
+            except BaseException:
+                traceback.print_exc()
+                os._exit(99)
+        status = os.waitstatus_to_exitcode(os.waitpid(process, 0)[1])
+        return SimpleNamespace(returncode=status, stdout=outputs[0].read_text(), stderr=outputs[1].read_text())
 
     def calls(self):
         return (self.state / "calls").read_text().splitlines()

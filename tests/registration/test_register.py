@@ -39,7 +39,7 @@ def test_what_fails_on_the_way_is_undone(host, server, task, fault, status):
     before = host.contents()
     host.copy()
     for number in itertools.count(1):
-        result = host.register("--remove" if task == "--remove" else "--install", fault=fault, at=number)
+        result = host.register("--update" if task == "upgrade" else task, fault=fault, at=number)
         if result.returncode == 0 and number > len(host.calls()):
             break
         if result.returncode == 0:  # some answers may fail
@@ -77,11 +77,20 @@ def test_an_administrators_schema_stays(host):
     assert host.contents() == before
 
 
-def test_chooses_no_server_by_itself_when_there_are_several(host):
+def test_several_servers(host):
     assert host.register("--install").returncode == 4
-    host.has(*SERVERS)
+    empty = host.has(*SERVERS).contents()
     assert "choose one with --server" in host.register("--install").stderr
-    assert host.register("--install", "--server", "sfcb").returncode == 0
+    assert (host.register("--update").stdout, host.contents()) == ("nothing is registered\n", empty)
+
+    assert [host.register("--install", "--server", server).returncode for server in SERVERS] == [0, 0]
+    host.places = []  # they are noted
+    host.make_product("2.0.0")
+    assert host.register("--status").returncode == 7
+    assert host.register("--update").returncode == 0
+    assert host.register("--status").returncode == 0
+    assert not [name for name, text in host.contents().items() if "1.0.0" in text]
+    assert (host.register("--remove").returncode, host.contents()) == (0, empty)
 
 
 def test_what_cannot_be_undone_is_told(host):

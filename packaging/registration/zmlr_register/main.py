@@ -8,9 +8,10 @@ import pathlib
 import sys
 
 from .catalogue import from_json
+from .choices import Choices
 from .servers.openpegasus import Open_Pegasus
 from .servers.sfcb import Sfcb
-from .steps import Failed, Not_Undone, carry_out
+from .steps import Failed, Not_Undone, Replace, carry_out
 from .tools import Stopped, Store, Tools
 
 DONE, FAILED, USAGE, NOT_UNDONE, NO_SERVER, IN_PART, NOT_ROOT, NOT_REGISTERED = range(8)
@@ -61,16 +62,18 @@ def _parse(arguments):
         epilog=_EXIT_CODES, formatter_class=argparse.RawDescriptionHelpFormatter)
     task = parser.add_mutually_exclusive_group(required=True)
     task.add_argument("--install", action="store_true", help="register the module, or bring its registration up to date")
-    task.add_argument("--remove", action="store_true", help="take the registration out of the server again")
+    task.add_argument("--update", action="store_true", help="bring up to date what is registered, with every server")
+    task.add_argument("--remove", action="store_true", help="take the registration out again, of every server")
     task.add_argument("--status", action="store_true", help="tell what is registered, change nothing")
     parser.add_argument("--dry-run", action="store_true", help="tell what would be changed, change nothing")
     parser.add_argument("--verbose", "-v", action="store_true", help="tell every program that is run for a change")
     parser.add_argument("--server", choices=_SERVERS, help="which CIM server, when several are installed")
     parser.add_argument("--interop", metavar="NAME", help="the server's interop name space, when it has an unusual name")
-    parser.add_argument("--schema", metavar="FILE", help="the CIM schema (CIM_Schema.mof) that the server works with")
-    parser.add_argument("--provider-folder", metavar="DIR", help="where the server looks for provider modules")
-    parser.add_argument("--staging", metavar="DIR", help="the staging folder of sfcb")
-    parser.add_argument("--module", metavar="FILE", help="the provider module, when it is not where it was installed")
+    parser.add_argument("--schema", metavar="FILE", type=os.path.abspath, help="the CIM schema (CIM_Schema.mof) that the server works with")
+    parser.add_argument("--provider-folder", metavar="DIR", type=os.path.abspath, help="where the server looks for provider modules")
+    parser.add_argument("--staging", metavar="DIR", type=os.path.abspath, help="the staging folder of sfcb")
+    parser.add_argument("--module", metavar="FILE", type=os.path.abspath,
+                        help="the provider module, when it is not where it was installed")
     parser.add_argument("--state", metavar="DIR", default=_STATE, help=f"where registrations are noted ({_STATE})")
     return parser.parse_args(arguments)
 
@@ -92,14 +95,30 @@ def _alone(folder):
 
 
 def _run(options, tools, data):
+    """The exit status: that of the first server with which something is wrong."""
     catalogue = from_json((data / "registration" / "registration.json").read_text(encoding="utf-8"))
-    library = pathlib.Path(os.path.normpath(options.module or data / catalogue.file)).absolute()
-    server = _find_server(options, tools)(tools, Store(tools, options.state), catalogue, options)
-    tools.say(f"{server.title}, interop name space {server.interop}")
-    if options.remove:
-        carry_out(server.removal(library), tools)
-        return DONE
+    store = Store(tools, options.state)
+    statuses = [_run_with(server, options, tools, store, catalogue, data) for server in _choose_servers(options, tools, store)]
+    return next(filter(None, statuses), DONE)
 
+
+def _run_with(server_class, options, tools, store, catalogue, data):
+    try:
+        choices = Choices(store, server_class.name)
+        options = choices.added_to(options)
+        library = pathlib.Path(os.path.abspath(options.module or data / catalogue.file))
+        server = server_class(tools, store, catalogue, options)
+        tools.say(f"{server.title}, interop name space {server.interop}")
+        if options.remove:
+            carry_out([*server.removal(library), Replace(tools, choices, None)], tools)
+            return DONE
+        return _install(server, Replace(tools, choices, choices.text_of(options)), library, options, tools, data)
+    except (Failed, OSError) as error:
+        tools.warn(str(error))
+        return _exit_code(error)
+
+
+def _install(server, noting, library, options, tools, data):
     if not library.is_file():
         raise Failed(f"the module {library} is not there: name it with --module")
     mof = (data / "mof" / "zemlar.mof").read_text(encoding="utf-8")
@@ -108,19 +127,27 @@ def _run(options, tools, data):
         tools.warn(f"left out: {cls.name} in {name_space}: the server has no {', '.join(missing)}")
     if options.status:
         return _status(tools, changes)
-    carry_out(changes, tools)
+    carry_out([noting, *changes], tools)
     return IN_PART if left_out else DONE
 
 
-def _find_server(options, tools):
+def _choose_servers(options, tools, store):
+    registered = [server for server in _SERVERS.values() if Choices(store, server.name).look() is not None]
+    if options.update:
+        registered = [server for server in registered if options.server in (None, server.name)]
+        if not registered:
+            tools.say("nothing is registered")
+        return registered
     if options.server:
-        return _SERVERS[options.server]
+        return [_SERVERS[options.server]]
+    if registered and not options.install:
+        return registered
     found = [server for server in _SERVERS.values() if all(map(tools.find, server.programs))]
     if not found:
         raise No_Server("found neither OpenPegasus (cimmof, cimprovider, cimcli) nor sfcb (sfcbstage, sfcbunstage, sfcbrepos)")
     if len(found) > 1:
         raise No_Server(f"found {' and '.join(server.title for server in found)}: choose one with --server")
-    return found[0]
+    return found
 
 
 def _status(tools, changes):

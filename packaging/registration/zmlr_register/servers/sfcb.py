@@ -14,6 +14,9 @@ _SETTINGS = ("/etc/sfcb/sfcb.cfg", "/usr/local/etc/sfcb/sfcb.cfg")
 _SCHEMA_FOLDERS = ("/usr/share/sfcb/CIM", "/usr/local/share/sfcb/CIM", "/usr/share/mof/cim-current")
 _UNITS = ("sfcb", "sblim-sfcb")  # distributions differ
 
+# sfcb goes on with the module that it has loaded until it is restarted: another version is another text, which makes it restart.
+_HEAD = "# {module} {version}\n#\n"
+
 # One group: one process, in which all providers share jobs, records and the event thread; it must not end while a run goes on.
 _SECTION = """[{cls}]
    provider: {provider}
@@ -26,7 +29,8 @@ _SECTION = """[{cls}]
 
 
 def registration_text(catalogue, selection):
-    return "#\n".join(_SECTION.format(cls=cls.name, provider=cls.provider, location=catalogue.location, kinds=" ".join(cls.kinds),
+    head = _HEAD.format(module=catalogue.module, version=catalogue.version)
+    return head + "#\n".join(_SECTION.format(cls=cls.name, provider=cls.provider, location=catalogue.location, kinds=" ".join(cls.kinds),
                                       name_spaces=" ".join(selection.name_spaces(cls))) for cls in selection.provided)
 
 
