@@ -100,7 +100,7 @@ void act(Session& session, const Adapter& adapter, const Adapter_Options& option
 
 void adapter(Session& session, const Adapter_Options& options)
 {
-    const Host host;
+    const Host host(session);
     if (options.action == "list")
         list_adapters(session, host.adapters());
     else if (options.action == "show")

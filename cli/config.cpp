@@ -96,7 +96,7 @@ void set(const Port& port, const Setting& setting, const std::string& value)
 
 void config(Session& session, const Config_Options& options)
 {
-    const Host host;
+    const Host host(session);
     hxal_config_load(options.file.c_str());
     if (options.action == "show")
         return show(session, host);

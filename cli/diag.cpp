@@ -140,7 +140,7 @@ void registers(Session& session, const Port& port, const Diag_Options& options)
 
 void diag(Session& session, const Diag_Options& options)
 {
-    const Host host;
+    const Host host(session);
     if (options.action == "temperature")
         temperature(session, host.adapter(options.element), options);
     else if (options.action == "memory")

@@ -179,7 +179,7 @@ void follow(Session& session, Queue& queue, int interrupted, unsigned count)
 void events(Session& session, const Events_Options& options)
 {
     const int interrupted = interruptions();
-    const Host host(hxa_aen_app_test); // nobody else's events are taken
+    const Host host(session, hxa_aen_app_test); // nobody else's events are taken
     Queue queue;
     Listening listening(session, queue);
     if (options.port.empty())

@@ -144,7 +144,7 @@ void switch_option_rom(Session& session, const Adapter& adapter, const std::stri
 
 void flash(Session& session, const Flash_Options& options)
 {
-    const Host host;
+    const Host host(session);
     if (options.action == "show")
         return show(session, host.adapters(options.adapter));
     if (options.action == "update")

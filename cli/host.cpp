@@ -45,16 +45,18 @@ const Port* find_port(const std::vector<Port>& ports, const std::string& text)
 
 } // namespace
 
-Host::Host(hxa_aen_app_t application)
+Host::Host(Session& session, hxa_aen_app_t application)
 {
     hxal_libinit(application);
     hxal_set_last_error(HXA_STATUS_OK);
-    if (hxal_adapter_scan() > 0)
-        return;
+    const int count = hxal_adapter_scan();
     const auto status = hxal_get_last_error();
-    if (status == HXA_STATUS_NO_DRIVER || status == HXA_STATUS_VERSION_FAIL)
+    if (count == 0 && (status == HXA_STATUS_NO_DRIVER || status == HXA_STATUS_VERSION_FAIL))
         throw Failure(Exit::no_driver, status_text(status));
-    require(status, "cannot read the adapters");
+    if (count == 0)
+        require(status, "cannot read the adapters");
+    else if (status != HXA_STATUS_NO_DRIVER)
+        session.accept(status, "cannot read all adapters");
 }
 
 Host::~Host() { hxal_libexit(); }

@@ -1,7 +1,7 @@
 // The adapters and ports of this host, and the names by which a person selects them.
 #pragma once
 
-#include "cli/failure.h"
+#include "cli/session.h"
 #include "hxal/adapter.h"
 
 #include <string>
@@ -33,11 +33,12 @@ struct Port
 };
 
 // Starts the library under the identity that the drivers queue events for, and scans the host. Throws when there is no driver,
-// when it refuses the library and when the scan fails otherwise; drivers that serve nothing are a host without adapters.
+// when it refuses the library and when the scan fails otherwise; drivers that serve nothing are a host without adapters. When one
+// of the two drivers fails the session tells that; one that is not there is no failure, since a host may have no use for it.
 class Host
 {
 public:
-    explicit Host(hxa_aen_app_t application = hxa_aen_app_tessik);
+    explicit Host(Session& session, hxa_aen_app_t application = hxa_aen_app_tessik);
     Host(const Host&) = delete;
     Host& operator=(const Host&) = delete;
     ~Host();

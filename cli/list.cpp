@@ -60,7 +60,7 @@ std::string names(const Host& host)
 
 void list(Session& session, const List_Options& options)
 {
-    const Host host;
+    const Host host(session);
     if (options.names)
         return session.print(names(host));
     List adapters, ports, iocs;

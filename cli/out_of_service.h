@@ -4,31 +4,35 @@
 #include "cli/host.h"
 #include "cli/session.h"
 
-#include <functional>
 #include <string>
+#include <vector>
 
 #include <signal.h>
 
 namespace hxa
 {
 
-// While one exists the element is out of service; it comes back into service at the end, also after a failure and when somebody
-// interrupts the program, which ends then. An element that was out of service before stays so, and nobody is asked.
+// While one exists the element is out of service. What of it was in service before comes back at the end, also after a failure
+// and when somebody interrupts the program, which ends then. Asks first, unless nothing of it was in service.
 class Out_Of_Service
 {
 public:
-    Out_Of_Service(Session& session, const Adapter& adapter, const std::string& test);
-    Out_Of_Service(Session& session, const Port& port, const std::string& test);
+    Out_Of_Service(Session& session, const Adapter& adapter, const std::string& test); // its IOCs
+    Out_Of_Service(Session& session, const Port& port, const std::string& test);       // its functions
     Out_Of_Service(const Out_Of_Service&) = delete;
     Out_Of_Service& operator=(const Out_Of_Service&) = delete;
     ~Out_Of_Service();
 
 private:
-    void hold_signals();
+    using Request = hxa_status_t (*)(const hxal_t*);
+
+    // Asks with the question, then sends `disable` to each of the IOCs.
+    void take(const std::string& question, Request disable);
 
     Session& _session;
     std::string _what;
-    std::function<hxa_status_t()> _enable; // null: nothing to do
+    Request _enable;
+    std::vector<const hxal_t*> _in_service;
     sigset_t _signals{};
 };
 

@@ -151,7 +151,7 @@ void act(Session& session, const Port& port, const Port_Options& options)
 
 void port(Session& session, const Port_Options& options)
 {
-    const Host host;
+    const Host host(session);
     if (options.action == "list")
         list_ports(session, host.ports(options.port));
     else if (options.action == "show")

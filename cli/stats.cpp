@@ -108,7 +108,7 @@ void watch(Session& session, const std::vector<Port>& ports, const Stats_Options
 
 void stats(Session& session, const Stats_Options& options)
 {
-    const Host host;
+    const Host host(session);
     if (!options.openmetrics.empty())
     {
         const auto samples = openmetrics::read_samples(session, host, std::time(nullptr));

@@ -124,7 +124,7 @@ std::string text_of(const List& remotes, bool with_luns)
 
 void targets(Session& session, const Targets_Options& options)
 {
-    const Host host;
+    const Host host(session);
     List remotes;
     for (const auto& port : host.ports(options.port))
         if (port.fc)

@@ -130,6 +130,14 @@ def test_what_fails_costs_its_own_part_and_the_library_speaks_on_standard_error(
     assert {"name": "Tx bytes", "value": 98304000} in blocks["Ethernet port"]
 
 
+def test_a_driver_that_refuses_costs_its_part_of_the_host(tmp_path):
+    path = host(tmp_path)
+    path.write_text(json.dumps(json.loads(path.read_text()) | {"drivers": {"hxn": {"version_status": 70}}}), encoding="utf-8")
+    ran = hxa(path, "list", "1")
+    assert (ran.returncode, "cannot read all adapters: Application/Driver version mismatch (70)" in ran.stderr) == (1, True)
+    assert "ZMC2000456" in ran.stdout and "/dev/hxn" not in ran.stdout
+
+
 def test_a_test_that_fails_leaves_the_port_in_service(tmp_path):
     busy = {"command": "IOCMD_DIAG_LOOPBACK", "status": 71}
     stuck = {"command": "IOCMD_PORT_ENABLE", "status": 1}
