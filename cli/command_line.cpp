@@ -153,7 +153,7 @@ private:
                "show what rises, again and again")
             ->expected(0, 1)
             ->type_name("SECONDS");
-        app->add_option("--count", options->count, "so many times")->type_name("NUMBER");
+        app->add_option("--count", options->count, "so many times")->type_name("NUMBER")->needs("--watch");
         app->add_option("--openmetrics", options->openmetrics,
                         "write states and counters of all ports to a file as OpenMetrics text")
             ->type_name("FILE")

@@ -96,6 +96,8 @@ void loopback(Session& session, const Port& port, const Diag_Options& options)
     const bool ethernet = options.ethernet || !port.fc;
     if (ethernet && !port.ethernet)
         throw Failure(Exit::no_such_element, "port " + port.name() + " has no Ethernet function");
+    if (ethernet && mode == HXA_PPORT_OPMODE_LB_INT) // refused all the same, but only once the port is out of service
+        throw Failure(Exit::usage, "an Ethernet function takes the modes external and cable");
     hxa_diag_loopback_result_t result{};
     hxa_status_t status;
     {

@@ -7,6 +7,8 @@
 #include "hxal/boot.h"
 #include "hxal/value_names.h"
 
+#include <unistd.h>
+
 #include <algorithm>
 
 namespace hxa
@@ -117,9 +119,13 @@ void act_on_partition(Session& session, const Adapter& adapter, const Flash_Opti
 {
     const auto part = partition(adapter, options.partition);
     if (options.action == "read")
-        return require(hxal_flash_read_part(adapter.ioc(), part.type, part.instance, const_cast<char*>(options.file.c_str()),
-                                            part.size, HXA_TRUE),
+    {
+        if (access(options.file.c_str(), F_OK) == 0)
+            session.confirm(safe_text(options.file) + " is replaced by what " + part.name + " holds.");
+        std::string file = options.file;
+        return require(hxal_flash_read_part(adapter.ioc(), part.type, part.instance, file.data(), part.size, HXA_TRUE),
                        part.name);
+    }
     if (options.action == "erase")
     {
         session.confirm("What " + part.name + " holds is lost.");
