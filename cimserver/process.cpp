@@ -3,13 +3,21 @@
 #include <fcntl.h>
 #include <semaphore.h>
 #include <sys/resource.h>
+#include <sys/socket.h>
+#include <sys/un.h>
 #include <unistd.h>
 
 #include <algorithm>
 #include <atomic>
+#include <cerrno>
 #include <csignal>
+#include <cstddef>
+#include <cstdio>
+#include <cstdlib>
+#include <cstring>
 #include <stdexcept>
 #include <string>
+#include <string_view>
 
 namespace cimserver
 {
@@ -69,6 +77,32 @@ Wish next_wish()
     {
     }
     return stop_wished ? Wish::stop : Wish::reload;
+}
+
+Service_Manager::Service_Manager()
+{
+    const char* name = std::getenv("NOTIFY_SOCKET");
+    _socket = name ? name : "";
+    unsetenv("NOTIFY_SOCKET");
+}
+
+void Service_Manager::tell_ready() const
+{
+    if (_socket.empty())
+        return;
+    constexpr std::string_view ready = "READY=1";
+    sockaddr_un address{};
+    address.sun_family = AF_UNIX;
+    const std::size_t size = _socket.copy(address.sun_path, sizeof address.sun_path);
+    if (address.sun_path[0] == '@')
+        address.sun_path[0] = '\0'; // a name of the kernel's own, no file
+    const auto length = static_cast<socklen_t>(offsetof(sockaddr_un, sun_path) + size);
+    const int descriptor = socket(AF_UNIX, SOCK_DGRAM | SOCK_CLOEXEC, 0);
+    if (descriptor < 0 ||
+        sendto(descriptor, ready.data(), ready.size(), MSG_NOSIGNAL, reinterpret_cast<const sockaddr*>(&address), length) < 0)
+        std::fprintf(stderr, "zmlr-cimserver: cannot tell %s that it is ready: %s\n", _socket.c_str(), std::strerror(errno));
+    if (descriptor >= 0)
+        close(descriptor);
 }
 
 } // namespace cimserver

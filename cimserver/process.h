@@ -1,7 +1,8 @@
-// What the server asks of its process: descriptors and signals.
+// What the server asks of its process: descriptors, signals, and who started it as a service.
 #pragma once
 
 #include <cstddef>
+#include <string>
 
 namespace cimserver
 {
@@ -23,5 +24,17 @@ enum class Wish
 // From now on no signal that others send ends the process: it waits for its wish to be taken, or does nothing.
 void handle_signals();
 Wish next_wish(); // waits for one
+
+// systemd, when it started the program as a service that tells when it is ready. Made before there are threads: it takes the
+// address out of the environment, so that no program that the module starts speaks for the server.
+class Service_Manager
+{
+public:
+    Service_Manager();
+    void tell_ready() const; // does nothing where nobody wants to know
+
+private:
+    std::string _socket;
+};
 
 } // namespace cimserver

@@ -50,6 +50,17 @@ def test_only_term_and_int_end_it(start):
     assert host.server.stop() == 0
 
 
+@pytest.mark.parametrize("address", ["{folder}/notify", "\0zmlr-{process}"])
+def test_tells_systemd_when_it_listens(start, tmp_path, address):
+    address = address.format(folder=tmp_path, process=os.getpid())
+    with socket.socket(socket.AF_UNIX, socket.SOCK_DGRAM) as manager:
+        manager.bind(address)
+        manager.settimeout(60)
+        host = start("fc-hba", {"NOTIFY_SOCKET": address.replace("\0", "@")})
+        assert manager.recv(100) == b"READY=1"
+        assert served(host)
+
+
 def test_closed_standard_descriptors_are_taken_by_nothing_else(program, tmp_path):
     command = 'exec "$@" <&- >&- 2>&-'
     process = subprocess.Popen(["sh", "-c", command, "sh", *program, "--no-auth"], cwd=tmp_path)
