@@ -1,15 +1,15 @@
 # The Debian packages: a component each. packaging/debian/COMPONENT holds its description (the first line is the synopsis) and its
 # maintainer scripts and other control files; packages/CPackConfig.cmake of the build folder makes them (script/package).
 
-# component  package         section   architecture  depends on, beside the shared libraries  recommends
+# component  package         section  arch multi-arch depends on, beside the shared libraries                 recommends
 set(packages
-  "provider   |zmlr-provider  |admin    |any |procps, python3:any, tftp-hpa                    |"
-  "library    |libhxal1       |libs     |any |                                                 |"
-  "development|libhxal-dev    |libdevel |any |libhxal1 (= ${PROJECT_VERSION})                  |"
-  "tools      |hxa            |admin    |any |                                                 |"
-  "server     |zmlr-cimserver |admin    |any |zmlr-provider (= ${PROJECT_VERSION}), systemd, udev|"
-  "inventory  |zmlr-inventory |admin    |all |python3:any                                      |graphviz, python3-pywbem"
-  "simulator  |hxasim         |utils    |any |                                                 |")
+  "provider   |zmlr-provider  |admin    |any |       |procps, python3:any, tftp-hpa                     |"
+  "library    |libhxal1       |libs     |any |same   |                                                  |"
+  "development|libhxal-dev    |libdevel |any |same   |libhxal1 (= ${PROJECT_VERSION})                   |"
+  "tools      |hxa            |admin    |any |foreign|                                                  |"
+  "server     |zmlr-cimserver |admin    |any |foreign|zmlr-provider (= ${PROJECT_VERSION}), systemd, udev|"
+  "inventory  |zmlr-inventory |admin    |all |foreign|python3:any                                       |graphviz, python3-pywbem"
+  "simulator  |hxasim         |utils    |any |       |                                                  |")
 
 # Who answers for the packages is who builds them, or else who wrote the newest of these sources.
 function(git result)
@@ -69,8 +69,9 @@ foreach(row ${packages})
   list(GET row 1 package)
   list(GET row 2 section)
   list(GET row 3 architecture)
-  list(GET row 4 depends)
-  list(GET row 5 recommends)
+  list(GET row 4 multiarch)
+  list(GET row 5 depends)
+  list(GET row 6 recommends)
   if(NOT component IN_LIST installed)
     continue()
   endif()
@@ -86,6 +87,9 @@ foreach(row ${packages})
   endif()
   if(component STREQUAL library)
     list(APPEND extra ${CPACK_ZMLR_SHLIBS})
+  endif()
+  if(multiarch) # CPack has no variable for it before 3.31
+    string(APPEND section "\nMulti-Arch: ${multiarch}")
   endif()
   file(READ ${control}/description description)
   string(STRIP "${description}" description)

@@ -130,15 +130,18 @@ def test_units_are_sound_and_keep_their_programs_in(tree):
 
 
 def test_a_purge_leaves_nothing(tree):
-    state = tree.root / "var/lib/zmlr-cimserver"
-    state.mkdir(parents=True)
-    (state / "subscriptions").touch()
+    metrics = "var/lib/prometheus/node-exporter/hxa.prom"
+    made = {"var/lib/zmlr-cimserver/subscriptions", "var/cache/zmlr-cimserver/boot.tar", "etc/zmlr/users.Xa3Bc9",
+            "var/lib/zmlr-register/sfcb.json", "usr/share/zmlr/venv/bin/python", metrics}
+    for file in map(tree.root.joinpath, made):
+        file.parent.mkdir(parents=True, exist_ok=True)
+        file.touch()
     users = tree.root / "etc/zmlr/users"
     assert (users.read_text(), users.stat().st_mode & 0o777) == ("", 0o640)
     assert "zmlr-cimserver:" in (tree.root / "etc/passwd").read_text()
 
     tree.dpkg("--remove", *PACKAGES)
-    assert users.exists() and state.exists(), "settings and state stay"
+    assert {*made, "etc/zmlr/users", "etc/default/zmlr-cimserver"} - tree.files() == {metrics}, "settings and state stay"
     tree.dpkg("--purge", *PACKAGES)
     assert tree.files() == set()
     assert "zmlr" not in (tree.root / "etc/passwd").read_text() + (tree.root / "etc/group").read_text()
