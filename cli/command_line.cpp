@@ -14,6 +14,8 @@ namespace hxa
 namespace
 {
 
+constexpr double most_seconds = 86400; // between two readings
+
 constexpr auto one_adapter = "number, serial number or name";
 constexpr auto all_adapters = "number, serial number or name; all without";
 constexpr auto one_port = "ADAPTER/PORT, WWN or MAC";
@@ -261,7 +263,8 @@ private:
     static double seconds(const std::vector<std::string>& words)
     {
         double number = 1;
-        if (!words.empty() && !words.front().empty() && (!CLI::detail::lexical_cast(words.front(), number) || !(number > 0)))
+        if (!words.empty() && !words.front().empty() &&
+            (!CLI::detail::lexical_cast(words.front(), number) || !(number > 0 && number <= most_seconds)))
             throw CLI::ValidationError("--watch", "\"" + words.front() + "\" is no number of seconds");
         return number;
     }

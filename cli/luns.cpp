@@ -161,7 +161,11 @@ List luns_of(Session& session, const Port& port, wwn_t remote_port)
     std::set<std::uint64_t> seen; // a list that lies about its length goes on with LUN 0
     for (std::size_t at = list_head; at + list_entry <= list.size(); at += list_entry)
         if (seen.insert(number_at(list, at, list_entry)).second)
+        {
+            session.progress("port " + port.name() + ", remote port " + wwn_text(remote_port) + ", unit " +
+                             std::to_string(trees.size() + 1));
             trees.push_back(lun_tree(target, std::span(list).subspan(at, list_entry)));
+        }
     return trees;
 }
 

@@ -48,6 +48,7 @@ void Session::answer_line(const Value& tree, const std::string& text) { print(_o
 
 void Session::print(std::string_view text)
 {
+    clear_progress();
     while (!text.empty())
     {
         const auto written = write(_output, text.data(), text.size());
@@ -84,9 +85,28 @@ bool Session::accept(hxa_status_t status, const std::string& what)
 {
     if (status == HXA_STATUS_OK)
         return true;
+    clear_progress();
     std::cerr << "hxa: " << what << ": " << status_text(status) << '\n';
     fail();
     return false;
+}
+
+void Session::progress(const std::string& what)
+{
+    const auto now = std::chrono::steady_clock::now();
+    if (now - _shown < std::chrono::seconds(1) || !isatty(STDERR_FILENO))
+        return;
+    clear_progress();
+    std::cerr << what << std::flush;
+    _shown = now;
+    _progress = true;
+}
+
+void Session::clear_progress()
+{
+    if (_progress)
+        std::cerr << "\r\x1B[K" << std::flush;
+    _progress = false;
 }
 
 } // namespace hxa

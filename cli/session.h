@@ -7,6 +7,7 @@
 #include "cli/failure.h"
 #include "cli/value.h"
 
+#include <chrono>
 #include <string>
 #include <string_view>
 
@@ -46,12 +47,19 @@ public:
     // with 1. Returns whether it was read.
     bool accept(hxa_status_t status, const std::string& what);
 
+    // Tells on a terminal how far a command is that takes longer than a second.
+    void progress(const std::string& what);
+
     Exit code() const { return _code; }
     void fail() { _code = Exit::refused; } // the command did its work and what it found is bad
 
 private:
+    void clear_progress();
+
     Common_Options _options;
     int _output = -1;
+    std::chrono::steady_clock::time_point _shown = std::chrono::steady_clock::now(); // the last progress, or the start
+    bool _progress = false;                                                          // it stands on the terminal
     Exit _code = Exit::done;
 };
 
