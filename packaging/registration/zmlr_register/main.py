@@ -41,6 +41,7 @@ def main(arguments=None, data=pathlib.Path(__file__).resolve().parent.parent):
     if changing and os.geteuid() != 0:
         tools.warn("only root can register the module (try --dry-run)")
         return NOT_ROOT
+    os.umask(0o022)  # the server's user reads what is made for it, anybody asks for --status
     try:
         tools.listen_to_signals()
         with _alone(options.state) if changing else contextlib.nullcontext():
