@@ -97,7 +97,7 @@ CMPIrc take(Container& container, const Meta_Class* meta_class, uint32 mask, con
 {
     if (container.convert(meta_class, mask, instance) != 0)
         return CMPI_RC_ERR_FAILED;
-    __set_name_space_recursive(instance.ptr(), name_space.c_str(), false);
+    __set_name_space_recursive(instance.ptr(), name_space, false);
     return CMPI_RC_OK;
 }
 

@@ -98,7 +98,7 @@ bool is_reference_of(const Instance* instance, const Instance* association, cons
 
 // Name spaces: the instance and, depth first, everything it references.
 void __visit(Instance* instance, void (*callback)(Instance* instance, void* data), void* data);
-void __set_name_space_recursive(Instance* instance, const char* name_space, bool force);
+void __set_name_space_recursive(Instance* instance, const String& name_space, bool force);
 
 // One counted reference to an instance.
 template <class T> class Ref

@@ -41,7 +41,7 @@ void __visit(Instance* instance, void (*callback)(Instance* instance, void* data
     }
 }
 
-void __set_name_space_recursive(Instance* instance, const char* name_space, bool force)
+void __set_name_space_recursive(Instance* instance, const String& name_space, bool force)
 {
     Name_Space_Change change = {name_space, force};
     __visit(instance, set_name_space, &change);

@@ -7,7 +7,7 @@
 namespace cimserver
 {
 
-Provider_Turn::Provider_Turn(Provider_Turns& turns, const std::string& class_name) : _turns(turns)
+Provider_Turn::Provider_Turn(Provider_Turns& turns, const char* class_name) : _turns(turns)
 {
     std::unique_lock lock(_turns._mutex);
     _nested = std::ranges::find(_turns._inside, std::this_thread::get_id()) != _turns._inside.end();
@@ -16,7 +16,8 @@ Provider_Turn::Provider_Turn(Provider_Turns& turns, const std::string& class_nam
     while (_turns._inside.size() >= Provider_Turns::at_once)
         if (_turns._left.wait_until(lock, _turns._last_change + _turns._patience) == std::cv_status::timeout &&
             std::chrono::steady_clock::now() >= _turns._last_change + _turns._patience)
-            throw Cim_Error(CIM_ERR_FAILED, class_name + " does not answer: earlier requests have kept it busy for " +
+            throw Cim_Error(CIM_ERR_FAILED, std::string(class_name) +
+                                                " does not answer: earlier requests have kept it busy for " +
                                                 std::to_string(_turns._patience / std::chrono::seconds(1)) + " s");
     _turns._inside.push_back(std::this_thread::get_id());
     _turns._last_change = std::chrono::steady_clock::now();

@@ -7,7 +7,6 @@
 #include <chrono>
 #include <condition_variable>
 #include <mutex>
-#include <string>
 #include <thread>
 #include <vector>
 
@@ -37,7 +36,7 @@ class Provider_Turn
 public:
     // Waits for a turn. A thread that is with the provider already, and came back through an up-call, needs none. Throws
     // Cim_Error, which names the class, when the provider does not answer others.
-    Provider_Turn(Provider_Turns& turns, const std::string& class_name);
+    Provider_Turn(Provider_Turns& turns, const char* class_name);
     ~Provider_Turn();
     Provider_Turn(const Provider_Turn&) = delete;
     Provider_Turn& operator=(const Provider_Turn&) = delete;
