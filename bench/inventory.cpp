@@ -11,6 +11,7 @@
 #include "sim/hxasim.h"
 
 #include <benchmark/benchmark.h>
+#include <malloc.h>
 
 #include <string>
 #include <vector>
@@ -93,6 +94,7 @@ std::size_t module_peak(cimserver::Module& module, const cimserver::Object_Path&
 void measure(benchmark::State& state, const std::string& name, const std::string& class_name, Host_Text host_text,
              const Work& work)
 {
+    malloc_trim(0); // of the benchmark before
     bench::Simulated_Host host(host_text(state.range(0)));
     const Instances all = all_of(host.operations(), class_name); // the first request makes the provider
     cimserver::Object_Path path = all.at(all.size() / 2).path;

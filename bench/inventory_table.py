@@ -1,9 +1,11 @@
 """Runs `inventory` (bench/inventory.cpp), then once more under callgrind, and prints its figures as tables."""
 
 import argparse
+import collections
 import json
 import math
 import re
+import statistics
 import subprocess
 import tempfile
 from pathlib import Path
@@ -20,16 +22,17 @@ def measured(program, selection):
 
 
 def instructions(program, selection):
-    """By benchmark: the instructions of one iteration, the simulated driver's left out."""
+    """By benchmark: the instructions of one iteration, the simulated driver's left out. The mean of four: what the allocator finds to
+    be put together again differs."""
     with tempfile.TemporaryDirectory() as folder:
         command = ["valgrind", "--tool=callgrind", "--collect-atstart=no", f"--callgrind-out-file={folder}/out", program]
-        subprocess.run([*command, selection, "--benchmark_min_time=0.000001"], check=True, capture_output=True)
+        subprocess.run([*command, selection, "--benchmark_min_time=0.000001", "--benchmark_repetitions=4"], check=True, capture_output=True)
         dumps = [path.read_text() for path in Path(folder).iterdir()]
-    counts = {}
+    counts = collections.defaultdict(list)
     for dump in dumps:
         if name := re.search(r"^desc: Trigger: Client Request: (.+)$", dump, re.MULTILINE):
-            counts[name[1]] = int(re.search(r"^(?:totals|summary): (\d+)", dump, re.MULTILINE)[1])
-    return counts
+            counts[name[1]].append(int(re.search(r"^(?:totals|summary): (\d+)", dump, re.MULTILINE)[1]))
+    return {name: statistics.fmean(values) for name, values in counts.items()}
 
 
 def print_table(title, head, rows):
