@@ -17,6 +17,7 @@ def test_installs_once_and_removes_everything(host, server):
 
     installed = host.register("--install")
     assert (installed.returncode, installed.stderr) == (0, "")
+    assert (host.folder / "notes").is_dir()  # by that the package's scripts see that something is registered
     once = host.contents()
     assert once["host/providers/libzmlrprovider.so"] == str(host.folder / "libzmlrprovider.so")
     assert host.register("--status").returncode == 0
@@ -24,7 +25,7 @@ def test_installs_once_and_removes_everything(host, server):
     assert host.contents() == once
 
     assert host.register("--remove").returncode == 0
-    assert host.contents() == empty
+    assert host.contents() == empty and not (host.folder / "notes").exists()
 
 
 @pytest.mark.parametrize("server, task, fault, status", [
