@@ -5,6 +5,8 @@ import ssl
 from pathlib import Path
 from urllib.parse import urlsplit
 
+from .values import visible
+
 HTTP_PORT, HTTPS_PORT = 5988, 5989
 
 
@@ -22,7 +24,8 @@ def url_of(text, plain_http=False):
         raise UsageError(f"{_without_login(text)!r} is no host: {error}") from None
     if "@" in parts.netloc:
         raise UsageError(f"{_without_login(text)!r}: a user or password does not belong in an address; use --user or --credentials")
-    if not name or parts.path not in ("", "/") or parts.query or parts.fragment or parts.scheme not in ("", "http", "https"):
+    is_name = name and " " not in name and visible(given) == given
+    if not is_name or parts.path not in ("", "/") or parts.query or parts.fragment or parts.scheme not in ("", "http", "https"):
         raise UsageError(f"{text!r} is no host: NAME, NAME:PORT, http://NAME:PORT or https://NAME:PORT")
     scheme = parts.scheme or ("http" if is_loopback(name) and port != HTTPS_PORT else "https")
     if scheme == "http" and not is_loopback(name) and not plain_http:

@@ -1,7 +1,8 @@
 """The program zmlr-inventory: reads hosts and shows what they have."""
 
-import re
 import sys
+import time
+import warnings
 from pathlib import Path
 
 from . import credentials, hosts, parallel
@@ -12,25 +13,35 @@ from .json_text import json_text
 from .model import Failure, Inventory
 from .openmetrics import write_openmetrics
 from .options import parse
-from .output import give_up_output, say, style_of
+from .output import give_up_output, prepare_output, reason, say, style_of
 from .topology import svg
 from .tree import tree_text
 
-HTTP_CLIENT = re.compile(r"HTTPS?Connection(Pool)?\([^)]*\): ")  # the host stands before the reason already
+GRACE = 1  # seconds in which a connection finds out by itself that an answer is late
 
 
 def main(arguments=None):
-    for stream in (sys.stdout, sys.stderr):
-        stream.reconfigure(errors="backslashreplace")
-    options = parse(arguments)
+    if not sys.warnoptions:
+        warnings.simplefilter("ignore")  # they are for developers
+    try:
+        prepare_output()
+        return run(parse(arguments))
+    except KeyboardInterrupt:
+        return INTERRUPTED
+    except OSError as error:
+        give_up_output()
+        if not isinstance(error, BrokenPipeError):
+            say(f"the output is lost: {error.strerror}")
+        return NOT_WRITTEN
+
+
+def run(options):
     try:
         urls = hosts.urls_of(options.host, options.hosts, options.plain_http)
         logins = credentials.Credentials(options.credentials, credentials.ask(options.user) if options.user else None)
     except UsageError as error:
         say(str(error))
         return USAGE
-    except KeyboardInterrupt:
-        return INTERRUPTED
     try:
         import pywbem  # noqa: F401
     except ImportError:
@@ -44,35 +55,34 @@ def main(arguments=None):
     def connect(url):
         return hosts.connect(url, options, logins)
 
-    try:
-        if options.watch:
-            from .watch import watch
+    if options.watch:
+        from .watch import watch
 
-            return watch(urls, connect, options)
-        inventory = read(urls, connect, options.parallel)
-        return show(inventory, options)
-    except KeyboardInterrupt:
-        return INTERRUPTED
-    except BrokenPipeError:
-        give_up_output()
-        return NOT_WRITTEN
+        return watch(urls, connect, options)
+    return show(read(urls, connect, options), options)
 
 
-def read(urls, connect, at_once):
+def read(urls, connect, options):
     """All hosts; what fails is told as it comes."""
     from .reading import read_host
 
     progress = parallel.Progress(sys.stderr, len(urls))
+    asked = {}  # when the answer that a host owes was asked for
 
     def read_one(url):
         def on_class(name, number, count):
+            asked[url] = time.monotonic()
             progress.step(hosts.label_of(url), f"reading {name} ({number} of {count} classes)")
 
         return read_host(connect(url), on_class)
 
+    def is_late(url):
+        """The connection's own limit is between two pieces of an answer, and a server may send one byte at a time."""
+        return url in asked and time.monotonic() > asked[url] + options.timeout + GRACE
+
     found, failures = {}, {}
     try:
-        for url, host, error in parallel.each(read_one, urls, at_once, progress.show):
+        for url, host, error in parallel.each(read_one, urls, options.parallel, progress.show, is_late):
             progress.finish(hosts.label_of(url))
             progress.clear()
             if error:
@@ -85,18 +95,6 @@ def read(urls, connect, at_once):
     finally:
         progress.clear()
     return Inventory([found[url] for url in urls if url in found], [failures[url] for url in urls if url in failures])
-
-
-def reason(error):
-    """Why a host told nothing, in a line."""
-    import pywbem
-
-    if isinstance(error, pywbem.AuthError):
-        return "the server wants another login; give it with --credentials FILE or --user NAME"
-    if isinstance(error, pywbem.CIMError):
-        return f"{error.status_code_name}: {error.status_description}"
-    text = " ".join(HTTP_CLIENT.sub("", str(error)).split())
-    return text if isinstance(error, (pywbem.Error, OSError)) else f"its answer is not understood: {type(error).__name__}: {text}"
 
 
 def show(inventory, options):

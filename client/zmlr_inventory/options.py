@@ -32,7 +32,7 @@ def parse(arguments):
         "--listen", metavar="ADDRESS", help="of this machine, that servers shall send to (default: that which reaches them)"
     )
     alerts.add_argument(
-        "--listen-port", metavar="N", type=int, default=0, help="of the first host; the next ones take the next ones (default: free ones)"
+        "--listen-port", metavar="N", type=_port, default=0, help="of the first host; the next ones take the next ones (default: free ones)"
     )
 
     asking = parser.add_argument_group("how hosts are asked")
@@ -60,7 +60,15 @@ def _existing(path):
 
 
 def _positive(text):
-    number = int(text)
-    if number < 1:
-        raise argparse.ArgumentTypeError("at least 1")
+    return _number(text, 1, 1_000_000)
+
+
+def _port(text):
+    return _number(text, 0, 65535)
+
+
+def _number(text, least, most):
+    number = int(text) if text.isascii() and text.isdecimal() and len(text) < 10 else -1
+    if not least <= number <= most:
+        raise argparse.ArgumentTypeError(f"{text!r} is no number from {least} to {most}")
     return number

@@ -3,12 +3,14 @@
 import signal
 import subprocess
 import sys
+import threading
 
 import pytest
 import pywbem
 from conftest import PROGRAM
 
 from tools.simulated_server import ROOT
+from zmlr_inventory import parallel
 
 TIMEOUT = 60  # seconds
 
@@ -80,6 +82,9 @@ def test_what_cannot_be_written_or_drawn(serve, run, tmp_path):
     without_graphviz = run(url, "--svg", tmp_path / "picture.svg", environment={"PATH": str(tmp_path)})
     assert (without_graphviz.returncode, "install the package graphviz" in without_graphviz.stderr) == (5, True)
     assert not (tmp_path / "picture.svg").exists()
+    with open("/dev/full", "w", encoding="utf-8") as full:
+        shown = subprocess.run([*PROGRAM, url], stdout=full, stderr=subprocess.PIPE, text=True, check=False)
+    assert (shown.returncode, shown.stderr) == (5, "zmlr-inventory: the output is lost: No space left on device\n")
 
 
 def test_without_pywbem_it_tells_how_to_get_it():
@@ -110,7 +115,26 @@ def test_watch_shows_the_alerts_of_several_hosts_and_leaves_nothing(serve):
     assert [subscriptions(server) for server in servers] == [[0, 0, 0]] * 2
 
 
-def test_a_subscription_that_is_refused_leaves_nothing(serve, run):
-    shown = run("--watch", serve("mixed").url, "--query", "SELECT * FROM Nobody")
-    assert (shown.returncode, "takes no subscription" in shown.stderr) == (3, True)
-    assert subscriptions(serve("mixed")) == [0, 0, 0]
+def test_a_subscription_that_fails_leaves_nothing(serve, run):
+    server = serve("mixed")
+    for options, told in ((["--query", "SELECT * FROM Nobody"], "CIM_ERR"), (["--listen-port", server.port], "already in use")):
+        shown = run("--watch", server.url, *options)
+        assert (shown.returncode, "takes no subscription" in shown.stderr, told in shown.stderr) == (3, True, True)
+        assert subscriptions(server) == [0, 0, 0]
+
+
+def test_what_a_killed_program_left_is_removed_by_the_next(serve):
+    server = serve("mixed")
+    for number in (signal.SIGKILL, signal.SIGTERM):
+        with subprocess.Popen([*PROGRAM, "--watch", server.url], stderr=-1, text=True) as program:
+            assert [program.stderr.readline() for _ in range(2)]
+            assert subscriptions(server) == [1, 1, 1]
+            program.send_signal(number)
+    assert subscriptions(server) == [0, 0, 0]
+
+
+def test_a_host_whose_answer_never_ends_costs_its_own_part():
+    late = threading.Event()
+    done = {item: error for item, _, error in parallel.each(lambda item: late.wait(item), [TIMEOUT, 0], 1, is_late=bool)}
+    assert (type(done[TIMEOUT]), done[0]) == (TimeoutError, None)
+    late.set()
