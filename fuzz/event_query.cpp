@@ -8,7 +8,7 @@ using namespace cimserver;
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size)
 {
     static const Instance alert{{"", "root/test", "A", {}},
-                                {{"T", {CMPI_string, "x"}},
+                                {{"T", {CMPI_string, std::string("x")}},
                                  {"N", {CMPI_sint64, std::int64_t{-5}}},
                                  {"B", {CMPI_boolean, true}},
                                  {"Z", {CMPI_string, {}}}}};
