@@ -1,5 +1,5 @@
-# Run by CPack when everything lies in folders of its own, before it makes packages of them: strips as Debian does, and asks
-# dpkg-shlibdeps what the programs and libraries need.
+# Run by CPack when everything lies in folders of its own, before it makes packages of them: takes the paths of libraries out of the
+# programs, strips as Debian does, and asks dpkg-shlibdeps what the programs and libraries need.
 set(stripping --strip-unneeded --remove-section=.comment --remove-section=.note)
 set(work ${CPACK_TEMPORARY_DIRECTORY}/shlibdeps)
 file(WRITE ${work}/debian/control "Source: zmlr\n\nPackage: zmlr\nArchitecture: any\n")
@@ -14,6 +14,7 @@ foreach(component ${CPACK_COMPONENTS_ALL})
     file(READ ${file} magic LIMIT 8 HEX)
     if(magic MATCHES ^7f454c46)
       list(APPEND binaries ${file})
+      file(RPATH_REMOVE FILE ${file})
       execute_process(COMMAND strip ${stripping} ${file} COMMAND_ERROR_IS_FATAL ANY)
     elseif(magic STREQUAL 213c617263683e0a)
       execute_process(COMMAND strip --strip-debug --remove-section=.comment --enable-deterministic-archives ${file}
