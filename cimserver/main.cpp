@@ -127,7 +127,7 @@ Http_Work for_user(const std::string& user, Http_Work work)
 void serve(const Options& options)
 {
     handle_signals();
-    const Service_Manager service_manager;
+    const std::string service_manager = take_service_manager();
     reserve_descriptors(options.limits.connections);
     const Http_Endpoint endpoint = endpoint_of(options);
     const auto credentials = credentials_of(options);
@@ -143,7 +143,7 @@ void serve(const Options& options)
                        [&](const Http_Request& request) { return for_user(request.user, service.handle(request)); });
     std::fprintf(stderr, "zmlr-cimserver: listening on %s%s\n", endpoint_text(endpoint.address, server.port()).c_str(),
                  endpoint.tls ? " (TLS)" : "");
-    service_manager.tell_ready();
+    tell_ready(service_manager);
 
     while (next_wish() == Wish::reload)
         reload(options, credentials.get());

@@ -11,13 +11,10 @@
 #include <atomic>
 #include <cerrno>
 #include <csignal>
-#include <cstddef>
 #include <cstdio>
 #include <cstdlib>
 #include <cstring>
 #include <stdexcept>
-#include <string>
-#include <string_view>
 
 namespace cimserver
 {
@@ -79,30 +76,28 @@ Wish next_wish()
     return stop_wished ? Wish::stop : Wish::reload;
 }
 
-Service_Manager::Service_Manager()
+std::string take_service_manager()
 {
-    const char* name = std::getenv("NOTIFY_SOCKET");
-    _socket = name ? name : "";
+    const char* address = std::getenv("NOTIFY_SOCKET");
+    std::string taken = address ? address : "";
     unsetenv("NOTIFY_SOCKET");
+    return taken;
 }
 
-void Service_Manager::tell_ready() const
+void tell_ready(const std::string& service_manager)
 {
-    if (_socket.empty())
+    if (service_manager.empty())
         return;
-    constexpr std::string_view ready = "READY=1";
-    sockaddr_un address{};
-    address.sun_family = AF_UNIX;
-    const std::size_t size = _socket.copy(address.sun_path, sizeof address.sun_path);
+    sockaddr_un address{AF_UNIX, {}};
+    const std::size_t size = service_manager.copy(address.sun_path, sizeof address.sun_path);
     if (address.sun_path[0] == '@')
         address.sun_path[0] = '\0'; // a name of the kernel's own, no file
     const auto length = static_cast<socklen_t>(offsetof(sockaddr_un, sun_path) + size);
     const int descriptor = socket(AF_UNIX, SOCK_DGRAM | SOCK_CLOEXEC, 0);
-    if (descriptor < 0 ||
-        sendto(descriptor, ready.data(), ready.size(), MSG_NOSIGNAL, reinterpret_cast<const sockaddr*>(&address), length) < 0)
-        std::fprintf(stderr, "zmlr-cimserver: cannot tell %s that it is ready: %s\n", _socket.c_str(), std::strerror(errno));
-    if (descriptor >= 0)
-        close(descriptor);
+    if (sendto(descriptor, "READY=1", 7, MSG_NOSIGNAL, reinterpret_cast<const sockaddr*>(&address), length) < 0)
+        std::fprintf(stderr, "zmlr-cimserver: cannot tell %s that it is ready: %s\n", service_manager.c_str(),
+                     std::strerror(errno));
+    close(descriptor);
 }
 
 } // namespace cimserver

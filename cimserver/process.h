@@ -25,16 +25,9 @@ enum class Wish
 void handle_signals();
 Wish next_wish(); // waits for one
 
-// systemd, when it started the program as a service that tells when it is ready. Made before there are threads: it takes the
-// address out of the environment, so that no program that the module starts speaks for the server.
-class Service_Manager
-{
-public:
-    Service_Manager();
-    void tell_ready() const; // does nothing where nobody wants to know
-
-private:
-    std::string _socket;
-};
+// The address at which systemd waits to hear that the server is ready; empty when nobody waits. Asked before there are threads:
+// it is taken out of the environment, so that no program that the module starts speaks for the server.
+std::string take_service_manager();
+void tell_ready(const std::string& service_manager);
 
 } // namespace cimserver

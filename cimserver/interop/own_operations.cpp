@@ -1,6 +1,7 @@
 #include "cimserver/interop/own_operations.h"
 
 #include "cimserver/interop/server_schema.h"
+#include "cimserver/model/paths.h"
 #include "cimserver/operations/typed_keys.h"
 #include "cimserver/operations/typed_objects.h"
 
@@ -22,6 +23,18 @@ void use_one_name(std::vector<Named_Value>& values)
             path.name_space = Own_Operations::name_space;
             value.value.content = std::move(path);
         }
+}
+
+std::optional<Instance> find_instance(const Server_Class& server_class, const Object_Path& path)
+{
+    const std::string wanted = path_identity(path);
+    for (Instance& instance : server_class.enumerate())
+    {
+        instance.path.name_space = path.name_space;
+        if (path_identity(instance.path) == wanted)
+            return std::move(instance);
+    }
+    return std::nullopt;
 }
 
 } // namespace

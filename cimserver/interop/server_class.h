@@ -5,7 +5,6 @@
 #include "runtime/meta.h"
 
 #include <functional>
-#include <optional>
 #include <vector>
 
 namespace cimserver
@@ -22,8 +21,5 @@ struct Server_Class
     std::function<Object_Path(const Instance&)> create; // its path may lack keys; none: not supported
     std::function<void(const Object_Path&)> remove;     // CIM_ERR_NOT_FOUND too; none: not supported
 };
-
-// The instance that the path names; nothing when there is none.
-std::optional<Instance> find_instance(const Server_Class& server_class, const Object_Path& path);
 
 } // namespace cimserver

@@ -1,3 +1,4 @@
+// The objects that hold a list of named values.
 #include "cimserver/broker/cmpi_values.h"
 #include "cimserver/broker/not_offered.h"
 #include "cimserver/broker/objects.h"
@@ -22,6 +23,11 @@ CMPICount get_arg_count(const CMPIArgs* self, CMPIStatus* status) noexcept
     return answer<CMPICount>(status, 0, [&] { return static_cast<CMPICount>(object<Args_Object>(self).args.size()); });
 }
 
+CMPIData get_entry(const CMPIContext* self, const char* name, CMPIStatus* status) noexcept
+{
+    return answer(status, no_data(), [&] { return data_named(object<Context_Object>(self).entries, name); });
+}
+
 } // namespace
 
 const CMPIArgsFT Args_Object::table = {
@@ -32,6 +38,16 @@ const CMPIArgsFT Args_Object::table = {
     .getArg = not_offered,
     .getArgAt = get_arg_at,
     .getArgCount = get_arg_count,
+};
+
+const CMPIContextFT Context_Object::table = {
+    .ftVersion = 100,
+    .release = release<Context_Object>,
+    .clone = clone<Context_Object>,
+    .getEntry = get_entry,
+    .getEntryAt = not_offered,
+    .getEntryCount = not_offered,
+    .addEntry = not_offered,
 };
 
 } // namespace cimserver

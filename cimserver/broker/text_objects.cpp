@@ -1,3 +1,4 @@
+// The objects that hold one text.
 #include "cimserver/broker/not_offered.h"
 #include "cimserver/broker/objects.h"
 #include "text/datetime.h"
@@ -6,6 +7,11 @@ namespace cimserver
 {
 namespace
 {
+
+const char* get_char_ptr(const CMPIString* self, CMPIStatus* status) noexcept
+{
+    return answer<const char*>(status, nullptr, [&] { return (*object<String_Object>(self).text).c_str(); });
+}
 
 // Any numbers in the form: a timestamp of all zeros is what many agents answer for an unset clock.
 Shared<std::string> checked(Shared<std::string> text)
@@ -20,7 +26,19 @@ CMPIString* get_string_format(const CMPIDateTime* self, CMPIStatus* status) noex
     return answer_new<String_Object>(status, [&] { return object<Datetime_Object>(self).text; });
 }
 
+CMPIString* get_string(const CMPISelectExp* self, CMPIStatus* status) noexcept
+{
+    return answer_new<String_Object>(status, [&] { return object<Select_Object>(self).query; });
+}
+
 } // namespace
+
+const CMPIStringFT String_Object::table = {
+    .ftVersion = 100,
+    .release = release<String_Object>,
+    .clone = clone<String_Object>,
+    .getCharPtr = get_char_ptr,
+};
 
 Datetime_Object::Datetime_Object(Shared<std::string> text_) : text(checked(std::move(text_))) {}
 
@@ -31,6 +49,17 @@ const CMPIDateTimeFT Datetime_Object::table = {
     .getBinaryFormat = not_offered,
     .getStringFormat = get_string_format,
     .isInterval = not_offered,
+};
+
+const CMPISelectExpFT Select_Object::table = {
+    .ftVersion = 100,
+    .release = release<Select_Object>,
+    .clone = clone<Select_Object>,
+    .evaluate = not_offered,
+    .getString = get_string,
+    .getDOC = not_offered,
+    .getCOD = not_offered,
+    .evaluateUsingAccessor = not_offered,
 };
 
 } // namespace cimserver
