@@ -3,6 +3,7 @@
 #include "cli/keep.h"
 #include "cli/report.h"
 #include "cli/trees.h"
+#include "cli/words.h"
 #include "hxal/value_names.h"
 
 namespace hxa
@@ -84,7 +85,10 @@ void act(Session& session, const Adapter& adapter, const Adapter_Options& option
         require(hxal_adapter_disable(adapter.number), what);
     }
     else if (options.action == "name")
+    {
+        check_name(options.value, sizeof adapter.handle->name - 1);
         change(session, options.keep, [&] { set_name(adapter, options.value); });
+    }
     else
     {
         const auto state = power_state(options.value);

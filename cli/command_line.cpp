@@ -27,7 +27,8 @@ class Parser
 public:
     Parser(Command_Line& result) : _result(result)
     {
-        _app.require_subcommand(1);
+        _app.require_subcommand(0, 1);
+        _app.callback([this] { require_command(); });
         _app.fallthrough();
         _app.set_version_flag("--version", "hxa " ZMLR_VERSION);
         _app.add_flag("--json", result.common.json, "answer with JSON");
@@ -53,6 +54,13 @@ public:
     }
 
 private:
+    // Asked for last, so that a word that is no command is told as such.
+    void require_command() const
+    {
+        if (_app.get_subcommands().empty())
+            throw CLI::RequiredError::Subcommand(1);
+    }
+
     // A command whose options live as long as what runs it.
     template <typename Options>
     std::pair<CLI::App*, std::shared_ptr<Options>> add(const std::string& name, const std::string& help,
@@ -76,11 +84,14 @@ private:
 
     static void take(CLI::App* app, const std::string& name, std::string& into, const std::string& help)
     {
-        app->add_option(name, into, help)->required()->type_name("");
+        may_take(app, name, into, help)->required();
     }
-    static void may_take(CLI::App* app, const std::string& name, std::string& into, const std::string& help)
+    static CLI::Option* may_take(CLI::App* app, const std::string& name, std::string& into, const std::string& help)
     {
-        app->add_option(name, into, help)->type_name("");
+        auto* option = app->add_option(name, into, help)->type_name("");
+        if (name != "value") // a script's variable that holds nothing shall not stand for all, nor for a card without a name
+            option->check([](const std::string& text) { return std::string(text.empty() ? "it is empty" : ""); });
+        return option;
     }
     static void take_keep(CLI::App* app, Keep_Options& keep)
     {
@@ -154,7 +165,8 @@ private:
                "--watch", [options = options](const auto& words) { options->watch = seconds(words); },
                "show what rises, again and again")
             ->expected(0, 1)
-            ->type_name("SECONDS");
+            ->type_name("SECONDS")
+            ->excludes("--reset");
         app->add_option("--count", options->count, "so many times")->type_name("NUMBER")->needs("--watch");
         app->add_option("--openmetrics", options->openmetrics,
                         "write states and counters of all ports to a file as OpenMetrics text")

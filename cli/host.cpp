@@ -4,6 +4,7 @@
 #include "text/integers.h"
 
 #include <algorithm>
+#include <iterator>
 
 namespace hxa
 {
@@ -25,22 +26,35 @@ bool is_port(const Port& port, const std::string& text)
            (mac && ((port.is_converged() && has_mac(port.fc)) || has_mac(port.ethernet)));
 }
 
+// The only element that fits. Cards may have one serial number, and ports one node WWN: then nobody knows which one was meant.
+template <typename Element, typename Fits>
+const Element* find_only(const std::vector<Element>& elements, const std::string& text, const Fits& fits)
+{
+    const auto found = std::find_if(elements.begin(), elements.end(), fits);
+    if (found == elements.end())
+        return nullptr;
+    const auto other = std::find_if(found + 1, elements.end(), fits);
+    if (other != elements.end())
+        throw Failure(Exit::no_such_element,
+                      '"' + safe_text(text) + "\" names " + found->name() + " as well as " + other->name());
+    return &*found;
+}
+
 // A device's name may look like a number: a number comes first, then the serial number, which its factory gave, then the name.
 const Adapter* find_adapter(const std::vector<Adapter>& adapters, const std::string& text)
 {
-    const auto find = [&](auto fits) { return std::find_if(adapters.begin(), adapters.end(), fits); };
-    auto found = find([&](const Adapter& adapter) { return text == adapter.name(); });
-    if (found == adapters.end())
+    const auto find = [&](const auto& fits) { return find_only(adapters, text, fits); };
+    const auto* found = find([&](const Adapter& adapter) { return text == adapter.name(); });
+    if (!found)
         found = find([&](const Adapter& adapter) { return text == adapter.handle->serial_num; });
-    if (found == adapters.end())
-        found = find([&](const Adapter& adapter) { return text == adapter.handle->name; });
-    return found == adapters.end() ? nullptr : &*found;
+    return found ? found : find([&](const Adapter& adapter) { return text == adapter.handle->name; });
 }
 
-const Port* find_port(const std::vector<Port>& ports, const std::string& text)
+std::vector<Port> find_ports(const std::vector<Port>& ports, const std::string& text)
 {
-    const auto found = std::find_if(ports.begin(), ports.end(), [&](const Port& port) { return is_port(port, text); });
-    return found == ports.end() ? nullptr : &*found;
+    std::vector<Port> found;
+    std::copy_if(ports.begin(), ports.end(), std::back_inserter(found), [&](const Port& port) { return is_port(port, text); });
+    return found;
 }
 
 } // namespace
@@ -75,10 +89,10 @@ Adapter Host::adapter(const std::string& text) const
     const auto all = adapters();
     if (const auto* found = find_adapter(all, text))
         return *found;
-    const auto all_ports = ports();
-    if (const auto* found = find_port(all_ports, text))
-        return found->adapter;
-    refuse("adapter", text);
+    const auto found = find_ports(ports(), text);
+    if (found.empty())
+        refuse("adapter", text);
+    return found.front().adapter;
 }
 
 std::vector<Port> Host::ports(const std::string& text) const
@@ -89,8 +103,8 @@ std::vector<Port> Host::ports(const std::string& text) const
             all.push_back(port);
     if (text.empty())
         return all;
-    if (const auto* found = find_port(all, text))
-        return {*found};
+    if (auto found = find_ports(all, text); !found.empty())
+        return found;
     const auto all_adapters = adapters();
     if (const auto* found = find_adapter(all_adapters, text))
         return ports_of(*found);
@@ -100,7 +114,7 @@ std::vector<Port> Host::ports(const std::string& text) const
 Port Host::port(const std::string& text) const
 {
     const auto all = ports();
-    if (const auto* found = find_port(all, text))
+    if (const auto* found = find_only(all, text, [&](const Port& port) { return is_port(port, text); }))
         return *found;
     refuse("port", text);
 }

@@ -44,7 +44,7 @@ public:
     ~Host();
 
     // What a text selects: an adapter by its number, serial number, name or a port of it; a port as "ADAPTER/PORT", by its port
-    // or node WWN or its MAC. Throws when there is none.
+    // or node WWN or its MAC. Throws when there is none, and when one is meant and there are several.
     Adapter adapter(const std::string& text) const;
     Port port(const std::string& text) const;
 

@@ -23,7 +23,8 @@ int main(int count, char** words)
         const auto command_line = hxa::read_command_line(count, words);
         if (!command_line.run)
         {
-            (command_line.code == hxa::Exit::done ? std::cout : std::cerr) << command_line.text;
+            if (!((command_line.code == hxa::Exit::done ? std::cout : std::cerr) << command_line.text << std::flush))
+                return static_cast<int>(hxa::Exit::refused);
             return static_cast<int>(command_line.code);
         }
         hxa::Session session(command_line.common);

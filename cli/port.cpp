@@ -139,6 +139,8 @@ void act(Session& session, const Port& port, const Port_Options& options)
         set_beacon(port, options);
     else
     {
+        if (options.action == "name")
+            check_name(options.value, sizeof port.ioc()->port_name - 1);
         if (options.action == "disable")
             session.confirm("Port " + port.name() + " goes out of service" +
                             (port.fc && port.ethernet ? ", for storage and for the network." : "."));

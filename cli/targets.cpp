@@ -32,6 +32,7 @@ constexpr Column remote_columns[] = {
 };
 
 constexpr Column lun_columns[] = {
+    {"Port",        "port"},
     {"Remote port", "wwn"},
     {"LUN",         "unit.lun"},
     {"Type",        "unit.type"},
@@ -116,7 +117,7 @@ std::string text_of(const List& remotes, bool with_luns)
     List rows;
     for (const auto& remote : remotes)
         for (const auto& unit : remote.at("units").list())
-            rows.push_back(Object{{"wwn", remote.at("wwn")}, {"unit", unit}});
+            rows.push_back(Object{{"port", remote.at("port")}, {"wwn", remote.at("wwn")}, {"unit", unit}});
     return table(remotes, remote_columns) + (with_luns ? '\n' + table(rows, lun_columns) : std::string());
 }
 

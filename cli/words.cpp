@@ -48,6 +48,12 @@ hxa_pport_topology_t read_topology(const std::string& text)
     refuse(text, "topology: p2p, loop or auto");
 }
 
+void check_name(const std::string& text, std::size_t most)
+{
+    if (text.size() > most || safe_text(text) != text || text.find('"') != std::string::npos)
+        refuse(text, "name: up to " + std::to_string(most) + " bytes of printable text without a quotation mark");
+}
+
 std::uint32_t read_number(const std::string& text, std::uint32_t most, int base, const std::string& what)
 {
     std::string_view digits = text;

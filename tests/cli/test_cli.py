@@ -59,6 +59,10 @@ def test_answers_are_those_of_the_golden_text(golden):
         ("no-driver", "list", 3, "not installed or loaded (133)"),
         ("version-refused", "stats", 3, "version mismatch (70)"),
         ("mixed", "", 2, "subcommand"),
+        ("mixed", "lists", 2, "not expected: lists"),
+        ("odd", "--yes adapter disable ''", 2, "empty"),
+        ("odd", "--yes adapter disable SAME-SERIAL1", 4, "1 as well as 2"),
+        ("mixed", "port name 1/0 'bell \a'", 2, "is no name"),
         ("mixed", "port speed 1/0 3", 2, '"3" is no speed'),
         ("mixed", "port speed 1/0", 2, "value is required"),
         ("mixed", "stats --watch 1e300", 2, "no number of seconds"),
@@ -81,7 +85,7 @@ def test_answers_are_those_of_the_golden_text(golden):
     ],
 )
 def test_what_cannot_be_done_is_told_with_its_exit_code(scenario, words, code, error):
-    ran = hxa(scenario, *words.split())
+    ran = hxa(scenario, *shlex.split(words))
     assert (ran.returncode, error in ran.stderr) == (code, True), ran.stderr
     if words != "port sfp 1/1":
         assert ran.stdout == ""
