@@ -17,7 +17,7 @@ from .output import give_up_output, prepare_output, reason, say, style_of
 from .topology import svg
 from .tree import tree_text
 
-GRACE = 1  # seconds in which a connection finds out by itself that an answer is late
+WHOLE_ANSWER = 3  # how many times the limit of a silence it may take, its reading included
 
 
 def main(arguments=None):
@@ -77,8 +77,8 @@ def read(urls, connect, options):
         return read_host(connect(url), on_class)
 
     def is_late(url):
-        """The connection's own limit is between two pieces of an answer, and a server may send one byte at a time."""
-        return url in asked and time.monotonic() > asked[url] + options.timeout + GRACE
+        """The connection limits the silence between two pieces of an answer, and a server may send one byte at a time."""
+        return url in asked and time.monotonic() > asked[url] + WHOLE_ANSWER * options.timeout
 
     found, failures = {}, {}
     try:

@@ -43,7 +43,7 @@ def parse(arguments):
     )
     asking.add_argument("--insecure", action="store_true", help="do not check who the servers are")
     asking.add_argument("--plain-http", action="store_true", help="allow unencrypted http to other machines")
-    asking.add_argument("--timeout", metavar="SECONDS", type=_positive, default=60, help="for one answer (default: %(default)s)")
+    asking.add_argument("--timeout", metavar="SECONDS", type=_positive, default=60, help="that a server may keep silent (default: %(default)s)")
     asking.add_argument("--parallel", metavar="N", type=_positive, default=16, help="hosts that are asked at once (default: %(default)s)")
 
     options = parser.parse_args(arguments)
