@@ -233,11 +233,15 @@ class _Joining:
         return self._targets[port, wwn]
 
     def _add_units(self):
-        """A unit's key names its port, its target, its model and its number."""
-        unplaced = 0
+        """A unit's key names its port, its target, its model and its number. A target may list a unit more than once."""
+        unplaced, seen = 0, set()
         for class_name, kind in (("StorageExtent", "disk"), ("TapeDrive", "tape")):
             for unit in self._answers[class_name]:
-                told = UNIT.fullmatch(_text(unit, "DeviceID"))
+                key = _text(unit, "DeviceID")
+                if key in seen:
+                    continue
+                seen.add(key)
+                told = UNIT.fullmatch(key)
                 if not told:
                     unplaced += 1
                     continue
