@@ -3,8 +3,13 @@
 #include "cli/field_text.h"
 #include "text/integers.h"
 
+#include <unistd.h>
+
 #include <algorithm>
+#include <cerrno>
+#include <cstring>
 #include <iterator>
+#include <optional>
 
 namespace hxa
 {
@@ -57,6 +62,15 @@ std::vector<Port> find_ports(const std::vector<Port>& ports, const std::string& 
     return found;
 }
 
+// A driver that is there and that the caller may not ask looks to the library like none.
+std::optional<std::string> obstacle()
+{
+    for (const std::string node : {"/dev/hxa", "/dev/hxn"})
+        if (access(node.c_str(), R_OK | W_OK) != 0 && errno != ENOENT)
+            return node + ": " + std::strerror(errno);
+    return std::nullopt;
+}
+
 } // namespace
 
 Host::Host(Session& session, hxa_aen_app_t application)
@@ -66,7 +80,7 @@ Host::Host(Session& session, hxa_aen_app_t application)
     const int count = hxal_adapter_scan();
     const auto status = hxal_get_last_error();
     if (count == 0 && (status == HXA_STATUS_NO_DRIVER || status == HXA_STATUS_VERSION_FAIL))
-        throw Failure(Exit::no_driver, status_text(status));
+        throw Failure(Exit::no_driver, obstacle().value_or(status_text(status)));
     if (count == 0)
         require(status, "cannot read the adapters");
     else if (status != HXA_STATUS_NO_DRIVER)
