@@ -13,14 +13,14 @@ using testing::SizeIs;
 namespace
 {
 
-int fetched = 0;    // instances that a provider asked the server for
-std::string listed; // in the property list of the last one
+int far_ends_fetched = 0; // instances that a provider asked the server for
+std::string listed;       // in the property list of the last one
 
 // The server finds a thing of every name but "gone".
 CMPIInstance* find_thing(const CMPIBroker* broker, const CMPIContext*, const CMPIObjectPath* path, const char** properties,
                          CMPIStatus* status)
 {
-    ++fetched;
+    ++far_ends_fetched;
     listed = properties && *properties ? *properties : "";
     const auto& name = cimserver::object<cimserver::Path_Object>(path).path.keys.at(0).value;
     const bool gone = name.get<std::string>() == "gone";
@@ -212,10 +212,10 @@ TEST_F(Association_Requests, fetch_associated_instances_from_the_server)
             script.instances.emplace_back(link.steal());
         }
     }
-    fetched = 0;
+    far_ends_fetched = 0;
     EXPECT_EQ(associators(a), CMPI_RC_OK);
     EXPECT_THAT(found(), ElementsAre("b", "d", "e", "e"));
-    EXPECT_EQ(fetched, 4) << "each far end once";
+    EXPECT_EQ(far_ends_fetched, 4) << "each far end once";
 
     script.instances.emplace(script.instances.begin() + 1, linked("a", "gone").steal());
     EXPECT_EQ(associators(a), CMPI_RC_ERR_FAILED) << "the server gives nothing";

@@ -2,13 +2,12 @@
 // features are.
 #include "runtime/features.h"
 #include "runtime/model_path.h"
-#include "schema/repository.h"
+#include "tests/schema/repository_classes.h"
 
 #include <gtest/gtest.h>
 
 #include <algorithm>
 #include <cstring>
-#include <span>
 #include <string>
 #include <type_traits>
 
@@ -76,12 +75,10 @@ Ref<Instance> filled(const Meta_Record* record, unsigned seed)
 
 Ref<Instance> cloned(const Ref<Instance>& instance) { return Ref<Instance>(clone(static_cast<const Instance*>(instance.ptr()))); }
 
-std::span<const Meta_Class* const> all_classes() { return {meta_repository().meta_classes, meta_repository().num_meta_classes}; }
-
 void for_each_class(void (*law)(const Meta_Class*))
 {
-    ASSERT_EQ(all_classes().size(), 177U);
-    for (const Meta_Class* meta_class : all_classes())
+    ASSERT_EQ(repository_classes().size(), 177U);
+    for (const Meta_Class* meta_class : repository_classes())
     {
         SCOPED_TRACE(meta_class->name);
         law(meta_class);
@@ -91,7 +88,7 @@ void for_each_class(void (*law)(const Meta_Class*))
 // A record of each class and of each method's parameters, where the method is declared.
 void for_each_record(void (*law)(const Meta_Record*))
 {
-    for (const Meta_Class* meta_class : all_classes())
+    for (const Meta_Class* meta_class : repository_classes())
     {
         SCOPED_TRACE(meta_class->name);
         law(meta_class);

@@ -1,22 +1,19 @@
 // The meta-data as generic code relies on it, for all classes at once, and by example.
 #include "runtime/features.h"
 #include "runtime/print.h"
-#include "schema/repository.h"
 #include "tests/runtime/printed.h"
+#include "tests/schema/repository_classes.h"
 #include "tests/support/rows.h"
 
 #include <gtest/gtest.h>
 
 #include <algorithm>
-#include <span>
 #include <string>
 
 namespace zmlr
 {
 namespace
 {
-
-std::span<const Meta_Class* const> all_classes() { return {meta_repository().meta_classes, meta_repository().num_meta_classes}; }
 
 const Meta_Class& class_named(const char* name)
 {
@@ -51,7 +48,7 @@ void expect_directions_and_return_value(const Meta_Method& method)
 // An inherited feature is the ancestor's object; an override stands in its place.
 TEST(Meta_Data, inherited_features_are_the_ancestors)
 {
-    for (const Meta_Class* meta_class : all_classes())
+    for (const Meta_Class* meta_class : repository_classes())
     {
         SCOPED_TRACE(meta_class->name);
         EXPECT_EQ(meta_class->num_keys, std::ranges::count_if(features_of(meta_class), is_key));
