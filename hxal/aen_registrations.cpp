@@ -1,7 +1,7 @@
 #include "hxal/aen.h"
 
 #include "hxal/internal/adapter_list.h"
-#include "hxal/internal/aen_kinds.h"
+#include "hxal/internal/aen_dispatch.h"
 #include "hxal/internal/fixed_text.h"
 #include "hxal/internal/ioc_state.h"
 #include "hxal/internal/memory.h"

@@ -1,6 +1,6 @@
 #include "hxal/aen.h"
 
-#include "hxal/internal/aen_kinds.h"
+#include "hxal/internal/aen_dispatch.h"
 #include "hxal/internal/application.h"
 #include "hxal/library.h"
 

@@ -1,5 +1,5 @@
 // Which registrations an event is for, and in which form they are told of it.
-#include "hxal/internal/aen_kinds.h"
+#include "hxal/internal/aen_dispatch.h"
 #include "tests/hxal/aen_listeners.h"
 #include "tests/hxal/golden.h"
 

@@ -1,4 +1,4 @@
-#include "hxal/internal/aen_kinds.h"
+#include "hxal/internal/aen_dispatch.h"
 
 #include "hxal/aen.h"
 #include "hxal/internal/addresses.h"

@@ -1,5 +1,5 @@
-// The kinds of events that can be registered for, one row each: which registrations an event is for, how they are called, and
-// who they are. An event's way is aen_thread.cpp, dispatch_event(), its kind's row, the row's list.
+// From an event to the callbacks that are registered for it. Each kind of event is a row: which registrations an event is for,
+// how they are called, and who they are. An event's way is aen_thread.cpp, dispatch_event(), its kind's row, the row's list.
 #pragma once
 
 #include "hxal/internal/aen_registrations.h"
