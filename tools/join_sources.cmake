@@ -1,6 +1,6 @@
 # zmlr_join_sources(LIBRARY...): compiles the sources of a library as one, so that the headers they share are read once. Their names
 # in unnamed namespaces must differ then, but for `log_source`: each may have its own. Sources that are generated, or have options of
-# their own, stay apart.
+# their own, stay apart, as do those with SKIP_UNITY_BUILD_INCLUSION.
 function(zmlr_join_sources)
   foreach(library ${ARGN})
     get_target_property(folder ${library} SOURCE_DIR)
@@ -12,7 +12,7 @@ function(zmlr_join_sources)
       cmake_path(RELATIVE_PATH source BASE_DIRECTORY ${CMAKE_SOURCE_DIR} OUTPUT_VARIABLE name)
       cmake_path(IS_PREFIX CMAKE_BINARY_DIR ${source} is_generated)
       set(has_options)
-      foreach(property COMPILE_OPTIONS COMPILE_DEFINITIONS SKIP_PRECOMPILE_HEADERS)
+      foreach(property COMPILE_OPTIONS COMPILE_DEFINITIONS SKIP_PRECOMPILE_HEADERS SKIP_UNITY_BUILD_INCLUSION)
         get_source_file_property(value ${source} TARGET_DIRECTORY ${library} ${property})
         if(value)
           set(has_options TRUE)
