@@ -5,6 +5,7 @@
 #include <array>
 #include <atomic>
 #include <barrier>
+#include <chrono>
 #include <cstdlib>
 #include <pthread.h>
 
@@ -79,13 +80,15 @@ const bool wants_log = false;
 // Each client has a test of its own: starts of one class wait for each other before they come to the job.
 TEST_F(Life, of_starts_that_meet_one_runs)
 {
+    constexpr int a_run_takes = 300; // ms at least
     for (const char* command : {"LOOPBACK", "LL_LOOPBACK", "FWPING", "MEMTEST"})
-        hxasim::inject({.command = std::string("IOCMD_DIAG_") + command, .delay = 300});
-    for (int round = 0; round < 20; ++round)
+        hxasim::inject({.command = std::string("IOCMD_DIAG_") + command, .delay = a_run_takes});
+    for (int judged = 0; judged < 20;)
     {
         std::barrier meeting(std::size(tests));
         std::array<std::string, std::size(tests)> codes;
         std::vector<std::thread> clients;
+        const auto start = std::chrono::steady_clock::now();
         for (std::size_t client = 0; client < codes.size(); ++client)
             clients.emplace_back(
                 [&, client]
@@ -97,7 +100,12 @@ TEST_F(Life, of_starts_that_meet_one_runs)
                 });
         for (auto& client : clients)
             client.join();
-        EXPECT_THAT(codes, testing::UnorderedElementsAre("4096", "4", "4", "4"));
+        // A client that was held up beyond the first run may start the next one.
+        if (std::chrono::steady_clock::now() - start < std::chrono::milliseconds(a_run_takes))
+        {
+            EXPECT_THAT(codes, testing::UnorderedElementsAre("4096", "4", "4", "4"));
+            ++judged;
+        }
         wait_for_end();
     }
 }
