@@ -46,6 +46,14 @@ TEST_F(Diagnostics, that_no_driver_offers_are_refused_without_a_request)
     EXPECT_THAT(commands(), IsEmpty());
 }
 
+TEST_F(Diagnostics, are_refused_while_what_they_test_is_in_service)
+{
+    EXPECT_EQ(hxal_diag_loopback(fc, HXA_PPORT_OPMODE_LB_INT, HXA_PPORT_SPEED_4GBPS, 1, 1, nullptr),
+              HXA_STATUS_PORT_NOT_DISABLED);
+    EXPECT_EQ(hxal_diag_eth_loopback(ethernet, HXA_PPORT_OPMODE_LB_CBL, 1, 1, nullptr), HXA_STATUS_CEE_NOT_DN);
+    EXPECT_EQ(hxal_diag_memtest(fc, 1, nullptr), HXA_STATUS_ADAPTER_ENABLED);
+}
+
 TEST_F(Diagnostics, turn_the_beacon_only_when_it_changes)
 {
     // clang-format off
