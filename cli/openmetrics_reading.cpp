@@ -36,12 +36,35 @@ template <std::size_t N> std::string padded(const std::uint8_t (&field)[N])
     return trimmed({begin, strnlen(begin, N)});
 }
 
+// By which CIM knows the card too: an FC HBA's node WWN, a converged card's MAC. Empty when there is none.
+std::string address_of(const Adapter& adapter, bool is_cna)
+{
+    const hxal_t* const fc = hxal_adapter_get_fcioc(adapter.handle, 0);
+    const hxal_t* const ethernet = hxal_adapter_get_ethioc(adapter.handle, 0);
+    if (!is_cna)
+        return fc ? wwn_text(fc->nwwn) : std::string();
+    hxa_ioctl_ioc_info_t info = {};
+    if (fc && hxal_ioc_get_info(fc, &info) == HXA_STATUS_OK)
+        return mac_text(info.mac);
+    return fc || ethernet ? mac_text((fc ? fc : ethernet)->mac) : std::string();
+}
+
+// What the label `adapter` says: the serial number, and where several cards of the host have it, the address too.
+std::string label_of(const Adapter& adapter, const std::vector<Adapter>& all, bool is_cna)
+{
+    const std::string serial = adapter.handle->serial_num;
+    if (std::ranges::count_if(all, [&](const Adapter& other) { return serial == other.handle->serial_num; }) == 1)
+        return serial;
+    const std::string address = address_of(adapter, is_cna);
+    return serial.empty() || address.empty() ? serial + address : serial + '_' + address;
+}
+
 class Reading
 {
 public:
     explicit Reading(Session& session) : _session(session) {}
 
-    void read_adapter(const Adapter& adapter);
+    void read_adapter(const Adapter& adapter, const std::vector<Adapter>& all);
 
     std::uint64_t errors = 0;
     std::vector<Sample> samples;
@@ -63,6 +86,7 @@ private:
     void read_ethernet(const Port& port);
 
     Session& _session;
+    std::string _adapter; // the label of the one that is read
 };
 
 void Reading::add_info(std::string_view family, Labels labels, std::initializer_list<std::string> more)
@@ -94,17 +118,16 @@ std::string_view Reading::add_state(std::string_view family, const Labels& label
 
 void Reading::read_card(const Adapter& adapter, bool is_cna)
 {
-    const std::string serial = adapter.handle->serial_num;
     hxa_ioc_attr_t attributes = {};
     for (const hxal_t* ioc : {hxal_adapter_get_ethioc(adapter.handle, 0), hxal_adapter_get_fcioc(adapter.handle, 0)})
     {
         if (!ioc || !succeeds(hxal_ioc_get_attr(ioc, &attributes), "adapter " + adapter.name()))
             continue;
-        add_info("hxa_adapter_info", {serial, is_cna ? "CNA" : "FC HBA"},
+        add_info("hxa_adapter_info", {_adapter, is_cna ? "CNA" : "FC HBA"},
                  {text_in(attributes.adapter_attr.model), trimmed(text_in(attributes.driver_attr.fw_ver))});
         break;
     }
-    add("hxa_adapter_enabled", hxal_adapter_is_disabled(adapter.number) == HXA_FALSE, {serial});
+    add("hxa_adapter_enabled", hxal_adapter_is_disabled(adapter.number) == HXA_FALSE, {_adapter});
 }
 
 void Reading::read_module(const Port& port, const Labels& labels)
@@ -142,7 +165,7 @@ void Reading::read_fc(const Port& port)
     hxa_pport_attr_t attributes = {};
     if (!succeeds(hxal_port_get_attr(port.fc, &attributes), "port " + port.name()))
         return;
-    const Labels labels = {port.adapter.handle->serial_num, wwn_text(attributes.pwwn)};
+    const Labels labels = {_adapter, wwn_text(attributes.pwwn)};
     add_info("hxa_port_info", labels, {wwn_text(attributes.nwwn), std::to_string(port.number), text_in(attributes.port_symname)});
     const std::string_view state = add_state("hxa_port_state", labels, attributes.port_state);
     add("hxa_port_speed_bytes_per_second", attributes.speed * bytes_per_gigabit, labels);
@@ -157,16 +180,17 @@ void Reading::read_ethernet(const Port& port)
     hxa_ethport_attr_t attributes = {};
     if (!succeeds(hxal_ethport_get_attr(port.ethernet, &attributes), "Ethernet port " + port.name()))
         return;
-    const Labels labels = {port.adapter.handle->serial_num, mac_text(port.ethernet->mac)};
+    const Labels labels = {_adapter, mac_text(port.ethernet->mac)};
     add_info("hxa_ethernet_port_info", labels, {std::to_string(port.number), port.ethernet->eth_name});
     add_state("hxa_ethernet_port_state", labels, attributes.port_state);
     add("hxa_ethernet_port_speed_bytes_per_second", attributes.speed * bytes_per_gigabit, labels);
 }
 
 // Ethernet functions of a card that is no converged one are nobody's, as over CIM.
-void Reading::read_adapter(const Adapter& adapter)
+void Reading::read_adapter(const Adapter& adapter, const std::vector<Adapter>& all)
 {
     const bool is_cna = hxal_adapter_is_cna_capable(adapter.number) != HXA_FALSE;
+    _adapter = label_of(adapter, all, is_cna);
     read_card(adapter, is_cna);
     for (Port port : ports_of(adapter))
     {
@@ -185,7 +209,7 @@ std::vector<Sample> read_samples(Session& session, const Host& host, std::time_t
     Reading reading(session);
     const auto adapters = host.adapters();
     for (const Adapter& adapter : adapters)
-        reading.read_adapter(adapter);
+        reading.read_adapter(adapter, adapters);
     reading.samples.push_back({"hxa_adapters", adapters.size()});
     reading.samples.push_back({"hxa_last_read_timestamp_seconds", static_cast<std::uint64_t>(now)});
     reading.samples.push_back({"hxa_read_errors", reading.errors});

@@ -6,6 +6,7 @@ import errno
 import functools
 import os
 import time
+from collections import Counter
 from pathlib import Path
 from urllib.parse import urlsplit
 
@@ -78,8 +79,9 @@ def _escaped(value):
 def _samples(host):
     yield "hxa_adapters", {}, len(host.adapters)
     yield "hxa_last_read_timestamp_seconds", {}, int(time.time())
+    serial_numbers = Counter(adapter.serial_number for adapter in host.adapters)
     for adapter in host.adapters:
-        label = {"adapter": adapter.serial_number}
+        label = {"adapter": _adapter_label(adapter, serial_numbers)}
         firmware = [software.version for software in adapter.software if software.identity.endswith("_firmware")]
         about = {"kind": adapter.kind, "model": adapter.model, "firmware_version": next(iter(firmware), "")}
         yield "hxa_adapter_info", {**label, **about}, 1
@@ -91,6 +93,12 @@ def _samples(host):
             labels = {**label, "mac": port.mac}
             yield "hxa_ethernet_port_info", {**labels, "port": _told(port.number), "interface": port.interface}, 1
             yield from _states("hxa_ethernet_port_state", labels, port.status)
+
+
+def _adapter_label(adapter, serial_numbers):
+    """The serial number, and where several cards of the host have it, the address too."""
+    told = [adapter.serial_number] if serial_numbers[adapter.serial_number] == 1 else [adapter.serial_number, adapter.address]
+    return "_".join(filter(None, told))
 
 
 def _port_samples(port, labels, is_fcoe):

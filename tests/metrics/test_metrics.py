@@ -61,6 +61,7 @@ def test_both_programs_tell_the_same_in_both_forms(scenario, tmp_path):
                     continue
                 told[program] = {key: value for key, value in series(path).items() if key[0] in SEEN_BY_BOTH and "last_read" not in key[0]}
     assert told["hxa"] == told["inventory"]
+    assert sum(key[0] == "hxa_adapter_enabled" for key in told["hxa"]) == told["hxa"]["hxa_adapters",]
     if scenario == "mixed":
         port = (("adapter", "ZMF2500789"), ("port_wwn", "100000051E100100"))
         assert told["hxa"][("hxa_port_receive_bytes_total", *port)] == 16384000
