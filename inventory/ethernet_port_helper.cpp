@@ -69,7 +69,6 @@ constexpr Builder<Ethernet_Reading> ethernet_builders[] = {
 
 void append(Instance_Array& instances, classId_t id, const Open_Adapter& adapter, const Inventory_Request& request)
 {
-    const Scope_Trace trace(log_source, "getInstancesByAdapterId");
     for (Port_Walk ports(ethernet_walk, adapter); ports.next();)
     {
         if (!request.wanted.may_be_of(ports.port()))
@@ -92,12 +91,16 @@ Instance_Array EthernetPortHelper::getInstancesByClass(classId_t id, const Inven
     const Scope_Trace trace(log_source);
     Instance_Array instances;
     for (Adapter_Walk adapters(ethernet_walk); adapters.next();)
+    {
+        const Scope_Trace of_adapter(log_source, "getInstancesByAdapterId");
         append(instances, id, adapters.adapter(), request);
+    }
     return instances;
 }
 
 Instance_Array EthernetPortHelper::getInstancesByAdapterId(int index, classId_t id, const Inventory_Request& request) const
 {
+    const Scope_Trace trace(log_source);
     Instance_Array instances;
     if (const std::optional<Open_Adapter> adapter = open_adapter(ethernet_walk, index))
         append(instances, id, *adapter, request);

@@ -3,6 +3,7 @@
 #include "inventory/address_text.h"
 #include "inventory/port_states.h"
 #include "inventory/property_text.h"
+#include "runtime/trace.h"
 
 #include <cstring>
 
@@ -11,6 +12,8 @@ namespace zmlr
 
 namespace
 {
+
+constexpr const char* log_source = "EthernetPortHelper";
 
 struct Media_Type
 {
@@ -39,6 +42,7 @@ void fill_ethernet_port(_ethPortInfo& info, const hxal_t* ethernet, const hxa_et
 
 uint16 getEthernetPortType(const char* media)
 {
+    const Scope_Trace trace(log_source, "getPortType");
     for (const Media_Type& row : media_types)
     {
         if (std::strcmp(row.media, media) == 0)

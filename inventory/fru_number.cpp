@@ -1,6 +1,7 @@
 #include "inventory/fru_number.h"
 
 #include "runtime/log.h"
+#include "runtime/trace.h"
 
 #include <algorithm>
 #include <array>
@@ -104,6 +105,7 @@ String find_fru(Data data, std::size_t limit)
 
 String getFRUNumber(const hxa_mfg_vpd_t& vpd)
 {
+    const Scope_Trace trace(log_source);
     const Data data(vpd.data);
     if (vpd.vendor == plain_layout)
         return text_of(data.subspan(plain_fru_at));

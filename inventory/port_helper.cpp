@@ -117,7 +117,6 @@ constexpr Builder<const Port_Reading> port_builders[] = {
 
 void append_ports(Instance_Array& instances, classId_t id, const Open_Adapter& adapter, const Inventory_Request& request)
 {
-    const Scope_Trace trace(log_source, "getInstancesByAdapterId");
     for (Port_Walk ports(port_walk, adapter); ports.next();)
     {
         if (!request.wanted.may_be_of(ports.port()))
@@ -140,12 +139,16 @@ Instance_Array PortHelper::getInstancesByClass(classId_t id, const Inventory_Req
     const Scope_Trace trace(log_source);
     Instance_Array instances;
     for (Adapter_Walk adapters(port_walk); adapters.next();)
+    {
+        const Scope_Trace of_adapter(log_source, "getInstancesByAdapterId");
         append_ports(instances, id, adapters.adapter(), request);
+    }
     return instances;
 }
 
 Instance_Array PortHelper::getInstancesByAdapterId(int index, classId_t id, const Inventory_Request& request) const
 {
+    const Scope_Trace trace(log_source);
     Instance_Array instances;
     if (const std::optional<Open_Adapter> adapter = open_adapter(port_walk, index))
         append_ports(instances, id, *adapter, request);

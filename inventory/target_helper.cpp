@@ -240,6 +240,7 @@ hxa_status_t TargetHelper::sendSCSIInquiry(const hxal_t* ioc, wwn_t lpwwn, wwn_t
                                            std::uint8_t page, void* data, std::uint32_t* size, std::uint8_t* scsi_status,
                                            void* sense, std::uint32_t* sense_size) const
 {
+    const Scope_Trace trace(log_source);
     // SPC-3, 6.4: operation code, EVPD, page code, allocation length in two bytes.
     scsi_cdb_t cdb{};
     cdb.scsi_cdb[0] = 0x12;

@@ -59,7 +59,7 @@ void Inventory_Test::scan()
     log();
 }
 
-std::vector<std::string> Inventory_Test::log()
+std::vector<std::string> Inventory_Test::log(bool entries)
 {
     static std::ifstream messages;
     if (!messages.is_open())
@@ -74,7 +74,7 @@ std::vector<std::string> Inventory_Test::log()
         const std::string message = end == line.npos ? line : line.substr(end + 3);
         if (end == line.npos)
             lines.push_back(line);
-        else if (!message.starts_with("Entering: ") && !message.starts_with("Returning: "))
+        else if ((entries || !message.starts_with("Entering: ")) && !message.starts_with("Returning: "))
             lines.push_back(line.substr(level, source - level) + line.substr(source + 1, number - source - 1) + ": " + message);
     }
     return lines;

@@ -20,7 +20,7 @@ protected:
 
     void plug_text(const std::string& json); // replaces the host ("mixed" at first) and scans it
 
-    std::vector<std::string> log(); // "LEVEL Source: message", since the last call, without entries and exits
+    std::vector<std::string> log(bool entries = false); // "LEVEL Source: message", since the last call, without exits
 
 private:
     void scan();

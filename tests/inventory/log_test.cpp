@@ -80,7 +80,7 @@ TEST_F(Log, tells_what_happens)
             plug_text(line);
         if (line.starts_with("- "))
             ask(line.substr(2));
-        for (const std::string& said : log())
+        for (const std::string& said : log(true))
             if (known.insert(said).second)
                 logged += '|' + said + "|\n";
     }
