@@ -43,9 +43,6 @@ struct _hbaLunInfo
     char serial_number[130] = {};
     char identifier[67] = {}; // of page 83h: hex digits or text
     std::uint32_t identifier_type = IDENTIFIER_SERIAL_NUMBER;
-
-    // Peripheral and flat addressing (SAM-3).
-    int lun_number() const { return (lun[0] & 0x3F) * 256 + lun[1]; }
 };
 static_assert(sizeof(_hbaLunInfo) == 276);
 
@@ -62,6 +59,11 @@ void fill_serial_number(_hbaLunInfo& info, const Serial_Page& page);
 // Answers of REPORT LUNS: a head with the length of the list, then an entry a unit.
 constexpr std::size_t lun_list_head = 8;
 constexpr std::size_t lun_entry_size = sizeof(lun_t);
+
+using Lun_Entry = std::span<const std::uint8_t, lun_entry_size>;
+
+// In peripheral and flat addressing (SAM-3).
+constexpr std::uint32_t lun_number(Lun_Entry entry) { return (entry[0] & 0x3FU) * 256 + entry[1]; }
 
 // How many units the list says there are, and how many entries a buffer has room for.
 std::uint32_t lun_count(std::span<const std::uint8_t> list);

@@ -67,6 +67,13 @@ String name_of(const _hbaLunInfo& lun)
     return kind_of(lun) ? property_text(lun.identifier) : String();
 }
 
+String lun_text(const _hbaLunInfo& lun)
+{
+    char text[24];
+    std::snprintf(text, sizeof text, "LUN_%u", lun_number(lun.lun));
+    return text;
+}
+
 String device_id(const _hbaPortInfo& port, const _hbaLunInfo& lun)
 {
     return String(port.port_wwn) + "_" + lun.target_wwn + "_" + vendor_and_product(lun, "_") + "_" + lun_text(lun);
@@ -90,13 +97,6 @@ template <class T> Ref<T> unit_instance(classId_t id, const _hbaPortInfo& port, 
 }
 
 } // namespace
-
-String lun_text(const _hbaLunInfo& lun)
-{
-    char text[24];
-    std::snprintf(text, sizeof text, "LUN_%d", lun.lun_number());
-    return text;
-}
 
 Ref<ZEMLAR_StorageExtent> getStorageExtentInstance(const _hbaPortInfo& port, const _hbaLunInfo& lun)
 {

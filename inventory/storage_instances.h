@@ -14,7 +14,4 @@ namespace zmlr
 Ref<ZEMLAR_StorageExtent> getStorageExtentInstance(const _hbaPortInfo& port, const _hbaLunInfo& lun);
 Ref<ZEMLAR_TapeDrive> getTapeDriveInstance(const _hbaPortInfo& port, const _hbaLunInfo& lun);
 
-// How a unit's DeviceID ends: "LUN_5". It is its ElementName too.
-String lun_text(const _hbaLunInfo& lun);
-
 } // namespace zmlr

@@ -94,10 +94,7 @@ struct Lun_List
     std::unique_ptr<std::uint8_t[]> bytes; // null when the target does not tell
     std::size_t count = 0;                 // entries that are there
 
-    std::span<const std::uint8_t, lun_entry_size> entry(std::size_t i) const
-    {
-        return std::span<const std::uint8_t, lun_entry_size>(bytes.get() + lun_list_head + i * lun_entry_size, lun_entry_size);
-    }
+    Lun_Entry entry(std::size_t i) const { return Lun_Entry(bytes.get() + lun_list_head + i * lun_entry_size, lun_entry_size); }
 };
 
 // The units of a target. A target that tells of more than its answer had room for is asked once more; what then does not fit is
@@ -199,10 +196,12 @@ void append_units(Instance_Array& instances, const Nexus& nexus, int index, cons
     const Lun_List luns = list_luns(nexus, index);
     for (std::size_t i = 0; i < luns.count; i++)
     {
+        if (!wanted.may_end_with_number(lun_number(luns.entry(i))))
+            continue;
         _hbaLunInfo info;
         std::ranges::copy(luns.entry(i), info.lun.begin());
         ProviderUtil::WWN2str(info.target_wwn, &nexus.remote_port);
-        if (wanted.may_end_with(lun_text(info).c_str()) && read_unit(nexus, info))
+        if (read_unit(nexus, info))
             append_unit(instances, port, info, id);
     }
 }

@@ -2,10 +2,13 @@
 
 #include "inventory/property_text.h"
 #include "runtime/ascii.h"
+#include "text/integers.h"
 
 #include <algorithm>
 #include <cstring>
+#include <optional>
 #include <span>
+#include <string_view>
 
 namespace zmlr
 {
@@ -63,6 +66,14 @@ void append_addresses(std::vector<std::uint64_t>& addresses, std::span<const int
     }
 }
 
+// What stands behind the last underscore, when it is a number.
+std::optional<std::uint64_t> number_at_end(const String& key)
+{
+    const std::string_view text(key.c_str(), key.size());
+    const std::size_t underscore = text.rfind('_');
+    return underscore == text.npos ? std::nullopt : text::read_digits(text.substr(underscore + 1), 10);
+}
+
 // An address of zeros is none, and stands in many keys.
 bool holds(const std::vector<std::uint64_t>& addresses, std::uint64_t address)
 {
@@ -100,6 +111,8 @@ Wanted::Wanted(const Instance* model)
         const std::vector<int> digits = digits_in(*key);
         append_addresses(_wwns, digits, sizeof(wwn_t));
         append_addresses(_macs, digits, sizeof(mac_t));
+        if (const std::optional<std::uint64_t> number = number_at_end(*key))
+            _numbers.push_back(*number);
         _sizes |= size_bit(key->size());
         _keys.push_back(*key);
     }
@@ -116,6 +129,11 @@ bool Wanted::may_end_with(const char* text) const
                                                const std::size_t begin = key.size() - std::min<std::size_t>(size, key.size());
                                                return eqi(key.c_str() + begin, text);
                                            });
+}
+
+bool Wanted::may_end_with_number(std::uint32_t number) const
+{
+    return is_all() || std::ranges::find(_numbers, number) != _numbers.end();
 }
 
 template <std::size_t N> bool Wanted::has_key(const char (&field)[N]) const

@@ -23,9 +23,11 @@ public:
 
     bool is_all() const { return _keys.empty(); }
 
-    // False when the WWN's digits stand in no key (hyphens between them do not count), when no key ends with the text.
+    // False when the WWN's digits stand in no key (hyphens between them do not count), when no key ends with the text, or with
+    // the number behind an underscore. The last is asked for every unit of a long list.
     bool may_hold(wwn_t wwn) const;
     bool may_end_with(const char* text) const;
+    bool may_end_with_number(std::uint32_t number) const;
 
     // False when no key holds an address of the port and none is its interface's name or its card's serial number, as the last
     // scan found them. Cheap: it is asked for every port that is passed over.
@@ -41,6 +43,7 @@ private:
     std::uint64_t _sizes = 0;         // of the keys, a bit each
     std::vector<std::uint64_t> _wwns; // all that the digits in the keys may be, in memory order
     std::vector<std::uint64_t> _macs; // the same, 6 bytes each
+    std::vector<std::uint64_t> _numbers;
 };
 
 } // namespace zmlr

@@ -154,10 +154,8 @@ TEST(Scsi_answers, are_read_within_their_bounds)
     fill_serial_number(info, page);
     EXPECT_EQ(std::string(32, 'S'), info.serial_number);
 
-    info.lun = {0x40, 0x05};
-    EXPECT_EQ(info.lun_number(), 5);
-    info.lun = {0x01, 0x02};
-    EXPECT_EQ(info.lun_number(), 258);
+    EXPECT_EQ(lun_number(std::array<std::uint8_t, 8>{0x40, 0x05}), 5U);
+    EXPECT_EQ(lun_number(std::array<std::uint8_t, 8>{0x01, 0x02}), 258U);
     EXPECT_EQ(lun_count(std::vector<std::uint8_t>{0xFF, 0xFF, 0xFF, 0xFF}), 0x1FFFFFFFU);
     EXPECT_EQ(lun_room(816), 101U);
 }
