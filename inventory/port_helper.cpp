@@ -60,7 +60,7 @@ void append_target_endpoint(Instance_Array& instances, const Port_Reading& readi
 void append_endpoints(Instance_Array& instances, const Port_Reading& reading)
 {
     instances.adopt(getSCSIProtocolEndpointInstance(reading.info, true));
-    const Remote_Ports remote_ports(reading.port.fc.get(), reading.attributes.pwwn, log_source);
+    const Remote_Ports remote_ports(reading.port.fc.get(), reading.attributes.pwwn, log_source, LL_DBG);
     for (const wwn_t remote_port : remote_ports.wwns())
         append_target_endpoint(instances, reading, remote_port);
 }

@@ -2,6 +2,7 @@
 #pragma once
 
 #include "hxal/hxal.h"
+#include "runtime/log.h"
 
 #include <array>
 #include <cstdint>
@@ -16,8 +17,9 @@ constexpr std::uint16_t base_fabric = 0; // virtual fabric of the port itself
 class Remote_Ports
 {
 public:
-    // Asks the driver (one request). Without an answer there are none; either is logged for `log_source`.
-    Remote_Ports(const hxal_t* ioc, wwn_t port_wwn, const char* log_source);
+    // Asks the driver (one request). Without an answer there are none, which is logged as an error for `log_source`; how many
+    // there are is logged at `level`.
+    Remote_Ports(const hxal_t* ioc, wwn_t port_wwn, const char* log_source, Log_Level level);
 
     std::span<const wwn_t> wwns() const { return {_wwns.data(), _count}; }
 

@@ -9,6 +9,7 @@
 
 #include <algorithm>
 #include <array>
+#include <bit>
 #include <cstring>
 #include <memory>
 #include <new>
@@ -36,6 +37,15 @@ struct Nexus
     wwn_t port;
     wwn_t remote_port;
 };
+
+// The digits of a WWN as one number.
+unsigned long long number_of(wwn_t wwn)
+{
+    unsigned long long number = 0;
+    for (const std::uint8_t byte : std::bit_cast<std::array<std::uint8_t, sizeof wwn>>(wwn))
+        number = number << 8 | byte;
+    return number;
+}
 
 lun_t lun_of(const _hbaLunInfo& info)
 {
@@ -105,7 +115,7 @@ Lun_List list_luns(const Nexus& nexus, int index)
     for (bool again = true;; again = false)
     {
         ZMLR_LOG(LL_INFO, "lunInvSize = %u. rPortWwns[%d]=%llx", static_cast<unsigned>(size), index,
-                 static_cast<unsigned long long>(nexus.remote_port));
+                 number_of(nexus.remote_port));
         Lun_List list{report_luns(nexus, size)};
         if (!list.bytes)
         {
@@ -222,7 +232,7 @@ Instance_Array TargetHelper::getTargetInstances(const hxal_t* ioc, const _hbaPor
     Nexus nexus = {.ioc = ioc, .port = 0, .remote_port = 0};
     ProviderUtil::getRawWWNFromStr(port.port_wwn, reinterpret_cast<unsigned char*>(&nexus.port));
 
-    const Remote_Ports remote_ports(ioc, nexus.port, log_source);
+    const Remote_Ports remote_ports(ioc, nexus.port, log_source, LL_INFO);
     int index = 0;
     for (const wwn_t remote_port : remote_ports.wwns())
     {

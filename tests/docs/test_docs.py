@@ -70,7 +70,7 @@ def logged_texts():
         for file in sorted((ROOT / folder).rglob("*.[ch]*")):
             name = str(file.relative_to(ROOT))
             text = re.sub(r"^\s*//.*$", "", file.read_text(encoding="utf-8"), flags=re.MULTILINE)
-            call = r"std::printf\(" if folder == "hxal" else r"(?:\bLL_\w+, ?(?:[\w.]+, ?)*|warning\(\)\.invoke\(|, log_source, )"
+            call = r"std::printf\(" if folder == "hxal" else r"(?:\bLL_\w+, ?(?:[\w.]+, ?)*|ZMLR_LOG\(level, |warning\(\)\.invoke\(|, log_source, )"
             texts = re.findall(call + LITERAL, text)
             given.update([name] if GIVEN.search(text) else [])
             if name in given - ELSEWHERE.keys() or name in ELSEWHERE.values():
