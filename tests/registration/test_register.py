@@ -24,6 +24,12 @@ def test_installs_once_and_removes_everything(host, server):
     assert "adding" not in host.register("--install").stdout
     assert host.contents() == once
 
+    (host.folder / "libzmlrprovider.so").write_text("built anew")
+    assert host.register("--status").returncode == 7
+    assert "libzmlrprovider.so is another one" in host.register("--install").stdout
+    assert any("cimprovider -r" in call or "systemctl restart" in call for call in host.calls())  # by which the old one is let go
+    assert host.register("--status").returncode == 0
+
     assert host.register("--remove").returncode == 0
     assert host.contents() == empty and not (host.folder / "notes").exists()
 

@@ -45,7 +45,7 @@ class Replace:
 
     def state(self):
         there = self.holder.look()
-        return AS_IT_SHOULD_BE if there == self.wanted else "missing" if there is None else "in part or of another version"
+        return AS_IT_SHOULD_BE if there == self.wanted else "missing" if there is None else "in part, or for another module"
 
     def apply(self):
         before = self._earlier.wanted if self._earlier else self.holder.look()

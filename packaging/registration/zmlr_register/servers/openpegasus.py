@@ -4,6 +4,7 @@ import os
 import re
 
 from ..catalogue import mof_of, select
+from ..heading import tell_another_module
 from ..provider_link import link_of
 from ..schema_files import find_schema
 from ..steps import Failed, Replace
@@ -35,7 +36,8 @@ class Open_Pegasus:
             schema_text = schema.text_of(find_schema(self._options.schema, _SCHEMA_FOLDERS))
             known = schema_text.splitlines()[1:]
         selection = select(self.catalogue, self.interop, known, self.classes(self.interop))
-        registration = registration_mof(self.catalogue, selection)
+        registration, registered = registration_mof(self.catalogue, selection, library), module.look()
+        tell_another_module(self.tools, library, registered, registration)
 
         changes = [
             self._change(self._link(library), str(library)),
@@ -44,7 +46,7 @@ class Open_Pegasus:
             self._change(Classes(self, self.interop), mof_of(mof, selection.in_interop) or None),
         ]
         # Classes are not replaced under a module that serves them.
-        removal = self._change(module, None) if module.look() not in (None, registration) else None
+        removal = self._change(module, None) if registered not in (None, registration) else None
         changes = [removal, *changes, Replace(self.tools, module, registration, removal)]
         return [change for change in changes if change], selection.left_out
 

@@ -3,6 +3,7 @@
 import re
 
 from ..catalogue import select_all
+from ..heading import heading
 
 # The values of PG_ProviderCapabilities.ProviderType and of PG_ProviderModule.UserContext.
 _KINDS = {"instance": 2, "association": 3, "indication": 4, "method": 5}
@@ -40,9 +41,10 @@ instance of PG_ProviderCapabilities
 """
 
 
-def registration_mof(catalogue, selection):
-    """The instances that make the server know the module, for its interop name space."""
-    texts = [_MODULE.format(module=catalogue.module, vendor=catalogue.vendor, version=catalogue.version,
+def registration_mof(catalogue, selection, library=None):
+    """The instances that make the server know the module, for its interop name space; `library` is the file that they are for."""
+    texts = ["// " + heading(catalogue, library),
+             _MODULE.format(module=catalogue.module, vendor=catalogue.vendor, version=catalogue.version,
                             location=catalogue.location, user_context=_PRIVILEGED_USER)]
     for cls in selection.provided:
         texts.append(_PROVIDER.format(module=catalogue.module, provider=cls.provider, cls=cls.name,

@@ -4,6 +4,7 @@ import pathlib
 import re
 
 from ..catalogue import mof_of, select, select_all
+from ..heading import heading, tell_another_module
 from ..provider_link import link_of
 from ..schema_files import declared_classes, find_schema
 from ..steps import Failed, Holder, Refresh, Replace
@@ -13,9 +14,6 @@ _STAGING = "/var/lib/sfcb/stage"
 _SETTINGS = ("/etc/sfcb/sfcb.cfg", "/usr/local/etc/sfcb/sfcb.cfg")
 _SCHEMA_FOLDERS = ("/usr/share/sfcb/CIM", "/usr/local/share/sfcb/CIM", "/usr/share/mof/cim-current")
 _UNITS = ("sfcb", "sblim-sfcb")  # distributions differ
-
-# sfcb goes on with the module that it has loaded until it is restarted: another version is another text, which makes it restart.
-_HEAD = "# {module} {version}\n#\n"
 
 # One group: one process, in which all providers share jobs, records and the event thread; it must not end while a run goes on.
 _SECTION = """[{cls}]
@@ -28,9 +26,8 @@ _SECTION = """[{cls}]
 """
 
 
-def registration_text(catalogue, selection):
-    head = _HEAD.format(module=catalogue.module, version=catalogue.version)
-    return head + "#\n".join(_SECTION.format(cls=cls.name, provider=cls.provider, location=catalogue.location, kinds=" ".join(cls.kinds),
+def registration_text(catalogue, selection, library=None):
+    return f"# {heading(catalogue, library)}#\n" + "#\n".join(_SECTION.format(cls=cls.name, provider=cls.provider, location=catalogue.location, kinds=" ".join(cls.kinds),
                                       name_spaces=" ".join(selection.name_spaces(cls))) for cls in selection.provided)
 
 
@@ -59,8 +56,11 @@ class Sfcb:
         """(the changes that register, what has to be left out). mof: the declarations of all classes."""
         known = declared_classes(find_schema(self._options.schema, _SCHEMA_FOLDERS))
         selection = select(self.catalogue, self.interop, known, known)
+        registration = registration_text(self.catalogue, selection, library)
+        registered = Staged(self, self.catalogue.name_space).look() or {}
+        tell_another_module(self.tools, library, registered.get("zmlr.reg"), registration)
         return self._plan(library, str(library),
-                          {"zmlr.reg": registration_text(self.catalogue, selection), "zemlar.mof": mof_of(mof, selection.served)},
+                          {"zmlr.reg": registration, "zemlar.mof": mof_of(mof, selection.served)},
                           {"zemlar.mof": mof_of(mof, selection.in_interop)} if selection.in_interop else None), selection.left_out
 
     def removal(self, library):
