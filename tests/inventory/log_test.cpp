@@ -38,11 +38,15 @@ void ask_for_what_there_is_not()
 void ask(const std::string& question)
 {
     std::istringstream words(question);
-    std::string what, address;
-    int state = 0;
-    words >> what >> address >> state;
+    std::string what, address, gives;
+    int state = 0, result = 0;
+    words >> what >> address >> state >> gives >> result;
     if (what == "beacon")
-        setAlarmState(address.c_str(), state);
+    {
+        EXPECT_EQ(setAlarmState(address.c_str(), state), result) << question;
+        for (const hxasim::Request& request : hxasim::take_requests())
+            EXPECT_TRUE(request.name != "IOCMD_DIAG_BEACON" || request.sent[16] == 0) << "a time limit";
+    }
     else if (what == "ports")
     {
         FCHBAManager::getFCHBAManager().getFCPortInstancesByAdapter(address.c_str());
@@ -59,7 +63,8 @@ using Log = Inventory_Test;
 
 } // namespace
 
-// In the file, "{" begins a host and "-" what is asked of it; behind that stand the lines that were not logged before, in bars.
+// In the file, "{" begins a host and "-" what is asked of it, of a beacon with its result; behind that stand the lines that were
+// not logged before, in bars.
 TEST_F(Log, tells_what_happens)
 {
     FCHBAManager::getFCHBAManager();

@@ -113,7 +113,9 @@ TEST_F(Lookups, read_the_driver_version_where_there_is_one)
 TEST_F(Lookups, tell_whether_a_port_is_disabled)
 {
     const std::string enabled = R"({"adapters": [{"kind": "cna"}, {"kind": "fc-hba", "ports": [{}, {"state": "disabled"}]}]})";
-    const hxasim::Fault fc_disabling = {.command = "IOCMD_PORT_GET_ATTR", .answer = {{8 + 324, {7}}}};
+    const auto fc_state = [](std::uint8_t state) {
+        return hxasim::Fault{.command = "IOCMD_PORT_GET_ATTR", .answer = {{8 + 324, {state}}}};
+    };
     const hxasim::Fault ethernet_disabled = {.command = "IOCMD_ETHPORT_GET_ATTR", .answer = {{8 + 8, {8}}}};
     const hxasim::Fault fc_fails = {.command = "IOCMD_PORT_GET_ATTR", .error = EIO};
     const hxasim::Fault ethernet_fails = {.command = "IOCMD_ETHPORT_GET_ATTR", .error = EIO};
@@ -134,8 +136,10 @@ TEST_F(Lookups, tell_whether_a_port_is_disabled)
         {"100000051E100000", {ethernet_disabled}, true, nullptr},
         {"00051E200000", {fc_fails, ethernet_disabled}, false, "ERR PortHelper: hxal_port_get_attr failed"},
         {"00051E200000", {ethernet_fails}, false, "ERR PortHelper: hxal_ethport_get_attr failed"},
-        {"00051E200000", {fc_disabling, ethernet_fails}, true, nullptr},
+        {"00051E200000", {fc_state(7), ethernet_fails}, true, nullptr},
         {"100000051E100101", {}, true, nullptr},
+        {"100000051E100000", {fc_state(6)}, false, "INFO PortHelper: Port Enabled"},
+        {"100000051E100000", {fc_state(9)}, false, "INFO PortHelper: Port Enabled"},
         {"100000051E100100", {}, false, "INFO PortHelper: Port Enabled"},
         // clang-format on
     };
