@@ -145,6 +145,7 @@ Members tell_status(Simulator& simulator, Json_Object& object)
             {"faults", number(simulator.fault_count())},
             {"lost_events", {lost}},
             {"open_descriptors", number(static_cast<std::uint64_t>(simulator.open_descriptors()))},
+            {"remembered", number(simulator.remembered_requests())},
             {"requests", number(simulator.request_count())},
             {"violations", list_of(simulator.violations(), text)}};
 }

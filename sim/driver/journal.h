@@ -31,6 +31,7 @@ public:
     void add_violation(std::string text);          // dropped beyond the bound
     std::vector<Request> take();                   // oldest first; leaves none
     std::uint64_t count() const { return _count; } // of all that were added
+    std::size_t kept() const { return _entries.size(); }
     const std::vector<std::string>& violations() const { return _violations; }
     void clear();
 

@@ -277,6 +277,12 @@ std::uint64_t Simulator::request_count()
     return _journal.count();
 }
 
+std::size_t Simulator::remembered_requests()
+{
+    const auto lock = locked();
+    return _journal.kept();
+}
+
 std::vector<Request> Simulator::take_requests()
 {
     auto lock = locked();

@@ -31,6 +31,7 @@ public:
     void unload();
     std::vector<Request> take_requests();
     std::uint64_t request_count();
+    std::size_t remembered_requests();
     void inject(const Fault& fault, const std::string& place = "fault");
     void clear_faults();
     std::vector<std::string> violations();

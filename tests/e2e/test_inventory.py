@@ -47,6 +47,11 @@ def test_each_instance_is_fetched_again_by_its_path(scenario):
             assert {key: some[key] for key in some.keys()} == {key: whole[key] for key in asked if key in whole}
 
 
+def test_script_server_lets_its_host_remember_the_latest_requests_only(scenario):
+    status = scenario[0].server.hxasim("status")
+    assert status["remembered"] == min(status["requests"], 1000)
+
+
 def key_values(path):
     for value in path.keybindings.values():
         yield from key_values(value) if isinstance(value, pywbem.CIMInstanceName) else [str(value)]
