@@ -1,9 +1,8 @@
 #include "cli/field_text.h"
 
-#include "text/characters.h"
 #include "text/integers.h"
+#include "text/safe_text.h"
 
-#include <algorithm>
 #include <array>
 #include <cstring>
 
@@ -12,14 +11,6 @@ namespace hxa
 
 namespace
 {
-
-// Controls (ISO/IEC 6429), and the characters of Unicode that break lines or turn the direction of writing.
-bool is_harmless(char32_t code)
-{
-    const auto within = [=](char32_t first, char32_t last) { return code >= first && code <= last; };
-    return code >= 0x20 && !within(0x7F, 0x9F) && !within(0x200B, 0x200F) && !within(0x2028, 0x202E) && !within(0x2060, 0x206F) &&
-           code != 0xFEFF && code != 0x061C && code < 0xE0000;
-}
 
 std::string digits_of(const void* bytes, std::size_t size)
 {
@@ -52,16 +43,7 @@ template <typename Address> std::optional<Address> read_address(std::string_view
 
 std::string safe_text(std::string_view bytes)
 {
-    std::string safe;
-    while (!bytes.empty())
-    {
-        const auto character = text::first_character(bytes);
-        if (character.size != 0 && is_harmless(character.code))
-            safe += bytes.substr(0, character.size);
-        else
-            safe += '?';
-        bytes.remove_prefix(std::max<std::size_t>(character.size, 1));
-    }
+    std::string safe = text::safe_text(bytes);
     safe.erase(safe.find_last_not_of(' ') + 1);
     return safe.erase(0, safe.find_first_not_of(' '));
 }

@@ -12,8 +12,7 @@
 namespace hxa
 {
 
-// Valid UTF-8 without anything that steers a terminal or turns the direction of writing: "?" stands for each such character and
-// for each byte that is part of none. Blanks at both ends are dropped.
+// text::safe_text() without blanks at both ends.
 std::string safe_text(std::string_view bytes);
 
 // The text of a field, up to its terminator or its end.

@@ -4,7 +4,6 @@
 #include "inventory/adapter_walk.h"
 #include "inventory/builder.h"
 #include "inventory/cim_values.h"
-#include "inventory/client_text.h"
 #include "inventory/property_text.h"
 #include "inventory/provider_util.h"
 #include "runtime/log.h"
@@ -42,7 +41,7 @@ constexpr Builder<const _hbaInfo> software_builders[] = {
 hxa_status_t update_through(hxal_t* first_ioc, const char* file)
 {
     const Ioc_Handle ioc(first_ioc);
-    ZMLR_LOG(LL_INFO, "calling hxal_boot_fwupdate() file=%s\n", log_text(file).c_str());
+    ZMLR_LOG(LL_INFO, "calling hxal_boot_fwupdate() file=%s\n", file);
     const hxa_status_t status = hxal_boot_fwupdate(ioc.get(), file, 0);
     ZMLR_LOG(LL_INFO, "return from hxal_boot_fwupdate() - %d\n", static_cast<int>(status));
     return status;
@@ -96,7 +95,7 @@ int SoftwareUpdateHelper::UpdatePortControllerSoftware(const ZEMLAR_PortControll
     const Scope_Trace trace(log_source);
     const String& address = controller.DeviceID.value;
     ZMLR_LOG(LL_INFO, "UpdatePortControllerSoftware portType=%d deviceid=%s file=%s", controller.ControllerType.value,
-             address.c_str(), log_text(file).c_str());
+             address.c_str(), file);
     const hxal_adapter_t* adapter = hxal_adapter_open_idx(ProviderUtil::getAdapterId(address));
     hxal_t* first_ioc = hxal_adapter_get_first_ioc(adapter);
     if (!first_ioc)

@@ -1,8 +1,8 @@
 #include "inventory/tftp.h"
 
-#include "inventory/client_text.h"
 #include "inventory/shell_command.h"
 #include "runtime/trace.h"
+#include "text/safe_text.h"
 
 #include <sys/stat.h>
 #include <unistd.h>
@@ -48,7 +48,10 @@ struct Commands
 };
 
 // Whether a command takes the word for what it is.
-bool is_plain(const String& word) { return !word.empty() && word[0] != '-' && !has_control_character(word); }
+bool is_plain(const String& word)
+{
+    return !word.empty() && word[0] != '-' && !text::holds_steering({word.c_str(), word.size()});
+}
 
 // The client takes what stands before a ':' for another server, and stores "folder/file" as "file". Where the working directory
 // is somebody's home, files that begin with '.' are run at the next start of a shell.

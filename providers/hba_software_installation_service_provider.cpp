@@ -1,5 +1,4 @@
 #include "inventory/cim_values.h"
-#include "inventory/client_text.h"
 #include "inventory/fchba_manager.h"
 #include "inventory/provider_util.h"
 #include "inventory/software_update_helper.h"
@@ -48,7 +47,7 @@ Error check(const Property<String>& uri, const CIM_ManagedElement* target, const
 
 Error use_local_file(const String& path)
 {
-    ZMLR_LOG(LL_INFO, "file=%s", log_text(path).c_str());
+    ZMLR_LOG(LL_INFO, "file=%s", path.c_str());
     return path.empty() ? "malformed file URI" : nullptr;
 }
 

@@ -6,6 +6,7 @@
 #include "runtime/log_options.h"
 #include "runtime/regular_file.h"
 #include "runtime/string.h"
+#include "text/safe_text.h"
 
 #include <cerrno>
 #include <cstdio>
@@ -14,6 +15,8 @@
 #include <fcntl.h>
 #include <memory>
 #include <mutex>
+#include <string>
+#include <string_view>
 #include <sys/stat.h>
 #include <unistd.h>
 #include <utility>
@@ -30,6 +33,7 @@ constexpr const char* cimple_home_envvar = "HOME";
 constexpr const char* default_name = ".cimple";
 constexpr const char* level_names[] = {"FATAL", "ERR", "WARN", "INFO", "DBG"};
 constexpr std::size_t path_size = 1024;
+constexpr std::size_t longest_message = 16 * 1024; // bytes
 
 // Other modules log from their static initialisers and destructors: nothing here is constructed or destroyed at run time.
 constinit std::mutex _mutex;
@@ -116,6 +120,18 @@ void write_all(const char* text, std::size_t size)
     }
 }
 
+// A message as one line, whatever clients, drivers and disks have put into it. Some formats end with a line feed, and one has a
+// tab.
+[[gnu::format(printf, 1, 0)]] std::string line_of(const char* format, va_list arguments)
+{
+    Buffer buffer;
+    buffer.vformat(format, arguments);
+    std::string_view message(buffer.data(), buffer.size());
+    if (message.ends_with('\n'))
+        message.remove_suffix(1);
+    return text::safe_text(message.substr(0, longest_message), "\t") + '\n';
+}
+
 [[gnu::format(printf, 4, 0)]] void write_line(Log_Level level, const char* file, int line, const char* format, va_list arguments)
 {
     char time[Datetime::pretty_text_size];
@@ -124,9 +140,8 @@ void write_all(const char* text, std::size_t size)
 
     Buffer buffer;
     buffer.format("%s %s: %s(%d): ", time, level_names[level], file, line);
-    buffer.vformat(format, arguments);
-    if (buffer[buffer.size() - 1] != '\n')
-        buffer.append('\n');
+    const std::string message = line_of(format, arguments);
+    buffer.append(message.data(), message.size());
 
     _lock->lock();
     write_all(buffer.data(), buffer.size());

@@ -26,7 +26,9 @@ extern constinit std::atomic<int> _log_threshold;
 // Whether a line of this level may have to be written: one relaxed load, so that a suppressed call formats nothing.
 inline bool log_wanted(Log_Level level) { return static_cast<int>(level) <= _log_threshold.load(std::memory_order_relaxed); }
 
-// Writes one line: local time, level name, "file(line): " and the formatted message. errno is left as it was.
+// Writes one line: local time, level name, "file(line): " and the formatted message. What others put into the message cannot
+// leave the line or steer a terminal (text/safe_text.h), and no more than 16 KiB of it are written: whoever logs hands texts of
+// clients and drivers over as they are. errno is left as it was.
 [[gnu::format(printf, 4, 5)]] void log(Log_Level level, const char* file, int line, const char* format, ...) noexcept;
 [[gnu::format(printf, 4, 0)]] void vlog(Log_Level level, const char* file, int line, const char* format,
                                         va_list arguments) noexcept;

@@ -23,6 +23,7 @@
 using namespace zmlr;
 using namespace sample;
 using ::testing::ElementsAre;
+using ::testing::EndsWith;
 using ::testing::MatchesRegex;
 
 namespace
@@ -94,7 +95,7 @@ TEST(Log, writes_time_level_source_and_line)
     const Home home;
     home.options("LOG_LEVEL=INFO\n");
     std::filesystem::create_directory(home.path(".cimple")); // one more call that sets errno
-    const std::string large(10000, 'x');
+    const std::string large(20000, 'x');
     ASSERT_TRUE(home.run(
         [&large]
         {
@@ -105,13 +106,15 @@ TEST(Log, writes_time_level_source_and_line)
             log(LL_WARN, "PortHelper", 7, "already ended\n");
             log(LL_INFO, "PortHelper", 8, "%s", large.c_str());
             log(LL_INFO, "PortHelper", 9, "%s", "");
+            log(LL_INFO, "Converter", 11, "%s", "name\r\n2026/11/25 ERR: \x1B[2J\t\xC2\x9B \xE2\x80\xAE\xC3\xA4\xFF\n\n");
             log(LL_DBG, "PortHelper", 10, "not written");
         }));
     const std::string time = "[0-9]{4}/[0-9]{2}/[0-9]{2} [0-9]{2}:[0-9]{2}:[0-9]{2} ";
     EXPECT_THAT(home.lines(), ElementsAre(MatchesRegex(time + "ERR: FCHBAManager\\(120\\): port 10000000C9000001: -5"),
                                           MatchesRegex(time + "WARN: PortHelper\\(7\\): already ended"),
-                                          MatchesRegex(time + "INFO: PortHelper\\(8\\): x{10000}"),
-                                          MatchesRegex(time + "INFO: PortHelper\\(9\\): ")));
+                                          MatchesRegex(time + "INFO: PortHelper\\(8\\): x{16384}"),
+                                          MatchesRegex(time + "INFO: PortHelper\\(9\\): "),
+                                          EndsWith("Converter(11): name??2026/11/25 ERR: ?[2J\t? ?\xC3\xA4??")));
 }
 
 TEST(Log, lines_of_processes_and_threads_never_mix)
