@@ -138,9 +138,25 @@ Ref<Instance> _to_cimple_instance(const Source& source, const CMPIInstance* cmpi
     return instance;
 }
 
+// Objects within objects come as deep as a client nests them, and a server's thread has only so much stack.
+constexpr unsigned deepest = 16;
+constinit thread_local unsigned depth = 0;
+
+class Nesting
+{
+public:
+    Nesting() { ++depth; }
+    ~Nesting() { --depth; }
+    Nesting(const Nesting&) = delete;
+    Nesting& operator=(const Nesting&) = delete;
+};
+
 Ref<Instance> _to_cimple_instance(const Source& source, CMPIType type, const CMPIValue& value)
 {
-    Ref<Instance> instance = type == CMPI_ref ? _to_cimple_instance(source, value.ref) : _to_cimple_instance(source, value.inst);
+    const Nesting nesting;
+    Ref<Instance> instance;
+    if (depth <= deepest)
+        instance = type == CMPI_ref ? _to_cimple_instance(source, value.ref) : _to_cimple_instance(source, value.inst);
     if (!instance)
         ZMLR_LOG(LL_WARN, "failed to create CIMPLE instance");
     return instance;

@@ -67,7 +67,8 @@ CMPIrc make_cmpi_method(const CMPIBroker* broker, const char* name_space, const 
                         CMPI_Data& return_value);
 
 // Data become a value of the matching type; a null value if their state says so. References become instances with the keys
-// of the referenced object, embedded objects whole instances: their classes are looked up in the repository.
+// of the referenced object, embedded objects whole instances: their classes are looked up in the repository. What is nested more
+// than 16 deep fails.
 int cmpi_to_cimple_value(const Meta_Repository* repository, const CMPIBroker* broker, const char* name_space,
                          const CMPIData& data, Value& value);
 

@@ -187,6 +187,26 @@ TEST_F(Conversion, refuses_data_that_are_no_value)
     EXPECT_THAT(logged(convert, "INFO"), ElementsAre("Converter: ignored null CMPI string"));
 }
 
+// A path that is its own key: as deep as no stack.
+TEST_F(Conversion, ends_where_objects_are_nested_without_end)
+{
+    static CMPIObjectPathFT keys = Path_Object::table;
+    static CMPIObjectPath endless = {&keys, &keys};
+    static const CMPIData data = {CMPI_ref, CMPI_goodValue, {.ref = &endless}};
+    static constexpr auto text = [](const char* chars) { return make<cimserver::String_Object>(std::string(chars)).face(); };
+    keys.getKeyCount = [](auto...) { return CMPICount{1}; };
+    keys.getClassName = [](auto...) { return text("TST_Pair"); };
+    keys.getKeyAt = [](const CMPIObjectPath*, CMPICount, CMPIString** name, CMPIStatus*)
+    {
+        *name = text("Antecedent");
+        return data;
+    };
+    Value made;
+    const auto convert = [&] { cmpi_to_cimple_value(&meta_repository(), broker.face(), name_space, data, made); };
+    EXPECT_EQ(logged(convert).front(), "Converter: failed to create CIMPLE instance");
+    EXPECT_EQ(made.type(), Value::INSTANCE);
+}
+
 TEST_F(Conversion, refuses_values_that_are_nothing_to_a_server)
 {
     Value none, null_instance, homeless;
