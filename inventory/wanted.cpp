@@ -16,6 +16,8 @@ namespace zmlr
 namespace
 {
 
+constexpr uint32 longest_key = 512; // longer than any of ours: a client's may be of any size
+
 // A property's text; null when it has none.
 const String* text_of(const Instance* model, const Meta_Property* property)
 {
@@ -103,7 +105,7 @@ Wanted::Wanted(const Instance* model)
         if (!is_property(feature) || !is_key(feature))
             continue;
         const String* key = text_of(model, as_property(feature));
-        if (!key || key->empty())
+        if (!key || key->empty() || key->size() > longest_key)
         {
             *this = Wanted();
             return;

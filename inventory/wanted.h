@@ -18,7 +18,8 @@ public:
     // All instances: nothing is left out.
     Wanted() = default;
 
-    // The instance with the model's keys; all instances when a key is null, empty or no text.
+    // The instance with the model's keys; all instances when a key is null, empty, no text, or longer than
+    // those of any instance.
     explicit Wanted(const Instance* model);
 
     bool is_all() const { return _keys.empty(); }
