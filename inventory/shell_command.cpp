@@ -1,5 +1,7 @@
 #include "inventory/shell_command.h"
 
+#include "runtime/blocked_signals.h"
+
 #include <fcntl.h>
 #include <poll.h>
 #include <sys/resource.h>
@@ -57,24 +59,6 @@ struct Pipe
         out.number = ends[1];
         return true;
     }
-};
-
-// No signal reaches a handler of this process in its child.
-class Blocked_Signals
-{
-public:
-    Blocked_Signals()
-    {
-        sigset_t all;
-        sigfillset(&all);
-        pthread_sigmask(SIG_SETMASK, &all, &_before);
-    }
-    ~Blocked_Signals() { pthread_sigmask(SIG_SETMASK, &_before, nullptr); }
-    Blocked_Signals(const Blocked_Signals&) = delete;
-    Blocked_Signals& operator=(const Blocked_Signals&) = delete;
-
-private:
-    sigset_t _before;
 };
 
 // ---- In the child: only what is safe after the fork of a process with threads ----
@@ -184,7 +168,7 @@ void wait_for_child(pid_t child)
 
 pid_t start_supervisor(const char* command, const Pipe& status, const Pipe& output)
 {
-    const Blocked_Signals blocked;
+    const Blocked_Signals blocked; // none reaches a handler of this process in its child
     const pid_t child = fork();
     if (child == 0)
         supervise(command, status.out.number, output.out.number);

@@ -1,6 +1,7 @@
 #include "runtime/thread.h"
 
 #include "runtime/assert.h"
+#include "runtime/blocked_signals.h"
 #include "runtime/log.h"
 #include "runtime/thread_context.h"
 
@@ -92,6 +93,12 @@ void* start(void* data)
     return result;
 }
 
+int start_with_blocked_signals(pthread_t& id, const pthread_attr_t& attributes, Arg* record)
+{
+    const Blocked_Signals blocked;
+    return pthread_create(&id, &attributes, start, record);
+}
+
 } // namespace
 
 int Thread::create(Thread& thread, Proc proc, void* arg, bool detached)
@@ -107,7 +114,7 @@ int Thread::create(Thread& thread, Proc proc, void* arg, bool detached)
     pthread_attr_init(&attributes);
     pthread_attr_setdetachstate(&attributes, detached ? PTHREAD_CREATE_DETACHED : PTHREAD_CREATE_JOINABLE);
     pthread_t id = 0;
-    const int error = pthread_create(&id, &attributes, start, record.get());
+    const int error = start_with_blocked_signals(id, attributes, record.get());
     pthread_attr_destroy(&attributes);
     if (error != 0)
         return error;

@@ -21,11 +21,11 @@ public:
     Thread(const Thread&) = delete;
     Thread& operator=(const Thread&) = delete;
 
-    // Runs proc(arg) in a new thread: 0, or the platform's error number; the handle then keeps what it had. When the calling
-    // thread has a context, its thread_create_hook() supplies the new thread's: it is on top of the new thread's stack while
-    // proc runs, and the stack must be as proc found it when proc is done. An exception that leaves proc is logged and
-    // ends the thread with a null result. Throws std::bad_alloc, and what the hook throws, in the creating thread: nothing was
-    // started then.
+    // Runs proc(arg) in a new thread that blocks all signals (blocked_signals.h): 0, or the platform's error number; the handle
+    // then keeps what it had. When the calling thread has a context, its thread_create_hook() supplies the new thread's: it is on
+    // top of the new thread's stack while proc runs, and the stack must be as proc found it when proc is done. An exception that
+    // leaves proc is logged and ends the thread with a null result. Throws std::bad_alloc, and what the hook throws, in the
+    // creating thread: nothing was started then.
     static int create_joinable(Thread& thread, Proc proc, void* arg);
     static int create_detached(Thread& thread, Proc proc, void* arg); // no join() for it
 

@@ -143,6 +143,18 @@ TEST(Thread, knows_itself_and_is_joined_once)
     EXPECT_EQ(Thread::join(thread, result), EINVAL) << "detached";
 }
 
+TEST(Thread, leaves_signals_to_the_program)
+{
+    const Thread::Proc blocks_them = [](void*) -> void*
+    {
+        static sigset_t blocked;
+        pthread_sigmask(SIG_BLOCK, nullptr, &blocked);
+        return sigismember(&blocked, SIGTERM) ? &blocked : nullptr;
+    };
+    EXPECT_NE(in_thread(blocks_them), nullptr);
+    EXPECT_EQ(blocks_them(nullptr), nullptr) << "the creator gets them as before";
+}
+
 // A thread that cannot end before the lock is given back is let go by its handle's next use: nobody waits for it. The thread
 // sanitizer reports it if it were leaked.
 TEST(Thread, used_again_lets_the_thread_before_go)
