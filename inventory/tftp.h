@@ -18,8 +18,8 @@ struct Tftp_Address
 };
 
 // The address in what follows "tftp://": a server of at least two characters, a slash, a file. None when a part is missing,
-// begins with '-' or holds a control character, when the file begins with '.' or holds
-// '/', ':' or "..", and when a command would be longer than 1023 bytes.
+// begins with '-' or holds a character that steers a terminal (text/safe_text.h), when the file begins with '.' or holds '/', ':'
+// or "..", and when a command would be longer than 1023 bytes.
 std::optional<Tftp_Address> parse_tftp_address(const String& text);
 
 namespace ProviderUtil

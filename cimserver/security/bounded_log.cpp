@@ -1,5 +1,7 @@
 #include "cimserver/security/bounded_log.h"
 
+#include "text/safe_text.h"
+
 #include <cstdio>
 
 namespace cimserver
@@ -42,7 +44,7 @@ void Bounded_Log::tell(const std::string& line)
     if (_untold > 0)
         std::fprintf(stderr, "zmlr-cimserver: %lu %s\n", _untold, _others.c_str());
     _untold = 0;
-    std::fprintf(stderr, "zmlr-cimserver: %s\n", line.c_str());
+    std::fprintf(stderr, "zmlr-cimserver: %s\n", text::safe_text(line).c_str());
 }
 
 } // namespace cimserver

@@ -18,7 +18,7 @@ public:
 
     explicit Bounded_Log(std::string others) : _others(std::move(others)) {} // "more logins were refused"
 
-    // Safe to call from several threads at once.
+    // Nothing in a line can begin another one. Safe to call from several threads at once.
     void tell(const std::string& line);
 
 private:
