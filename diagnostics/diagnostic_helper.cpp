@@ -116,6 +116,7 @@ Instance_Array DiagnosticHelper::getInstancesByClass(classId_t id, const Invento
 void DiagnosticHelper::generateDiagnosticRecord(const String& message, const DiagnosticTestInput& input,
                                                 diag_compl_record_state_t state)
 {
+    const Scope_Trace trace(log_source);
     DiagnosticRecord record;
     record.recordData = message;
     record.serviceName = ProviderUtil::getDiagTestName(input.test->id);

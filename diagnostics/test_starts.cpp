@@ -81,6 +81,7 @@ uint32 choose_speed(hxa_ioc_type_e type)
 
 DiagnosticJob createDiagnosticJob(const DiagnosticTestInput& input)
 {
+    const Scope_Trace trace(log_source);
     DiagnosticJob job;
     job.name = ProviderUtil::getDiagTestName(input.test->id);
     job.element = input.element;

@@ -158,6 +158,18 @@ hxal_t* ProviderUtil::getHxalHandlerByPortAddress(const String& address, bool is
     return nullptr;
 }
 
+hxal_t* ProviderUtil::getHxalHandlerByPortWWN(const String& wwn)
+{
+    const Scope_Trace trace(log_source);
+    return getHxalHandlerByPortAddress(wwn, true);
+}
+
+hxal_t* ProviderUtil::getHxalHandlerByPortMAC(const String& mac)
+{
+    const Scope_Trace trace(log_source);
+    return getHxalHandlerByPortAddress(mac, false);
+}
+
 String ProviderUtil::getEthDeviceNameByMAC(const String& mac)
 {
     const Scope_Trace trace(log_source);

@@ -23,8 +23,8 @@ hxal_t* getHxalHandlerByAdapterId(int adapter);
 
 // The FC IOC with this port WWN (is_wwn) or the Ethernet IOC with this MAC address; null when there is none.
 hxal_t* getHxalHandlerByPortAddress(const String& address, bool is_wwn);
-inline hxal_t* getHxalHandlerByPortWWN(const String& wwn) { return getHxalHandlerByPortAddress(wwn, true); }
-inline hxal_t* getHxalHandlerByPortMAC(const String& mac) { return getHxalHandlerByPortAddress(mac, false); }
+hxal_t* getHxalHandlerByPortWWN(const String& wwn);
+hxal_t* getHxalHandlerByPortMAC(const String& mac);
 
 // True when the FC IOC has this port WWN, the Ethernet IOC this MAC address, as the scan found them.
 bool has_wwn(const hxal_t* fc, const String& address);

@@ -24,6 +24,8 @@ namespace
 // What no request of a client leads to.
 void ask_for_what_there_is_not()
 {
+    FCHBAManager::getFCHBAManager().getInstances(static_cast<classId_t>(MAXCLASSID + 1));
+    HDRManager::getHDRManager().getInstances(CLASSID_FCPort);
     AdapterHelper::getAdapterHelperInstance().getInstancesByClass(CLASSID_None);
     PortHelper::getPortHelperObject().getInstancesByClass(CLASSID_None);
     EthernetPortHelper::getEthernetPortHelperObject().getInstancesByClass(CLASSID_None);
