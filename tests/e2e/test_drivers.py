@@ -13,7 +13,9 @@ def test_without_a_driver_the_host_and_the_profiles_are_left(start, tmp_path, sc
     host = start(scenario, {"HOME": str(tmp_path)})
     assert len(host.pywbem.EnumerateInstances("ZEMLAR_ComputerSystem")) == 1
     assert len(host.pywbem.EnumerateInstances("ZEMLAR_ElementConformsToProfile")) == 14
-    for needs_it in ("CIM_LogicalDevice", "CIM_PhysicalElement", "CIM_ProtocolEndpoint", "CIM_StatisticalData", "CIM_Product"):
+    elements = ("LogicalDevice", "PhysicalElement", "ProtocolEndpoint", "StatisticalData", "Product", "LogicalPortGroup")
+    software = ("SoftwareInstallationService", "SoftwareInstallationServiceCapabilities", "DiagnosticTest")
+    for needs_it in [f"CIM_{name}" for name in elements + software]:
         assert host.pywbem.EnumerateInstanceNames(needs_it) == []
     log = (tmp_path / ".cimple/messages").read_text(encoding="utf-8")
     assert line in log and GATE in log and "Building association instance for profile : Server\n" in log

@@ -69,7 +69,8 @@ TEST(FRU_number, comes_out_of_a_whole_block_only)
         {"identifier string tag", changed(0, 0x83, changed(1, 0xFF)), ""},
         {"section tag", changed(131, 0x91, changed(1, 0xFF)), ""},
         {"header", changed(134, 'W', changed(1, 0xFF)), ""},
-        {"no checksum keyword within the section", changed(132, 0), ""},
+        {"checksum keyword that begins with the section's last byte", changed(132, 30, changed(1, 3)), "42D0510"},
+        {"checksum keyword behind the section", changed(132, 29, changed(1, 4)), ""},
         {"nothing but Vs", unending, ""},
         {"nothing", hxa_mfg_vpd_t{}, ""},
     };

@@ -1,3 +1,5 @@
+#include "inventory/fchba_manager.h"
+#include "inventory/hdr_manager.h"
 #include "inventory/provider_init.h"
 #include "inventory/provider_util.h"
 #include "tests/inventory/inventory_fixture.h"
@@ -34,6 +36,8 @@ const std::map<std::string, Probe> probes = {
     {"version-refused", {DRIVER_VERSION_FAIL, 0, "ERR ProviderInit: ERROR: HXAL version mismatch"}},
 };
 
+constexpr const char* closed = "Driver is not installed or there is a hxal mismatch hence no instances returned";
+
 class Driver_Gate : public Inventory_Test
 {
 protected:
@@ -55,8 +59,14 @@ TEST_F(Driver_Gate, is_what_the_probe_found)
 {
     EXPECT_EQ(asked_early, probe().status);
     EXPECT_EQ(ProviderUtil::getDriverStatus(), open());
+    EXPECT_EQ(FCHBAManager::getFCHBAManager().getInstances(CLASSID_PortController).empty(), probe().adapters == 0);
+    HDRManager::getHDRManager().getInstances(CLASSID_TapeDrive);
     const std::vector<std::string> lines = log();
     EXPECT_THAT(lines, IsSupersetOf({"INFO ProviderInit: hxal_libinit() returned  0 "s,
-                                     "DBG ProviderInit: Adapter Count = " + std::to_string(probe().adapters), probe().line}));
+                                     "DBG ProviderInit: Adapter Count = " + std::to_string(probe().adapters), probe().line,
+                                     "INFO FCHBAManager: Inside FCHBAManager Constructor"s,
+                                     "INFO HDRManager: Inside HDRManager Constructor"s}));
     EXPECT_EQ(std::count(lines.begin(), lines.end(), "INFO ProviderInit: Inside ProviderInit Constructor."), 1);
+    for (const char* manager : {"FCHBAManager", "HDRManager"})
+        EXPECT_EQ(std::count(lines.begin(), lines.end(), "ERR "s + manager + ": " + closed), !open());
 }

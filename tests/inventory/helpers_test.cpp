@@ -120,12 +120,14 @@ TEST_F(Helpers, skip_what_fails_and_say_so)
         {"command": "IOCMD_IOC_GET_ATTR", "answer": [{"offset": 1600, "bytes": "01"}]}]})";
     const hxasim::Fault hxn = {.command = "IOCMD_IOC_GET_ATTR", .node = "/dev/hxn", .error = EIO};
     const hxasim::Fault hxa = {.command = "IOCMD_IOC_GET_ATTR", .node = "/dev/hxa", .error = EIO};
+    const hxasim::Fault other_serial = {.command = "IOCMD_IOC_GET_ATTR", .node = "/dev/hxn", .answer = {{8 + 8 + 8, {'E', 0}}}};
     const hxasim::Fault info = {.command = "IOCMD_IOC_GET_INFO", .error = EIO};
     const hxasim::Fault hba_1 = {.command = "IOCMD_IOC_GET_ATTR", .node = "/dev/hxa", .instance = 0, .error = ENODEV};
     const hxasim::Fault port_1 = {.command = "IOCMD_PORT_GET_ATTR", .instance = 1, .error = EIO};
     const hxasim::Fault stats = {.command = "IOCMD_PORT_GET_STATS", .instance = 0, .error = EIO};
     const hxasim::Fault flash = {.command = "IOCMD_FLASH_GET_ATTR", .error = EIO};
     const hxasim::Fault bad_boot_code = {.command = "IOCMD_FLASH_GET_ATTR", .answer = {{8 + 8 + 20, {5}}}};
+    const hxasim::Fault no_partition = {.command = "IOCMD_FLASH_GET_ATTR", .answer = {{8 + 4, {0, 0, 0, 0}}}};
     const hxasim::Fault strange_boot_code = {.command = "IOCMD_FLASH_GET_ATTR", .answer = {{8 + 8 + 20, {6}}}};
     const hxasim::Fault port_2 = {.command = "IOCMD_PORT_GET_ATTR", .instance = 2, .status = 56};
     const struct
@@ -145,6 +147,7 @@ TEST_F(Helpers, skip_what_fails_and_say_so)
              "WARN AdapterHelper: hxal_ioc_get_info() failed",
              "INFO AdapterHelper: Using hxal_ioc_get_mac() to get Mac address"}},
         {controller, cna, {hxa}, "Name", {R"("SERIAL")"}, {"INFO AdapterHelper: Adapter Type : CNA"}},
+        {controller, cna, {other_serial}, "Name", {R"("E")"}, {}}, // the Ethernet side tells of the card
         {controller, cna, {hxa, hxn}, "Name", {},
             {"WARN AdapterHelper: hxal_ioc_get_attr falied for both fc and eth", "INFO AdapterHelper: Number of instances: 0"}},
         {controller, no_fc, {}, "DeviceID", {R"("00051E200000")", R"("00051E200100")"},
@@ -167,6 +170,8 @@ TEST_F(Helpers, skip_what_fails_and_say_so)
         {CLASSID_AdapterSoftwareIdentity, cna, {bad_boot_code}, "Classifications", {"{ 2 }", "{ 2 }", "{ 10 }"},
             {"INFO AdapterHelper: Boot code upload status is not GOOD"}},
         {CLASSID_AdapterSoftwareIdentity, cna, {strange_boot_code}, "Classifications", {"{ 2 }", "{ 2 }", "{ 10 }"},
+            {"WARN AdapterHelper: No Flash Status Found"}},
+        {CLASSID_AdapterSoftwareIdentity, cna, {no_partition}, "Classifications", {"{ 2 }", "{ 2 }", "{ 10 }"},
             {"WARN AdapterHelper: No Flash Status Found"}},
         // clang-format on
     };

@@ -68,6 +68,8 @@ TEST_F(Host, info_tells_the_best_text_there_is)
         EXPECT_THAT(values_of(systems, "Name"), ElementsAre(name));
         EXPECT_THAT(values_of(systems, "OtherIdentifyingInfo"), ElementsAre("{ " + name + " }"));
         EXPECT_THAT(values_of(systems, "NameFormat"), ElementsAre(c.expected.first == 0 ? "\"IP\"" : "\"Other\""));
+        EXPECT_THAT(values_of(systems, "IdentifyingDescriptions"),
+                    ElementsAre(c.expected.first == 0 ? R"({ "Ipv4 Address" })" : R"({ "Fully Qualified Domain Name" })"));
         EXPECT_EQ(testing::Value(log(), testing::Contains(remark)), c.expected.first == 3);
     }
 }
@@ -81,6 +83,8 @@ TEST_F(Host, info_is_bounded)
 
     fake_host = {.name = std::string(300, 'n'), .addresses = {"127.0.0.1"}, .domain = std::string(300, 'd')};
     EXPECT_EQ(info(), (Info{4, std::string(254, 'n')}));
+    fake_host.name = "localhost";
+    EXPECT_EQ(info(10), (Info{2, "localhost"}));
 }
 
 TEST_F(Host, has_paths_files_and_a_node_name)
