@@ -93,10 +93,14 @@ private:
             option->check([](const std::string& text) { return std::string(text.empty() ? "it is empty" : ""); });
         return option;
     }
+    static void take_file(CLI::App* app, std::string& file, const std::string& help)
+    {
+        app->add_option("--file", file, help)->type_name("FILE")->capture_default_str();
+    }
     static void take_keep(CLI::App* app, Keep_Options& keep)
     {
         app->add_flag("--keep", keep.keep, "write it to the drivers' configuration file too (asks)");
-        app->add_option("--file", keep.file, "that file")->type_name("FILE")->capture_default_str();
+        take_file(app, keep.file, "that file");
     }
 
     void add_list()
@@ -128,6 +132,10 @@ private:
         app->require_subcommand(0, 1);
         may_take(action(app, options, "show", "show what the ports tell"), "port", options->port, all_ports);
         may_take(action(app, options, "sfp", "show the modules in the ports"), "port", options->port, all_ports);
+        auto* virtual_ports =
+            action(app, options, "virtual", "show the virtual ports that the drivers' configuration file names");
+        may_take(virtual_ports, "port", options->port, all_ports);
+        take_file(virtual_ports, options->keep.file, "that file");
         for (const auto& [name, help] : {std::pair{"enable", "put into service"}, {"disable", "put out of service (asks)"}})
         {
             auto* change = action(app, options, name, help);
@@ -262,7 +270,7 @@ private:
     {
         const auto [app, options] = add("config", "show and change the drivers' configuration file", config);
         app->require_subcommand(0, 1);
-        app->add_option("--file", options->file, "the file")->type_name("FILE")->capture_default_str();
+        take_file(app, options->file, "the file");
         action(app, options, "show", "show what is set");
         action(app, options, "sync", "write the file anew, with every card and port of the host (asks)");
         auto* set = action(app, options, "set", "set what the driver takes when it starts (asks)");

@@ -37,7 +37,7 @@ void adapter(Session& session, const Adapter_Options& options);
 
 struct Port_Options
 {
-    // show, sfp, enable, disable, name, beacon, speed, topology, frame-size, address, trunk
+    // show, sfp, virtual, enable, disable, name, beacon, speed, topology, frame-size, address, trunk
     std::string action = "list";
     std::string port;
     std::string value;

@@ -54,6 +54,15 @@ void add_adapter(const Host& host, const hxal_ad_config_t& entry, List& rows)
         add("power", hxal_pm_ds_to_string(entry.power));
 }
 
+// As the file has it.
+std::string virtual_port_text(const hxal_vf_config_t& vport)
+{
+    std::string text;
+    for (const auto& field : {field_text(vport.pwwn), field_text(vport.nwwn), field_text(vport.name), field_text(vport.role)})
+        text += field + ',';
+    return text + std::to_string(vport.vf_id);
+}
+
 void add_port(const Host& host, const hxal_ioc_config_t& entry, List& rows)
 {
     const auto id = field_text(has(entry.flags, HXAL_CONFIG_PORT_WWN) ? entry.pwwn : entry.mac);
@@ -61,6 +70,11 @@ void add_port(const Host& host, const hxal_ioc_config_t& entry, List& rows)
         if (has(entry.flags, setting.code))
             rows.push_back(Object{
                 {"element", port_name(host, entry)}, {"id", id}, {"setting", setting.name}, {"value", setting.show(entry)}});
+    for (const auto* vport = entry.vport; vport; vport = vport->next)
+        rows.push_back(Object{{"element", port_name(host, entry)},
+                              {"id", id},
+                              {"setting", "vport-" + std::to_string(vport->vidx)},
+                              {"value", virtual_port_text(*vport)}});
 }
 
 void show(Session& session, const Host& host)

@@ -5,6 +5,7 @@
 #include "cli/report.h"
 #include "cli/sfp.h"
 #include "cli/trees.h"
+#include "cli/virtual_ports.h"
 #include "cli/words.h"
 #include "hxal/diag.h"
 
@@ -160,6 +161,8 @@ void port(Session& session, const Port_Options& options)
         show(session, host.ports(options.port), port_tree, [](const Value& tree) { return details(tree, columns); });
     else if (options.action == "sfp")
         show(session, host.ports(options.port), sfp_tree, sfp_text);
+    else if (options.action == "virtual")
+        show_virtual_ports(session, host.ports(options.port), options.keep.file);
     else
         act(session, host.port(options.port), options);
 }

@@ -27,7 +27,7 @@ def environment(scenario, **more):
 
 def hxa(scenario, *words):
     command = [BUILD / "cli/hxa", *words]
-    return subprocess.run(command, env=environment(scenario), stdin=subprocess.DEVNULL, capture_output=True, text=True, timeout=TIMEOUT)
+    return subprocess.run(command, cwd=ROOT, env=environment(scenario), stdin=subprocess.DEVNULL, capture_output=True, text=True, timeout=TIMEOUT)
 
 
 def host(tmp_path, *faults, scenario="mixed"):
