@@ -83,6 +83,9 @@ TEST_F(Host, info_is_bounded)
 
     fake_host = {.name = std::string(300, 'n'), .addresses = {"127.0.0.1"}, .domain = std::string(300, 'd')};
     EXPECT_EQ(info(), (Info{4, std::string(254, 'n')}));
+    for (const auto& [id, size] : {std::pair{CLASSID_FCPort, 254U}, {CLASSID_EthernetPort, 63U}, {CLASSID_LANEndpoint, 63U}})
+        EXPECT_THAT(values_of(FCHBAManager::getFCHBAManager().getInstances(id), "SystemName"),
+                    testing::Each('"' + std::string(size, 'n') + '"'));
     fake_host.name = "localhost";
     EXPECT_EQ(info(10), (Info{2, "localhost"}));
 }
