@@ -115,6 +115,8 @@ TEST_F(Helpers, skip_what_fails_and_say_so)
     // Where the FC driver is missing, the Ethernet side is all there is: its MAC address still tells the adapters apart.
     const std::string no_fc = R"({"adapters": [{"kind": "cna"}, {"kind": "cna"}],
         "faults": [{"command": "IOCMD_IOC_GET_INST", "node": "/dev/hxa", "error": "EIO"}]})";
+    const std::string no_ethernet = R"({"adapters": [{"kind": "cna"}],
+        "faults": [{"command": "IOCMD_IOC_GET_INST", "node": "/dev/hxn", "error": "EIO"}]})";
     // Port 0 of the adapter has no IOC: the driver says that its only IOC drives port 1.
     const std::string port_1_only = R"({"adapters": [{"kind": "fc-hba", "ports": [{}]}], "faults": [
         {"command": "IOCMD_IOC_GET_ATTR", "answer": [{"offset": 1600, "bytes": "01"}]}]})";
@@ -125,6 +127,8 @@ TEST_F(Helpers, skip_what_fails_and_say_so)
     const hxasim::Fault hba_1 = {.command = "IOCMD_IOC_GET_ATTR", .node = "/dev/hxa", .instance = 0, .error = ENODEV};
     const hxasim::Fault port_1 = {.command = "IOCMD_PORT_GET_ATTR", .instance = 1, .error = EIO};
     const hxasim::Fault stats = {.command = "IOCMD_PORT_GET_STATS", .instance = 0, .error = EIO};
+    const hxasim::Fault no_sfp = {.command = "IOCMD_DIAG_SFP", .node = "/dev/hxn", .instance = 0, .status = 89};
+    const hxasim::Fault fc_side = {.command = "IOCMD_DIAG_SFP", .node = "/dev/hxa", .error = EIO};
     const hxasim::Fault flash = {.command = "IOCMD_FLASH_GET_ATTR", .error = EIO};
     const hxasim::Fault bad_boot_code = {.command = "IOCMD_FLASH_GET_ATTR", .answer = {{8 + 8 + 20, {5}}}};
     const hxasim::Fault no_partition = {.command = "IOCMD_FLASH_GET_ATTR", .answer = {{8 + 4, {0, 0, 0, 0}}}};
@@ -165,6 +169,14 @@ TEST_F(Helpers, skip_what_fails_and_say_so)
         {port, nothing, {}, "DeviceID", {}, {"INFO PortHelper: No adapters in the system. "}},
         {CLASSID_FCPortStatistics, cna, {stats}, "InstanceID", {R"("100000051E100001")"},
             {"WARN PortHelper: hxal_port_get_stats failed for fcoe port WWN= 100000051E100000"}},
+        {CLASSID_EthernetPort, cna, {no_sfp, fc_side}, "PortType", {"0", "105"},
+            {"INFO EthernetPortHelper: hxal_diag_sfp_query failed for PortIndex =0"}},
+        {CLASSID_PhysicalConnector, cna, {no_sfp, fc_side}, "Tag", {R"("SERIAL-1_1_1")"},
+            {"INFO PhysicalAssetHelper: hxal_diag_sfp_query failed for PortIndex =0"}},
+        {CLASSID_PhysicalConnector, no_fc, {}, "Description", {4, R"("10G_BASE-SR")"},
+            {"WARN PhysicalAssetHelper: hxal_adapter_get_fcioc failed for adapter Index: 2, Port=1. "}},
+        {CLASSID_PhysicalConnector, no_ethernet, {}, "Description", {2, R"("10G_BASE-SR")"},
+            {"WARN PhysicalAssetHelper: hxal_adapter_get_ethioc failed for adapter Index: 1, Port=1. "}},
         {CLASSID_AdapterSoftwareIdentity, cna, {flash}, "Classifications", {"{ 2 }", "{ 2 }", "{ 10 }"},
             {"ERR AdapterHelper: hxal_ioc_get_attr call failed for Adapter id 1"}},
         {CLASSID_AdapterSoftwareIdentity, cna, {bad_boot_code}, "Classifications", {"{ 2 }", "{ 2 }", "{ 10 }"},
