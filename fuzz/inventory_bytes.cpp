@@ -1,5 +1,6 @@
-// Any bytes given as what cards, modules and disks deliver: read within their bounds, into terminated texts.
+// Any bytes given as what cards, modules and disks deliver: read within their bounds, into texts that clients can be shown.
 #include "inventory/fru_number.h"
+#include "inventory/property_text.h"
 #include "inventory/scsi_pages.h"
 #include "inventory/sfp_info.h"
 
@@ -19,28 +20,44 @@ template <class Block> Block block_of(const uint8_t* data, std::size_t size)
     return block;
 }
 
-template <std::size_t N> void expect_terminated(const char (&text)[N])
+void expect(bool holds)
 {
-    if (!std::memchr(text, '\0', N))
+    if (!holds)
         std::abort();
+}
+
+// A field as clients see it: nothing in it is to be replaced any more.
+template <std::size_t N> String shown(const char (&field)[N])
+{
+    expect(std::memchr(field, '\0', N) != nullptr);
+    const String text = property_text(field);
+    expect(property_text(text.c_str(), text.size()) == text);
+    return text;
 }
 
 } // namespace
 
 extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, size_t size)
 {
-    if (getFRUNumber(block_of<hxa_mfg_vpd_t>(data, size)).size() > sizeof(hxa_mfg_vpd_t::data))
-        std::abort();
+    expect(getFRUNumber(block_of<hxa_mfg_vpd_t>(data, size)).size() <= sizeof(hxa_mfg_vpd_t::data));
 
     const _sfpInfo module = sfp_info(block_of<sfp_mem_t>(data, size), size % 2 == 0, 1, 0);
-    expect_terminated(module.tag);
-    expect_terminated(module.media);
+    expect(shown(module.tag) == shown(module.serial_number) + "_1_0");
+    for (const String& text : {shown(module.vendor_name), shown(module.part_number), shown(module.revision)})
+        expect(text.empty() || (text[0] != ' ' && text[text.size() - 1] != ' '));
+    shown(module.kind);
+    shown(module.media);
 
     _hbaLunInfo lun;
-    fill_inquiry(lun, block_of<Inquiry_Data>(data, size));
-    fill_identifier(lun, block_of<Identification_Page>(data, size));
+    const auto inquiry = block_of<Inquiry_Data>(data, size);
+    fill_inquiry(lun, inquiry);
+    shown(lun.vendor);
+    shown(lun.product);
+    expect(!fill_identifier(lun, block_of<Identification_Page>(data, size)) || lun.identifier_type != 0);
     fill_serial_number(lun, block_of<Serial_Page>(data, size));
-    expect_terminated(lun.identifier);
-    expect_terminated(lun.serial_number);
+    shown(lun.identifier);
+    shown(lun.serial_number);
+    is_tape_device(inquiry);
+    expect(lun_count(inquiry) <= UINT32_MAX / lun_entry_size);
     return 0;
 }
