@@ -95,6 +95,20 @@ bool pass_on_reference(Instance* instance, Enum_Instances_Status, void* client_d
     return !args.stopped;
 }
 
+// The status of an answer that was made of an enumeration.
+template <auto ok, auto failed, auto denied> auto made_of(Enum_Instances_Status status)
+{
+    switch (status)
+    {
+    case ENUM_INSTANCES_FAILED:
+        return failed;
+    case ENUM_INSTANCES_ACCESS_DENIED:
+        return denied;
+    default:
+        return ok;
+    }
+}
+
 } // namespace
 
 Provider_Handle::Provider_Handle(const Registration* registration)
@@ -215,15 +229,7 @@ Enum_Associator_Names_Status Provider_Handle::enum_associator_names(const Instan
     const auto status = enum_instances(model.ptr(), pass_on_far_ends, &args);
     proc(nullptr, ENUM_ASSOCIATOR_NAMES_OK, client_data);
 
-    switch (status)
-    {
-    case ENUM_INSTANCES_FAILED:
-        return ENUM_ASSOCIATOR_NAMES_FAILED;
-    case ENUM_INSTANCES_ACCESS_DENIED:
-        return ENUM_ASSOCIATOR_NAMES_ACCESS_DENIED;
-    default:
-        return ENUM_ASSOCIATOR_NAMES_OK;
-    }
+    return made_of<ENUM_ASSOCIATOR_NAMES_OK, ENUM_ASSOCIATOR_NAMES_FAILED, ENUM_ASSOCIATOR_NAMES_ACCESS_DENIED>(status);
 }
 
 Enum_References_Status Provider_Handle::enum_references(const Instance* instance, const Instance* model, const String& role,
@@ -241,15 +247,7 @@ Enum_References_Status Provider_Handle::enum_references(const Instance* instance
     const auto status = enum_instances(model, pass_on_reference, &args);
     proc(nullptr, ENUM_REFERENCES_OK, client_data);
 
-    switch (status)
-    {
-    case ENUM_INSTANCES_FAILED:
-        return ENUM_REFERENCES_FAILED;
-    case ENUM_INSTANCES_ACCESS_DENIED:
-        return ENUM_REFERENCES_ACCESS_DENIED;
-    default:
-        return ENUM_REFERENCES_OK;
-    }
+    return made_of<ENUM_REFERENCES_OK, ENUM_REFERENCES_FAILED, ENUM_REFERENCES_ACCESS_DENIED>(status);
 }
 
 const Meta_Class* Provider_Handle::association_class() const
