@@ -1,5 +1,7 @@
 """Drivers that are missing, refuse or say nonsense: what a client sees, and what the log tells."""
 
+import re
+
 import pytest
 
 GATE = "Driver is not installed or there is a hxal mismatch hence no instances returned"
@@ -18,6 +20,9 @@ def test_without_a_driver_the_host_and_the_profiles_are_left(start, tmp_path, sc
     for needs_it in [f"CIM_{name}" for name in elements + software]:
         assert host.pywbem.EnumerateInstanceNames(needs_it) == []
     log = (tmp_path / ".cimple/messages").read_text(encoding="utf-8")
+    for service in ("Service", "ServiceCapabilities"):
+        empty = rf"ERR: ZEMLAR_HBASoftwareInstallation{service}_Provider\(\d+\): Error: Invalid mapping information\n"
+        assert re.search(empty, log)
     assert line in log and GATE in log and "Building association instance for profile : Server\n" in log
 
 

@@ -1,6 +1,7 @@
 """The inventory as clients see it. Golden inventories hold all that is served on a scenario; script/golden rewrites them."""
 
 import difflib
+import re
 import shutil
 import subprocess
 from pathlib import Path
@@ -120,5 +121,5 @@ def test_the_access_point_is_there_while_the_agent_runs(start, tmp_path):
     assert (before, during, addresses()) == ([], [service], [])
     assert ([point["Name"] for point in points], [found["Name"] for found in systems]) == (["Quillon Service"], [system])
     log = (tmp_path / ".cimple/messages").read_text(encoding="utf-8")
-    for line in ("The Quillon Agent is not running so no service available", "Warning: No service is available"):
-        assert log.count(line) == 2
+    for level, line in (("INFO", "The Quillon Agent is not running so no service available"), ("ERR", "Warning: No service is available")):
+        assert len(re.findall(rf"{level}: \w+\(\d+\): {line}\n", log)) == 2
