@@ -58,7 +58,7 @@ def files(options):
     served = [cls for cls in classes if cls.name in catalogues.mof_blocks(served_mof)]
     catalogue = catalogues.Catalogue(
         module="zmlrprovider_Module", vendor="Zemlar", version=options.version, location="zmlrprovider", file=options.module,
-        name_space="root/zemlar", classes=_served_classes(served, options, classes))
+        name_space="root/zemlar", classes=_served_classes(served, options, classes), inherited=_inherited(served))
     in_interop = [cls for cls in catalogue.classes if cls.interop]
     return {
         "mof/zemlar.mof": served_mof,
@@ -80,6 +80,12 @@ def _served_classes(served, options, classes):
     return [catalogues.Served_Class(
         cls.name, needs(cls), f"{cls.name}_Provider" if cls.name in providers else "",
         _kinds(providers[cls.name]) if cls.name in providers else [], bool(_line(cls) & set(roots))) for cls in served]
+
+
+def _inherited(served):
+    names = {cls.name for cls in served}
+    superclasses = {cls.superclass.name: cls.superclass for cls in served if cls.superclass and cls.superclass.name not in names}
+    return {name: [feature.name for feature in cls.features] for name, cls in superclasses.items()}
 
 
 def _kinds(provider):

@@ -8,7 +8,7 @@ _HEAD = """What the classes of the module take from the CIM schema of the server
 The classes were written against the features of the DMTF schema 2.23 with its experimental classes, and are declared on any
 schema from 2.19 on that has the classes below. zmlr-register asks the server before it changes anything: a class whose standard
 class is missing is left out and named, the others are registered. Clients do not see a property that the server's standard class
-does not have; what is marked experimental is missing from the DMTF's final schemas of some versions.
+does not have, which is named too; what is marked experimental is missing from the DMTF's final schemas of some versions.
 
 """
 _EXPERIMENTAL = "experimental: "

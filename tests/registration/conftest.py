@@ -59,8 +59,8 @@ class Host:
         for name, text in files.items():
             (self.folder / "schema" / name).write_text(text)
 
-    def make_product(self, version, mof=PRODUCT):
-        texts = {"cim.mof": STANDARD, "zemlar.mof": mof, "providers.def": PROVIDERS, "libzmlrprovider.so": "",
+    def make_product(self, version, mof=PRODUCT, standard=STANDARD):
+        texts = {"cim.mof": standard, "zemlar.mof": mof, "providers.def": PROVIDERS, "libzmlrprovider.so": "",
                  "roots.def": "ZMLR_INTEROP_ROOT(CIM_RegisteredProfile)\n"}
         for name, text in texts.items():
             (self.folder / name).write_text(text)

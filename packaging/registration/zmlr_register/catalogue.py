@@ -25,6 +25,7 @@ class Catalogue:
     file: str  # the library, relative to the folder of the data
     name_space: str
     classes: list  # a class stands after those that it needs
+    inherited: dict = field(default_factory=dict)  # standard superclass -> the names of what the module's classes inherit from it
 
     @property
     def library(self):

@@ -123,7 +123,9 @@ def _install(server, noting, library, options, tools, data):
     if not library.is_file():
         raise Failed(f"the module {library} is not there: name it with --module")
     mof = (data / "mof" / "zemlar.mof").read_text(encoding="utf-8")
-    changes, left_out = server.changes(mof, library)
+    changes, left_out, lacks = server.changes(mof, library)
+    for name_space, standard, missing, below in lacks:
+        tools.warn(f"{standard} in {name_space} has no {', '.join(missing)}: clients do not see that of {', '.join(below)}")
     for name_space, cls, missing in left_out:
         tools.warn(f"left out: {cls.name} in {name_space}: the server has no {', '.join(missing)}")
     if options.status:

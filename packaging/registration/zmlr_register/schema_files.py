@@ -1,5 +1,6 @@
 """The CIM schema as the DMTF publishes it: a MOF file that includes one file per class."""
 
+import functools
 import pathlib
 import re
 
@@ -26,9 +27,24 @@ def find_schema(given, folders):
 
 def declared_classes(file):
     """The names of the classes that a MOF file declares, with what it includes, in their order: superclasses first."""
-    classes, seen = [], set()
-    _collect(pathlib.Path(file), pathlib.Path(file).parent, classes, seen)
+    return list(_class_files(file))
+
+
+def declarations(file):
+    """A function that finds the text with the declaration of a class in a MOF file and what it includes; empty without one."""
+    files = {name.lower(): declaring for name, declaring in _class_files(file).items()}
+    return lambda cls: _read(files[cls.lower()]) if cls.lower() in files else ""
+
+
+@functools.cache
+def _class_files(file):
+    classes = {}
+    _collect(pathlib.Path(file), pathlib.Path(file).parent, classes, set())
     return classes
+
+
+def _read(file):
+    return file.read_text(encoding="utf-8", errors="replace")
 
 
 def _collect(file, root, classes, seen):
@@ -36,12 +52,12 @@ def _collect(file, root, classes, seen):
         return
     seen.add(file)
     try:
-        text = _COMMENT.sub("", file.read_text(encoding="utf-8", errors="replace"))
+        text = _COMMENT.sub("", _read(file))
     except OSError as error:
         raise Failed(f"the schema is not whole: {error}") from error
     for included, name in _INCLUDE_OR_CLASS.findall(text):
         if name:
-            classes.append(name)
+            classes.setdefault(name, file)
             continue
         # As compilers look for it: beside the file that includes it, then from where the schema begins.
         path = file.parent / included.replace("\\", "/")

@@ -1,12 +1,14 @@
 """OpenPegasus: what it takes to know the module, and how its programs are asked and told."""
 
+import functools
 import os
 import re
 
 from ..catalogue import mof_of, select
+from ..features import lacking
 from ..heading import tell_another_module
 from ..provider_link import link_of
-from ..schema_files import find_schema
+from ..schema_files import declarations, find_schema
 from ..steps import Failed, Replace
 from .openpegasus_holders import Classes, Module, Schema
 from .openpegasus_registration import registration_mof
@@ -29,11 +31,13 @@ class Open_Pegasus:
         self.interop = options.interop or self._find_interop()
 
     def changes(self, mof, library):
-        """(the changes that register, what has to be left out). mof: the declarations of all classes."""
+        """(the changes that register, what has to be left out, what it lacks). mof: the declarations of all classes."""
         schema, module = Schema(self, self.catalogue.name_space), Module(self)
         schema_text, known = schema.look(), self.classes(self.catalogue.name_space)
+        declaration = self._declarations(self.catalogue.name_space)
         if not schema_text:
-            schema_text = schema.text_of(find_schema(self._options.schema, _SCHEMA_FOLDERS))
+            schema_file = find_schema(self._options.schema, _SCHEMA_FOLDERS)
+            schema_text, declaration = schema.text_of(schema_file), declarations(schema_file)
             known = schema_text.splitlines()[1:]
         selection = select(self.catalogue, self.interop, known, self.classes(self.interop))
         registration, registered = registration_mof(self.catalogue, selection, library), module.look()
@@ -48,7 +52,9 @@ class Open_Pegasus:
         # Classes are not replaced under a module that serves them.
         removal = self._change(module, None) if registered not in (None, registration) else None
         changes = [removal, *changes, Replace(self.tools, module, registration, removal)]
-        return [change for change in changes if change], selection.left_out
+        lacks = [*lacking(self.catalogue.name_space, selection.served, self.catalogue, declaration),
+                 *lacking(self.interop, selection.in_interop, self.catalogue, self._declarations(self.interop))]
+        return [change for change in changes if change], selection.left_out, lacks
 
     def removal(self, library):
         schema = Schema(self, self.catalogue.name_space)
@@ -72,6 +78,17 @@ class Open_Pegasus:
             if self.path_of(name_space):
                 raise
             return []
+
+    def _declarations(self, name_space):
+        """A function that finds the declaration of a class in a name space; empty when the server does not tell it."""
+        @functools.cache
+        def declaration(cls):
+            try:
+                return self.tools.ask("cimcli", "gc", cls, "-n", name_space)
+            except Failed:
+                return ""
+
+        return declaration
 
     def path_of(self, name_space):
         """The object path of the name space in the interop name space; empty when there is none."""

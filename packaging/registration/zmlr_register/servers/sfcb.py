@@ -4,9 +4,10 @@ import pathlib
 import re
 
 from ..catalogue import mof_of, select, select_all
+from ..features import lacking
 from ..heading import heading, tell_another_module
 from ..provider_link import link_of
-from ..schema_files import declared_classes, find_schema
+from ..schema_files import declarations, declared_classes, find_schema
 from ..steps import Failed, Holder, Refresh, Replace
 
 INTEROP = "root/interop"
@@ -53,15 +54,16 @@ class Sfcb:
             raise Failed(f"sfcb's folder {self.staging} is not there: name it with --staging")
 
     def changes(self, mof, library):
-        """(the changes that register, what has to be left out). mof: the declarations of all classes."""
-        known = declared_classes(find_schema(self._options.schema, _SCHEMA_FOLDERS))
+        """(the changes that register, what has to be left out, what it lacks). mof: the declarations of all classes."""
+        schema = find_schema(self._options.schema, _SCHEMA_FOLDERS)
+        known = declared_classes(schema)
         selection = select(self.catalogue, self.interop, known, known)
         registration = registration_text(self.catalogue, selection, library)
         registered = Staged(self, self.catalogue.name_space).look() or {}
         tell_another_module(self.tools, library, registered.get("zmlr.reg"), registration)
-        return self._plan(library, str(library),
-                          {"zmlr.reg": registration, "zemlar.mof": mof_of(mof, selection.served)},
-                          {"zemlar.mof": mof_of(mof, selection.in_interop)} if selection.in_interop else None), selection.left_out
+        plan = self._plan(library, str(library), {"zmlr.reg": registration, "zemlar.mof": mof_of(mof, selection.served)},
+                          {"zemlar.mof": mof_of(mof, selection.in_interop)} if selection.in_interop else None)
+        return plan, selection.left_out, lacking(self.catalogue.name_space, selection.served, self.catalogue, declarations(schema))
 
     def removal(self, library):
         return self._plan(library, None, None, None)
