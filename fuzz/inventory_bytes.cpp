@@ -1,10 +1,13 @@
 // Any bytes given as what cards, modules and disks deliver: read within their bounds, into texts that clients can be shown.
 #include "inventory/fru_number.h"
+#include "inventory/port_statistics.h"
 #include "inventory/property_text.h"
 #include "inventory/scsi_pages.h"
 #include "inventory/sfp_info.h"
 
 #include <algorithm>
+#include <array>
+#include <cstdint>
 #include <cstdlib>
 #include <cstring>
 
@@ -59,5 +62,10 @@ extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, size_t size)
     shown(lun.serial_number);
     is_tape_device(inquiry);
     expect(lun_count(inquiry) <= UINT32_MAX / lun_entry_size);
+
+    const auto counters = block_of<std::array<hxal_stats_long_t, HXAL_ETH_PORT_STATS>>(data, size);
+    const uint64 received = fc_port_statistics(counters).fc.rx_frames;
+    expect(received == 0 || std::ranges::find(counters, received, &hxal_stats_long_t::value) != counters.end());
+    eth_port_statistics(counters);
     return 0;
 }

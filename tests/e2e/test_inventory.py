@@ -76,17 +76,20 @@ def test_the_beacon_does_what_it_is_told(start):
     path = host.pywbem.EnumerateInstanceNames("ZEMLAR_AlarmDevice")[0]
 
     def set_state(state, of=path):
+        """The code that comes back, and whether the driver was asked at all."""
         arguments = {} if state is None else {"State": pywbem.Uint16(state)}
-        return host.pywbem.InvokeMethod("SetAlarmState", of, **arguments)[0]
+        before = host.server.hxasim("requests")
+        code = host.pywbem.InvokeMethod("SetAlarmState", of, **arguments)[0]
+        return code, host.server.hxasim("requests") != before
 
     seen = []
     for state in (3, 3, 1, 1, 2, 0, None):
-        seen.append((set_state(state), host.pywbem.GetInstance(path)["AlarmState"]))
-    assert seen == [(0, 3), (2, 3), (0, 1), (2, 1), (2, 1), (2, 1), (2, 1)]
+        seen.append((*set_state(state), host.pywbem.GetInstance(path)["AlarmState"]))
+    assert seen == [(0, True, 3), (2, True, 3), (0, True, 1), (2, True, 1), (2, False, 1), (2, False, 1), (2, False, 1)]
 
     nobody = path.copy()
     nobody["DeviceID"] = "1000000000000000"
-    assert set_state(3, nobody) == 2
+    assert [set_state(3, of) for of in (nobody, path.classname)] == [(2, False), (2, False)]
 
 
 def test_the_beacon_of_a_mezzanine_card_is_not_supported(mixed):
