@@ -103,6 +103,11 @@ private:
         ZMLR_LOG(LL_ERR, "Unable to create the indication thread: %s", exception.what());
         return false;
     }
+    catch (...) // out of the server, which prepares the thread
+    {
+        ZMLR_LOG(LL_ERR, "Unable to create the indication thread: %s", "unexpected exception");
+        return false;
+    }
 
     // At the end of a process that did not disable it, this thread runs on while everything static is destroyed.
     static void* deliverIndications(void* provider)
