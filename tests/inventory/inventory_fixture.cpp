@@ -1,6 +1,7 @@
 #include "tests/inventory/inventory_fixture.h"
 
 #include "hxal/hxal.h"
+#include "inventory/property_text.h"
 #include "runtime/print.h"
 #include "tests/runtime/home.h"
 #include "tests/runtime/printed.h"
@@ -32,9 +33,14 @@ std::string text_of(const Instance* instance, const Meta_Property* property)
 {
     if (null_of(instance, property))
         return {};
+    const void* value = address_of(instance, property->offset);
+    if (property->type == STRING && property->subscript == 0)
+    {
+        const String& text = *static_cast<const String*>(value);
+        EXPECT_TRUE(property_text(text.c_str(), text.size()) == text) << property->name << " is what no client can be sent";
+    }
     const auto print = property->subscript ? print_array : print_scalar;
-    return printed([&](FILE* stream)
-                   { print(stream, static_cast<Type>(property->type), address_of(instance, property->offset)); });
+    return printed([&](FILE* stream) { print(stream, static_cast<Type>(property->type), value); });
 }
 
 } // namespace
