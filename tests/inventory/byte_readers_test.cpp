@@ -155,6 +155,7 @@ TEST(Scsi_answers, are_read_within_their_bounds)
     fill_serial_number(info, page);
     EXPECT_EQ(std::string(32, 'S'), info.serial_number);
 
+    EXPECT_TRUE(is_tape_device({0x28})) << "a changer, which is not connected";
     EXPECT_EQ(lun_number(std::array<std::uint8_t, 8>{0x40, 0x05}), 5U);
     EXPECT_EQ(lun_number(std::array<std::uint8_t, 8>{0x01, 0x02}), 258U);
     EXPECT_EQ(lun_count(std::vector<std::uint8_t>{0xFF, 0xFF, 0xFF, 0xFF}), 0x1FFFFFFFU);

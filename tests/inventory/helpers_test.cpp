@@ -5,6 +5,7 @@
 #include "inventory/port_helper.h"
 #include "tests/inventory/inventory_fixture.h"
 
+#include <algorithm>
 #include <cerrno>
 #include <cstring>
 
@@ -151,7 +152,31 @@ TEST_F(Helpers, let_the_other_side_of_a_card_stand_in)
     }
 }
 
-// However many units a target tells of, it is asked twice at most, and not for more than there can be.
+// The target's 101 units just fit into the first list.
+TEST_F(Helpers, ask_units_with_the_room_for_what_they_may_answer)
+{
+    plug_text(R"({"adapters": [{"kind": "fc-hba", "ports": [{"remote_ports": [
+        {"pwwn": "2100000F00000001", "luns": {"count": 101, "identification": "none"}}]}]}]})");
+    all(CLASSID_StorageExtent);
+    std::vector<std::vector<std::uint32_t>> asked; // command, page and its length; room for data and sense
+    for (const hxasim::Request& request : hxasim::take_requests())
+    {
+        hxa_ioctl_scsi_t scsi = {};
+        std::memcpy(&scsi, request.sent.data(), std::min(request.sent.size(), sizeof scsi));
+        const auto& cdb = scsi.cdb.scsi_cdb;
+        if (request.name == "IOCMD_LPORT_GET_RPORTS")
+        {
+            EXPECT_THAT(std::vector(&request.sent[24], &request.sent[28]), ElementsAre(255, 0, 0, 0));
+        }
+        if (request.name == "IOCMD_SCSI_CMND" && asked.size() < 5)
+            asked.push_back({cdb[0], cdb[1], cdb[2], cdb[4], scsi.iosz, scsi.snssz});
+    }
+    EXPECT_THAT(asked, ElementsAre(ElementsAre(0x12, 0, 0, 36, 36, 18), ElementsAre(0xA0, 0, 0, 0, 816, 18),
+                                   ElementsAre(0x12, 0, 0, 36, 36, 18), ElementsAre(0x12, 1, 0x83, 40, 40, 18),
+                                   ElementsAre(0x12, 1, 0x80, 36, 36, 18)));
+}
+
+// However many units a target tells of, it is asked twice at most, not for more than there can be, and told no more than fit.
 TEST_F(Helpers, believe_no_number_of_units)
 {
     plug_text(R"({"adapters": [{"kind": "fc-hba", "ports": [{"remote_ports": [
@@ -164,4 +189,8 @@ TEST_F(Helpers, believe_no_number_of_units)
     EXPECT_EQ(last.iosz, 65536U * 8 + 8);
     EXPECT_THAT(log(), IsSupersetOf({"ERR TargetHelper: hxal_scsi_reportluns returned error -  42",
                                      "INFO TargetHelper: Continue with next rport. Reportlun had issue. "}));
+
+    plug_text(R"({"adapters": [{"kind": "fc-hba", "ports": [{"remote_ports": [{"luns": {"count": 102}}]}]}]})");
+    hxasim::inject({.cdb = {0xA0}, .skip = 1, .data = {{2, {0x10}}}}); // 512 units more
+    EXPECT_EQ(all(CLASSID_StorageExtent).size(), 102U);
 }
