@@ -71,8 +71,9 @@ def test_wbemcli_sees_the_same(mixed):
             assert texts.items() <= mixed.wbemcli.get_instance(lines[-1]).items()
 
 
-def test_the_beacon_does_what_it_is_told(start):
-    host = start("cna")
+def test_the_beacon_does_what_it_is_told(start, tmp_path):
+    (tmp_path / ".cimplerc").write_text("LOG_LEVEL = INFO\n", encoding="utf-8")
+    host = start("cna", {"HOME": str(tmp_path)})
     path = host.pywbem.EnumerateInstanceNames("ZEMLAR_AlarmDevice")[0]
 
     def set_state(state, of=path):
@@ -86,6 +87,10 @@ def test_the_beacon_does_what_it_is_told(start):
     for state in (3, 3, 1, 1, 2, 0, None):
         seen.append((*set_state(state), host.pywbem.GetInstance(path)["AlarmState"]))
     assert seen == [(0, True, 3), (2, True, 3), (0, True, 1), (2, True, 1), (2, False, 1), (2, False, 1), (2, False, 1)]
+    log = (tmp_path / ".cimple/messages").read_text(encoding="utf-8")
+    done, failed, refused = ("INFO", "return value = 0"), ("INFO", "return value = 2"), ("ERR", "Error: Invalid Input State")
+    said = [done, failed, done, failed, *[refused, failed] * 3]
+    assert re.findall(r"(\w+): ZEMLAR_AlarmDevice_Provider\(\d+\): (.*)", log) == said
 
     nobody = path.copy()
     nobody["DeviceID"] = "1000000000000000"

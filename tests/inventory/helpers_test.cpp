@@ -115,6 +115,10 @@ TEST_F(Helpers, let_the_other_side_of_a_card_stand_in)
     // Port 0 of the adapter has no IOC: the driver says that its only IOC drives port 1.
     const std::string port_1_only = R"({"adapters": [{"kind": "fc-hba", "ports": [{}]}], "faults": [
         {"command": "IOCMD_IOC_GET_ATTR", "answer": [{"offset": 1600, "bytes": "01"}]}]})";
+    // Which counters come is decided by the IOC, which are looked for by the card.
+    const std::string strange = R"({"adapters": [
+        {"kind": "cna", "cna_capable": false, "ports": [{"counters": {"from": 1000}}]},
+        {"kind": "fc-hba", "cna_capable": true, "ports": [{"counters": {"from": 2000}}]}]})";
     const hxasim::Fault hxn = {.command = "IOCMD_IOC_GET_ATTR", .node = "/dev/hxn", .error = EIO};
     const hxasim::Fault hxa = {.command = "IOCMD_IOC_GET_ATTR", .node = "/dev/hxa", .error = EIO};
     const hxasim::Fault other_serial = {.command = "IOCMD_IOC_GET_ATTR", .node = "/dev/hxn", .answer = {{8 + 8 + 8, {'E', 0}}}};
@@ -137,6 +141,7 @@ TEST_F(Helpers, let_the_other_side_of_a_card_stand_in)
         {CLASSID_PortController,    cna,         {other_serial},    "Name",        {R"("E")"}}, // the Ethernet side tells of the card
         {CLASSID_PortController,    no_fc,       {},                "DeviceID",    {R"("00051E200000")", R"("00051E200100")"}},
         {CLASSID_FCPort,            port_1_only, {},                "PortNumber",  {"1"}},
+        {CLASSID_FCPortStatistics,  strange,     {},                "DumpedFrames", {"0", "0"}},
         {CLASSID_EthernetPort,      cna,         {no_sfp, fc_side}, "PortType",    {"0", "105"}},
         {CLASSID_PhysicalConnector, cna,         {no_sfp, fc_side}, "Tag",         {R"("SERIAL-1_1_1")"}},
         {CLASSID_PhysicalConnector, no_fc,       {},                "Description", {4, R"("10G_BASE-SR")"}},
