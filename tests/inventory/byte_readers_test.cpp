@@ -59,7 +59,7 @@ TEST(FRU_number, comes_out_of_a_whole_block_only)
 
     const Row rows[] = {
         {"whole", vpd_with("V1", fru_value), "42D0510"},
-        {"16 characters at most", vpd_with("VZ", "FRU NUMBER         0123456789ABCDEFG"), "0123456789ABCDEF"},
+        {"16 characters at most", vpd_with("VZ", " A FRU NUMBER      0123456789ABCDEFG"), "0123456789ABCDEF"},
         {"shorter than its label", vpd_with("V1", "FRU"), ""},
         {"another keyword", vpd_with("S1", fru_value), ""},
         {"a keyword of no letters", vpd_with("V-", fru_value), ""},

@@ -107,6 +107,7 @@ TEST_F(Helpers, find_ports_by_their_adapter)
 TEST_F(Helpers, let_the_other_side_of_a_card_stand_in)
 {
     const std::string cna = R"({"adapters": [{"kind": "cna", "serial": "SERIAL"}]})";
+    const std::string hba_and_cna = R"({"adapters": [{"kind": "fc-hba"}, {"kind": "cna"}]})";
     // Where the FC driver is missing, the Ethernet side is all there is: its MAC address still tells the adapters apart.
     const std::string no_fc = R"({"adapters": [{"kind": "cna"}, {"kind": "cna"}],
         "faults": [{"command": "IOCMD_IOC_GET_INST", "node": "/dev/hxa", "error": "EIO"}]})";
@@ -123,6 +124,7 @@ TEST_F(Helpers, let_the_other_side_of_a_card_stand_in)
     const hxasim::Fault hxa = {.command = "IOCMD_IOC_GET_ATTR", .node = "/dev/hxa", .error = EIO};
     const hxasim::Fault other_serial = {.command = "IOCMD_IOC_GET_ATTR", .node = "/dev/hxn", .answer = {{8 + 8 + 8, {'E', 0}}}};
     const hxasim::Fault info = {.command = "IOCMD_IOC_GET_INFO", .error = EIO};
+    const hxasim::Fault fcoe = {.command = "IOCMD_IOC_GET_ATTR", .node = "/dev/hxa", .instance = 2, .error = EIO};
     const hxasim::Fault no_sfp = {.command = "IOCMD_DIAG_SFP", .node = "/dev/hxn", .instance = 0, .status = 89};
     const hxasim::Fault fc_side = {.command = "IOCMD_DIAG_SFP", .node = "/dev/hxa", .error = EIO};
     const hxasim::Fault no_partition = {.command = "IOCMD_FLASH_GET_ATTR", .answer = {{8 + 4, {0, 0, 0, 0}}}};
@@ -147,6 +149,8 @@ TEST_F(Helpers, let_the_other_side_of_a_card_stand_in)
         {CLASSID_PhysicalConnector, no_fc,       {},                "Description", {4, R"("10G_BASE-SR")"}},
         {CLASSID_PhysicalConnector, no_ethernet, {},                "Description", {2, R"("10G_BASE-SR")"}},
         {CLASSID_AdapterSoftwareIdentity, cna,   {no_partition},    "Classifications", {"{ 2 }", "{ 2 }", "{ 10 }"}},
+        {CLASSID_AdapterSoftwareIdentity, hba_and_cna, {fcoe},      "Classifications", // a storage driver, then a network driver
+         {"{ 2 }", "{ 11 }", "{ 10 }", "{ 2 }", "{ 10 }"}},
         // clang-format on
     };
     for (const auto& row : rows)
