@@ -2,8 +2,6 @@
 
 import difflib
 import re
-import shutil
-import subprocess
 from pathlib import Path
 
 import pytest
@@ -101,33 +99,3 @@ def test_the_beacon_of_a_mezzanine_card_is_not_supported(mixed):
     path = mixed.pywbem.EnumerateInstanceNames("ZEMLAR_AlarmDevice")[0]
     path["DeviceID"] = "100000051E100200"
     assert mixed.pywbem.InvokeMethod("SetAlarmState", path, State=pywbem.Uint16(3))[0] == 1
-
-
-def test_the_access_point_is_there_while_the_agent_runs(start, tmp_path):
-    (tmp_path / ".cimplerc").write_text("LOG_LEVEL = INFO\n", encoding="utf-8")
-    agent = tmp_path / "quillonagent"
-    shutil.copy(shutil.which("sleep"), agent)
-    host = start("no-driver", {"HOME": str(tmp_path)})
-
-    def addresses():
-        points = host.pywbem.EnumerateInstances("ZEMLAR_RemoteServiceAccessPoint")
-        return [(point["Name"], point["ElementName"], point["InfoFormat"], point["AccessInfo"]) for point in points]
-
-    def hosted(source, role, far_role):
-        return client.AssociatorNames(source, AssocClass="ZEMLAR_RemoteServiceHostedAccessPoint", Role=role, ResultRole=far_role)
-
-    client = host.pywbem
-    system_path = client.EnumerateInstanceNames("ZEMLAR_ComputerSystem")[0]
-    system = system_path["Name"]
-    before = addresses()
-    with subprocess.Popen([agent, "60"]) as process:
-        during = addresses()
-        points = hosted(system_path, "Antecedent", "Dependent")
-        systems = hosted(points[0], "Dependent", "Antecedent") if points else []
-        process.terminate()
-    service = ("Quillon Service", "Quillon Service Access Point", 200, f"https://{system}:34568/index.html")
-    assert (before, during, addresses()) == ([], [service], [])
-    assert ([point["Name"] for point in points], [found["Name"] for found in systems]) == (["Quillon Service"], [system])
-    log = (tmp_path / ".cimple/messages").read_text(encoding="utf-8")
-    for level, line in (("INFO", "The Quillon Agent is not running so no service available"), ("ERR", "Warning: No service is available")):
-        assert len(re.findall(rf"{level}: \w+\(\d+\): {line}\n", log)) == 2
