@@ -51,17 +51,18 @@ template <std::size_t N> String trimmed(const char (&field)[N])
     return property_text(text);
 }
 
-// One after the other: compilers differ in the order of operands, and trimming is logged.
-String vendor_and_product(const _hbaLunInfo& lun, const char* between)
+// Texts are trimmed one after the other: compilers differ in the order of operands, and trimming is logged.
+String serial_name(const _hbaLunInfo& lun)
 {
     const String vendor = trimmed(lun.vendor);
-    return vendor + between + trimmed(lun.product);
+    const String product = trimmed(lun.product);
+    return vendor + "+" + product + "+" + trimmed(lun.serial_number);
 }
 
 String name_of(const _hbaLunInfo& lun)
 {
     if (lun.identifier_type == IDENTIFIER_SERIAL_NUMBER)
-        return vendor_and_product(lun, "+") + "+" + trimmed(lun.serial_number);
+        return serial_name(lun);
     if (lun.identifier_type == IDENTIFIER_UNAVAILABLE)
         return "Unable To Fetch";
     return kind_of(lun) ? property_text(lun.identifier) : String();
@@ -76,7 +77,12 @@ String lun_text(const _hbaLunInfo& lun)
 
 String device_id(const _hbaPortInfo& port, const _hbaLunInfo& lun)
 {
-    return String(port.port_wwn) + "_" + lun.target_wwn + "_" + vendor_and_product(lun, "_") + "_" + lun_text(lun);
+    const String vendor = trimmed(lun.vendor);
+    const String product = trimmed(lun.product);
+    char text[128];
+    std::snprintf(text, sizeof text, "%s_%s_%s_%s_LUN_%u", port.port_wwn, lun.target_wwn, vendor.c_str(), product.c_str(),
+                  lun_number(lun.lun));
+    return text;
 }
 
 // What disks and tapes have in common.
