@@ -1,6 +1,7 @@
 """The demonstration: what real clients see of a simulated host. Fails loudly when a step fails or the clients disagree."""
 
 import argparse
+import json
 import queue
 import subprocess
 import sys
@@ -11,14 +12,18 @@ import pywbem
 from tools.simulated_server import ROOT, SimulatedServer
 from tools.wbemcli import Wbemcli
 from zmlr_inventory.subscription import Subscription
-from zmlr_inventory.values import ENABLED_STATE, OPERATIONAL_STATUS, speed
+from zmlr_inventory.values import ENABLED_STATE, ETHERNET_PORT_TYPE, FC_PORT_TYPE, OPERATIONAL_STATUS, speed
 from zmlr_inventory.watch import line_of
 
 NAME_SPACE = "root/zemlar"
+SCENARIO = "mixed"
 
 ALARM_STATES = {1: "off", 3: "blinking"}
 JOB_STATES = {4: "Running", 7: "Completed"}
 COMPLETION_STATES = {2: "Passed", 5: "Failed"}
+HEALTH_STATES = {0: "Unknown", 5: "OK", 10: "Degraded", 15: "Minor failure"}
+ROLES = {2: "Initiator", 3: "Target"}
+NAME_FORMATS = {0: "Unknown", 1: "Other", 7: "vendor+product+serial", 9: "NAA", 10: "EUI-64", 11: "T10 vendor"}
 
 STARTED = 4096  # what RunDiagnostic returns for a job that runs
 RUN_TIMEOUT = 60  # seconds
@@ -62,32 +67,52 @@ def text(value):
     return "" if value is None else str(value)
 
 
-def show(title, columns, rows):
+def show(title, columns, rows, right=()):
     table = [columns] + [[str(cell) for cell in row] for row in rows]
     widths = [max(len(row[i]) for row in table) for i in range(len(columns))]
     print(f"\n{title}\n")
     for row in [table[0], ["-" * width for width in widths], *table[1:]]:
-        print("  " + "  ".join(cell.ljust(width) for cell, width in zip(row, widths)).rstrip())
+        cells = (cell.rjust(width) if name in right else cell.ljust(width) for cell, width, name in zip(row, widths, columns))
+        print("  " + "  ".join(cells).rstrip())
 
 
 def status(codes):
     return OPERATIONAL_STATUS[codes[0]]
 
 
-def kind(other_type):
-    return other_type or "FC"
+def count(number):
+    return f"{number:,}"
 
 
-def target(other_identifying_info):
-    """The target's WWN, of a unit's "<port WWN>_<target WWN>_..."."""
-    return other_identifying_info[0].split("_")[1]
+def gigabits(bits_per_second):
+    return speed(bits_per_second) or "-"
+
+
+def part(index):
+    """Tells the part of a key "<port WWN>_<target WWN>_<vendor>_<product>_LUN_<number>"; an initiator's key is its port WWN."""
+    return lambda key: key.split("_")[index] if "_" in key else "-" if index else key
+
+
+def device(device_id):
+    return " ".join(device_id.split("_")[2:-2])
+
+
+def place(tag):
+    """The adapter and port of a module, by its tag "<serial number>_<adapter>_<port>"."""
+    return "adapter {}, port {}".format(*tag.split("_")[-2:])
+
+
+def media(text):
+    """Ethernet media by their names, FC speeds in MB/s."""
+    return text.replace(",", ", ") + " MB/s" if text[:1].isdigit() and "BASE" not in text else text
 
 
 UNIT = [
-    ("Target WWN", "OtherIdentifyingInfo", target),
+    ("Port WWN", "DeviceID", part(0)),
+    ("Target WWN", "DeviceID", part(1)),
     ("Unit", "ElementName", str),
+    ("Device", "DeviceID", device),
     ("Name", "Name", str),
-    ("Status", "OperationalStatus", status),
 ]
 
 # What is shown: a title, a class, and for each column its heading, its property and how a value is told.
@@ -98,8 +123,8 @@ TABLES = [
         "ZEMLAR_PortController",
         [
             ("Address", "DeviceID", str),
+            ("Kind", "Caption", str),
             ("Serial number", "Name", str),
-            ("Kind", "OtherControllerType", kind),
             ("State", "EnabledState", ENABLED_STATE.get),
             ("Status", "OperationalStatus", status),
         ],
@@ -107,7 +132,13 @@ TABLES = [
     (
         "Their cards",
         "ZEMLAR_PhysicalPackage",
-        [("Tag", "Tag", str), ("Model", "Model", str), ("Serial number", "SerialNumber", str), ("FRU", "FRUNumber", str)],
+        [
+            ("Tag", "Tag", str),
+            ("Manufacturer", "Manufacturer", str),
+            ("Model", "Model", str),
+            ("Serial number", "SerialNumber", str),
+            ("FRU number", "FRUNumber", str),
+        ],
     ),
     (
         "Their products",
@@ -127,41 +158,69 @@ TABLES = [
             ("Port", "PortNumber", str),
             ("Status", "OperationalStatus", status),
             ("State", "EnabledState", ENABLED_STATE.get),
-            ("Speed", "Speed", lambda bits: speed(bits) or "-"),
+            ("Type", "PortType", FC_PORT_TYPE.get),
+            ("Speed", "Speed", gigabits),
+            ("At most", "MaxSpeed", gigabits),
             ("Symbolic name", "Caption", str),
         ],
     ),
     (
-        "What the FC ports count",
+        "What the FC ports have counted",
         "ZEMLAR_FCPortStatistics",
         [
             ("Port WWN", "InstanceID", str),
-            ("Bytes sent", "BytesTransmitted", str),
-            ("Bytes received", "BytesReceived", str),
-            ("Error frames", "ErrorFrames", str),
-            ("CRC errors", "CRCErrors", str),
-            ("Link failures", "LinkFailures", str),
+            ("Bytes sent", "BytesTransmitted", count),
+            ("Bytes received", "BytesReceived", count),
+            ("Frames sent", "PacketsTransmitted", count),
+            ("Frames received", "PacketsReceived", count),
+            ("Errored", "ErrorFrames", count),
+            ("Dropped", "DumpedFrames", count),
+            ("CRC errors", "CRCErrors", count),
+            ("Link failures", "LinkFailures", count),
         ],
     ),
-    ("Their beacons", "ZEMLAR_AlarmDevice", [("Port WWN", "DeviceID", str), ("Beacon", "AlarmState", ALARM_STATES.get)]),
+    (
+        "The SCSI initiators in the ports, and the targets that they see",
+        "ZEMLAR_SCSIProtocolEndpoint",
+        [("Port WWN", "Name", part(0)), ("Target WWN", "Name", part(1)), ("Role", "Role", ROLES.get), ("Status", "OperationalStatus", status)],
+    ),
+    ("The disks behind the targets", "ZEMLAR_StorageExtent", [*UNIT, ("Kind of name", "NameFormat", NAME_FORMATS.get)]),
+    ("The tapes behind the targets", "ZEMLAR_TapeDrive", UNIT),
     (
         "The Ethernet ports",
         "ZEMLAR_EthernetPort",
-        [("MAC", "DeviceID", str), ("Interface", "ElementName", str), ("Port", "PortNumber", str), ("Status", "OperationalStatus", status)],
+        [
+            ("MAC", "DeviceID", str),
+            ("Interface", "ElementName", str),
+            ("Port", "PortNumber", str),
+            ("Status", "OperationalStatus", status),
+            ("Type", "PortType", ETHERNET_PORT_TYPE.get),
+        ],
+    ),
+    (
+        "Their LAN endpoints",
+        "ZEMLAR_LANEndpoint",
+        [
+            ("Interface", "Name", str),
+            ("MAC", "MACAddress", str),
+            ("MTU", "MaxDataSize", count),
+            ("Health", "HealthState", HEALTH_STATES.get),
+        ],
     ),
     (
         "The modules in the ports",
         "ZEMLAR_PhysicalConnector",
         [
-            ("Tag", "Tag", str),
+            ("Where", "Tag", place),
             ("Kind", "Model", str),
             ("Manufacturer", "Manufacturer", str),
             ("Part number", "PartNumber", str),
-            ("Made for", "Description", str),
+            ("Revision", "Version", str),
+            ("Serial number", "SerialNumber", str),
+            ("Made for", "Description", media),
         ],
     ),
-    ("Disks behind the ports", "ZEMLAR_StorageExtent", UNIT),
-    ("Tapes behind the ports", "ZEMLAR_TapeDrive", UNIT),
+    ("The beacons of the ports", "ZEMLAR_AlarmDevice", [("Port WWN", "DeviceID", str), ("Beacon", "AlarmState", ALARM_STATES.get)]),
 ]
 
 
@@ -191,6 +250,7 @@ def show_class(clients, title, class_name, columns):
         title,
         [heading for heading, _, _ in columns],
         [[tell(value) for value, (_, _, tell) in zip(row, columns)] for row in rows],
+        right=[heading for heading, _, tell in columns if tell is count],
     )
 
 
@@ -210,7 +270,7 @@ def switch_a_beacon(clients):
         seen = clients.pywbem.GetInstance(path)["AlarmState"]
         if (code, seen) != (0, state):
             raise SystemExit(f"demo: SetAlarmState {state} gave {code}, and the beacon shows {seen}")
-        print(f"\nThe beacon of {path['DeviceID']} is {ALARM_STATES[seen]}.")
+        print(f"\nSetAlarmState {state}: the beacon of {path['DeviceID']} is {ALARM_STATES[seen]}.")
 
 
 def show_the_tree(server):
@@ -254,8 +314,10 @@ def run_a_test(clients):
 
 def demonstrate(server):
     clients = Clients(server)
-    print(f"The embedded CIM server runs on {server.url}, its host has the simulated adapters of scenario 'mixed'.")
-    print("Every table below was fetched twice, by wbemcli and by pywbem, and is the same for both.")
+    scenario = json.loads((ROOT / f"sim/scenarios/{SCENARIO}.json").read_text(encoding="utf-8"))
+    print(f"The simulated host \"{SCENARIO}\", as the CIM server on {server.url} shows it to storage management in {NAME_SPACE}:")
+    print(scenario["description"])
+    print("\nEvery table below was fetched twice, by wbemcli and by pywbem, and is the same for both.")
     for title, class_name, columns in TABLES:
         show_class(clients, title, class_name, columns)
     show_one_port(clients)
@@ -267,7 +329,7 @@ def demonstrate(server):
 
 def main():
     argparse.ArgumentParser(prog="tools.demo", description=__doc__).parse_args()
-    server = SimulatedServer("mixed")
+    server = SimulatedServer(SCENARIO)
     try:
         demonstrate(server)
     finally:
