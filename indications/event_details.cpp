@@ -2,6 +2,7 @@
 
 #include "hxal/records/aen.h"
 #include "indications/event_index.h"
+#include "runtime/trace.h"
 
 #include <algorithm>
 #include <iterator>
@@ -11,6 +12,8 @@ namespace zmlr
 
 namespace
 {
+
+constexpr const char* log_source = "IndicationHelper";
 
 struct Event_Details
 {
@@ -66,8 +69,22 @@ const char* text_of(uint32 id, const char* Event_Details::*column)
 
 } // namespace
 
-const char* getEventCauseById(uint32 id) { return text_of(id, &Event_Details::cause); }
-const char* getEventActionById(uint32 id) { return text_of(id, &Event_Details::action); }
-const char* getMessageIDById(uint32 id) { return text_of(id, &Event_Details::message_id); }
+const char* getEventCauseById(uint32 id)
+{
+    const Scope_Trace trace(log_source);
+    return text_of(id, &Event_Details::cause);
+}
+
+const char* getEventActionById(uint32 id)
+{
+    const Scope_Trace trace(log_source);
+    return text_of(id, &Event_Details::action);
+}
+
+const char* getMessageIDById(uint32 id)
+{
+    const Scope_Trace trace(log_source);
+    return text_of(id, &Event_Details::message_id);
+}
 
 } // namespace zmlr

@@ -1,6 +1,7 @@
 #include "indications/event_index.h"
 
 #include "runtime/log.h"
+#include "runtime/trace.h"
 
 namespace zmlr
 {
@@ -45,12 +46,14 @@ const Event_Index& event_index()
 
 bool initEventIndex()
 {
+    const Scope_Trace trace(log_source);
     event_index();
     return true;
 }
 
 void getIndexBoundaryForCategory(hxa_aen_category_t category, int* min, int* max)
 {
+    const Scope_Trace trace(log_source);
     *min = event_index().min[category];
     *max = event_index().max[category];
     ZMLR_LOG(LL_DBG, "The boundary : Category = %d, MinIndex = %d, MaxIndex = %d ", static_cast<int>(category), *min, *max);
@@ -58,6 +61,7 @@ void getIndexBoundaryForCategory(hxa_aen_category_t category, int* min, int* max
 
 bool getEventIndexInArray(hxa_aen_category_t category, uint32 id, int* index)
 {
+    const Scope_Trace trace(log_source);
     int row = 0;
     int last = 0;
     getIndexBoundaryForCategory(category, &row, &last);

@@ -30,13 +30,12 @@ IndicationHelper& IndicationHelper::getIndicationHelperInstance()
     return helper;
 }
 
-// The first event may come before the registration returns: it finds the index made.
 bool IndicationHelper::subscribeForEventNotifications()
 {
     const Scope_Trace trace(log_source);
-    const bool indexed = initEventIndex();
     if (!registrations.registerForEvents())
         return false;
+    const bool indexed = initEventIndex();
     ZMLR_LOG(LL_DBG, "initEventIndex() method returned %d.", static_cast<int>(indexed));
     return true;
 }
@@ -55,6 +54,7 @@ bool IndicationHelper::getIndicationObject(Ref<ZEMLAR_AlertIndication>& out)
 
 bool IndicationHelper::updateIndicationObjects(Ref<ZEMLAR_AlertIndication> alert)
 {
+    const Scope_Trace trace(log_source);
     pending.append(std::move(alert));
     return true;
 }

@@ -2,6 +2,7 @@
 
 #include "hxal/hxal.h"
 #include "runtime/log.h"
+#include "runtime/trace.h"
 
 namespace zmlr
 {
@@ -15,6 +16,7 @@ constexpr const char* log_source = "IndicationHelper";
 
 Perceived_Severity getPerceivedSeverity(int severity)
 {
+    const Scope_Trace trace(log_source);
     switch (severity)
     {
     case HXA_LOG_CRITICAL:
