@@ -14,7 +14,7 @@ namespace
 
 constexpr const char* log_source = "PortHelper";
 
-constexpr Walk_Row disabled_walk = {.source = log_source, .iocs = Iocs::of_card};
+constexpr Walk_Row disabled_walk = {.source = log_source, .iocs = Iocs::any};
 
 bool is_mac(const String& address) { return address.size() == ProviderUtil::mac_text_size - 1; }
 
@@ -61,7 +61,7 @@ std::optional<std::uint32_t> state_of(const hxal_t* ioc, hxa_status_t (*read)(co
     return std::nullopt;
 }
 
-bool is_disabled(const Open_Port& port)
+bool is_disabled(const Open_Adapter& adapter, const Open_Port& port)
 {
     if (port.fc)
     {
@@ -69,7 +69,7 @@ bool is_disabled(const Open_Port& port)
         if (!state || is_out_of_service(*state))
             return state.has_value();
     }
-    if (port.ethernet)
+    if (adapter.is_cna && port.ethernet)
     {
         const auto state = state_of(port.ethernet.get(), hxal_ethport_get_attr, "hxal_ethport_get_attr failed");
         if (!state || is_out_of_service(*state))
@@ -96,7 +96,7 @@ bool isPortDisabled(const String& address)
     for (Port_Walk ports(disabled_walk, *adapter); ports.next();)
     {
         if (has_address(ports.port(), address))
-            return is_disabled(ports.port());
+            return is_disabled(*adapter, ports.port());
     }
     return false;
 }

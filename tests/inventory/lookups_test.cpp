@@ -112,7 +112,8 @@ TEST_F(Lookups, read_the_driver_version_where_there_is_one)
 // A port is asked on its FC side first; what it does not tell counts as in service.
 TEST_F(Lookups, tell_whether_a_port_is_disabled)
 {
-    const std::string enabled = R"({"adapters": [{"kind": "cna"}, {"kind": "fc-hba", "ports": [{}, {"state": "disabled"}]}]})";
+    const std::string enabled = R"({"adapters": [{"kind": "cna"}, {"kind": "fc-hba", "ports": [{}, {"state": "disabled"}]},
+        {"kind": "cna", "cna_capable": false}]})";
     const auto fc_state = [](std::uint8_t state) {
         return hxasim::Fault{.command = "IOCMD_PORT_GET_ATTR", .answer = {{8 + 324, {state}}}};
     };
@@ -141,6 +142,8 @@ TEST_F(Lookups, tell_whether_a_port_is_disabled)
         {"100000051E100000", {fc_state(6)}, false, "INFO PortHelper: Port Enabled"},
         {"100000051E100000", {fc_state(9)}, false, "INFO PortHelper: Port Enabled"},
         {"100000051E100100", {}, false, "INFO PortHelper: Port Enabled"},
+        {"100000051E100200", {ethernet_disabled}, false, "INFO PortHelper: Port Enabled"}, // not of a CNA
+        {"00051E200200", {fc_state(8)}, true, nullptr},
         // clang-format on
     };
     for (const auto& row : rows)
