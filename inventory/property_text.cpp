@@ -15,7 +15,7 @@ String property_text(const char* field, std::size_t size)
     for (std::size_t i = 0; i < bytes.size();)
     {
         const std::size_t length = text::xml_character_size(bytes.substr(i));
-        if (length == 0)
+        if (length == 0 || bytes[i] == '\r')
             result.set(static_cast<uint32>(i), '?');
         i += std::max<std::size_t>(length, 1);
     }

@@ -8,9 +8,9 @@
 namespace zmlr
 {
 
-// The text in `field`, up to its terminator or the field's end. A byte that cannot stand in an XML 1.0 document encoded in
-// UTF-8 (a control character other than tab, line feed and carriage return; a byte of no valid sequence; a code point that
-// XML excludes) becomes '?'.
+// The text in `field`, up to its terminator or the field's end. A byte that does not come through an XML 1.0 document encoded
+// in UTF-8 as it is (a control character other than tab and line feed; a byte of no valid sequence; a code point that XML
+// excludes) becomes '?'. Readers take a carriage return for a line feed: a key with one could not be sent back.
 String property_text(const char* field, std::size_t size);
 template <std::size_t N> String property_text(const char (&field)[N]) { return property_text(field, N); }
 
