@@ -56,17 +56,26 @@ def key_values(path):
         yield from key_values(value) if isinstance(value, pywbem.CIMInstanceName) else [str(value)]
 
 
+def as_wbemcli_prints(value):
+    if isinstance(value, list):
+        return ",".join(map(as_wbemcli_prints, value))
+    return "" if value is None else str(value).lower() if isinstance(value, bool) else str(value)
+
+
 def test_wbemcli_sees_the_same(mixed):
     for class_name in served_classes():
         lines = mixed.wbemcli.enumerate_instance_names(class_name)
-        names = mixed.pywbem.EnumerateInstanceNames(class_name)
-        for line, name in zip(lines, names, strict=True):
-            for value in key_values(name):
+        seen = mixed.wbemcli.enumerate_instances(class_name)
+        for instance, other, line in zip(mixed.pywbem.EnumerateInstances(class_name), seen, lines, strict=True):
+            plain = {key: as_wbemcli_prints(value) for key, value in instance.items() if not isinstance(value, pywbem.CIMInstanceName)}
+            assert plain.items() <= other.items()
+            for value in key_values(instance.path):
                 _, found, line = line.partition(value)
                 assert found
-        if names:
-            texts = {key: text for key, text in mixed.pywbem.GetInstance(names[-1]).items() if isinstance(text, str)}
-            assert texts.items() <= mixed.wbemcli.get_instance(lines[-1]).items()
+        if lines:
+            assert mixed.wbemcli.get_instance(lines[-1]) == seen[-1]
+            listed = list(seen[-1])[1::5]
+            assert mixed.wbemcli.get_instance(lines[-1], *listed).items() == {key: seen[-1][key] for key in ["__path", *listed]}.items()
 
 
 def test_the_beacon_does_what_it_is_told(start, tmp_path):
