@@ -336,7 +336,7 @@ def main():
         code = server.stop()
     if code != 0:
         raise SystemExit(f"demo: the server ended with {code}:\n" + "\n".join(server.lines))
-    print("\nThe server has stopped. Done.")
+    print(f"\nThe server has stopped. Done: script/server --scenario {SCENARIO} keeps one running for any client.")
 
 
 if __name__ == "__main__":

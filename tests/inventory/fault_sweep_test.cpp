@@ -219,7 +219,11 @@ TEST_F(Fault_Sweep, costs_what_depends_on_the_request_and_nothing_else)
                     continue; // may be believed
                 EXPECT_THAT(gained, testing::Each(testing::Truly(is_marked)));
                 EXPECT_LE(gained.size(), lost.size());
-                EXPECT_TRUE(lost.size() == marked || has_a_substitute(row.id, sent, i)) << lost.size() << " of " << marked;
+                // With a substitute one may change, and only what a side alone tells of, its driver or the boot code, is missing.
+                const std::size_t may_be_missing = row.id == CLASSID_AdapterSoftwareIdentity ? 1 : 0;
+                EXPECT_TRUE(has_a_substitute(row.id, sent, i) ? lost.size() <= gained.size() + may_be_missing
+                                                              : lost.size() == marked)
+                    << lost.size() << " of " << marked;
                 std::erase_if(said, [&](const std::string& line) { return std::ranges::count(usual_log, line) > 0; });
                 if (!is_told_by_the_library(row.id, sent, i))
                 {
