@@ -67,16 +67,17 @@ def generate(mof, providers_file, omitted=()):
 
 
 def update(output, files):
-    """Brings the directory to this content, touching only what differs."""
+    """Brings the folders of the files to this content, touching only what differs. Other folders there are of other generators."""
     for name, content in files.items():
         path = output / name
         if path.is_file() and path.read_text(encoding="utf-8") == content:
             continue
         path.parent.mkdir(parents=True, exist_ok=True)
         path.write_text(content, encoding="utf-8")
-    for path in output.glob("*/*"):
-        if path.suffix in (".h", ".cpp") and path.relative_to(output).as_posix() not in files:
-            path.unlink()
+    for folder in {(output / name).parent for name in files}:
+        for path in folder.iterdir():
+            if path.suffix in (".h", ".cpp") and path.relative_to(output).as_posix() not in files:
+                path.unlink()
 
 
 if __name__ == "__main__":

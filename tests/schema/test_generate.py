@@ -118,5 +118,9 @@ def test_output_is_deterministic_and_touched_only_where_it_changes(project):
     changed = {path.name for path in second if first.get(path) != second[path]}
     assert changed == {"CIM_C.h", "meta_data.cpp", "repository.h"}
 
+    of_another = project.output / "metrics/families.h"
+    of_another.parent.mkdir()
+    of_another.touch()
     project.generate(classes)
+    of_another.unlink()  # and it is still there
     assert project.contents().keys() == first.keys()
