@@ -5,7 +5,7 @@ from pathlib import Path
 import pytest
 import pywbem
 from conftest import NAME_SPACE, code_of, without_id
-from pywbem import CIMInstanceName
+from pywbem import CIMInstance, CIMInstanceName
 
 CLASS = Path(__file__).with_name("class.xml").read_text(encoding="utf-8")
 FC_PORT_KEYS = ["SystemCreationClassName", "SystemName", "CreationClassName", "DeviceID"]
@@ -209,6 +209,7 @@ def port(**keys):
         (lambda c: c.GetInstance(port(DeviceID=True)), 4),
         (lambda c: c.InvokeMethod("Explode", port()), 17),
         (lambda c: c.DeleteInstance(port()), 7),
+        (lambda c: c.ModifyInstance(CIMInstance("ZEMLAR_FCPort", {"Caption": "x"}, path=port())), 7),
         (lambda c: c.OpenEnumerateInstances("ZEMLAR_FCPort"), 7),
         (lambda c: c.PullInstances(("1", NAME_SPACE), 1), 7),
         (lambda c: c.CreateClass(pywbem.CIMClass("TST_New")), 7),
