@@ -9,6 +9,7 @@ import pytest
 import pywbem
 from conftest import PROGRAM
 
+from tools.running import running
 from tools.simulated_server import ROOT
 from zmlr_inventory import parallel
 
@@ -102,7 +103,7 @@ def subscriptions(server):
 
 def test_watch_shows_the_alerts_of_several_hosts_and_leaves_nothing(serve):
     servers = [serve("mixed"), serve("odd")]
-    with subprocess.Popen([*PROGRAM, "--watch", *(server.url for server in servers), "http://127.0.0.1:1"], stdout=-1, stderr=-1, text=True) as program:
+    with running([*PROGRAM, "--watch", *(server.url for server in servers), "http://127.0.0.1:1"], stdout=-1, stderr=-1, text=True) as program:
         said = [program.stderr.readline() for _ in range(4)]
         assert sorted("refused" in line for line in said) == [False, False, False, True]
         assert [subscriptions(server) for server in servers] == [[1, 1, 1]] * 2
@@ -126,7 +127,7 @@ def test_a_subscription_that_fails_leaves_nothing(serve, run):
 def test_what_a_killed_program_left_is_removed_by_the_next(serve):
     server = serve("mixed")
     for number in (signal.SIGKILL, signal.SIGTERM):
-        with subprocess.Popen([*PROGRAM, "--watch", server.url], stderr=-1, text=True) as program:
+        with running([*PROGRAM, "--watch", server.url], stderr=-1, text=True) as program:
             assert [program.stderr.readline() for _ in range(2)]
             assert subscriptions(server) == [1, 1, 1]
             program.send_signal(number)

@@ -3,6 +3,7 @@
 import json
 import os
 import re
+import signal
 import socket
 import subprocess
 import sys
@@ -16,6 +17,9 @@ sys.path.insert(0, str(Path(__file__).resolve().parents[2]))
 
 from tools.simulated_server import ROOT, SimulatedServer  # noqa: E402
 from tools.wbemcli import Wbemcli  # noqa: E402
+
+# Jobs in the background of a shell ignore it, and so would all that the tests start and interrupt.
+signal.signal(signal.SIGINT, signal.default_int_handler)
 
 NAME_SPACE = "root/zemlar"
 TIMEOUT = 60  # seconds until something that must happen has failed to

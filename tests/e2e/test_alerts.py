@@ -5,7 +5,6 @@ import json
 import re
 import signal
 import socket
-import subprocess
 import time
 from pathlib import Path
 
@@ -13,6 +12,7 @@ import pytest
 import pywbem
 from conftest import TIMEOUT, code_of, wait_until
 
+from tools.running import running
 from tools.simulated_server import ROOT
 from zmlr_inventory.subscription import Subscription
 
@@ -203,7 +203,7 @@ def test_script_alerts_shows_them_until_it_is_interrupted(served):
     one_property = ["--query", "SELECT EventID FROM ZEMLAR_AlertIndication"]
     for number, query, told in ((signal.SIGINT, [], everything), (signal.SIGTERM, one_property, "HXA_AEN_PORT_SFP_REMOVE")):
         command = [ROOT / "script/alerts", host.server.url, *query]
-        with subprocess.Popen(command, stdout=-1, stderr=-1, text=True) as script:
+        with running(command, stdout=-1, stderr=-1, text=True) as script:
             assert host.server.url in script.stderr.readline()
             host.server.hxasim("event", "port", "sfp-remove")
             line = script.stdout.readline().rstrip("\n")
