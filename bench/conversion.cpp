@@ -48,9 +48,8 @@ private:
 
 void convert(const Port& port)
 {
-    zmlr::CMPI_Ptr<CMPIObjectPath> path;
     zmlr::CMPI_Ptr<CMPIInstance> instance;
-    zmlr::make_cmpi_object(port.broker(), port.instance.ptr(), name_space, nullptr, path, instance);
+    zmlr::make_cmpi_object(port.broker(), port.instance, name_space, nullptr, instance);
 }
 
 // ---- the bare calls ----

@@ -6,6 +6,8 @@
 
 #include <cmpift.h>
 
+#include <utility>
+
 namespace zmlr
 {
 
@@ -22,15 +24,18 @@ struct Answer
     CMPIrc rc = CMPI_RC_OK;       // of the first object that could not be answered
 };
 
-// The callback of an enumeration whose client data are an Answer: takes over each object and gives it to `send`, which
-// answers a CMPIrc. Says stop at the first failure, which `rc` keeps, and at the end mark.
-template <CMPIrc (*send)(const Answer&, Instance*), class Status> bool answer_with(Instance* instance, Status, void* client_data)
+// Gives an object to the server.
+using Send = CMPIrc (*)(const Answer&, Ref<Instance>);
+
+// The callback of an enumeration whose client data are an Answer: takes over each object and sends it. Says stop at the first
+// failure, which `rc` keeps, and at the end mark.
+template <Send send, class Status> bool answer_with(Instance* instance, Status, void* client_data)
 {
-    const Ref<Instance> object(instance);
+    Ref<Instance> object(instance);
     auto& answer = *static_cast<Answer*>(client_data);
     if (!object || answer.rc != CMPI_RC_OK)
         return false;
-    answer.rc = send(answer, object.ptr());
+    answer.rc = send(answer, std::move(object));
     return answer.rc == CMPI_RC_OK;
 }
 

@@ -45,11 +45,11 @@ const char* own_name_space(const Answer& answer, const Instance* object)
     return object->__name_space.empty() ? answer.name_space.c_str() : object->__name_space.c_str();
 }
 
-CMPIrc send_associator(const Answer& answer, Instance* object)
+CMPIrc send_associator(const Answer& answer, Ref<Instance> object)
 {
     CMPI_Ptr<CMPIInstance> cmpi_instance;
-    if (make_cmpi_instance(answer.broker, object, own_name_space(answer, object), nullptr, answer.properties, cmpi_instance) !=
-        CMPI_RC_OK)
+    const char* name_space = own_name_space(answer, object.ptr());
+    if (make_cmpi_instance(answer.broker, std::move(object), name_space, nullptr, answer.properties, cmpi_instance) != CMPI_RC_OK)
         return CMPI_RC_ERR_FAILED;
     CMReturnInstance(answer.result, cmpi_instance.get());
     return CMPI_RC_OK;
@@ -60,10 +60,10 @@ CMPIrc make_name(const Answer& answer, const Instance* object, CMPI_Ptr<CMPIObje
     return make_cmpi_object_path(answer.broker, object, own_name_space(answer, object), path);
 }
 
-CMPIrc send_name(const Answer& answer, Instance* object)
+CMPIrc send_name(const Answer& answer, Ref<Instance> object)
 {
     CMPI_Ptr<CMPIObjectPath> path;
-    if (make_name(answer, object, path) != CMPI_RC_OK)
+    if (make_name(answer, object.ptr(), path) != CMPI_RC_OK)
         return CMPI_RC_ERR_FAILED;
     CMReturnObjectPath(answer.result, path.get());
     return CMPI_RC_OK;
@@ -71,12 +71,12 @@ CMPIrc send_name(const Answer& answer, Instance* object)
 
 // An answer has each far end once, however many associations lead to it: a repeated one is not worth another fetch, which may ask
 // the drivers. (Names cost nothing; servers drop those that are repeated, also across providers.)
-CMPIrc send_named_instance(const Answer& answer, Instance* object)
+CMPIrc send_named_instance(const Answer& answer, Ref<Instance> object)
 {
-    if (!answer.far_ends->add(object))
+    if (!answer.far_ends->add(object.ptr()))
         return CMPI_RC_OK;
     CMPI_Ptr<CMPIObjectPath> path;
-    if (make_name(answer, object, path) != CMPI_RC_OK)
+    if (make_name(answer, object.ptr(), path) != CMPI_RC_OK)
         return CMPI_RC_ERR_FAILED;
     CMPIStatus status = {CMPI_RC_OK, nullptr};
     const CMPI_Ptr<CMPIInstance> found(
@@ -105,26 +105,27 @@ void keep_listed(Instance* association, const char** properties)
             null_of(association, as_property(feature)) = 1;
 }
 
-CMPIrc send_reference(const Answer& answer, Instance* association)
+CMPIrc send_reference(const Answer& answer, Ref<Instance> association)
 {
     CMPI_Ptr<CMPIObjectPath> path;
-    CMPIrc rc = make_cmpi_object_path(answer.broker, association, answer.name_space.c_str(), path);
+    CMPIrc rc = make_cmpi_object_path(answer.broker, association.ptr(), answer.name_space.c_str(), path);
     if (rc != CMPI_RC_OK)
         return rc;
-    keep_listed(association, answer.properties.names()); // after the path, which needs the keys
+    keep_listed(association.ptr(), answer.properties.names()); // after the path, which needs the keys
 
     CMPI_Ptr<CMPIInstance> cmpi_instance;
-    rc = make_cmpi_instance(answer.broker, association, answer.name_space.c_str(), path.get(), answer.properties, cmpi_instance);
+    rc = make_cmpi_instance(answer.broker, std::move(association), answer.name_space.c_str(), path.get(), answer.properties,
+                            cmpi_instance);
     if (rc == CMPI_RC_OK)
         CMReturnInstance(answer.result, cmpi_instance.get());
     return rc;
 }
 
-CMPIrc send_reference_name(const Answer& answer, Instance* association)
+CMPIrc send_reference_name(const Answer& answer, Ref<Instance> association)
 {
-    nullify_non_keys(association);
+    nullify_non_keys(association.ptr());
     CMPI_Ptr<CMPIObjectPath> path;
-    const CMPIrc rc = make_cmpi_object_path(answer.broker, association, answer.name_space.c_str(), path);
+    const CMPIrc rc = make_cmpi_object_path(answer.broker, association.ptr(), answer.name_space.c_str(), path);
     if (rc == CMPI_RC_OK)
         CMReturnObjectPath(answer.result, path.get());
     return rc;
@@ -200,8 +201,7 @@ CMPIrc answer_associator_names(const Association_Request& request)
 }
 
 // References and their names: the model tells which properties the caller wants of the associations.
-template <CMPIrc (*send)(const Answer&, Instance*)>
-CMPIrc answer_references(const Association_Request& request, void (*prepare_model)(Instance*))
+template <Send send> CMPIrc answer_references(const Association_Request& request, void (*prepare_model)(Instance*))
 {
     const Meta_Class* source_class = request.source_class();
     if (!source_class)

@@ -102,7 +102,13 @@ int CMPIInstance_Container::set_value(const char* name, const Value& value, uint
     {
         const auto kept = std::ranges::find(*_keys, name, &Kept_Key::name);
         if (kept != _keys->end())
-            return put(name, kept->data);
+        {
+            CMPI_Data data = std::move(kept->data);
+            _keys->erase(kept); // it is not needed again
+            if (_keys->empty())
+                *_keys = Kept_Keys();
+            return put(name, data);
+        }
     }
     return CMPI_Container::set_value(name, value, flags);
 }

@@ -66,6 +66,19 @@ int Container::convert(const Meta_Class* meta_class, uint32 mask, Ref<Instance>&
 
 int Container::convert(const Instance* instance, uint32 mask)
 {
+    return carry(instance, mask, [](const Meta_Property*) {});
+}
+
+int Container::convert(Ref<Instance> instance)
+{
+    if (is_shared(instance.ptr()))
+        return convert(instance.ptr(), 0);
+    return carry(instance.ptr(), 0, [&](const Meta_Property* property) { end_value(instance.ptr(), property); });
+}
+
+// Tells which of the properties that take memory of their own are done.
+template <class Done> int Container::carry(const Instance* instance, uint32 mask, Done done)
+{
     if (!instance)
     {
         ZMLR_LOG(LL_WARN, "ignored null instance arg");
@@ -88,6 +101,8 @@ int Container::convert(const Instance* instance, uint32 mask)
         }
         if (set_value(feature->name, value, feature->flags) != 0)
             ZMLR_LOG(LL_WARN, "conversion error: %s.%s", record->name, feature->name);
+        if (const Meta_Property* property = to_property(feature); property && takes_memory(property))
+            done(property);
     }
     return 0;
 }

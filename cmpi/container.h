@@ -33,10 +33,16 @@ public:
     // Returns 0, or -1 for a null instance.
     int convert(const Instance* instance, uint32 mask);
 
+    // The same with all features, for the last time: unless somebody else holds the instance, each property ends when it is in
+    // the container, so that memory never has room for the whole of both.
+    int convert(Ref<Instance> instance);
+
 protected:
     const Meta_Repository* repository() const { return _repository; }
 
 private:
+    template <class Done> int carry(const Instance* instance, uint32 mask, Done done);
+
     const Meta_Repository* _repository;
 };
 

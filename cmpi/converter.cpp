@@ -28,20 +28,24 @@ CMPIrc fill_path(const CMPIBroker* broker, const Instance* instance, const char*
     return CMPI_RC_OK;
 }
 
-CMPIrc fill_instance(const CMPIBroker* broker, const Instance* instance, const char* name_space, const CMPIObjectPath* path,
-                     const Property_Filter& filter, Kept_Keys* keys, CMPI_Ptr<CMPIInstance>& cmpi_instance)
+// An instance without values under a path.
+CMPIrc begin_instance(const CMPIBroker* broker, const Meta_Class* meta_class, const CMPIObjectPath* path,
+                      const Property_Filter& filter, CMPI_Ptr<CMPIInstance>& begun)
 {
     CMPIStatus status = {CMPI_RC_OK, nullptr};
-    CMPI_Ptr<CMPIInstance> made(CMNewInstance(broker, path, &status));
-    if (!made || !okay(status))
+    begun.reset(CMNewInstance(broker, path, &status));
+    if (!begun || !okay(status))
         return CMPI_RC_ERR_FAILED;
-    const CMPIrc rc = filter ? filter.install(made.get(), instance->meta_class) : CMPI_RC_OK;
-    if (rc != CMPI_RC_OK)
-        return rc;
-    CMPIInstance_Container container(instance->meta_class->meta_repository, broker, name_space, made.get(), keys);
-    if (container.convert(instance, 0) != 0)
+    return filter ? filter.install(begun.get(), meta_class) : CMPI_RC_OK;
+}
+
+CMPIrc finish_instance(const CMPIBroker* broker, Ref<Instance> instance, const char* name_space, Kept_Keys* keys,
+                       CMPI_Ptr<CMPIInstance> begun, CMPI_Ptr<CMPIInstance>& cmpi_instance)
+{
+    CMPIInstance_Container container(instance->meta_class->meta_repository, broker, name_space, begun.get(), keys);
+    if (container.convert(std::move(instance)) != 0)
         return CMPI_RC_ERR_FAILED;
-    cmpi_instance = std::move(made);
+    cmpi_instance = std::move(begun);
     return CMPI_RC_OK;
 }
 
@@ -70,23 +74,34 @@ CMPIrc make_cmpi_object_path(const CMPIBroker* broker, const Instance* instance,
     return fill_path(broker, instance, name_space, path, nullptr);
 }
 
-CMPIrc make_cmpi_object(const CMPIBroker* broker, const Instance* instance, const char* name_space, const Property_Filter& filter,
-                        CMPI_Ptr<CMPIObjectPath>& path, CMPI_Ptr<CMPIInstance>& cmpi_instance)
+CMPIrc make_cmpi_object(const CMPIBroker* broker, Ref<Instance> instance, const char* name_space, const Property_Filter& filter,
+                        CMPI_Ptr<CMPIInstance>& cmpi_instance)
 {
     Kept_Keys keys;
     keys.reserve(instance->meta_class->num_keys);
-    const CMPIrc rc = fill_path(broker, instance, name_space, path, &keys);
-    return rc == CMPI_RC_OK ? fill_instance(broker, instance, name_space, path.get(), filter, &keys, cmpi_instance) : rc;
+    CMPI_Ptr<CMPIObjectPath> path;
+    CMPIrc rc = fill_path(broker, instance.ptr(), name_space, path, &keys);
+    CMPI_Ptr<CMPIInstance> begun;
+    if (rc == CMPI_RC_OK)
+        rc = begin_instance(broker, instance->meta_class, path.get(), filter, begun);
+    path.reset(); // the instance has its own
+    if (rc == CMPI_RC_OK)
+        rc = finish_instance(broker, std::move(instance), name_space, &keys, std::move(begun), cmpi_instance);
+    return rc;
 }
 
-CMPIrc make_cmpi_instance(const CMPIBroker* broker, const Instance* instance, const char* name_space, const CMPIObjectPath* path,
+CMPIrc make_cmpi_instance(const CMPIBroker* broker, Ref<Instance> instance, const char* name_space, const CMPIObjectPath* path,
                           const Property_Filter& filter, CMPI_Ptr<CMPIInstance>& cmpi_instance)
 {
-    if (path)
-        return fill_instance(broker, instance, name_space, path, filter, nullptr, cmpi_instance);
-    ZMLR_LOG(LL_WARN, "No ObjectPath built before call to make_CMPI_instance");
-    CMPI_Ptr<CMPIObjectPath> own_path;
-    return make_cmpi_object(broker, instance, name_space, filter, own_path, cmpi_instance);
+    if (!path)
+    {
+        ZMLR_LOG(LL_WARN, "No ObjectPath built before call to make_CMPI_instance");
+        return make_cmpi_object(broker, std::move(instance), name_space, filter, cmpi_instance);
+    }
+    CMPI_Ptr<CMPIInstance> begun;
+    const CMPIrc rc = begin_instance(broker, instance->meta_class, path, filter, begun);
+    return rc == CMPI_RC_OK ? finish_instance(broker, std::move(instance), name_space, nullptr, std::move(begun), cmpi_instance)
+                            : rc;
 }
 
 namespace

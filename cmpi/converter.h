@@ -38,14 +38,15 @@ private:
 CMPIrc make_cmpi_object_path(const CMPIBroker* broker, const Instance* instance, const char* name_space,
                              CMPI_Ptr<CMPIObjectPath>& path);
 
-// The whole instance under a path (null: the one of its keys, which is logged). A property list is installed as the
-// instance's property filter; the code of a failing filter call is answered as it is.
-CMPIrc make_cmpi_instance(const CMPIBroker* broker, const Instance* instance, const char* name_space, const CMPIObjectPath* path,
+// The whole instance under a path (null: the one of its keys, which is logged). What nobody else holds ends value by value while
+// it is converted. A property list is installed as the instance's property filter; the code of a failing filter call is answered
+// as it is.
+CMPIrc make_cmpi_instance(const CMPIBroker* broker, Ref<Instance> instance, const char* name_space, const CMPIObjectPath* path,
                           const Property_Filter& filter, CMPI_Ptr<CMPIInstance>& cmpi_instance);
 
-// Both, the instance under the path: its keys are converted once.
-CMPIrc make_cmpi_object(const CMPIBroker* broker, const Instance* instance, const char* name_space, const Property_Filter& filter,
-                        CMPI_Ptr<CMPIObjectPath>& path, CMPI_Ptr<CMPIInstance>& cmpi_instance);
+// The same under the path of its keys, which are converted once.
+CMPIrc make_cmpi_object(const CMPIBroker* broker, Ref<Instance> instance, const char* name_space, const Property_Filter& filter,
+                        CMPI_Ptr<CMPIInstance>& cmpi_instance);
 
 // An instance of meta_class with the properties of a CMPI instance. It and what it references get the path's name space
 // where they have none.

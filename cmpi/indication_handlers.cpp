@@ -57,7 +57,7 @@ void deliver(const CMPI_Thread_Context& thread_context, const Instance* indicati
     trc(__LINE__, "delivering an indication to %s", name_space);
     CMPI_Ptr<CMPIInstance> cmpi_instance;
     const CMPIBroker* broker = thread_context.cmpi_broker();
-    if (make_cmpi_instance(broker, indication, name_space, nullptr, nullptr, cmpi_instance) != CMPI_RC_OK)
+    if (make_cmpi_instance(broker, share(indication), name_space, nullptr, nullptr, cmpi_instance) != CMPI_RC_OK)
         return;
     const CMPIStatus status = CBDeliverIndication(broker, thread_context.cmpi_context(), name_space, cmpi_instance.get());
     if (!okay(status))

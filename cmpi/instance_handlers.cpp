@@ -11,20 +11,20 @@ namespace zmlr
 namespace
 {
 
-CMPIrc send_path(const Answer& answer, Instance* object)
+CMPIrc send_path(const Answer& answer, Ref<Instance> object)
 {
     CMPI_Ptr<CMPIObjectPath> path;
-    const CMPIrc rc = make_cmpi_object_path(answer.broker, object, answer.name_space.c_str(), path);
+    const CMPIrc rc = make_cmpi_object_path(answer.broker, object.ptr(), answer.name_space.c_str(), path);
     if (rc == CMPI_RC_OK)
         CMReturnObjectPath(answer.result, path.get());
     return rc;
 }
 
-CMPIrc send_instance(const Answer& answer, Instance* object)
+CMPIrc send_instance(const Answer& answer, Ref<Instance> object)
 {
-    CMPI_Ptr<CMPIObjectPath> path;
     CMPI_Ptr<CMPIInstance> cmpi_instance;
-    const CMPIrc rc = make_cmpi_object(answer.broker, object, answer.name_space.c_str(), answer.properties, path, cmpi_instance);
+    const CMPIrc rc =
+        make_cmpi_object(answer.broker, std::move(object), answer.name_space.c_str(), answer.properties, cmpi_instance);
     if (rc == CMPI_RC_OK)
         CMReturnInstance(answer.result, cmpi_instance.get());
     return rc;
@@ -106,7 +106,9 @@ CMPIrc get(CMPI_Adapter& adapter, const CMPIResult* result, const CMPIObjectPath
         return CMPI_RC_ERR_FAILED;
 
     CMPI_Ptr<CMPIInstance> cmpi_instance;
-    rc = make_cmpi_instance(adapter.broker, found.ptr(), model->__name_space.c_str(), path, properties, cmpi_instance);
+    const String name_space = model->__name_space;
+    model.reset();
+    rc = make_cmpi_instance(adapter.broker, std::move(found), name_space.c_str(), path, properties, cmpi_instance);
     if (rc != CMPI_RC_OK)
         return rc;
     CMReturnInstance(result, cmpi_instance.get());

@@ -34,7 +34,7 @@ struct Outgoing
     bool make(const CMPIBroker* broker, const char* name_space, const Instance* source)
     {
         return make_path(broker, name_space, source) &&
-               make_cmpi_instance(broker, source, name_space, path.get(), nullptr, instance) == CMPI_RC_OK;
+               make_cmpi_instance(broker, share(source), name_space, path.get(), nullptr, instance) == CMPI_RC_OK;
     }
 };
 

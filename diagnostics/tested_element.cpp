@@ -43,10 +43,8 @@ Ref<Instance> Tested_Elements::find(const Tested_Element& element)
     for (Instance* instance : all_of(element.class_id))
     {
         const auto* device = cast<CIM_LogicalDevice>(instance);
-        if (!device || !element.address.equali(device->DeviceID.value))
-            continue;
-        ref(instance);
-        return Ref<Instance>(instance);
+        if (device && element.address.equali(device->DeviceID.value))
+            return share(instance);
     }
     return Ref<Instance>();
 }

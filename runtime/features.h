@@ -54,14 +54,23 @@ inline const Array<Instance*>& references_of(const Instance* instance, const Met
 inline bool is_null(const Instance* instance, const Meta_Feature* feature)
 {
     if (const Meta_Property* property = to_property(feature))
-        return value_at<uint8>(instance,
-                               property->offset + (is_array(property) ? uint32{sizeof(void*)} : type_size[property->type])) != 0;
+        return null_of(instance, property) != 0;
     const Meta_Reference* reference = as_reference(feature);
     return is_array(reference) ? null_of(instance, reference) != 0 : !reference_of(instance, reference);
 }
 
+// Whether the value of a feature is more than the bytes of a number.
+inline bool takes_memory(const Meta_Feature* feature)
+{
+    const Meta_Property* property = to_property(feature);
+    return !property || is_array(property) || property->type == STRING || property->type == DATETIME;
+}
+
 // A new record of a class or a method: null flags clear, values zero, references unset.
 Instance* create_record(const Meta_Record* record);
+
+// Ends the value of a property: it is that of a new record.
+void end_value(Instance* instance, const Meta_Property* property);
 
 // Copies one feature between instances of one class; a reference gets a clone of the source's.
 void copy_feature(Instance* dest, const Instance* src, const Meta_Feature* feature);

@@ -65,7 +65,8 @@ void destruct(Instance* instance, const Meta_Feature* feature)
 void free_record(Instance* instance)
 {
     for (const Meta_Feature* feature : features_of(instance))
-        destruct(instance, feature);
+        if (takes_memory(feature))
+            destruct(instance, feature);
 
     const std::size_t size = record_of(instance)->size;
     unref(instance->meta_class);
@@ -115,31 +116,6 @@ void set_defaults(Instance* instance)
 constinit const Meta_Class Instance::static_meta_class = {
     {{{0}, Flag_Class, "Instance", nullptr, 0}, nullptr, 0, sizeof(Instance)}, nullptr, nullptr, 0, nullptr};
 
-uint32 type_size_of(const Meta_Property* property)
-{
-    return is_array(property) ? static_cast<uint32>(sizeof(void*)) : type_size[property->type];
-}
-
-uint8& null_of(Instance* instance, const Meta_Property* property)
-{
-    return value_at<uint8>(instance, property->offset + type_size_of(property));
-}
-
-uint8 null_of(const Instance* instance, const Meta_Property* property)
-{
-    return value_at<uint8>(instance, property->offset + type_size_of(property));
-}
-
-uint8& null_of(Instance* instance, const Meta_Reference* array_reference)
-{
-    return value_at<uint8>(instance, array_reference->offset + static_cast<uint32>(sizeof(void*)));
-}
-
-uint8 null_of(const Instance* instance, const Meta_Reference* array_reference)
-{
-    return value_at<uint8>(instance, array_reference->offset + static_cast<uint32>(sizeof(void*)));
-}
-
 Instance*& reference_of(Instance* instance, const Meta_Reference* reference)
 {
     return value_at<Reference_Slot>(instance, reference->offset);
@@ -161,7 +137,8 @@ Instance* create_record(const Meta_Record* record)
     new (&instance->__name_space) String;
 
     for (const Meta_Feature* feature : features_of(record))
-        construct(instance, feature);
+        if (takes_memory(feature))
+            construct(instance, feature);
     return instance;
 }
 
@@ -193,6 +170,14 @@ void ref(const Instance* instance)
         return;
     check_inst(instance);
     Atomic_inc(&const_cast<Instance*>(instance)->__refs);
+}
+
+bool is_shared(const Instance* instance) { return instance && Atomic_get(&instance->__refs) > 1; }
+
+void end_value(Instance* instance, const Meta_Property* property)
+{
+    destruct(instance, property);
+    construct(instance, property);
 }
 
 void unref(const Instance* instance)

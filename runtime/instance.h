@@ -39,11 +39,26 @@ inline const void* address_of(const Instance* instance, uint32 offset)
 {
     return reinterpret_cast<const char*>(instance) + offset;
 }
-uint32 type_size_of(const Meta_Property* property); // bytes of the value: a scalar's or an array handle's
-uint8& null_of(Instance* instance, const Meta_Property* property);
-uint8 null_of(const Instance* instance, const Meta_Property* property);
-uint8& null_of(Instance* instance, const Meta_Reference* array_reference); // arrays of references only
-uint8 null_of(const Instance* instance, const Meta_Reference* array_reference);
+inline uint32 type_size_of(const Meta_Property* property) // bytes of the value: a scalar's or an array handle's
+{
+    return property->subscript != 0 ? uint32{sizeof(void*)} : type_size[property->type];
+}
+inline uint8& null_of(Instance* instance, const Meta_Property* property)
+{
+    return *static_cast<uint8*>(address_of(instance, property->offset + type_size_of(property)));
+}
+inline uint8 null_of(const Instance* instance, const Meta_Property* property)
+{
+    return null_of(const_cast<Instance*>(instance), property);
+}
+inline uint8& null_of(Instance* instance, const Meta_Reference* array_reference) // arrays of references only
+{
+    return *static_cast<uint8*>(address_of(instance, array_reference->offset + uint32{sizeof(void*)}));
+}
+inline uint8 null_of(const Instance* instance, const Meta_Reference* array_reference)
+{
+    return null_of(const_cast<Instance*>(instance), array_reference);
+}
 Instance*& reference_of(Instance* instance, const Meta_Reference* reference); // single references only
 const Instance* reference_of(const Instance* instance, const Meta_Reference* reference);
 
@@ -52,8 +67,9 @@ const Instance* reference_of(const Instance* instance, const Meta_Reference* ref
 Instance* create(const Meta_Class* meta_class, bool defaults);
 Instance* create(const Meta_Method* meta_method);
 void destroy(Instance* instance);
-void ref(const Instance* instance);   // null is ignored
-void unref(const Instance* instance); // null is ignored; destroys at zero
+void ref(const Instance* instance);       // null is ignored
+void unref(const Instance* instance);     // null is ignored; destroys at zero
+bool is_shared(const Instance* instance); // held by more than one reference; null is not
 Instance* clone(const Instance* instance);
 Instance* key_clone(const Instance* instance); // keys copied, everything else null
 
@@ -125,6 +141,13 @@ public:
 private:
     T* _ptr = nullptr;
 };
+
+// Another reference to an instance that somebody holds.
+inline Ref<Instance> share(const Instance* instance)
+{
+    ref(instance);
+    return Ref<Instance>(const_cast<Instance*>(instance));
+}
 
 // A reference field takes a reference to the instance, which is a T or unset.
 template <class T> void set_reference(T*& field, Instance* instance)

@@ -33,7 +33,7 @@ protected:
     CMPI_Ptr<CMPIInstance> to_cmpi(const Instance* instance)
     {
         CMPI_Ptr<CMPIInstance> made;
-        EXPECT_EQ(make_cmpi_instance(broker.face(), instance, name_space, nullptr, nullptr, made), CMPI_RC_OK);
+        EXPECT_EQ(make_cmpi_instance(broker.face(), share(instance), name_space, nullptr, nullptr, made), CMPI_RC_OK);
         return made;
     }
 
@@ -79,7 +79,7 @@ TEST_F(Conversion, leaves_bad_items_null_and_says_why)
     {
         Ref<TST_Thing> made;
         const auto convert = [&] { made = instance_of<TST_Thing>({c.item, {"Sint64Value", {CMPI_sint64, std::int64_t{5}}}}); };
-        EXPECT_EQ(logged(convert), c.messages) << c.item.name.text();
+        EXPECT_EQ(logged(convert), c.messages) << c.item.name.string();
         EXPECT_THAT(non_null_of(made.ptr()), ElementsAre("Sint64Value"));
     }
 }
@@ -290,7 +290,7 @@ TEST_F(Conversion, tells_of_every_call_that_fails)
         const CMPI_Ptr<CMPIArgs> args(CMNewArgs(broker.face(), nullptr));
         CMPIrc rc = args ? make_cmpi_object_path(broker.face(), sent.ptr(), name_space, path) : CMPI_RC_ERR_FAILED;
         if (rc == CMPI_RC_OK)
-            rc = make_cmpi_instance(broker.face(), sent.ptr(), name_space, path.get(), list, made);
+            rc = make_cmpi_instance(broker.face(), share(sent.ptr()), name_space, path.get(), list, made);
         if (rc == CMPI_RC_OK)
             rc = make_cmpi_method(broker.face(), name_space, method.ptr(), args.get(), return_value);
         return rc;
