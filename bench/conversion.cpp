@@ -58,7 +58,7 @@ void convert(const Port& port)
 template <class Set> void with_scalar(const CMPIBroker* broker, const Value& value, Set set)
 {
     CMPIValue data{};
-    if (const auto* text = value.as<std::string>())
+    if (const auto* text = value.as<cimserver::Text>())
     {
         if (value.type == CMPI_dateTime)
         {
@@ -102,13 +102,13 @@ void call_broker(const Port& port)
     CMPIObjectPath* path = CMNewObjectPath(broker, name_space, "ZEMLAR_FCPort", nullptr);
     for (const auto& key : port.wire.path.keys)
         with_value(broker, key.value,
-                   [&](const CMPIValue* value, CMPIType type) { CMAddKey(path, key.name.text().c_str(), value, type); });
+                   [&](const CMPIValue* value, CMPIType type) { CMAddKey(path, key.name.string().c_str(), value, type); });
     CMPIInstance* instance = CMNewInstance(broker, path, nullptr);
     for (const auto& property : port.wire.properties)
         if (!property.value.null())
             with_value(broker, property.value,
                        [&](const CMPIValue* value, CMPIType type)
-                       { CMSetProperty(instance, property.name.text().c_str(), value, type); });
+                       { CMSetProperty(instance, property.name.string().c_str(), value, type); });
     CMRelease(instance);
     CMRelease(path);
 }

@@ -83,9 +83,9 @@ CMPIValue to_pointer(const Value& value)
     switch (value.type)
     {
     case CMPI_string:
-        return {.string = make<String_Object>(std::get<Shared<std::string>>(value.content)).face()};
+        return {.string = make<String_Object>(std::get<Text>(value.content)).face()};
     case CMPI_dateTime:
-        return {.dateTime = make<Datetime_Object>(std::get<Shared<std::string>>(value.content)).face()};
+        return {.dateTime = make<Datetime_Object>(std::get<Text>(value.content)).face()};
     case CMPI_ref:
         return {.ref = make<Path_Object>(value.get<Object_Path>()).face()};
     case CMPI_instance:
@@ -158,7 +158,7 @@ CMPIData data_at(const std::vector<Named_Value>& list, CMPICount index, CMPIStri
     if (index >= list.size())
         throw Failure{CMPI_RC_ERR_NOT_FOUND};
     if (name)
-        *name = make<String_Object>(list[index].name.text()).face();
+        *name = make<String_Object>(list[index].name).face();
     return to_cmpi(list[index].value);
 }
 

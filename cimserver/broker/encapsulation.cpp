@@ -29,7 +29,8 @@ CMPIObjectPath* new_object_path(const CMPIBroker* broker, const char* name_space
     const auto body = [&]
     {
         const Class_Entry* entry = broker_of(broker).repository().find(required(class_name));
-        return make<Path_Object>(Object_Path{"", name_space ? name_space : "", class_name, {}}, entry).face();
+        return make<Path_Object>(Object_Path{{}, name_space ? name_space : "", entry ? entry->name : class_name, {}}, entry)
+            .face();
     };
     return answer<CMPIObjectPath*>(status, nullptr, body);
 }

@@ -50,7 +50,7 @@ CMPIData get_property_at(const CMPIInstance* self, CMPICount index, CMPIString**
                       const auto& instance = object<Instance_Object>(self);
                       const std::size_t slot = visible_slot(instance, index);
                       if (name)
-                          *name = make<String_Object>(instance.layout().slots()[slot].name.text()).face();
+                          *name = make<String_Object>(instance.layout().slots()[slot].name).face();
                       return to_cmpi(instance.value(slot));
                   });
 }

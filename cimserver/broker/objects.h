@@ -20,9 +20,9 @@ class String_Object : public Handle<CMPIString, String_Object>
 public:
     static const Table table;
 
-    explicit String_Object(Shared<std::string> text_) : text(std::move(text_)) {}
+    explicit String_Object(Text text_) : text(std::move(text_)) {}
 
-    const Shared<std::string> text;
+    const Text text;
 };
 
 // An array of fixed size. Elements start null; a text array takes CMPI_chars too.
@@ -45,9 +45,9 @@ class Datetime_Object : public Handle<CMPIDateTime, Datetime_Object>
 public:
     static const Table table;
 
-    explicit Datetime_Object(Shared<std::string> text_); // throws INVALID_PARAMETER when the text is no datetime
+    explicit Datetime_Object(Text text_); // throws INVALID_PARAMETER when the text is no datetime
 
-    const Shared<std::string> text;
+    const Text text;
 };
 
 class Path_Object : public Handle<CMPIObjectPath, Path_Object>

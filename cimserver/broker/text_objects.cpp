@@ -10,13 +10,13 @@ namespace
 
 const char* get_char_ptr(const CMPIString* self, CMPIStatus* status) noexcept
 {
-    return answer<const char*>(status, nullptr, [&] { return (*object<String_Object>(self).text).c_str(); });
+    return answer<const char*>(status, nullptr, [&] { return object<String_Object>(self).text.c_str(); });
 }
 
 // Any numbers in the form: a timestamp of all zeros is what many agents answer for an unset clock.
-Shared<std::string> checked(Shared<std::string> text)
+Text checked(Text text)
 {
-    if (!text::read_datetime(*text))
+    if (!text::read_datetime(text))
         throw Failure{CMPI_RC_ERR_INVALID_PARAMETER};
     return text;
 }
@@ -40,7 +40,7 @@ const CMPIStringFT String_Object::table = {
     .getCharPtr = get_char_ptr,
 };
 
-Datetime_Object::Datetime_Object(Shared<std::string> text_) : text(checked(std::move(text_))) {}
+Datetime_Object::Datetime_Object(Text text_) : text(checked(std::move(text_))) {}
 
 const CMPIDateTimeFT Datetime_Object::table = {
     .ftVersion = 100,

@@ -99,7 +99,7 @@ Named_Value read_property(const Xml_Element& element, const std::string& name_sp
         if (child.name == "QUALIFIER")
             continue;
         if (property.value.type != CMPI_null)
-            fail("property with two values: " + property.name.text());
+            fail("property with two values: " + property.name.string());
         property.value = read_value(child, name_space);
     }
     return property;

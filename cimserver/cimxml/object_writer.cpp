@@ -38,7 +38,7 @@ void write_key_value(Xml_Writer& writer, const Value& value)
     // A key that clients could refuse as a datetime still names its instance as a text.
     if (text)
         writer.attribute("TYPE", cim_type_name(value.type)).text(*text);
-    else if (const auto* raw = value.as<std::string>())
+    else if (const auto* raw = value.as<Text>())
         writer.text(*raw);
     writer.end();
 }
@@ -139,7 +139,7 @@ void write_reference(Xml_Writer& writer, const Object_Path& path)
 
 void write_instance_path(Xml_Writer& writer, const Object_Path& path)
 {
-    writer.start("INSTANCEPATH").start("NAMESPACEPATH").element("HOST", path.host.empty() ? host_name() : path.host);
+    writer.start("INSTANCEPATH").start("NAMESPACEPATH").element("HOST", path.host.empty() ? host_name() : path.host.string());
     write_local_name_space(writer, path.name_space);
     writer.end();
     write_instance_name(writer, path);

@@ -71,14 +71,14 @@ void enumerate_qualifiers(Name_Spaces& name_spaces, const Parameters& parameters
 // A key without a name is the only key of its class.
 void name_single_key(Name_Spaces& name_spaces, Object_Path& path)
 {
-    if (path.keys.size() != 1 || !path.keys.front().name.text().empty())
+    if (path.keys.size() != 1 || !path.keys.front().name.string().empty())
         return;
     const zmlr::Meta_Class& meta_class = *name_spaces.at(path).get_class(path.class_name);
     for (unsigned i = 0; meta_class.num_keys == 1 && i < meta_class.num_meta_features; ++i)
         if (zmlr::is_key(meta_class.meta_features[i]))
             path.keys.front().name = meta_class.meta_features[i]->name;
-    if (path.keys.front().name.text().empty())
-        throw Cim_Error(CIM_ERR_INVALID_PARAMETER, "unnamed key of a class with several keys: " + path.class_name);
+    if (path.keys.front().name.string().empty())
+        throw Cim_Error(CIM_ERR_INVALID_PARAMETER, "unnamed key of a class with several keys: " + path.class_name.string());
 }
 
 // The class whose features' origins are written; null when the client does not want them, and for an object of a class or a

@@ -78,7 +78,7 @@ void Indication_Providers::activate_with(Active_Filter& active, Provider& provid
     const CMPIIndicationMIFT& calls = *provider.mi->ft;
     if (_order == Indication_Order::sfcb)
     {
-        call.run(provider.mi, calls.authorizeFilter, expression, class_name, call.path, (*Principal_Scope::current()).c_str());
+        call.run(provider.mi, calls.authorizeFilter, expression, class_name, call.path, Principal_Scope::current().c_str());
         if (calls.mustPoll)
             calls.mustPoll(provider.mi, call.request.context(), expression, class_name, call.path);
     }

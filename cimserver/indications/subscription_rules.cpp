@@ -24,7 +24,7 @@ constexpr std::uint64_t not_suppressed = 2;      // RepeatNotificationPolicy
 
 [[noreturn]] void refuse(const Instance& instance, const std::string& why, int code = CIM_ERR_INVALID_PARAMETER)
 {
-    throw Cim_Error(code, instance.path.class_name + ": " + why);
+    throw Cim_Error(code, instance.path.class_name.string() + ": " + why);
 }
 
 Value* value_of(Instance& instance, std::string_view name)
@@ -36,14 +36,14 @@ Value* value_of(Instance& instance, std::string_view name)
 std::string text_of(const Instance& instance, std::string_view name)
 {
     const Named_Value* property = find_named(instance.properties, name);
-    const auto* text = property ? property->value.as<std::string>() : nullptr;
+    const auto* text = property ? property->value.as<Text>() : nullptr;
     return text ? *text : "";
 }
 
 std::size_t text_bytes(const Value& value)
 {
-    if (const auto* text = value.as<std::string>())
-        return text->size();
+    if (const auto* text = value.as<Text>())
+        return text->view().size();
     std::size_t bytes = 0;
     if (const auto* elements = value.as<std::vector<Value>>())
         for (const Value& element : *elements)
@@ -81,8 +81,8 @@ void complete_keys(Instance& instance)
     for (const auto& [name, otherwise] : keys)
     {
         const Named_Value* given = find_named(instance.path.keys, name);
-        const auto* text = given ? given->value.as<std::string>() : nullptr;
-        const std::string value = text ? *text : otherwise;
+        const auto* text = given ? given->value.as<Text>() : nullptr;
+        const std::string value = text ? text->string() : otherwise;
         if (value.empty() || value.size() > max_name_bytes)
             refuse(instance, std::string(name) + " has 1 to " + std::to_string(max_name_bytes) + " bytes");
         complete.push_back({name, {CMPI_string, value}});
@@ -111,7 +111,7 @@ std::vector<std::string> source_name_spaces(const Instance& filter)
     const Named_Value* several = find_named(filter.properties, "SourceNamespaces");
     if (const auto* list = several ? several->value.as<std::vector<Value>>() : nullptr)
         for (const Value& element : *list)
-            if (const auto* text = element.as<std::string>())
+            if (const auto* text = element.as<Text>())
                 names.push_back(*text);
     return names;
 }

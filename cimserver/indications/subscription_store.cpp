@@ -41,7 +41,7 @@ Json json_of(const std::vector<Named_Value>& values)
     Json json = Json::object();
     for (const auto& [name, value] : values)
         if (!value.null())
-            json[name.text()] = json_of(value);
+            json[name.string()] = json_of(value);
     return json;
 }
 
@@ -50,7 +50,7 @@ Json json_of(const Instance&) { return nullptr; } // no property of these classe
 
 Json json_of(const Object_Path& path)
 {
-    return {{"class", path.class_name}, {"name space", path.name_space}, {"keys", json_of(path.keys)}};
+    return {{"class", path.class_name.string()}, {"name space", path.name_space}, {"keys", json_of(path.keys)}};
 }
 
 Json json_of(const std::vector<Value>& elements)
@@ -100,7 +100,7 @@ Value value_of(const Json& json)
     }
     Object_Path path;
     path.name_space = json.at("name space");
-    path.class_name = json.at("class");
+    path.class_name = json.at("class").get<std::string>();
     path.keys = values_of(json.at("keys"));
     return {CMPI_ref, std::move(path)};
 }

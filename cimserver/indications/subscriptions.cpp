@@ -55,7 +55,7 @@ std::vector<Instance> Subscriptions::list(Kind kind) const
 Subscriptions::Entry Subscriptions::checked(Kind kind, Instance instance) const
 {
     Entry entry;
-    instance.path.host.clear();
+    instance.path.host = {};
     instance.path.name_space = Interop_Operations::name_space;
     if (kind == Kind::filter)
     {
@@ -101,7 +101,7 @@ Provider_Filter Subscriptions::provider_filter(const std::string& filter_id) con
 {
     const Entry& filter = table(Kind::filter).at(filter_id);
     const Named_Value* query = find_named(filter.instance.properties, "Query");
-    return {query->value.get<std::string>(), filter.filter->query.class_name(), filter.filter->name_spaces};
+    return {query->value.get<Text>(), filter.filter->query.class_name(), filter.filter->name_spaces};
 }
 
 void Subscriptions::insert(Kind kind, const std::string& id, Entry entry)
@@ -126,7 +126,7 @@ void Subscriptions::update_routes()
     for (const auto& [id, subscription] : table(Kind::subscription))
     {
         const Instance& destination = table(Kind::destination).at(subscription.destination_id).instance;
-        const auto& url = find_named(destination.properties, "Destination")->value.get<std::string>();
+        const auto& url = find_named(destination.properties, "Destination")->value.get<Text>();
         Route& route = by_filter[subscription.filter_id];
         route.filter = table(Kind::filter).at(subscription.filter_id).filter;
         route.urls.push_back(url);
@@ -172,9 +172,9 @@ Object_Path Subscriptions::create(Kind kind, Instance instance)
     const Object_Path path = entry.instance.path;
     const std::string id = path_identity(path);
     if (table(kind).contains(id))
-        throw Cim_Error(CIM_ERR_ALREADY_EXISTS, "there is such an instance of " + path.class_name + " already");
+        throw Cim_Error(CIM_ERR_ALREADY_EXISTS, "there is such an instance of " + path.class_name.string() + " already");
     if (table(kind).size() >= max_of_a_kind)
-        throw Cim_Error(CIM_ERR_SERVER_LIMITS_EXCEEDED, "there are too many instances of " + path.class_name);
+        throw Cim_Error(CIM_ERR_SERVER_LIMITS_EXCEEDED, "there are too many instances of " + path.class_name.string());
 
     const std::string filter_id = entry.filter_id;
     const bool starts = kind == Kind::subscription && !in_use(Kind::filter, filter_id);
@@ -202,9 +202,9 @@ void Subscriptions::remove(Kind kind, const Object_Path& path)
     const Change change = begin_change();
     const std::string id = path_identity(path);
     if (!table(kind).contains(id))
-        throw Cim_Error(CIM_ERR_NOT_FOUND, "there is no such instance of " + path.class_name);
+        throw Cim_Error(CIM_ERR_NOT_FOUND, "there is no such instance of " + path.class_name.string());
     if (in_use(kind, id))
-        throw Cim_Error(CIM_ERR_FAILED, "a subscription uses this instance of " + path.class_name);
+        throw Cim_Error(CIM_ERR_FAILED, "a subscription uses this instance of " + path.class_name.string());
 
     Entry entry = take(kind, id);
     try

@@ -42,7 +42,7 @@ std::vector<Own_Operations::Reference> Own_Operations::find_references(const Obj
     const Class_Entry& named = *_repository.find(path.class_name);
     if (!admits(filter))
         return {};
-    const std::string source = path_identity({"", name_space, named.meta_class->name, keys_of(named, path)});
+    const std::string source = path_identity({{}, name_space, named.name, keys_of(named, path)});
 
     std::vector<Reference> found;
     for (const Class_Entry* entry : concerned_associations(_repository, _repository, named, filter, ends))

@@ -85,11 +85,11 @@ Own_Operations::Found Own_Operations::find(const Object_Path& path) const
     for (const Class_Entry* entry : _repository.served(known_class(path.class_name)))
         if (const Server_Class* server_class = answering(*entry))
         {
-            Object_Path own_path{"", name_space, entry->meta_class->name, keys_of(*entry, path)};
+            Object_Path own_path{{}, name_space, entry->name, keys_of(*entry, path)};
             if (auto instance = find_instance(*server_class, own_path))
                 return {*entry, *server_class, std::move(own_path), *std::move(instance)};
         }
-    throw Cim_Error(CIM_ERR_NOT_FOUND, "there is no such instance of class " + path.class_name);
+    throw Cim_Error(CIM_ERR_NOT_FOUND, "there is no such instance of class " + path.class_name.string());
 }
 
 Instance Own_Operations::shown(Instance instance, const Class_Entry& entry, const Property_List& properties)
@@ -172,7 +172,7 @@ void Own_Operations::delete_instance(const Object_Path& path)
 
 Method_Result Own_Operations::invoke_method(const Object_Path& path, const std::string& method, const std::vector<Named_Value>&)
 {
-    throw Cim_Error(CIM_ERR_METHOD_NOT_FOUND, "class " + path.class_name + " has no method " + method);
+    throw Cim_Error(CIM_ERR_METHOD_NOT_FOUND, "class " + path.class_name.string() + " has no method " + method);
 }
 
 } // namespace cimserver

@@ -39,8 +39,8 @@ template <class T> bool holds(const T& left, Relation relation, const T& right)
 std::optional<bool> compare(const Query_Condition& condition, const Value& value)
 {
     if (const auto* text = std::get_if<std::string>(&condition.literal))
-        if (const auto* mine = value.as<std::string>())
-            return holds(*mine, condition.relation, *text);
+        if (const auto* mine = value.as<Text>())
+            return holds(mine->view(), condition.relation, std::string_view(*text));
     if (const auto* flag = std::get_if<bool>(&condition.literal))
         if (const auto* mine = value.as<bool>())
             return holds(*mine, condition.relation, *flag);

@@ -35,6 +35,14 @@ std::size_t Name_Hash::operator()(std::string_view name) const
     return static_cast<std::size_t>(hash);
 }
 
+Text::Block* Text::make(std::string_view text)
+{
+    void* room = ::operator new(sizeof(Block) + text.size() + 1);
+    char* end = std::ranges::copy(text, static_cast<char*>(room) + sizeof(Block)).out;
+    *end = '\0';
+    return new (room) Block{1, static_cast<std::uint32_t>(text.size())};
+}
+
 void put(std::vector<Named_Value>& list, Name name, Value value)
 {
     if (Named_Value* found = find_named(list, name))

@@ -31,7 +31,7 @@ std::string key_text(const Value& value)
         return std::to_string(*number);
     if (const auto* number = value.as<double>())
         return std::to_string(*number);
-    if (const auto* text = value.as<std::string>())
+    if (const auto* text = value.as<Text>())
         return quoted(*text);
     if (const auto* path = value.as<Object_Path>())
         return quoted(path_text(*path));
@@ -56,11 +56,11 @@ Object_Path normal_form(Object_Path path)
 
 std::string path_text(const Object_Path& path)
 {
-    std::string text = path.name_space.empty() ? path.class_name : path.name_space + ':' + path.class_name;
+    std::string text = path.name_space.empty() ? path.class_name.string() : path.name_space + ':' + path.class_name.string();
     char separator = '.';
     for (const Named_Value& key : path.keys)
     {
-        text += separator + key.name.text() + '=' + key_text(key.value);
+        text += separator + key.name.string() + '=' + key_text(key.value);
         separator = ',';
     }
     return text;

@@ -7,14 +7,14 @@ namespace cimserver
 namespace
 {
 
-thread_local Shared<std::string> user_of_thread = std::string("root");
+thread_local Text user_of_thread = "root";
 
 } // namespace
 
-Principal_Scope::Principal_Scope(std::string user) : _before(std::exchange(user_of_thread, Shared(std::move(user)))) {}
+Principal_Scope::Principal_Scope(std::string user) : _before(std::exchange(user_of_thread, Text(user))) {}
 
 Principal_Scope::~Principal_Scope() { user_of_thread = std::move(_before); }
 
-const Shared<std::string>& Principal_Scope::current() { return user_of_thread; }
+const Text& Principal_Scope::current() { return user_of_thread; }
 
 } // namespace cimserver

@@ -18,10 +18,10 @@ public:
     Principal_Scope& operator=(const Principal_Scope&) = delete;
 
     // Whom the calling thread works for; "root", the server itself, outside any scope.
-    static const Shared<std::string>& current();
+    static const Text& current();
 
 private:
-    Shared<std::string> _before;
+    Text _before;
 };
 
 } // namespace cimserver

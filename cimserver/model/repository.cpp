@@ -20,7 +20,7 @@ Repository::Repository(const zmlr::Registration* head)
             const zmlr::Meta_Repository* repository = record->meta_class->meta_repository;
             for (zmlr::uint32 i = 0; i < repository->num_meta_classes; ++i)
                 add(std::make_shared<Class_Entry>(
-                    Class_Entry{repository->meta_classes[i],
+                    Class_Entry{repository->meta_classes[i]->name, repository->meta_classes[i],
                                 std::make_shared<const Property_Layout>(*repository->meta_classes[i]), nullptr}));
         }
         const auto found = _index.find(record->meta_class->name);

@@ -19,6 +19,7 @@ namespace cimserver
 
 struct Class_Entry
 {
+    Name name;
     const zmlr::Meta_Class* meta_class;
     std::shared_ptr<const Property_Layout> layout;
     const zmlr::Registration* registration; // null when no provider serves the class itself

@@ -20,7 +20,7 @@ std::optional<text::Integer> integer_of(const Value& value)
     if (const auto* number = value.as<std::int64_t>())
         return text::Integer{*number < 0,
                              *number < 0 ? 0 - static_cast<std::uint64_t>(*number) : static_cast<std::uint64_t>(*number)};
-    if (const auto* string = value.as<std::string>())
+    if (const auto* string = value.as<Text>())
         return text::read_integer(trimmed(*string));
     return std::nullopt;
 }
@@ -40,7 +40,7 @@ Value::Content boolean_content(const Value& value)
 {
     if (const auto* flag = value.as<bool>())
         return *flag;
-    const auto* string = value.as<std::string>();
+    const auto* string = value.as<Text>();
     const auto flag = string ? read_boolean_text(*string) : std::nullopt;
     return flag ? Value::Content(*flag) : Value::Content();
 }
@@ -73,7 +73,7 @@ Value::Content real_content(const Value& value, CMPIType type)
 {
     if (const auto* number = value.as<double>())
         return *number;
-    const auto* string = value.as<std::string>();
+    const auto* string = value.as<Text>();
     const auto number = string ? read_real(trimmed(*string), type) : std::nullopt;
     return number ? Value::Content(*number) : Value::Content();
 }
@@ -81,19 +81,19 @@ Value::Content real_content(const Value& value, CMPIType type)
 // The one character of a text, when it is of the Basic Multilingual Plane.
 Value::Content char16_content(const Value& value, const Cim_Type& type)
 {
-    const auto* string = value.as<std::string>();
+    const auto* string = value.as<Text>();
     if (!string)
         return integer_content(value, type);
     const text::Character character = text::first_character(*string);
-    const bool fits = character.size > 0 && character.size == string->size() && character.code <= 0xFFFF;
+    const bool fits = character.size > 0 && character.size == string->view().size() && character.code <= 0xFFFF;
     return fits ? Value::Content(std::uint64_t{character.code}) : Value::Content();
 }
 
-Value::Content text_content(const Value& value) { return value.as<std::string>() ? value.content : Value::Content(); }
+Value::Content text_content(const Value& value) { return value.as<Text>() ? value.content : Value::Content(); }
 
 Value::Content datetime_content(const Value& value)
 {
-    const auto* string = value.as<std::string>();
+    const auto* string = value.as<Text>();
     const std::string datetime(string ? trimmed(*string) : "");
     return is_readable_datetime(datetime) ? Value::Content(datetime) : Value::Content();
 }

@@ -71,7 +71,7 @@ std::optional<std::string> value_text(const Value& value)
         return integer_text(*type, *number);
     if (const auto* number = value.as<double>())
         return real_text(value.type, *number);
-    if (const auto* string = value.as<std::string>())
+    if (const auto* string = value.as<Text>())
         if (value.type != CMPI_dateTime || is_readable_datetime(*string))
             return *string;
     return std::nullopt;

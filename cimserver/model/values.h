@@ -1,9 +1,10 @@
 // What the server knows of CIM objects: typed values, object paths and instances, free of CMPI handles and of XML.
 #pragma once
 
+#include "cimserver/model/shared.h"
+
 #include <cmpidt.h>
 
-#include <atomic>
 #include <cstdint>
 #include <exception>
 #include <optional>
@@ -20,44 +21,14 @@ namespace cimserver
 struct Object_Path;
 struct Instance;
 
-// One pointer to a constant that its copies share, safe in several threads at once.
-template <class T> class Shared
-{
-public:
-    Shared(T value) : _held(new Held{std::move(value)}) {}
-    Shared(const Shared& x) : _held(x._held) { ++_held->owners; }
-    Shared(Shared&& x) noexcept : _held(std::exchange(x._held, nullptr)) {} // x may only be assigned to or end
-    ~Shared()
-    {
-        if (_held && --_held->owners == 0)
-            delete _held;
-    }
-    Shared& operator=(Shared x) noexcept
-    {
-        std::swap(_held, x._held);
-        return *this;
-    }
-
-    const T& operator*() const { return _held->value; }
-
-private:
-    struct Held
-    {
-        const T value;
-        std::atomic<std::size_t> owners = 1;
-    };
-
-    Held* _held;
-};
-
 // A CIM value. `type` is the CMPI type (with the array bit for an array); its content stands in the alternative that fits:
 // booleans bool, unsigned integers and char16 std::uint64_t, signed integers std::int64_t, reals double, strings and
-// datetimes (25-character text) std::string, references and embedded instances what they say, arrays a vector of scalars.
+// datetimes (25-character text) Text, references and embedded instances what they say, arrays a vector of scalars.
 // What is larger than a number is shared: an answer of many instances with many properties, most of them null, stays small.
 struct Value
 {
-    using Content = std::variant<std::monostate, bool, std::uint64_t, std::int64_t, double, Shared<std::string>,
-                                 Shared<Object_Path>, Shared<Instance>, Shared<std::vector<Value>>>;
+    using Content = std::variant<std::monostate, bool, std::uint64_t, std::int64_t, double, Text, Shared<Object_Path>,
+                                 Shared<Instance>, Shared<std::vector<Value>>>;
 
     Value() = default;
     Value(CMPIType type_, Content content_) : content(std::move(content_)), type(type_) {}
@@ -70,7 +41,7 @@ struct Value
     // The content; null when it is no T.
     template <class T> const T* as() const
     {
-        if constexpr (std::is_arithmetic_v<T>)
+        if constexpr (std::is_arithmetic_v<T> || std::is_same_v<T, Text>)
             return std::get_if<T>(&content);
         else
             return std::holds_alternative<Shared<T>>(content) ? &*std::get<Shared<T>>(content) : nullptr;
@@ -85,21 +56,8 @@ struct Value
 };
 static_assert(sizeof(Value) == 16);
 
-// Copies share one text: the instances of a class hold the names of its properties once.
-class Name
-{
-public:
-    Name(std::string text = {}) : _text(std::move(text)) {}
-    Name(const char* text) : Name(std::string(text)) {}
-
-    const std::string& text() const { return *_text; }
-    operator const std::string&() const { return *_text; }
-    operator std::string_view() const { return *_text; }
-    friend bool operator==(const Name& a, std::string_view b) { return *a._text == b; }
-
-private:
-    Shared<std::string> _text;
-};
+// The instances of a class hold its name and those of its properties once.
+using Name = Text;
 
 struct Named_Value
 {
@@ -109,9 +67,9 @@ struct Named_Value
 
 struct Object_Path
 {
-    std::string host;
+    Name host;
     std::string name_space;
-    std::string class_name;
+    Name class_name;
     std::vector<Named_Value> keys;
 };
 

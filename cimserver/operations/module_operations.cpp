@@ -32,7 +32,7 @@ const Class_Entry& Module_Operations::known_class(const std::string& class_name)
 
 Object_Path Module_Operations::path_to(const Class_Entry& entry, std::vector<Named_Value> keys) const
 {
-    return {"", _name_space, entry.meta_class->name, std::move(keys)};
+    return {{}, _name_space, entry.name, std::move(keys)};
 }
 
 const zmlr::Meta_Class* Module_Operations::get_class(const std::string& class_name)

@@ -39,7 +39,7 @@ public:
         if (!entry || !are_related(entry->meta_class, reference.meta_class))
             return {};
 
-        Object_Path result{target->host, target->name_space, entry->meta_class->name, keys(*entry, *target)};
+        Object_Path result{target->host, target->name_space, entry->name, keys(*entry, *target)};
         if (result.name_space.empty())
             result.name_space = name_space;
         return result;

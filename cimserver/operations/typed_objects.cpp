@@ -44,9 +44,9 @@ public:
             const zmlr::Meta_Feature* feature = find_value(*entry.meta_class, property.name);
             if (!feature)
                 throw Cim_Error(unknown_property,
-                                "class " + std::string(entry.meta_class->name) + " has no property " + property.name.text());
+                                "class " + std::string(entry.meta_class->name) + " has no property " + property.name.string());
             if (!seen.insert(feature).second)
-                throw Type_Error("property given twice: " + property.name.text());
+                throw Type_Error("property given twice: " + property.name.string());
             result.push_back({feature->name, value(*feature, property.value)});
         }
         return result;
@@ -101,7 +101,7 @@ void add_keys(Instance& instance)
         if (!property)
             instance.properties.push_back(key);
         else if (path_identity({"", "", "", {*property}}) != path_identity({"", "", "", {key}}))
-            throw Cim_Error(CIM_ERR_INVALID_PARAMETER, "the key " + key.name.text() + " cannot be changed");
+            throw Cim_Error(CIM_ERR_INVALID_PARAMETER, "the key " + key.name.string() + " cannot be changed");
     }
 }
 
@@ -109,7 +109,7 @@ void add_keys(Instance& instance)
 
 Instance typed_instance(const Repository& repository, const Class_Entry& entry, const Instance& instance, int unknown_property)
 {
-    Instance result{{"", instance.path.name_space, entry.meta_class->name, {}}, {}};
+    Instance result{{{}, instance.path.name_space, entry.name, {}}, {}};
     Converter converter(repository, result.path.name_space);
     result.properties = converter.properties(entry, instance.properties, unknown_property);
     if (instance.path.keys.empty())

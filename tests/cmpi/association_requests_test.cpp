@@ -23,7 +23,7 @@ CMPIInstance* find_thing(const CMPIBroker* broker, const CMPIContext*, const CMP
     ++far_ends_fetched;
     listed = properties && *properties ? *properties : "";
     const auto& name = cimserver::object<cimserver::Path_Object>(path).path.keys.at(0).value;
-    const bool gone = name.get<std::string>() == "gone";
+    const bool gone = name.get<cimserver::Text>() == "gone";
     *status = {gone ? CMPI_RC_ERR_NOT_FOUND : CMPI_RC_OK, nullptr};
     return gone ? nullptr : CMNewInstance(broker, path, nullptr);
 }

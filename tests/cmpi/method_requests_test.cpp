@@ -75,7 +75,7 @@ TEST_F(Method_Requests, carry_parameters_of_every_kind_there_and_back)
     EXPECT_EQ(cast<TST_Disk>(script.instance.ptr())->Name.value, "disk");
     ASSERT_THAT(result.data, SizeIs(1));
     EXPECT_EQ(result.data[0].type, CMPI_string);
-    EXPECT_EQ(result.data[0].get<std::string>(), "done");
+    EXPECT_EQ(result.data[0].get<cimserver::Text>(), "done");
     EXPECT_EQ(result.done, 1);
 
     ASSERT_THAT(out.args, SizeIs(5)) << "neither the return value nor null outputs are arguments";
@@ -133,7 +133,7 @@ TEST_F(Method_Requests, leave_arguments_null_that_do_not_fit)
     {
         in.args = {argument};
         EXPECT_THAT(logged([&] { EXPECT_EQ(invoke("Convert", disk_path()), CMPI_RC_OK); }), SizeIs(messages))
-            << argument.name.text();
+            << argument.name.string();
     }
 }
 

@@ -101,7 +101,7 @@ const cimserver::Value& Served_Provider::value(const Items& items, const char* n
 {
     for (const auto& item : items)
     {
-        if (eqi(item.name.text().c_str(), name))
+        if (eqi(item.name.string().c_str(), name))
             return item.value;
     }
     ADD_FAILURE() << "no item " << name;
@@ -111,7 +111,7 @@ const cimserver::Value& Served_Provider::value(const Items& items, const char* n
 
 std::string Served_Provider::text(const Items& items, const char* name)
 {
-    const auto* content = value(items, name).as<std::string>();
+    const auto* content = value(items, name).as<cimserver::Text>();
     return content ? *content : "(null)";
 }
 

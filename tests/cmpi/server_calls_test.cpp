@@ -26,7 +26,8 @@ struct Server
     CMPIrc asked(const std::string& call, const CMPIObjectPath* to)
     {
         const auto& path = cimserver::object<cimserver::Path_Object>(to).path;
-        calls.push_back(call + " " + path.name_space + ":" + path.class_name + "." + path.keys.at(0).value.get<std::string>());
+        calls.push_back(call + " " + path.name_space + ":" + path.class_name.string() + "." +
+                        path.keys.at(0).value.get<cimserver::Text>().string());
         return rc;
     }
 };

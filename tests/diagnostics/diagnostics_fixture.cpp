@@ -42,7 +42,7 @@ const Temporary_Folder& home()
 
 std::string text_of(const cimserver::Value& value)
 {
-    if (const auto* text = value.as<std::string>())
+    if (const auto* text = value.as<cimserver::Text>())
         return *text;
     const auto* number = value.as<std::uint64_t>();
     return number ? std::to_string(*number) : "";

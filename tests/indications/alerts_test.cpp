@@ -87,7 +87,7 @@ public:
             if (name == "MessageArguments")
             {
                 const auto& arguments = value.get<std::vector<cimserver::Value>>();
-                const auto number = std::stoul(arguments.back().get<std::string>(), nullptr, 16);
+                const auto number = std::stoul(arguments.back().get<cimserver::Text>(), nullptr, 16);
                 std::unique_lock lock(_mutex);
                 _taken.push_back(where + '|' + std::to_string(number));
                 _changed.notify_all();

@@ -160,11 +160,11 @@ Value key_value(const std::string& keys) { return read_path(instance_name(keys),
 
 TEST(object_reader, reads_keys_of_every_kind)
 {
-    EXPECT_EQ(key_value(key("string", " a ")).get<std::string>(), " a ");
+    EXPECT_EQ(key_value(key("string", " a ")).get<Text>(), " a ");
     EXPECT_EQ(key_value(key("boolean", " TRUE ")).get<bool>(), true);
     EXPECT_EQ(key_value(key("boolean", "false")).get<bool>(), false);
     for (const char* number : {"0", "-12", "0x1F", "1.5e3", "18446744073709551616"})
-        EXPECT_EQ(key_value(key("numeric", std::string(" ") + number)).get<std::string>(), number);
+        EXPECT_EQ(key_value(key("numeric", std::string(" ") + number)).get<Text>(), number);
 
     const Object_Path unnamed = read_path(instance_name("<KEYVALUE>x</KEYVALUE>"), "n");
     EXPECT_EQ(unnamed.keys.at(0).name, "");
@@ -174,7 +174,7 @@ TEST(object_reader, reads_keys_of_every_kind)
                   "</NAMESPACEPATH><INSTANCENAME CLASSNAME=\"B\"/></INSTANCEPATH>"
                   "</VALUE.REFERENCE></KEYBINDING>");
     const auto& target = reference.get<Object_Path>();
-    EXPECT_EQ(target.host + " " + target.name_space + " " + target.class_name, "h root/test B");
+    EXPECT_EQ(target.host.string() + " " + target.name_space + " " + target.class_name.string(), "h root/test B");
 }
 
 TEST(object_reader, refuses_keys_that_cannot_be_read)
