@@ -52,7 +52,7 @@ __Array_Rep* make_rep(const __Array_Traits* traits, std::size_t n)
     const uint32 capacity = _next_pow_2(n, min_capacity);
     std::size_t size = 0;
     if (__builtin_mul_overflow(std::size_t{capacity}, std::size_t{traits->elem_size}, &size) ||
-        __builtin_add_overflow(size, sizeof(__Array_Rep), &size))
+        __builtin_add_overflow(size, offsetof(__Array_Rep, data), &size))
         throw std::bad_array_new_length();
 
     auto* rep = static_cast<__Array_Rep*>(::operator new(size));
