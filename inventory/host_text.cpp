@@ -38,13 +38,12 @@ public:
     explicit Address_List(const char* host)
     {
         hostent* found = nullptr;
-        for (std::size_t size = 1024; size <= size_limit; size *= 2)
+        int error = 0;
+        int outcome = gethostbyname_r(host, &_entry, _room, sizeof _room, &found, &error);
+        for (std::size_t size = 2 * sizeof _room; outcome == ERANGE && size <= size_limit; size *= 2)
         {
-            int error = 0;
             _memory = std::make_unique_for_overwrite<char[]>(size);
-            if (gethostbyname_r(host, &_entry, _memory.get(), size, &found, &error) != ERANGE)
-                break;
-            found = nullptr;
+            outcome = gethostbyname_r(host, &_entry, _memory.get(), size, &found, &error);
         }
         if (found && found->h_addrtype == AF_INET && found->h_length == sizeof(in_addr))
             _next = found->h_addr_list;
@@ -65,7 +64,8 @@ private:
     static constexpr std::size_t size_limit = 64 * 1024;
 
     hostent _entry = {};
-    std::unique_ptr<char[]> _memory;
+    char _room[1024];                // enough for all but the longest lists
+    std::unique_ptr<char[]> _memory; // for those
     char** _next = nullptr;
 };
 
