@@ -2,6 +2,7 @@
 
 #include <dlfcn.h>
 #include <malloc.h>
+#include <netdb.h>
 #include <sys/ioctl.h>
 
 #include <cstdarg>
@@ -24,6 +25,18 @@ thread_local constinit State state;
 
 // What a block takes of the heap: its size stands before it.
 std::ptrdiff_t size_of(void* block) { return static_cast<std::ptrdiff_t>(malloc_usable_size(block) + sizeof(std::size_t)); }
+
+template <class Call> int resting(Call call)
+{
+    if (state.counts)
+        CALLGRIND_TOGGLE_COLLECT;
+    const bool watched = std::exchange(state.watches_memory, false);
+    const int result = call();
+    state.watches_memory = watched;
+    if (state.counts)
+        CALLGRIND_TOGGLE_COLLECT;
+    return result;
+}
 
 } // namespace
 
@@ -75,7 +88,7 @@ void operator delete(void* block) noexcept
 
 void operator delete(void* block, std::size_t) noexcept { operator delete(block); }
 
-// Stands before the simulator's: the meters rest while the driver answers.
+// The meters rest in what belongs to the machine: while the driver answers (this stands before the simulator's)...
 extern "C" [[gnu::visibility("default")]] int ioctl(int descriptor, unsigned long request, ...) noexcept
 {
     static const auto driver = reinterpret_cast<int (*)(int, unsigned long, ...)>(dlsym(RTLD_NEXT, "ioctl"));
@@ -84,12 +97,13 @@ extern "C" [[gnu::visibility("default")]] int ioctl(int descriptor, unsigned lon
     void* record = va_arg(arguments, void*);
     va_end(arguments);
 
-    if (state.counts)
-        CALLGRIND_TOGGLE_COLLECT;
-    const bool watched = std::exchange(state.watches_memory, false);
-    const int result = driver(descriptor, request, record);
-    state.watches_memory = watched;
-    if (state.counts)
-        CALLGRIND_TOGGLE_COLLECT;
-    return result;
+    return resting([&] { return driver(descriptor, request, record); });
+}
+
+// ...and while the resolver looks up the host's name, in a file or on the network.
+extern "C" [[gnu::visibility("default")]] int gethostbyname_r(const char* name, hostent* entry, char* room, std::size_t size,
+                                                              hostent** found, int* error)
+{
+    static const auto resolver = reinterpret_cast<decltype(&gethostbyname_r)>(dlsym(RTLD_NEXT, "gethostbyname_r"));
+    return resting([&] { return resolver(name, entry, room, size, found, error); });
 }
