@@ -21,7 +21,10 @@ def test_the_access_point_is_there_while_the_agent_runs(start, tmp_path):
     client = host.pywbem
     system_path = client.EnumerateInstanceNames("ZEMLAR_ComputerSystem")[0]
     system = system_path["Name"]
-    before = addresses()
+    other = shutil.copy(agent, tmp_path / "quillonagentd")
+    with subprocess.Popen([other, "60"]) as process:
+        before = addresses()
+        process.terminate()
     with subprocess.Popen([agent, "60"]) as process:
         during = addresses()
         points = hosted(system_path, "Antecedent", "Dependent")
