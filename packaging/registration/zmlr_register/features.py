@@ -4,6 +4,7 @@ import re
 
 _NO_WORDS = re.compile(r'/\*.*?\*/|//[^\n]*|"(?:[^"\\]|\\.)*"', re.DOTALL)
 _QUALIFIERS = re.compile(r"\[[^\]]*\]")
+_ARRAY_DEFAULT = re.compile(r"=\s*{[^}]*}")  # ends as a class does
 _CLASS = r"\bclass\s+{}\s*(?::\s*(\w+)\s*)?{{(.*?)}}\s*;"
 _FEATURE = re.compile(r"\s*\w+\s+(?:ref\s+)?(\w+)", re.IGNORECASE)
 
@@ -26,7 +27,7 @@ def _features(cls, mof_of):
     """In lower case, of the class and its ancestors; None when one of them cannot be read."""
     features = set()
     while cls:
-        text = _QUALIFIERS.sub("", _NO_WORDS.sub("", mof_of(cls)))
+        text = _ARRAY_DEFAULT.sub("", _QUALIFIERS.sub("", _NO_WORDS.sub("", mof_of(cls))))
         declared = re.search(_CLASS.format(re.escape(cls)), text, re.DOTALL | re.IGNORECASE)
         if not declared:
             return None

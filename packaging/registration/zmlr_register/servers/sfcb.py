@@ -28,8 +28,9 @@ _SECTION = """[{cls}]
 
 
 def registration_text(catalogue, selection, library=None):
-    return f"# {heading(catalogue, library)}#\n" + "#\n".join(_SECTION.format(cls=cls.name, provider=cls.provider, location=catalogue.location, kinds=" ".join(cls.kinds),
-                                      name_spaces=" ".join(selection.name_spaces(cls))) for cls in selection.provided)
+    sections = [_SECTION.format(cls=cls.name, provider=cls.provider, location=catalogue.location, kinds=" ".join(cls.kinds),
+                                name_spaces=" ".join(selection.name_spaces(cls))) for cls in selection.provided]
+    return f"# {heading(catalogue, library)}#\n" + "#\n".join(sections)
 
 
 def full_registration(catalogue):
