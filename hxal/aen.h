@@ -11,7 +11,7 @@
 // The drivers queue events for each application (hxal_libinit()). One thread of the library fetches them and calls the
 // callbacks that were registered for the object concerned: each matching one once for an event, the newest registration
 // first, one callback at a time. A callback may use the whole library, register and unregister included, and what it
-// registers is considered for the same event. The thread holds no lock meanwhile and blocks all signals. Events are fetched
+// registers is considered for the same event. The thread holds no lock meanwhile and blocks signals. Events are fetched
 // only from drivers that a registration was made on, and from the IOCs of the last scan: do not scan while the thread runs. A
 // scan ends what registrations hear: they wait on the node as it was open before. After it, unregister them and register anew,
 // with the handles that the scan has made.

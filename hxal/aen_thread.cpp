@@ -144,13 +144,15 @@ void* run(void*) noexcept
     return nullptr;
 }
 
-// Signals are the program's: the thread starts with all of them blocked.
+// Signals are the program's: the thread starts with all of them blocked but those that a fault of its own raises.
 int start_thread(pthread_t& started)
 {
-    sigset_t all;
+    sigset_t blocked;
     sigset_t before;
-    sigfillset(&all);
-    pthread_sigmask(SIG_SETMASK, &all, &before);
+    sigfillset(&blocked);
+    for (const int fault : {SIGSEGV, SIGBUS, SIGFPE, SIGILL})
+        sigdelset(&blocked, fault);
+    pthread_sigmask(SIG_SETMASK, &blocked, &before);
     const int error = ::pthread_create(&started, nullptr, run, nullptr);
     pthread_sigmask(SIG_SETMASK, &before, nullptr);
     return error;
