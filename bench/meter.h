@@ -1,5 +1,6 @@
 // What the work of this program takes of memory and, under callgrind, of instructions. A program that links this has its
-// allocations watched. The simulated driver is no part of the work: what it does and keeps for a request does not count.
+// allocations watched. The simulated driver and the resolver of host names are no part of the work: what they do and keep
+// does not count.
 #pragma once
 
 #include <valgrind/callgrind.h>

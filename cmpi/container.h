@@ -34,7 +34,7 @@ public:
     int convert(const Instance* instance, uint32 mask);
 
     // The same with all features, for the last time: unless somebody else holds the instance, each property ends when it is in
-    // the container, so that memory never has room for the whole of both.
+    // the container, so that the whole of both is never in memory.
     int convert(Ref<Instance> instance);
 
 protected:

@@ -39,8 +39,8 @@ CMPIrc make_cmpi_object_path(const CMPIBroker* broker, const Instance* instance,
                              CMPI_Ptr<CMPIObjectPath>& path);
 
 // The whole instance under a path (null: the one of its keys, which is logged). What nobody else holds ends value by value while
-// it is converted. A property list is installed as the instance's property filter; the code of a failing filter call is answered
-// as it is.
+// it is converted; `name_space` may be the instance's own. A property list is installed as the instance's property filter; the
+// code of a failing filter call is answered as it is.
 CMPIrc make_cmpi_instance(const CMPIBroker* broker, Ref<Instance> instance, const char* name_space, const CMPIObjectPath* path,
                           const Property_Filter& filter, CMPI_Ptr<CMPIInstance>& cmpi_instance);
 
@@ -69,7 +69,7 @@ CMPIrc make_cmpi_method(const CMPIBroker* broker, const char* name_space, const 
 
 // Data become a value of the matching type; a null value if their state says so. References become instances with the keys
 // of the referenced object, embedded objects whole instances: their classes are looked up in the repository. What is nested more
-// than 16 deep fails.
+// than 16 deep fails, which leaves the feature that holds it null.
 int cmpi_to_cimple_value(const Meta_Repository* repository, const CMPIBroker* broker, const char* name_space,
                          const CMPIData& data, Value& value);
 

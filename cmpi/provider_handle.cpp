@@ -67,8 +67,8 @@ bool pass_on_far_ends(Instance* instance, Enum_Instances_Status, void* client_da
                                       args.result_role.c_str(), args.far_ends.data());
     for (int i = 0; i < count && !args.stopped; ++i)
     {
-        Ref<Instance> name = share(args.far_ends[static_cast<std::size_t>(i)]);
-        args.stopped = !args.proc(name.steal(), ENUM_ASSOCIATOR_NAMES_OK, args.client_data);
+        const Instance* name = args.far_ends[static_cast<std::size_t>(i)];
+        args.stopped = !args.proc(share(name).steal(), ENUM_ASSOCIATOR_NAMES_OK, args.client_data);
     }
     return !args.stopped;
 }

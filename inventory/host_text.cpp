@@ -48,6 +48,8 @@ public:
         if (found && found->h_addrtype == AF_INET && found->h_length == sizeof(in_addr))
             _next = found->h_addr_list;
     }
+    Address_List(const Address_List&) = delete; // it points into itself
+    Address_List& operator=(const Address_List&) = delete;
 
     bool empty() const { return !_next || !*_next; }
 
