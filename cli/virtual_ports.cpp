@@ -40,20 +40,14 @@ List role_words(std::uint32_t roles)
     return words;
 }
 
-// A text that is no WWN names no port.
-hxa_status_t read(const Port& port, const hxal_vf_config_t& configured, hxa_port_attr_t& attr)
-{
-    const auto wwn = read_wwn(configured.pwwn);
-    return wwn ? hxal_lport_get_attr(port.fc, configured.vf_id, *wwn, &attr) : HXA_STATUS_UNKNOWN_LWWN;
-}
-
 Value tree_of(Session& session, const Port& port, const hxal_vf_config_t& configured)
 {
     const auto wwn = read_wwn(configured.pwwn);
     const auto name = wwn ? wwn_text(*wwn) : field_text(configured.pwwn);
     Object tree{{"port", port.name()}, {"wwn", name}, {"virtual_fabric", unsigned{configured.vf_id}}};
     hxa_port_attr_t attr{};
-    const auto status = read(port, configured, attr);
+    // A text that is no WWN names no port.
+    const auto status = wwn ? hxal_lport_get_attr(port.fc, configured.vf_id, *wwn, &attr) : HXA_STATUS_UNKNOWN_LWWN;
     if (status == HXA_STATUS_UNKNOWN_LWWN || status == HXA_STATUS_UNKNOWN_VWWN || status == HXA_STATUS_UNKNOWN_VFID)
         tree.push_back({"state", "missing"});
     else if (session.accept(status, "virtual port " + name))
