@@ -2,7 +2,8 @@
 
 import re
 import shutil
-import subprocess
+
+from tools.running import running
 
 
 def test_the_access_point_is_there_while_the_agent_runs(start, tmp_path):
@@ -22,10 +23,10 @@ def test_the_access_point_is_there_while_the_agent_runs(start, tmp_path):
     system_path = client.EnumerateInstanceNames("ZEMLAR_ComputerSystem")[0]
     system = system_path["Name"]
     other = shutil.copy(agent, tmp_path / "quillonagentd")
-    with subprocess.Popen([other, "60"]) as process:
+    with running([other, "60"]) as process:
         before = addresses()
         process.terminate()
-    with subprocess.Popen([agent, "60"]) as process:
+    with running([agent, "60"]) as process:
         during = addresses()
         points = hosted(system_path, "Antecedent", "Dependent")
         systems = hosted(points[0], "Dependent", "Antecedent") if points else []
