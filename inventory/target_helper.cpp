@@ -14,7 +14,6 @@
 #include <memory>
 #include <new>
 #include <optional>
-#include <span>
 
 namespace zmlr
 {
