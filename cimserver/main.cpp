@@ -2,12 +2,12 @@
 //
 // Exit status: 0 after a stop, 1 when it cannot serve, 2 for a wrong command line.
 #include "cimserver/broker/module.h"
+#include "cimserver/broker/request.h"
 #include "cimserver/cimxml/http_server.h"
 #include "cimserver/cimxml/listener.h"
 #include "cimserver/cimxml/service.h"
 #include "cimserver/indications/subscriptions.h"
 #include "cimserver/interop/name_spaces.h"
-#include "cimserver/model/principal.h"
 #include "cimserver/options.h"
 #include "cimserver/process.h"
 #include "cimserver/security/credentials.h"

@@ -59,8 +59,8 @@ private:
 // The broker behind its handle. Throws INVALID_HANDLE.
 const Broker& broker_of(const CMPIBroker* face);
 
-extern const CMPIBrokerFT broker_table;            // up_calls.cpp
-extern const CMPIBrokerEncFT encapsulation_table;  // encapsulation.cpp
-extern const CMPIBrokerExtFT system_service_table; // system_services.cpp
+extern const CMPIBrokerFT broker_table;           // up_calls.cpp
+extern const CMPIBrokerEncFT encapsulation_table; // encapsulation.cpp
+extern const CMPIBrokerExtFT system_service_table;
 
 } // namespace cimserver

@@ -123,7 +123,7 @@ Value from_cmpi(const CMPIValue* value, CMPIType type)
     if (type == CMPI_null)
         return {};
     if (type == CMPI_chars)
-        return {CMPI_string, value ? Value::Content(std::string(reinterpret_cast<const char*>(value))) : Value::Content()};
+        return {CMPI_string, value ? Value::Content(Text(reinterpret_cast<const char*>(value))) : Value::Content()};
     if (type == array_of(CMPI_chars))
         type = array_of(CMPI_string);
     if (value && (type & CMPI_ARRAY) == 0)

@@ -42,7 +42,7 @@ CMPIArgs* new_args(const CMPIBroker*, CMPIStatus* status) noexcept
 
 CMPIString* new_string(const CMPIBroker*, const char* text, CMPIStatus* status) noexcept
 {
-    return answer_new<String_Object>(status, [&] { return std::string(required(text)); });
+    return answer_new<String_Object>(status, [&] { return required(text); });
 }
 
 CMPIArray* new_array(const CMPIBroker*, CMPICount size, CMPIType element_type, CMPIStatus* status) noexcept
@@ -52,7 +52,7 @@ CMPIArray* new_array(const CMPIBroker*, CMPICount size, CMPIType element_type, C
 
 CMPIDateTime* new_date_time_from_chars(const CMPIBroker*, const char* text, CMPIStatus* status) noexcept
 {
-    return answer_new<Datetime_Object>(status, [&] { return std::string(required(text)); });
+    return answer_new<Datetime_Object>(status, [&] { return required(text); });
 }
 
 } // namespace

@@ -1,4 +1,4 @@
-// The objects that hold a list of named values.
+// The objects that hold a list: of named values, or of what an up-call found.
 #include "cimserver/broker/cmpi_values.h"
 #include "cimserver/broker/not_offered.h"
 #include "cimserver/broker/objects.h"
@@ -28,6 +28,28 @@ CMPIData get_entry(const CMPIContext* self, const char* name, CMPIStatus* status
     return answer(status, no_data(), [&] { return data_named(object<Context_Object>(self).entries, name); });
 }
 
+CMPIData get_next(const CMPIEnumeration* self, CMPIStatus* status) noexcept
+{
+    const auto body = [&]
+    {
+        auto& enumeration = object<Enumeration_Object>(self);
+        if (enumeration.next == enumeration.elements.size())
+            throw Failure{CMPI_RC_ERR_NOT_FOUND};
+        return to_cmpi(enumeration.elements[enumeration.next++]);
+    };
+    return answer(status, no_data(), body);
+}
+
+CMPIBoolean has_next(const CMPIEnumeration* self, CMPIStatus* status) noexcept
+{
+    const auto body = [&]
+    {
+        const auto& enumeration = object<Enumeration_Object>(self);
+        return enumeration.next < enumeration.elements.size();
+    };
+    return answer<CMPIBoolean>(status, 0, body);
+}
+
 } // namespace
 
 const CMPIArgsFT Args_Object::table = {
@@ -48,6 +70,15 @@ const CMPIContextFT Context_Object::table = {
     .getEntryAt = not_offered,
     .getEntryCount = not_offered,
     .addEntry = not_offered,
+};
+
+const CMPIEnumerationFT Enumeration_Object::table = {
+    .ftVersion = 100,
+    .release = release<Enumeration_Object>,
+    .clone = clone<Enumeration_Object>,
+    .getNext = get_next,
+    .hasNext = has_next,
+    .toArray = not_offered,
 };
 
 } // namespace cimserver

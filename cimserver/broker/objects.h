@@ -139,13 +139,8 @@ class Enumeration_Object : public Handle<CMPIEnumeration, Enumeration_Object>
 public:
     static const Table table;
 
-    Enumeration_Object(CMPIType element_type_, std::vector<Value> elements_)
-        : element_type(element_type_)
-        , elements(std::move(elements_))
-    {
-    }
+    explicit Enumeration_Object(std::vector<Value> elements_) : elements(std::move(elements_)) {}
 
-    const CMPIType element_type;
     std::vector<Value> elements;
     std::size_t next = 0;
 };
@@ -156,9 +151,9 @@ class Select_Object : public Handle<CMPISelectExp, Select_Object>
 public:
     static const Table table;
 
-    explicit Select_Object(std::string query_) : query(std::move(query_)) {}
+    explicit Select_Object(Text query_) : query(std::move(query_)) {}
 
-    const std::string query;
+    const Text query;
 };
 
 } // namespace cimserver

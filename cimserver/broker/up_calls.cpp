@@ -86,7 +86,7 @@ CMPIEnumeration* enumeration(std::vector<Instance> found)
     std::vector<Value> elements;
     for (Instance& instance : found)
         elements.push_back({CMPI_instance, std::move(instance)});
-    return make<Enumeration_Object>(CMPIType{CMPI_instance}, std::move(elements)).face();
+    return make<Enumeration_Object>(std::move(elements)).face();
 }
 
 CMPIEnumeration* enumerate_instances(const CMPIBroker* broker, const CMPIContext* context, const CMPIObjectPath* self,

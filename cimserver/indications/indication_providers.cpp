@@ -1,6 +1,6 @@
 #include "cimserver/indications/indication_providers.h"
 
-#include "cimserver/model/principal.h"
+#include "cimserver/broker/request.h"
 #include "cimserver/operations/provider_call.h"
 
 #include <cstdio>

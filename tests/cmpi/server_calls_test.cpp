@@ -50,7 +50,7 @@ CMPIEnumeration* enumerate(B, C, O path, L, CMPIStatus* status)
     std::vector<cimserver::Value> elements;
     for (const auto& instance : server.instances)
         elements.push_back({CMPI_instance, instance});
-    return cimserver::make<cimserver::Enumeration_Object>(CMPIType{CMPI_instance}, elements).face();
+    return cimserver::make<cimserver::Enumeration_Object>(elements).face();
 }
 CMPIInstance* get(B, C, O path, L, CMPIStatus* status)
 {
@@ -164,7 +164,7 @@ TEST_F(Server_Calls, end_an_enumeration_at_what_is_no_instance)
     table.enumerateInstances = [](B, C, O, L, CMPIStatus*)
     {
         const std::vector<cimserver::Value> elements = {string("no instance")};
-        return cimserver::make<cimserver::Enumeration_Object>(CMPIType{CMPI_string}, elements).face();
+        return cimserver::make<cimserver::Enumeration_Object>(elements).face();
     };
     const auto work = [&]
     {

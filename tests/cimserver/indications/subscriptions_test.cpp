@@ -2,8 +2,8 @@
 #include "cimserver/indications/subscriptions.h"
 
 #include "alert_module.h"
+#include "cimserver/broker/request.h"
 #include "cimserver/model/names.h"
-#include "cimserver/model/principal.h"
 
 #include <gtest/gtest.h>
 
