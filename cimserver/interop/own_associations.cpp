@@ -29,8 +29,7 @@ bool Own_Operations::admits(const Association_Filter& filter) const
     for (const std::string* class_name : {&filter.association_class, &filter.result_class})
         if (!class_name->empty() && !_repository.find(*class_name))
         {
-            if (!_module_classes.find(*class_name))
-                throw Cim_Error(CIM_ERR_INVALID_PARAMETER, "there is no class " + *class_name);
+            _module_classes.get(*class_name, CIM_ERR_INVALID_PARAMETER);
             all_own = false;
         }
     return all_own;

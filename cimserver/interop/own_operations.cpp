@@ -65,14 +65,6 @@ void Own_Operations::serve(Server_Class server_class)
     _server_classes.emplace(entry, std::move(server_class));
 }
 
-const Class_Entry& Own_Operations::known_class(const std::string& class_name) const
-{
-    const Class_Entry* entry = _repository.find(class_name);
-    if (!entry)
-        throw Cim_Error(CIM_ERR_INVALID_CLASS, "there is no class " + class_name);
-    return *entry;
-}
-
 const Server_Class* Own_Operations::answering(const Class_Entry& entry) const
 {
     const auto found = _server_classes.find(&entry);
@@ -82,7 +74,7 @@ const Server_Class* Own_Operations::answering(const Class_Entry& entry) const
 // A path may name a superclass of the instance's.
 Own_Operations::Found Own_Operations::find(const Object_Path& path) const
 {
-    for (const Class_Entry* entry : _repository.served(known_class(path.class_name)))
+    for (const Class_Entry* entry : _repository.served(_repository.get(path.class_name)))
         if (const Server_Class* server_class = answering(*entry))
         {
             Object_Path own_path{{}, name_space, entry->name, keys_of(*entry, path)};
@@ -105,11 +97,14 @@ Instance Own_Operations::shown(Instance instance, const Class_Entry& entry, cons
     return instance;
 }
 
-const zmlr::Meta_Class* Own_Operations::get_class(const std::string& class_name) { return known_class(class_name).meta_class; }
+const zmlr::Meta_Class* Own_Operations::get_class(const std::string& class_name)
+{
+    return _repository.get(class_name).meta_class;
+}
 
 std::vector<const zmlr::Meta_Class*> Own_Operations::enumerate_classes(const std::string& class_name, bool deep_inheritance)
 {
-    return _repository.subclasses(class_name.empty() ? nullptr : known_class(class_name).meta_class, deep_inheritance);
+    return _repository.subclasses(class_name.empty() ? nullptr : _repository.get(class_name).meta_class, deep_inheritance);
 }
 
 std::vector<Object_Path> Own_Operations::enumerate_instance_names(const std::string& class_name)
@@ -123,7 +118,7 @@ std::vector<Object_Path> Own_Operations::enumerate_instance_names(const std::str
 std::vector<Instance> Own_Operations::enumerate_instances(const std::string& class_name, bool deep_inheritance,
                                                           const Property_List& properties)
 {
-    const Class_Entry& named = known_class(class_name);
+    const Class_Entry& named = _repository.get(class_name);
     const Property_List asked = deep_inheritance ? properties : named.layout->names(properties);
     std::vector<Instance> instances;
     for (const Class_Entry* entry : _repository.served(named))
@@ -141,7 +136,7 @@ Instance Own_Operations::get_instance(const Object_Path& path, const Property_Li
 
 Object_Path Own_Operations::create_instance(const Instance& instance)
 {
-    const Class_Entry& entry = known_class(instance.path.class_name);
+    const Class_Entry& entry = _repository.get(instance.path.class_name);
     const Server_Class* server_class = answering(entry);
     if (!server_class || !server_class->create)
         throw Cim_Error(CIM_ERR_NOT_SUPPORTED, std::string("instances of ") + entry.meta_class->name + " cannot be created");

@@ -63,8 +63,7 @@ private:
         std::string near; // the reference that names the source
     };
 
-    const Class_Entry& known_class(const std::string& class_name) const; // throws CIM_ERR_INVALID_CLASS
-    const Server_Class* answering(const Class_Entry& entry) const;       // null when nobody does
+    const Server_Class* answering(const Class_Entry& entry) const; // null when nobody does
     Found find(const Object_Path& path) const;
     std::vector<Named_Value> keys_of(const Class_Entry& entry, const Object_Path& path) const; // typed
 

@@ -83,6 +83,13 @@ const Class_Entry* Repository::find(std::string_view class_name) const
     return found == _index.end() ? nullptr : found->second;
 }
 
+const Class_Entry& Repository::get(std::string_view class_name, int unknown) const
+{
+    if (const Class_Entry* entry = find(class_name))
+        return *entry;
+    throw Cim_Error(unknown, "there is no class " + std::string(class_name));
+}
+
 bool Repository::is_a(const zmlr::Meta_Class* meta_class, const zmlr::Meta_Class* ancestor)
 {
     while (meta_class && meta_class != ancestor)

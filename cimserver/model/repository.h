@@ -38,6 +38,7 @@ public:
     Repository& operator=(const Repository&) = delete;
 
     const Class_Entry* find(std::string_view class_name) const; // null when the module does not know the class
+    const Class_Entry& get(std::string_view class_name, int unknown = CIM_ERR_INVALID_CLASS) const; // throws Cim_Error `unknown`
 
     // Whether a class is `ancestor` or derives from it.
     static bool is_a(const zmlr::Meta_Class* meta_class, const zmlr::Meta_Class* ancestor);

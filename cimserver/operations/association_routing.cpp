@@ -23,12 +23,7 @@ References references_of(const zmlr::Meta_Class& meta_class)
 // A class that a filter names, null when it names none.
 const zmlr::Meta_Class* named(const Repository& known, const std::string& class_name)
 {
-    if (class_name.empty())
-        return nullptr;
-    const Class_Entry* entry = known.find(class_name);
-    if (!entry)
-        throw Cim_Error(CIM_ERR_INVALID_PARAMETER, "there is no class " + class_name);
-    return entry->meta_class;
+    return class_name.empty() ? nullptr : known.get(class_name, CIM_ERR_INVALID_PARAMETER).meta_class;
 }
 
 bool can_name(const zmlr::Meta_Reference& reference, const zmlr::Meta_Class* meta_class, const std::string& role)

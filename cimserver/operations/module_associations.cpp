@@ -36,11 +36,9 @@ auto Module_Operations::traverse(const Object_Path& path, const Association_Filt
                                  Function CMPIAssociationMIFT::*function, Words... words)
 {
     const Module::Use use(_module);
-    const Class_Entry* named = _classes.find(path.class_name);
-    if (!named)
-        throw Cim_Error(CIM_ERR_INVALID_PARAMETER, "there is no class " + path.class_name.string());
-    const std::vector<const Class_Entry*> asked = concerned_associations(_classes, _module.repository(), *named, filter, ends);
-    const std::optional<Object_Path> source = source_of(*named, path);
+    const Class_Entry& named = _classes.get(path.class_name, CIM_ERR_INVALID_PARAMETER);
+    const std::vector<const Class_Entry*> asked = concerned_associations(_classes, _module.repository(), named, filter, ends);
+    const std::optional<Object_Path> source = source_of(named, path);
     if (source)
         for (const Class_Entry* provider : asked)
             if (CMPIAssociationMI* mi = _module.association_mi(*provider))

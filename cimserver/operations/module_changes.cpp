@@ -34,18 +34,18 @@ std::vector<std::string> names_of(const std::vector<Named_Value>& properties)
 
 Module_Operations::Target Module_Operations::target_of(const Object_Path& path)
 {
-    const Class_Entry& named = known_class(path.class_name);
+    const Class_Entry& named = _classes.get(path.class_name);
     if (named.registration)
         return {named, path_to(named, typed_keys(_module.repository(), named, path))};
     Object_Path found = get_instance(path, std::vector<std::string>()).path;
-    const Class_Entry& provider = known_class(found.class_name);
+    const Class_Entry& provider = _classes.get(found.class_name);
     return {provider, std::move(found)};
 }
 
 Object_Path Module_Operations::create_instance(const Instance& instance)
 {
     const Module::Use use(_module);
-    const Class_Entry& entry = known_class(instance.path.class_name);
+    const Class_Entry& entry = _classes.get(instance.path.class_name);
     Instance typed = typed_instance(_module.repository(), entry, instance, CIM_ERR_INVALID_PARAMETER);
     typed.path.name_space = _name_space;
     CMPIInstanceMI* mi = entry.registration ? _module.instance_mi(entry) : nullptr;
@@ -110,7 +110,7 @@ Method_Result Module_Operations::invoke_method(const Object_Path& path, const st
                                                const std::vector<Named_Value>& in)
 {
     const Module::Use use(_module);
-    const Class_Entry& named = known_class(path.class_name);
+    const Class_Entry& named = _classes.get(path.class_name);
     const Class_Entry* provider = method_provider(named, path);
     const zmlr::Meta_Feature* feature = find_feature(provider ? *provider->meta_class : *named.meta_class, name);
     if (!feature || !zmlr::is_method(feature))

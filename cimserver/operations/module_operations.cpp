@@ -22,37 +22,27 @@ Module_Operations::Module_Operations(Module& module, std::string name_space, std
 {
 }
 
-const Class_Entry& Module_Operations::known_class(const std::string& class_name) const
-{
-    const Class_Entry* entry = _classes.find(class_name);
-    if (!entry)
-        throw Cim_Error(CIM_ERR_INVALID_CLASS, "there is no class " + class_name);
-    return *entry;
-}
-
 Object_Path Module_Operations::path_to(const Class_Entry& entry, std::vector<Named_Value> keys) const
 {
     return {{}, _name_space, entry.name, std::move(keys)};
 }
 
+// Of all operations, only this one calls an unknown class "not found" (DSP0200).
 const zmlr::Meta_Class* Module_Operations::get_class(const std::string& class_name)
 {
-    const Class_Entry* entry = _classes.find(class_name);
-    if (!entry) // DSP0200: of all operations, only this one calls an unknown class "not found"
-        throw Cim_Error(CIM_ERR_NOT_FOUND, "there is no class " + class_name);
-    return entry->meta_class;
+    return _classes.get(class_name, CIM_ERR_NOT_FOUND).meta_class;
 }
 
 std::vector<const zmlr::Meta_Class*> Module_Operations::enumerate_classes(const std::string& class_name, bool deep_inheritance)
 {
-    const zmlr::Meta_Class* parent = class_name.empty() ? nullptr : known_class(class_name).meta_class;
+    const zmlr::Meta_Class* parent = class_name.empty() ? nullptr : _classes.get(class_name).meta_class;
     return _classes.subclasses(parent, deep_inheritance);
 }
 
 std::vector<Object_Path> Module_Operations::enumerate_instance_names(const std::string& class_name)
 {
     const Module::Use use(_module);
-    const auto& providers = _classes.served(known_class(class_name));
+    const auto& providers = _classes.served(_classes.get(class_name));
 
     Path_Sink sink(_name_space);
     for (const Class_Entry* provider : providers)
@@ -68,7 +58,7 @@ std::vector<Instance> Module_Operations::enumerate_instances(const std::string& 
                                                              const Property_List& properties)
 {
     const Module::Use use(_module);
-    const Class_Entry& named = known_class(class_name);
+    const Class_Entry& named = _classes.get(class_name);
     const auto& providers = _classes.served(named);
 
     Instance_Sink sink(_name_space, deep_inheritance ? properties : named.layout->names(properties));
@@ -90,7 +80,7 @@ std::vector<Instance> Module_Operations::enumerate_instances(const std::string& 
 Instance Module_Operations::get_instance(const Object_Path& path, const Property_List& properties)
 {
     const Module::Use use(_module);
-    const Class_Entry& named = known_class(path.class_name);
+    const Class_Entry& named = _classes.get(path.class_name);
     const auto& providers = _classes.served(named);
     if (providers.empty())
         typed_keys(_module.repository(), named, path);

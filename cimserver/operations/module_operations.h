@@ -65,7 +65,6 @@ private:
         Object_Path path;
     };
 
-    const Class_Entry& known_class(const std::string& class_name) const;
     Object_Path path_to(const Class_Entry& entry, std::vector<Named_Value> keys = {}) const;
     std::optional<Instance> find_instance(const Class_Entry& provider, std::vector<Named_Value> keys,
                                           const Property_List& properties);
