@@ -16,12 +16,14 @@ constexpr int exit_usage = 2;
 
 std::string check_address(const std::string& text) { return is_address(text) ? "" : text + " is no IPv4 or IPv6 address"; }
 
-// What help shows of a range: the numbers, not the type that holds them.
-template <class T> CLI::Range range(T least, T most)
+// Help shows the numbers of a range, not the type that holds them.
+template <class T>
+void add_number(CLI::App& app, const std::string& name, T& value, std::size_t least, std::size_t most, const std::string& text,
+                const std::string& unit = "NUMBER")
 {
-    CLI::Range result(least, most);
-    result.description(std::to_string(least) + " to " + std::to_string(most));
-    return result;
+    CLI::Range range(least, most);
+    range.description(std::to_string(least) + " to " + std::to_string(most));
+    app.add_option(name, value, text)->type_name(unit)->check(range)->capture_default_str();
 }
 
 void declare_access(CLI::App& app, Options& options)
@@ -43,22 +45,10 @@ void declare_access(CLI::App& app, Options& options)
 
 void declare_limits(CLI::App& app, Http_Limits& limits)
 {
-    app.add_option("--max-request", limits.request_bytes, "largest request")
-        ->type_name("BYTES")
-        ->check(range(std::size_t{1024}, std::size_t{1} << 30))
-        ->capture_default_str();
-    app.add_option("--max-connections", limits.connections, "connections served at once")
-        ->type_name("NUMBER")
-        ->check(range(1, 10000))
-        ->capture_default_str();
-    app.add_option("--max-waiting", limits.waiting_requests, "requests that may wait for a worker")
-        ->type_name("NUMBER")
-        ->check(range(1, 100000))
-        ->capture_default_str();
-    app.add_option("--workers", limits.workers, "requests answered at once")
-        ->type_name("NUMBER")
-        ->check(range(1, 256))
-        ->capture_default_str();
+    add_number(app, "--max-request", limits.request_bytes, 1024, std::size_t{1} << 30, "largest request", "BYTES");
+    add_number(app, "--max-connections", limits.connections, 1, 10'000, "connections served at once");
+    add_number(app, "--max-waiting", limits.waiting_requests, 1, 100'000, "requests that may wait for a worker");
+    add_number(app, "--workers", limits.workers, 1, 256, "requests answered at once");
 }
 
 // Options hold milliseconds, people give seconds.
@@ -84,16 +74,10 @@ void declare_indications(CLI::App& app, Options& options)
     app.add_option("--listener-ca", options.delivery.ca_file, "certificates that vouch for HTTPS listeners [the system's]")
         ->type_name("FILE")
         ->check(CLI::Validator(CLI::ExistingFile).description(""));
-    app.add_option("--delivery-attempts", options.delivery.attempts, "how often an indication is tried")
-        ->type_name("NUMBER")
-        ->check(range(1, 100))
-        ->capture_default_str();
+    add_number(app, "--delivery-attempts", options.delivery.attempts, 1, 100, "how often an indication is tried");
     add_seconds(app, "--delivery-pause", options.delivery.pause, 0, "between attempts");
     add_seconds(app, "--delivery-timeout", options.delivery.timeout, 0.1, "that one attempt may take");
-    app.add_option("--max-indications", options.delivery.waiting, "indications that may wait for a listener")
-        ->type_name("NUMBER")
-        ->check(range(1, 100000))
-        ->capture_default_str();
+    add_number(app, "--max-indications", options.delivery.waiting, 1, 100'000, "indications that may wait for a listener");
 }
 
 void check(const Options& options)
