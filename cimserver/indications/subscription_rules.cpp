@@ -147,7 +147,7 @@ Event_Filter event_filter(const Instance& filter, const Repository& repository)
     if (!entry || (entry->meta_class->flags & zmlr::Flag_Indication) == 0)
         refuse(filter, "there is no indication class " + query.class_name(), CIM_ERR_INVALID_QUERY);
     query.check(*entry->layout);
-    return {std::move(query), entry, {Module_Operations::served_name_space}};
+    return {std::move(query), entry};
 }
 
 Instance complete_destination(Instance instance)

@@ -5,9 +5,6 @@
 #include "cimserver/model/event_query.h"
 #include "cimserver/model/repository.h"
 
-#include <string>
-#include <vector>
-
 namespace cimserver
 {
 
@@ -15,8 +12,7 @@ namespace cimserver
 struct Event_Filter
 {
     Event_Query query;
-    const Class_Entry* entry;             // of the query's class
-    std::vector<std::string> name_spaces; // as the server writes them
+    const Class_Entry* entry; // of the query's class
 };
 
 // Each function takes an instance whose properties and keys are typed (interop/server_class.h) and returns it with all its

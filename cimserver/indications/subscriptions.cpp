@@ -101,7 +101,7 @@ Provider_Filter Subscriptions::provider_filter(const std::string& filter_id) con
 {
     const Entry& filter = table(Kind::filter).at(filter_id);
     const Named_Value* query = find_named(filter.instance.properties, "Query");
-    return {query->value.get<Text>(), filter.filter->query.class_name(), filter.filter->name_spaces};
+    return {query->value.get<Text>(), filter.filter->query.class_name(), {Module_Operations::served_name_space}};
 }
 
 void Subscriptions::insert(Kind kind, const std::string& id, Entry entry)
@@ -266,14 +266,12 @@ void Subscriptions::deliver(const std::string& name_space, const Instance& indic
         routes = _routes;
     }
     const Class_Entry* entry = _module.repository().find(indication.path.class_name);
-    if (!entry)
+    if (!entry || !equal_names(name_space, Module_Operations::served_name_space))
         return;
     for (const Route& route : *routes)
     {
         const Event_Filter& filter = *route.filter;
-        const bool from_here =
-            std::ranges::any_of(filter.name_spaces, [&](const std::string& name) { return equal_names(name, name_space); });
-        if (from_here && Repository::is_a(entry->meta_class, filter.entry->meta_class) && filter.query.wants(indication))
+        if (Repository::is_a(entry->meta_class, filter.entry->meta_class) && filter.query.wants(indication))
             _delivery.send(route.urls, export_message(filter.query.selected(indication)));
     }
 }
