@@ -38,7 +38,7 @@ int subscript_of(const zmlr::Meta_Feature& feature)
     return zmlr::as_reference(&feature)->subscript != 0 ? -1 : 0;
 }
 
-const char* element_of(const zmlr::Meta_Feature& feature, const Element_Names& names)
+const char* element_name(const zmlr::Meta_Feature& feature, const Element_Names& names)
 {
     const bool array = subscript_of(feature) != 0;
     if (zmlr::is_reference(&feature))
@@ -76,7 +76,7 @@ void write_origin(Xml_Writer& writer, const zmlr::Meta_Class& meta_class, unsign
 void write_property(Xml_Writer& writer, const zmlr::Meta_Class& meta_class, unsigned index, const Class_Selection& selection)
 {
     const zmlr::Meta_Feature& feature = *meta_class.meta_features[index];
-    const char* element = element_of(feature, property_elements);
+    const char* element = element_name(feature, property_elements);
     if (!element)
         return;
     start_typed(writer, element, feature);
@@ -103,7 +103,7 @@ void write_method(Xml_Writer& writer, const zmlr::Meta_Class& meta_class, unsign
         const zmlr::Meta_Feature& parameter = *method.meta_features[i];
         if (equal_names(parameter.name, "return_value"))
             continue;
-        start_typed(writer, element_of(parameter, parameter_elements), parameter);
+        start_typed(writer, element_name(parameter, parameter_elements), parameter);
         if (selection.qualifiers)
             write_parameter_qualifiers(writer, meta_class, method, parameter);
         writer.end();

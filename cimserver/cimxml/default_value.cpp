@@ -57,7 +57,7 @@ Value default_of(const zmlr::Meta_Property& property)
 {
     const CMPIType type = cmpi_type(property.type);
     const bool array = property.subscript != 0;
-    Value value{array ? static_cast<CMPIType>(type | CMPI_ARRAY) : type, {}};
+    Value value{array ? array_of(type) : type, {}};
     if (!property.value || (!property.value->data && (!array || property.value->size > 0)))
         return value;
 

@@ -2,6 +2,7 @@
 
 #include "cimserver/cimxml/http_message.h"
 #include "cimserver/cimxml/request_rules.h"
+#include "cimserver/model/cim_types.h"
 #include "cimserver/model/names.h"
 #include "cimserver/model/value_reader.h"
 
@@ -47,9 +48,7 @@ void add_key(Object_Path& path, const Xml_Element& binding)
 
 Object_Path read_instance_name(const Xml_Element& element, const std::string& name_space)
 {
-    Object_Path path;
-    path.name_space = name_space;
-    path.class_name = *element.attribute("CLASSNAME");
+    Object_Path path{{}, name_space, *element.attribute("CLASSNAME"), {}};
     if (element.children.size() == 1 && element.children.front().name != "KEYBINDING")
     {
         path.keys.push_back({"", read_key(element.children.front(), name_space)});
@@ -57,14 +56,6 @@ Object_Path read_instance_name(const Xml_Element& element, const std::string& na
     }
     for (const Xml_Element& binding : element.children)
         add_key(path, binding);
-    return path;
-}
-
-Object_Path read_class_name(const Xml_Element& element, const std::string& name_space)
-{
-    Object_Path path;
-    path.name_space = name_space;
-    path.class_name = *element.attribute("NAME");
     return path;
 }
 
@@ -88,7 +79,7 @@ Value read_array(const Xml_Element& element, CMPIType element_type, const std::s
     std::vector<Value> elements;
     for (const Xml_Element& child : element.children)
         elements.push_back(child.name == "VALUE.NULL" ? Value{element_type, {}} : read_value(child, name_space));
-    return {static_cast<CMPIType>(element_type | CMPI_ARRAY), std::move(elements)};
+    return {array_of(element_type), std::move(elements)};
 }
 
 Named_Value read_property(const Xml_Element& element, const std::string& name_space)
@@ -150,7 +141,7 @@ std::string read_name_space(const Xml_Element& element)
 Object_Path read_path(const Xml_Element& element, const std::string& name_space)
 {
     if (element.name == "CLASSNAME")
-        return read_class_name(element, name_space);
+        return {{}, name_space, *element.attribute("NAME"), {}};
     if (element.name == "INSTANCENAME")
         return read_instance_name(element, name_space);
     if (element.name == "VALUE.REFERENCE")

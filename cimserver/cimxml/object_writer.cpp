@@ -73,8 +73,7 @@ std::optional<std::vector<std::string>> element_texts(const std::vector<Value>& 
 
 void write_array(Xml_Writer& writer, const std::vector<Value>& elements, CMPIType type)
 {
-    const CMPIType element_type = type & static_cast<CMPIType>(~CMPI_ARRAY);
-    const auto texts = element_texts(elements, element_type == CMPI_string);
+    const auto texts = element_texts(elements, element_of(type) == CMPI_string);
     if (!texts)
         return;
     writer.start("VALUE.ARRAY");

@@ -17,15 +17,6 @@ using Declaration = Qualifier_Declaration;
 
 std::span<const Declaration> declarations() { return {qualifier_declarations, num_qualifier_declarations}; }
 
-// Null when there is none of that name.
-const Declaration* find_declaration(std::string_view name)
-{
-    for (const Declaration& row : declarations())
-        if (equal_names(row.name, name))
-            return &row;
-    return nullptr;
-}
-
 void start(Xml_Writer& writer, const char* element, const Declaration& row)
 {
     writer.start(element).attribute("NAME", row.name).attribute("TYPE", row.type);
@@ -39,7 +30,7 @@ void start(Xml_Writer& writer, const char* element, const Declaration& row)
 
 void write_qualifier(Xml_Writer& writer, std::string_view name, std::string_view value)
 {
-    start(writer, "QUALIFIER", *find_declaration(name));
+    start(writer, "QUALIFIER", *find_named(declarations(), name));
     writer.element("VALUE", value).end();
 }
 
@@ -92,7 +83,7 @@ Rows rows_of(std::string_view class_name)
 void write_row(Xml_Writer& writer, const Qualifier_Row& row)
 {
     const std::span<const char* const> texts(row.values, row.num_values);
-    start(writer, "QUALIFIER", *find_declaration(row.name));
+    start(writer, "QUALIFIER", *find_named(declarations(), row.name));
     if (row.array)
         writer.start("VALUE.ARRAY");
     for (const char* value : texts)
@@ -153,7 +144,7 @@ void write_qualifier_declarations(Xml_Writer& writer)
 
 bool write_qualifier_declaration(Xml_Writer& writer, std::string_view name)
 {
-    const Declaration* row = find_declaration(name);
+    const Declaration* row = find_named(declarations(), name);
     if (row)
         write_declaration(writer, *row);
     return row != nullptr;

@@ -1,6 +1,7 @@
 #include "cimserver/cimxml/request_rules.h"
 
 #include "cimserver/cimxml/http_message.h"
+#include "cimserver/model/value_reader.h"
 
 #include <algorithm>
 #include <array>
@@ -84,8 +85,6 @@ const Rule& rule_of(std::string_view name)
     return *rule;
 }
 
-bool blank(std::string_view text) { return text.find_first_not_of(" \t\r\n") == std::string_view::npos; }
-
 void check_attributes(const Xml_Element& element, const Rule& rule)
 {
     for (std::string_view name : rule.attributes)
@@ -113,7 +112,7 @@ void check_rules(const Xml_Element& element)
     check_attributes(element, rule);
     if (rule.content == Content::opaque)
         return;
-    if (rule.content == Content::elements && !blank(element.text))
+    if (rule.content == Content::elements && !trimmed(element.text).empty())
         refuse();
     check_children(element, rule);
 }

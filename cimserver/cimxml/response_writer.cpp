@@ -36,20 +36,17 @@ std::string write_message(const Cimxml_Request& request, const std::function<voi
 
 } // namespace
 
-std::string write_success(const Cimxml_Request& request, const std::function<void(Xml_Writer&)>& content)
+std::string write_success(const Cimxml_Request& request, Answer answer, const std::function<void(Xml_Writer&)>& run)
 {
+    if (answer == Answer::nothing)
+        return write_message(request, run);
     return write_message(request,
                          [&](Xml_Writer& writer)
                          {
                              writer.start("IRETURNVALUE");
-                             content(writer);
+                             run(writer);
                              writer.end();
                          });
-}
-
-std::string write_empty_success(const Cimxml_Request& request, const std::function<void(Xml_Writer&)>& run)
-{
-    return write_message(request, run);
 }
 
 std::string write_method_result(const Cimxml_Request& request, const Method_Result& result)

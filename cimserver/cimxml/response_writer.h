@@ -12,12 +12,15 @@
 namespace cimserver
 {
 
-// A response to an intrinsic operation with the children of its IRETURNVALUE, which `content` writes. What it throws passes
-// through.
-std::string write_success(const Cimxml_Request& request, const std::function<void(Xml_Writer&)>& content);
+enum class Answer
+{
+    value,  // an IRETURNVALUE, perhaps empty
+    nothing // no IRETURNVALUE at all
+};
 
-// A response to an intrinsic operation that returns nothing, once `run` has run. What it throws passes through.
-std::string write_empty_success(const Cimxml_Request& request, const std::function<void(Xml_Writer&)>& run);
+// A response to an intrinsic operation, once `run` has run, which writes the children of the IRETURNVALUE. What it throws passes
+// through.
+std::string write_success(const Cimxml_Request& request, Answer answer, const std::function<void(Xml_Writer&)>& run);
 
 // A response to a method call: the return value, unless it is null, and the output parameters that have a value.
 std::string write_method_result(const Cimxml_Request& request, const Method_Result& result);

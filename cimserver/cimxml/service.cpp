@@ -71,13 +71,13 @@ void enumerate_qualifiers(Name_Spaces& name_spaces, const Parameters& parameters
 // A key without a name is the only key of its class.
 void name_single_key(Name_Spaces& name_spaces, Object_Path& path)
 {
-    if (path.keys.size() != 1 || !path.keys.front().name.string().empty())
+    if (path.keys.size() != 1 || !path.keys.front().name.empty())
         return;
     const zmlr::Meta_Class& meta_class = *name_spaces.at(path).get_class(path.class_name);
     for (unsigned i = 0; meta_class.num_keys == 1 && i < meta_class.num_meta_features; ++i)
         if (zmlr::is_key(meta_class.meta_features[i]))
             path.keys.front().name = meta_class.meta_features[i]->name;
-    if (path.keys.front().name.string().empty())
+    if (path.keys.front().name.empty())
         throw Cim_Error(CIM_ERR_INVALID_PARAMETER, "unnamed key of a class with several keys: " + path.class_name.string());
 }
 
@@ -209,12 +209,6 @@ template <bool to_associations> void traverse_names(Name_Spaces& name_spaces, co
     }
 }
 
-enum class Answer
-{
-    value,  // an IRETURNVALUE, perhaps empty
-    nothing // no IRETURNVALUE at all
-};
-
 enum class Asks
 {
     nobody,
@@ -274,9 +268,8 @@ constexpr Operation_Row operation_rows[] = {
 
 const Operation_Row& row_of(const std::string& method)
 {
-    for (const Operation_Row& row : operation_rows)
-        if (equal_names(row.name, method))
-            return row;
+    if (const Operation_Row* row = find_named(operation_rows, method))
+        return *row;
     throw Cim_Error(CIM_ERR_NOT_SUPPORTED, "operation not supported: " + method);
 }
 
@@ -299,8 +292,7 @@ bool may_take_long(Name_Spaces& name_spaces, const Operation_Row& row, const Par
 std::string run_operation(Name_Spaces& name_spaces, const Operation_Row& row, const Parameters& parameters,
                           const Cimxml_Request& request)
 {
-    const auto run = [&](Xml_Writer& writer) { row.run(name_spaces, parameters, writer); };
-    return row.answer == Answer::value ? write_success(request, run) : write_empty_success(request, run);
+    return write_success(request, row.answer, [&](Xml_Writer& writer) { row.run(name_spaces, parameters, writer); });
 }
 
 std::string call_method(Name_Spaces& name_spaces, const Cimxml_Request& request)

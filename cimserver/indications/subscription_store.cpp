@@ -1,6 +1,7 @@
 #include "cimserver/indications/subscription_store.h"
 
 #include "cimserver/interop/server_schema.h"
+#include "cimserver/model/cim_types.h"
 
 #include <nlohmann/json.hpp>
 
@@ -96,7 +97,7 @@ Value value_of(const Json& json)
         std::vector<Value> elements;
         for (const Json& element : json)
             elements.push_back(value_of(element));
-        return {static_cast<CMPIType>(CMPI_string | CMPI_ARRAY), std::move(elements)};
+        return {array_of(CMPI_string), std::move(elements)};
     }
     Object_Path path;
     path.name_space = json.at("name space");

@@ -1,6 +1,7 @@
 #include "cimserver/interop/object_manager.h"
 
 #include "cimserver/interop/server_schema.h"
+#include "cimserver/model/cim_types.h"
 #include "cimserver/model/server_identity.h"
 
 #include <algorithm>
@@ -15,8 +16,6 @@ constexpr const char* product = "zmlr-cimserver";
 constexpr const char* system_class = "CIM_ComputerSystem";
 
 Value text(std::string value) { return {CMPI_string, std::move(value)}; }
-
-Value array_of(const Value& element) { return {static_cast<CMPIType>(element.type | CMPI_ARRAY), std::vector<Value>{element}}; }
 
 std::string manager_name() { return std::string(product) + ':' + host_name(); }
 
@@ -36,7 +35,8 @@ std::vector<Instance> object_managers()
     instance.properties.push_back({"Description", text(std::string(product) + " version " + version())});
     instance.properties.push_back({"Started", {CMPI_boolean, true}});
     instance.properties.push_back({"GatherStatisticalData", {CMPI_boolean, false}});
-    instance.properties.push_back({"OperationalStatus", array_of({CMPI_uint16, std::uint64_t{2}})}); // OK
+    instance.properties.push_back(
+        {"OperationalStatus", {array_of(CMPI_uint16), std::vector<Value>{{CMPI_uint16, std::uint64_t{2}}}}}); // OK
     return {instance};
 }
 

@@ -2,6 +2,7 @@
 #pragma once
 
 #include <cstddef>
+#include <ranges>
 #include <string>
 #include <string_view>
 #include <unordered_map>
@@ -27,7 +28,8 @@ struct Name_Equal
 template <class T> using Name_Map = std::unordered_map<std::string_view, T, Name_Hash, Name_Equal>;
 
 // The element of a list of named things that has the name, or null.
-template <class List> auto find_named(List& list, std::string_view name) -> decltype(list.data())
+template <std::ranges::borrowed_range List>
+auto find_named(List&& list, std::string_view name) -> decltype(std::ranges::data(list))
 {
     for (auto& element : list)
         if (equal_names(element.name, name))

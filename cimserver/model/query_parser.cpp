@@ -3,8 +3,8 @@
 #include "cimserver/model/names.h"
 #include "cimserver/model/query_tokens.h"
 
+#include <algorithm>
 #include <charconv>
-#include <iterator>
 #include <string_view>
 
 namespace cimserver
@@ -41,10 +41,7 @@ constexpr std::string_view keywords[] = {"SELECT", "FROM", "WHERE", "AND",   "OR
 
 bool is_keyword(std::string_view word)
 {
-    for (const std::string_view keyword : keywords)
-        if (equal_names(keyword, word))
-            return true;
-    return false;
+    return std::ranges::any_of(keywords, [&](std::string_view keyword) { return equal_names(keyword, word); });
 }
 
 class Parser

@@ -100,7 +100,6 @@ private:
 };
 
 inline constexpr int CIM_ERR_FAILED = 1;
-inline constexpr int CIM_ERR_ACCESS_DENIED = 2;
 inline constexpr int CIM_ERR_INVALID_NAMESPACE = 3;
 inline constexpr int CIM_ERR_INVALID_PARAMETER = 4;
 inline constexpr int CIM_ERR_INVALID_CLASS = 5;

@@ -66,7 +66,7 @@ private:
         const auto* elements = given.as<std::vector<Value>>();
         if (!elements)
             return {};
-        const CMPIType type = cmpi_type(feature) & static_cast<CMPIType>(~CMPI_ARRAY);
+        const CMPIType type = element_of(cmpi_type(feature));
         std::vector<Value> result;
         result.reserve(elements->size());
         for (const Value& element : *elements)
