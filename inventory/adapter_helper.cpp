@@ -126,7 +126,7 @@ Instance_Array AdapterHelper::getInstancesByClass(classId_t id, const Inventory_
 {
     const Scope_Trace trace(log_source);
     Instance_Array instances;
-    Adapter_Walk adapters(adapter_walk);
+    Adapter_Walk adapters(adapter_walk, &request.wanted);
     if (adapters.count() == 0)
         return instances;
 
@@ -134,8 +134,8 @@ Instance_Array AdapterHelper::getInstancesByClass(classId_t id, const Inventory_
     bool storage_driver_is_told = false;
     while (adapters.next())
     {
-        std::optional<Open_Port> port = open_port(adapter_walk, adapters.adapter(), 0);
-        if (!port || !request.wanted.may_be_of(*port))
+        std::optional<Open_Port> port = open_port(adapter_walk, adapters.adapter(), 0, &request.wanted);
+        if (!port)
             continue;
         std::optional<Hba_Reading> adapter = read_hba(adapters.adapter(), std::move(*port), request);
         if (!adapter)

@@ -64,17 +64,21 @@ std::optional<Open_Adapter> open_adapter(const Walk_Row& row, int index)
     return handle ? with_ports(row, *handle) : std::nullopt;
 }
 
-std::optional<Open_Port> open_port(const Walk_Row& row, const Open_Adapter& adapter, int index)
+std::optional<Open_Port> open_port(const Walk_Row& row, const Open_Adapter& adapter, int index, const Wanted* wanted)
 {
-    Ioc_Handle ethernet(take_ethernet(row, adapter, index));
-    Ioc_Handle fc(take_fc(row, adapter, index));
-    if (ethernet || fc)
-        return Open_Port{adapter.index, index, std::move(ethernet), std::move(fc)};
-    say(row, row.no_ioc, adapter.index, index);
+    hxal_t* const ethernet = take_ethernet(row, adapter, index);
+    hxal_t* const fc = take_fc(row, adapter, index);
+    if (!ethernet && !fc)
+        say(row, row.no_ioc, adapter.index, index);
+    else if (!wanted || wanted->may_be_of(adapter.index, index, ethernet, fc))
+        return Open_Port{adapter.index, index, Ioc_Handle(ethernet), Ioc_Handle(fc)};
     return std::nullopt;
 }
 
-Adapter_Walk::Adapter_Walk(const Walk_Row& row) : _row(row), _count(static_cast<int>(hxal_adapter_get_num()))
+Adapter_Walk::Adapter_Walk(const Walk_Row& row, const Wanted* wanted)
+    : _row(row)
+    , _wanted(log_wanted(LL_ERR) ? nullptr : wanted)
+    , _count(static_cast<int>(hxal_adapter_get_num()))
 {
     say(row, row.count, _count);
     if (_count == 0)
@@ -91,6 +95,13 @@ bool Adapter_Walk::next()
             return false;
         if (!_handle)
             continue;
+        if (_wanted) // the adapters before it are passed over at once
+        {
+            _handle = _wanted->first_of(_handle, _row.iocs);
+            if (!_handle)
+                return false;
+            _index = _handle->id;
+        }
         if (_row.no_cna.text && !_handle->cna_capable)
         {
             say(_row, _row.no_cna, _index);
@@ -107,7 +118,7 @@ bool Port_Walk::next()
 {
     while (++_index < _adapter.ports)
     {
-        _port = open_port(_row, _adapter, _index);
+        _port = open_port(_row, _adapter, _index, _wanted);
         if (_port)
             return true;
     }

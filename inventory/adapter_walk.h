@@ -10,6 +10,7 @@
 #pragma once
 
 #include "hxal/hxal.h"
+#include "inventory/wanted.h"
 #include "runtime/log.h"
 
 #include <memory>
@@ -23,15 +24,6 @@ struct Walk_Line
 {
     Log_Level level = LL_INFO;
     const char* text = nullptr;
-};
-
-// Which IOCs of a port are taken. A port is visited when it has one of them.
-enum class Iocs
-{
-    fc,
-    ethernet,
-    of_card, // the FC one, on a CNA the Ethernet one too
-    any      // both, whatever the adapter says it is
 };
 
 struct Walk_Row
@@ -84,13 +76,14 @@ struct Open_Port
 // One adapter: empty when it cannot be opened or has no ports.
 std::optional<Open_Adapter> open_adapter(const Walk_Row& row, int index);
 
-// One port: empty when it has none of the IOCs.
-std::optional<Open_Port> open_port(const Walk_Row& row, const Open_Adapter& adapter, int index);
+// One port: empty when it has none of the IOCs, or when what is wanted (null: everything) is not of it.
+std::optional<Open_Port> open_port(const Walk_Row& row, const Open_Adapter& adapter, int index, const Wanted* wanted = nullptr);
 
 class Adapter_Walk
 {
 public:
-    explicit Adapter_Walk(const Walk_Row& row);
+    // Adapters that have nothing of what is wanted (null: everything) may be left out.
+    explicit Adapter_Walk(const Walk_Row& row, const Wanted* wanted = nullptr);
 
     int count() const { return _count; } // of all adapters
     bool next();                         // to the next adapter that can be visited; false at the end
@@ -98,6 +91,7 @@ public:
 
 private:
     const Walk_Row& _row;
+    const Wanted* const _wanted; // null too while the log takes lines of each adapter
     const int _count;
     int _index = 0;
     hxal_adapter_t* _handle = nullptr; // of the index; null when it cannot be opened
@@ -107,14 +101,20 @@ private:
 class Port_Walk
 {
 public:
-    Port_Walk(const Walk_Row& row, const Open_Adapter& adapter) : _row(row), _adapter(adapter) {}
+    Port_Walk(const Walk_Row& row, const Open_Adapter& adapter, const Wanted* wanted = nullptr)
+        : _row(row)
+        , _adapter(adapter)
+        , _wanted(wanted)
+    {
+    }
 
-    bool next(); // to the next port that can be visited; false at the end
+    bool next(); // to the next port that can be visited and may be wanted; false at the end
     Open_Port& port() { return *_port; }
 
 private:
     const Walk_Row& _row;
     const Open_Adapter& _adapter;
+    const Wanted* const _wanted;
     int _index = -1;
     std::optional<Open_Port> _port;
 };

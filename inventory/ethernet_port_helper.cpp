@@ -69,10 +69,8 @@ constexpr Builder<Ethernet_Reading> ethernet_builders[] = {
 
 void append(Instance_Array& instances, classId_t id, const Open_Adapter& adapter, const Inventory_Request& request)
 {
-    for (Port_Walk ports(ethernet_walk, adapter); ports.next();)
+    for (Port_Walk ports(ethernet_walk, adapter, &request.wanted); ports.next();)
     {
-        if (!request.wanted.may_be_of(ports.port()))
-            continue;
         if (std::optional<Ethernet_Reading> reading = read_ethernet_port(ports.port(), request))
             build(instances, ethernet_builders, id, *reading, log_source, "Unhandled class support");
     }
@@ -90,7 +88,7 @@ Instance_Array EthernetPortHelper::getInstancesByClass(classId_t id, const Inven
 {
     const Scope_Trace trace(log_source);
     Instance_Array instances;
-    for (Adapter_Walk adapters(ethernet_walk); adapters.next();)
+    for (Adapter_Walk adapters(ethernet_walk, &request.wanted); adapters.next();)
     {
         const Scope_Trace of_adapter(log_source, "getInstancesByAdapterId");
         append(instances, id, adapters.adapter(), request);

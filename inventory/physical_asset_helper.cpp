@@ -6,8 +6,6 @@
 #include "runtime/log.h"
 #include "runtime/trace.h"
 
-#include <charconv>
-
 namespace zmlr
 {
 
@@ -32,18 +30,6 @@ void append_connector(Instance_Array& instances, const _sfpInfo& info) { instanc
 constexpr Builder<const _sfpInfo> module_builders[] = {
     {CLASSID_PhysicalConnector, append_connector},
 };
-
-// A connector's tag ends with the indexes of adapter and port.
-bool may_be_in(const Open_Port& port, const Wanted& wanted)
-{
-    if (wanted.is_all())
-        return true;
-    char end[32] = "_"; // and zeros
-    char* next = std::to_chars(end + 1, end + 12, port.adapter).ptr;
-    *next = '_';
-    std::to_chars(next + 1, next + 12, port.index);
-    return wanted.may_end_with(end);
-}
 
 void append_module(Instance_Array& instances, classId_t id, const Open_Adapter& adapter, const Open_Port& port)
 {
@@ -70,13 +56,10 @@ Instance_Array PhysicalAssetHelper::getInstancesByClass(classId_t id, const Inve
 {
     const Scope_Trace trace(log_source);
     Instance_Array instances;
-    for (Adapter_Walk adapters(module_walk); adapters.next();)
+    for (Adapter_Walk adapters(module_walk, &request.wanted); adapters.next();)
     {
-        for (Port_Walk ports(module_walk, adapters.adapter()); ports.next();)
-        {
-            if (may_be_in(ports.port(), request.wanted))
-                append_module(instances, id, adapters.adapter(), ports.port());
-        }
+        for (Port_Walk ports(module_walk, adapters.adapter(), &request.wanted); ports.next();)
+            append_module(instances, id, adapters.adapter(), ports.port());
     }
     return instances;
 }

@@ -117,10 +117,8 @@ constexpr Builder<const Port_Reading> port_builders[] = {
 
 void append_ports(Instance_Array& instances, classId_t id, const Open_Adapter& adapter, const Inventory_Request& request)
 {
-    for (Port_Walk ports(port_walk, adapter); ports.next();)
+    for (Port_Walk ports(port_walk, adapter, &request.wanted); ports.next();)
     {
-        if (!request.wanted.may_be_of(ports.port()))
-            continue;
         if (const std::optional<Port_Reading> reading = read_port(adapter, ports.port(), request))
             build(instances, port_builders, id, *reading, log_source, "Unhandled class support");
     }
@@ -138,7 +136,7 @@ Instance_Array PortHelper::getInstancesByClass(classId_t id, const Inventory_Req
 {
     const Scope_Trace trace(log_source);
     Instance_Array instances;
-    for (Adapter_Walk adapters(port_walk); adapters.next();)
+    for (Adapter_Walk adapters(port_walk, &request.wanted); adapters.next();)
     {
         const Scope_Trace of_adapter(log_source, "getInstancesByAdapterId");
         append_ports(instances, id, adapters.adapter(), request);

@@ -1,14 +1,15 @@
 #include "inventory/wanted.h"
 
-#include "inventory/property_text.h"
 #include "runtime/ascii.h"
 #include "text/integers.h"
 
 #include <algorithm>
+#include <array>
+#include <bit>
 #include <cstring>
 #include <optional>
-#include <span>
 #include <string_view>
+#include <utility>
 
 namespace zmlr
 {
@@ -17,6 +18,11 @@ namespace
 {
 
 constexpr uint32 longest_key = 512; // longer than any of ours: a client's may be of any size
+constexpr uint32 longest_name = 15; // of an interface; a serial number has 12 characters
+
+// What is compared of a name, and where its last 8 bytes begin.
+constexpr std::size_t compared_size = sizeof(hxal_t::serialnum);
+constexpr std::size_t last_bytes_at = compared_size - sizeof(std::uint64_t);
 
 // A property's text; null when it has none.
 const String* text_of(const Instance* model, const Meta_Property* property)
@@ -24,6 +30,12 @@ const String* text_of(const Instance* model, const Meta_Property* property)
     if (property->type != STRING || property->subscript != 0 || null_of(model, property))
         return nullptr;
     return static_cast<const String*>(address_of(model, property->offset));
+}
+
+// Whether a key, by its name, tells nothing of the adapter or port that an instance is of.
+bool tells_no_place(std::string_view name)
+{
+    return name.ends_with("CreationClassName") || name == "SystemName" || name == "Vendor" || name == "Version";
 }
 
 int digit_of(char c)
@@ -34,66 +46,51 @@ int digit_of(char c)
     return lower >= 'a' && lower <= 'f' ? lower - 'a' + 10 : -1;
 }
 
-// The digits in a key, hyphens left out; -1 for everything else.
-std::vector<int> digits_in(const String& key)
-{
-    std::vector<int> digits;
-    for (const char* c = key.c_str(); *c; c++)
-    {
-        if (*c != '-')
-            digits.push_back(digit_of(*c));
-    }
-    return digits;
-}
-
-std::uint64_t as_number(const void* bytes, std::size_t size)
+template <std::size_t size> std::uint64_t as_number(const void* bytes)
 {
     std::uint64_t number = 0;
     std::memcpy(&number, bytes, size);
     return number;
 }
 
-// Appends every address of `size` bytes that stands in the digits.
-void append_addresses(std::vector<std::uint64_t>& addresses, std::span<const int> digits, std::size_t size)
+// An address whose digits end the number.
+template <class Address> Address address_in(std::uint64_t number)
 {
-    for (std::size_t i = 0; i + 2 * size <= digits.size(); i++)
-    {
-        const auto part = digits.subspan(i, 2 * size);
-        if (std::ranges::find(part, -1) != part.end())
-            continue;
-        unsigned char bytes[sizeof(std::uint64_t)] = {};
-        for (std::size_t byte = 0; byte < size; byte++)
-            bytes[byte] = static_cast<unsigned char>(part[2 * byte] << 4 | part[2 * byte + 1]);
-        addresses.push_back(as_number(bytes, sizeof bytes));
-    }
+    std::array<unsigned char, sizeof(Address)> bytes;
+    for (std::size_t i = bytes.size(); i > 0; i--, number >>= 8)
+        bytes[i - 1] = static_cast<unsigned char>(number);
+    return std::bit_cast<Address>(bytes);
 }
 
-// What stands behind the last underscore, when it is a number.
-std::optional<std::uint64_t> number_at_end(const String& key)
+// What stands behind the last underscore, when it is a number; the text is cut before it.
+std::optional<std::uint64_t> cut_number(std::string_view& text)
 {
-    const std::string_view text(key.c_str(), key.size());
     const std::size_t underscore = text.rfind('_');
-    return underscore == text.npos ? std::nullopt : text::read_digits(text.substr(underscore + 1), 10);
+    if (underscore == text.npos)
+        return std::nullopt;
+    const std::string_view digits = text.substr(underscore + 1);
+    text = text.substr(0, underscore);
+    return text::read_digits(digits, 10);
 }
 
-// An address of zeros is none, and stands in many keys.
-bool holds(const std::vector<std::uint64_t>& addresses, std::uint64_t address)
+bool holds(const std::vector<std::uint64_t>& numbers, std::uint64_t number)
 {
-    return address != 0 && std::ranges::find(addresses, address) != addresses.end();
+    return std::ranges::find(numbers, number) != numbers.end();
 }
 
-// Names and serial numbers that are counted up differ at their ends. A byte that may be shown as another is like any.
-bool ends_alike(const String& key, const char* field, std::size_t size)
+// The first of a list, linked through `next`, up to its end that fits, else the end.
+template <class Node, class Fits> Node* first_that(Node* node, Node* end, Fits fits)
 {
-    for (std::size_t i = size; i > 0; i--)
-    {
-        if (ascii::to_lower(field[i - 1]) != ascii::to_lower(key.c_str()[i - 1]))
-            return static_cast<signed char>(field[i - 1]) < ' ';
-    }
-    return true;
+    while (node != end && !fits(*node))
+        node = node->next;
+    return node;
 }
 
-constexpr std::uint64_t size_bit(std::size_t size) { return size < 64 ? std::uint64_t{1} << size : 0; }
+template <class Is_Of> bool has_ioc(const hxal_adapter_t& adapter, Iocs iocs, Is_Of is_of)
+{
+    return (iocs != Iocs::ethernet && first_that<hxal_t>(adapter.fcioc_list, nullptr, is_of)) ||
+           (iocs != Iocs::fc && first_that<hxal_t>(adapter.ethioc_list, nullptr, is_of));
+}
 
 } // namespace
 
@@ -110,14 +107,73 @@ Wanted::Wanted(const Instance* model)
             *this = Wanted();
             return;
         }
-        const std::vector<int> digits = digits_in(*key);
-        append_addresses(_wwns, digits, sizeof(wwn_t));
-        append_addresses(_macs, digits, sizeof(mac_t));
-        if (const std::optional<std::uint64_t> number = number_at_end(*key))
+        if (tells_no_place(feature->name))
+            continue;
+        append_addresses(*key);
+        std::string_view text(key->c_str(), key->size());
+        const std::optional<std::uint64_t> number = cut_number(text);
+        if (number)
             _numbers.push_back(*number);
-        _sizes |= size_bit(key->size());
+        if (const std::optional<std::uint64_t> before = cut_number(text); number && before)
+            _places.push_back({*before, *number});
+        if (key->size() <= longest_name)
+            _names.emplace_back(*key);
         _keys.push_back(*key);
     }
+}
+
+// A row of digits may end with a WWN, whose first two bytes are not zero, or with a MAC address. One of zeros is none, and stands
+// in many keys.
+void Wanted::append_address(std::size_t digits, std::uint64_t number)
+{
+    constexpr std::uint64_t mac_digits = 0xFFFF'FFFF'FFFF;
+    if (digits >= 2 * sizeof(wwn_t) && number > mac_digits)
+        _wwns.push_back(address_in<wwn_t>(number));
+    else if (digits >= 2 * sizeof(mac_t) && (number & mac_digits) != 0)
+        _macs.push_back(address_in<mac_t>(number));
+}
+
+// Hyphens between digits do not count.
+void Wanted::append_addresses(const String& key)
+{
+    std::size_t digits = 0;
+    std::uint64_t number = 0; // of the last 16
+    for (const char* c = key.c_str(); *c; c++)
+    {
+        const int digit = digit_of(*c);
+        if (digit >= 0)
+        {
+            digits++;
+            number = number << 4 | static_cast<std::uint64_t>(digit);
+        }
+        else if (*c != '-')
+            append_address(std::exchange(digits, 0), number);
+    }
+    append_address(digits, number);
+}
+
+Wanted::Name::Name(const String& key)
+{
+    unsigned char mask[compared_size];
+    unsigned char value[compared_size];
+    for (std::size_t i = 0; i < compared_size; i++)
+    {
+        const char c = i < key.size() ? key.c_str()[i] : '\0';
+        const bool is_letter = ascii::to_lower(c) >= 'a' && ascii::to_lower(c) <= 'z';
+        mask[i] = c == '?' ? 0 : is_letter ? 0xDF : 0xFF;
+        value[i] = static_cast<unsigned char>(c) & mask[i];
+    }
+    first_mask = as_number<sizeof first_mask>(mask);
+    first = as_number<sizeof first>(value);
+    last_mask = as_number<sizeof last_mask>(mask + last_bytes_at);
+    last = as_number<sizeof last>(value + last_bytes_at);
+}
+
+// Names that are counted up differ at their ends.
+bool Wanted::Name::is_in(const char* field) const
+{
+    return (as_number<sizeof last>(field + last_bytes_at) & last_mask) == last &&
+           (as_number<sizeof first>(field) & first_mask) == first;
 }
 
 bool Wanted::may_hold(wwn_t wwn) const { return is_all() || holds(_wwns, wwn); }
@@ -133,31 +189,36 @@ bool Wanted::may_end_with(const char* text) const
                                            });
 }
 
-bool Wanted::may_end_with_number(std::uint32_t number) const
+bool Wanted::may_end_with_number(std::uint32_t number) const { return is_all() || holds(_numbers, number); }
+
+// A name's numbers are copied to stay in registers while a list is passed over.
+template <class Use> void Wanted::use_tests(Use use) const
 {
-    return is_all() || std::ranges::find(_numbers, number) != _numbers.end();
+    for (const wwn_t wwn : _wwns)
+        use([=](const hxal_t& ioc) { return ioc.pwwn == wwn || ioc.nwwn == wwn; });
+    for (const mac_t& mac : _macs)
+        use([&](const hxal_t& ioc) { return std::memcmp(ioc.mac.mac, mac.mac, sizeof mac.mac) == 0; });
+    for (const Name& name : _names)
+        use([=](const hxal_t& ioc) { return name.is_in(ioc.serialnum) || name.is_in(ioc.eth_name); });
 }
 
-template <std::size_t N> bool Wanted::has_key(const char (&field)[N]) const
+bool Wanted::may_be_of(int adapter, int port, const hxal_t* ethernet, const hxal_t* fc) const
 {
-    static_assert(N <= 64);
-    const std::size_t size = ::strnlen(field, N);
-    return (_sizes & size_bit(size)) != 0 && std::ranges::any_of(_keys,
-                                                                 [&](const String& key) {
-                                                                     return key.size() == size && ends_alike(key, field, size) &&
-                                                                            key.equali(property_text(field));
-                                                                 });
+    const Place place = {static_cast<std::uint64_t>(adapter), static_cast<std::uint64_t>(port)};
+    bool may_be = is_all() || std::ranges::find(_places, place) != _places.end();
+    use_tests([&](auto is_of) { may_be = may_be || (ethernet && is_of(*ethernet)) || (fc && is_of(*fc)); });
+    return may_be;
 }
 
-bool Wanted::may_be_of_ioc(const hxal_t& ioc) const
+hxal_adapter_t* Wanted::first_of(hxal_adapter_t* list, Iocs iocs) const
 {
-    return holds(_wwns, ioc.pwwn) || holds(_wwns, ioc.nwwn) || holds(_macs, as_number(ioc.mac.mac, sizeof ioc.mac.mac)) ||
-           has_key(ioc.eth_name) || has_key(ioc.serialnum);
-}
-
-bool Wanted::may_be_of(const Open_Port& port) const
-{
-    return is_all() || (port.fc && may_be_of_ioc(*port.fc)) || (port.ethernet && may_be_of_ioc(*port.ethernet));
+    hxal_adapter_t* first = is_all() ? list : nullptr;
+    for (const Place& place : _places)
+        first = first_that(
+            list, first, [=](const hxal_adapter_t& adapter) { return static_cast<std::uint64_t>(adapter.id) == place.adapter; });
+    use_tests([&](auto is_of)
+              { first = first_that(list, first, [&](const hxal_adapter_t& adapter) { return has_ioc(adapter, iocs, is_of); }); });
+    return first;
 }
 
 } // namespace zmlr

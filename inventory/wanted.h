@@ -2,7 +2,7 @@
 // else; a hint, no filter: what is left in may still be another instance.
 #pragma once
 
-#include "inventory/adapter_walk.h"
+#include "hxal/hxal.h"
 #include "runtime/instance.h"
 #include "runtime/string.h"
 
@@ -11,6 +11,15 @@
 
 namespace zmlr
 {
+
+// Which IOCs of a port are taken. A port is visited when it has one of them.
+enum class Iocs
+{
+    fc,
+    ethernet,
+    of_card, // the FC one, on a CNA the Ethernet one too
+    any      // both, whatever the adapter says it is
+};
 
 class Wanted
 {
@@ -30,21 +39,45 @@ public:
     bool may_end_with(const char* text) const;
     bool may_end_with_number(std::uint32_t number) const;
 
-    // False when no key holds an address of the port and none is its interface's name or its card's serial number, as the last
-    // scan found them. Cheap: it is asked for every port that is passed over.
-    bool may_be_of(const Open_Port& port) const;
+    // False when no key ends with the indexes of adapter and port, each behind an underscore, and none holds an address of one of
+    // the port's IOCs (which may be null), or is its interface's name or its card's serial number, as the last scan found them.
+    bool may_be_of(int adapter, int port, const hxal_t* ethernet, const hxal_t* fc) const;
+
+    // The first adapter of the list that has such a port with such IOCs; null when there is none. Cheap: it passes over every
+    // other adapter of the host.
+    hxal_adapter_t* first_of(hxal_adapter_t* list, Iocs iocs) const;
 
 private:
-    bool may_be_of_ioc(const hxal_t& ioc) const;
+    struct Place
+    {
+        std::uint64_t adapter;
+        std::uint64_t port;
 
-    // True when a key is the text of the field, as a property would show it.
-    template <std::size_t N> bool has_key(const char (&field)[N]) const;
+        bool operator==(const Place&) const = default;
+    };
+
+    // How a field begins whose text is shown as the key, as two numbers: the first and the last 8 bytes of those that are
+    // compared, zeros behind the text. The masks leave out what may differ: the case of letters, and bytes that are shown as '?'.
+    struct Name
+    {
+        std::uint64_t first_mask, first, last_mask, last;
+
+        explicit Name(const String& key);
+        bool is_in(const char* field) const;
+    };
+
+    void append_addresses(const String& key);
+    void append_address(std::size_t digits, std::uint64_t number);
+
+    // Hands over a function for each address and name in the keys: whether it is one of an IOC.
+    template <class Use> void use_tests(Use use) const;
 
     std::vector<String> _keys;
-    std::uint64_t _sizes = 0;         // of the keys, a bit each
-    std::vector<std::uint64_t> _wwns; // all that the digits in the keys may be, in memory order
-    std::vector<std::uint64_t> _macs; // the same, 6 bytes each
+    std::vector<wwn_t> _wwns;
+    std::vector<mac_t> _macs;
     std::vector<std::uint64_t> _numbers;
+    std::vector<Place> _places;
+    std::vector<Name> _names;
 };
 
 } // namespace zmlr
