@@ -38,6 +38,9 @@ bool tells_no_place(std::string_view name)
     return name.ends_with("CreationClassName") || name == "SystemName" || name == "Vendor" || name == "Version";
 }
 
+// Whether a key, by its name, may be an interface's name or a card's serial number: devices are known by their addresses.
+bool may_be_name(std::string_view name) { return name != "DeviceID"; }
+
 int digit_of(char c)
 {
     const char lower = static_cast<char>(ascii::to_lower(c));
@@ -116,7 +119,7 @@ Wanted::Wanted(const Instance* model)
             _numbers.push_back(*number);
         if (const std::optional<std::uint64_t> before = cut_number(text); number && before)
             _places.push_back({*before, *number});
-        if (key->size() <= longest_name)
+        if (key->size() <= longest_name && may_be_name(feature->name))
             _names.emplace_back(*key);
         _keys.push_back(*key);
     }

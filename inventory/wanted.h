@@ -27,8 +27,7 @@ public:
     // All instances: nothing is left out.
     Wanted() = default;
 
-    // The instance with the model's keys; all instances when a key is null, empty, no text, or longer than
-    // those of any instance.
+    // The instance with the model's keys; all instances when a key is null, empty, no text, or longer than those of any instance.
     explicit Wanted(const Instance* model);
 
     bool is_all() const { return _keys.empty(); }
@@ -75,7 +74,7 @@ private:
     std::vector<String> _keys;
     std::vector<wwn_t> _wwns;
     std::vector<mac_t> _macs;
-    std::vector<std::uint64_t> _numbers;
+    std::vector<std::uint64_t> _numbers; // behind the last underscores
     std::vector<Place> _places;
     std::vector<Name> _names;
 };
