@@ -55,20 +55,28 @@ Thread_Context* CMPI_Thread_Context::thread_create_hook(void*)
     return context.release();
 }
 
+// A thread that the server does not let in leaves the broker alone: what it made there would belong to nobody.
 void CMPI_Thread_Context::thread_start_hook() noexcept
 {
     const auto attach = [&]
     {
         complete_top();
-        const Gate_Pass pass(gate());
+        const std::shared_ptr<Gate> open = _gate;
+        const Gate_Pass pass(open.get());
         if (!pass)
             return CMPI_RC_OK;
-        const CMPIrc rc = CBAttachThread(_cmpi_broker, _cmpi_context).rc;
+        const auto call = [&] { return CBAttachThread(_cmpi_broker, _cmpi_context).rc; };
+        const CMPIrc rc = shielded("CBAttachThread", call);
         _attached = rc == CMPI_RC_OK;
         if (_attached)
+        {
             static_cast<void>(_prepared.release());
-        else
-            ZMLR_LOG(LL_ERR, "CBAttachThread() failed: %s", _rc_to_str(rc));
+            return rc;
+        }
+        ZMLR_LOG(LL_ERR, "CBAttachThread() failed: %s", _rc_to_str(rc));
+        _gate = std::make_shared<Gate>();
+        _gate->shut();
+        _prepared.reset();
         return rc;
     };
     shielded("thread_start_hook", attach);

@@ -17,7 +17,7 @@ class CMPI_Adapter;
 
 // A request's context borrows the request's CMPI context. A provider thread's owns one that its server made for it; such a
 // thread may outlive adapter and broker: the gate that both share is shut then, and whatever would reach the server answers
-// its failure.
+// its failure. So it does for a thread that could not attach, behind a gate of its own.
 class CMPI_Thread_Context : public Thread_Context
 {
 public:

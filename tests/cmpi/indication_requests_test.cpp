@@ -339,13 +339,27 @@ TEST_F(Provider_Threads, are_waited_for_while_they_use_the_broker)
         CMRelease(counts.context); // as a server does that goes
 }
 
-TEST_F(Provider_Threads, that_cannot_attach_do_not_detach)
+TEST_F(Provider_Threads, that_cannot_attach_leave_the_broker_alone)
 {
-    calls.attachThread = [](auto...) { return CMPIStatus{CMPI_RC_ERR_FAILED, nullptr}; };
-    Provider_Thread thread;
-    EXPECT_THAT(logged([&] { enable_with(thread, [] {}), thread.join(); }, "ERR"),
-                ElementsAre("CMPI_Thread_Context: CBAttachThread() failed: CMPI_RC_ERR_FAILED"));
+    static bool throws;
+    calls.attachThread = [](auto...) { return throws ? throw 1 : CMPIStatus{CMPI_RC_ERR_FAILED, nullptr}; };
+    activate("root/a");
+    const auto body = [&]
+    {
+        String user;
+        EXPECT_FALSE(cimom::get_username(user));
+        EXPECT_FALSE(script.handler->handle(alert("lost")));
+    };
+    for (const bool how : {false, true})
+    {
+        throws = how;
+        Provider_Thread thread;
+        EXPECT_THAT(logged([&] { enable_with(thread, body), thread.join(); }, "ERR"),
+                    testing::Contains("CMPI_Thread_Context: CBAttachThread() failed: CMPI_RC_ERR_FAILED"));
+        EXPECT_EQ(disable(), CMPI_RC_OK);
+    }
     EXPECT_EQ(counts.detached, 0);
+    EXPECT_EQ(inbox.count, 0);
 }
 
 using Indications_Death_Test = Indications;
