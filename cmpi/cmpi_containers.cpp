@@ -181,10 +181,15 @@ int CMPIArgs_Container::put(const char* name, CMPI_Data& data)
         _return_value = std::move(data);
         return 0;
     }
-    if (!_args || okay(CMAddArg(_args, name, data.value(), data.type())))
+    if (!_args)
         return 0;
-    ZMLR_LOG(LL_WARN, "CMAddArg() failed");
-    return -1;
+    if (!okay(CMAddArg(_args, name, data.value(), data.type())))
+    {
+        ZMLR_LOG(LL_WARN, "CMAddArg() failed");
+        return -1;
+    }
+    data.leave(); // not every server copies arguments
+    return 0;
 }
 
 // Servers deliver untyped nulls as booleans.

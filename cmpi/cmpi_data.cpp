@@ -14,7 +14,7 @@ CMPI_Data& CMPI_Data::operator=(CMPI_Data&& x) noexcept
 void CMPI_Data::release_object()
 {
     std::exchange(_release, nullptr)(_data.value);
-    _elements.reset();
+    _elements.clear();
 }
 
 } // namespace zmlr

@@ -6,19 +6,19 @@
 #include <cmpimacs.h>
 
 #include <cstring>
-#include <memory>
 #include <utility>
+#include <vector>
 
 namespace zmlr
 {
 
 // Releases its string, datetime, path, instance or array at its end, an array before its elements: brokers copy what is set
-// as a property, key or argument. A long enumeration must not pile up objects until its request is over, nor a thread that
-// delivers alerts until it ends.
+// as a property or key. A long enumeration must not pile up objects until its request is over, nor a thread that delivers
+// alerts until it ends.
 class CMPI_Data
 {
 public:
-    using Elements = std::unique_ptr<CMPI_Data[]>;
+    using Elements = std::vector<CMPI_Data>;
 
     CMPI_Data() = default;
     ~CMPI_Data() { release(); }
@@ -54,6 +54,14 @@ public:
         };
         _elements = std::move(elements);
         return true;
+    }
+
+    // Leaves its object, an array's elements too, to the broker, which frees it when the request ends.
+    void leave()
+    {
+        _release = nullptr;
+        for (CMPI_Data& element : _elements)
+            element.leave();
     }
 
     CMPIType type() const { return _data.type; }

@@ -102,7 +102,7 @@ template <class T> int to_cmpi_array(const Target& target, CMPIType element_type
         return failed("CMNewArray() failed");
     // What the elements point to is kept as long as the array; numbers point to nothing.
     constexpr bool number = std::is_arithmetic_v<T> || std::is_same_v<T, char16>;
-    CMPI_Data::Elements made(number ? nullptr : new CMPI_Data[elements.size()]);
+    CMPI_Data::Elements made(number ? 0 : elements.size());
     CMPI_Data single;
     for (uint32 i = 0; i < elements.size(); ++i)
     {

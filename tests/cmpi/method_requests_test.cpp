@@ -1,6 +1,7 @@
 // The method interface as a server calls it.
 #include "cimserver/broker/cmpi_values.h"
 #include "cimserver/broker/objects.h"
+#include "cmpi/cmpi_objects.h"
 #include "tests/cmpi/served_provider.h"
 
 #include <cmpimacs.h>
@@ -71,7 +72,19 @@ TEST_F(Method_Requests, carry_parameters_of_every_kind_there_and_back)
         p.Found = thing("found").steal();
         p.return_value.set("done");
     };
+    static const CMPIObjectPath* last_made;
+    CMPIBrokerEncFT table = cimserver::encapsulation_table;
+    table.newObjectPath = [](auto... arguments)
+    {
+        auto* made = cimserver::encapsulation_table.newObjectPath(arguments...);
+        last_made = made;
+        return made;
+    };
+    CMPIBroker server = *broker.face();
+    server.eft = &table;
+    disk_data.adapter->broker = &server;
     EXPECT_EQ(invoke("convert", disk_path()), CMPI_RC_OK);
+    EXPECT_EQ(class_name_of(last_made), "TST_Thing") << "a server may keep what it is handed: it lives until the request ends";
     EXPECT_EQ(cast<TST_Disk>(script.instance.ptr())->Name.value, "disk");
     ASSERT_THAT(result.data, SizeIs(1));
     EXPECT_EQ(result.data[0].type, CMPI_string);
