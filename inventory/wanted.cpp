@@ -1,6 +1,7 @@
 #include "inventory/wanted.h"
 
 #include "runtime/ascii.h"
+#include "schema/ZEMLAR_LANEndpoint.h"
 #include "text/integers.h"
 
 #include <algorithm>
@@ -18,7 +19,6 @@ namespace
 {
 
 constexpr uint32 longest_key = 512; // longer than any of ours: a client's may be of any size
-constexpr uint32 longest_name = 15; // of an interface; a serial number has 12 characters
 
 // What is compared of a name, and where its last 8 bytes begin.
 constexpr std::size_t compared_size = sizeof(hxal_t::serialnum);
@@ -38,8 +38,11 @@ bool tells_no_place(std::string_view name)
     return name.ends_with("CreationClassName") || name == "SystemName" || name == "Vendor" || name == "Version";
 }
 
-// Whether a key, by its name, may be an interface's name or a card's serial number: devices are known by their addresses.
-bool may_be_name(std::string_view name) { return name != "DeviceID"; }
+// Whether a key is an interface's name or a card's serial number, whatever it looks like.
+bool is_name(const Meta_Class* meta_class, std::string_view name)
+{
+    return name == "IdentifyingNumber" || (name == "Name" && meta_class == &ZEMLAR_LANEndpoint::static_meta_class);
+}
 
 int digit_of(char c)
 {
@@ -56,13 +59,12 @@ template <std::size_t size> std::uint64_t as_number(const void* bytes)
     return number;
 }
 
-// An address whose digits end the number.
-template <class Address> Address address_in(std::uint64_t number)
+wwn_t wwn_of(std::uint64_t number)
 {
-    std::array<unsigned char, sizeof(Address)> bytes;
+    std::array<unsigned char, sizeof(wwn_t)> bytes;
     for (std::size_t i = bytes.size(); i > 0; i--, number >>= 8)
         bytes[i - 1] = static_cast<unsigned char>(number);
-    return std::bit_cast<Address>(bytes);
+    return std::bit_cast<wwn_t>(bytes);
 }
 
 // What stands behind the last underscore, when it is a number; the text is cut before it.
@@ -112,47 +114,56 @@ Wanted::Wanted(const Instance* model)
         }
         if (tells_no_place(feature->name))
             continue;
-        append_addresses(*key);
-        std::string_view text(key->c_str(), key->size());
-        const std::optional<std::uint64_t> number = cut_number(text);
-        if (number)
-            _numbers.push_back(*number);
-        if (const std::optional<std::uint64_t> before = cut_number(text); number && before)
-            _places.push_back({*before, *number});
-        if (key->size() <= longest_name && may_be_name(feature->name))
-            _names.emplace_back(*key);
         _keys.push_back(*key);
+        if (is_name(model->meta_class, feature->name))
+            _names.emplace_back(*key);
+        else if (!append_numbers(*key))
+        {
+            *this = Wanted();
+            return;
+        }
     }
 }
 
-// A row of digits may end with a WWN, whose first two bytes are not zero, or with a MAC address. One of zeros is none, and stands
-// in many keys.
-void Wanted::append_address(std::size_t digits, std::uint64_t number)
+bool Wanted::append_numbers(const String& key)
 {
-    constexpr std::uint64_t mac_digits = 0xFFFF'FFFF'FFFF;
-    if (digits >= 2 * sizeof(wwn_t) && number > mac_digits)
-        _wwns.push_back(address_in<wwn_t>(number));
-    else if (digits >= 2 * sizeof(mac_t) && (number & mac_digits) != 0)
-        _macs.push_back(address_in<mac_t>(number));
-}
+    std::string_view text(key.c_str(), key.size());
+    const std::optional<std::uint64_t> number = cut_number(text);
+    if (number)
+        _numbers.push_back(*number);
+    if (const std::optional<std::uint64_t> before = cut_number(text); number && before)
+        _places.push_back({*before, *number});
 
-// Hyphens between digits do not count.
-void Wanted::append_addresses(const String& key)
-{
+    // Hyphens between digits do not count.
+    bool all_tell = true;
     std::size_t digits = 0;
-    std::uint64_t number = 0; // of the last 16
+    std::uint64_t last = 0; // 16 of them
     for (const char* c = key.c_str(); *c; c++)
     {
         const int digit = digit_of(*c);
         if (digit >= 0)
         {
             digits++;
-            number = number << 4 | static_cast<std::uint64_t>(digit);
+            last = last << 4 | static_cast<std::uint64_t>(digit);
         }
         else if (*c != '-')
-            append_address(std::exchange(digits, 0), number);
+            all_tell = append_address(std::exchange(digits, 0), last) && all_tell;
     }
-    append_address(digits, number);
+    return append_address(digits, last) && all_tell;
+}
+
+// A row of digits may end with a WWN or with a MAC address: what has zeros before the 12 digits of a MAC may be either.
+bool Wanted::append_address(std::size_t digits, std::uint64_t number)
+{
+    constexpr std::uint64_t mac_digits = 0xFFFF'FFFF'FFFF;
+    if (digits >= 2 * sizeof(wwn_t) && number > mac_digits)
+        _wwns.push_back(wwn_of(number));
+    else if (digits >= 2 * sizeof(mac_t))
+    {
+        _macs.push_back(wwn_of(number & mac_digits));
+        return (number & mac_digits) != 0;
+    }
+    return true;
 }
 
 Wanted::Name::Name(const String& key)
@@ -179,7 +190,7 @@ bool Wanted::Name::is_in(const char* field) const
            (as_number<sizeof first>(field) & first_mask) == first;
 }
 
-bool Wanted::may_hold(wwn_t wwn) const { return is_all() || holds(_wwns, wwn); }
+bool Wanted::may_hold(wwn_t wwn) const { return is_all() || holds(_wwns, wwn) || holds(_macs, wwn); }
 
 bool Wanted::may_end_with(const char* text) const
 {
@@ -194,13 +205,23 @@ bool Wanted::may_end_with(const char* text) const
 
 bool Wanted::may_end_with_number(std::uint32_t number) const { return is_all() || holds(_numbers, number); }
 
-// A name's numbers are copied to stay in registers while a list is passed over.
+// Numbers are copied to stay in registers while a list is passed over. Addresses that are counted up differ at their ends.
 template <class Use> void Wanted::use_tests(Use use) const
 {
     for (const wwn_t wwn : _wwns)
         use([=](const hxal_t& ioc) { return ioc.pwwn == wwn || ioc.nwwn == wwn; });
-    for (const mac_t& mac : _macs)
-        use([&](const hxal_t& ioc) { return std::memcmp(ioc.mac.mac, mac.mac, sizeof mac.mac) == 0; });
+    for (const wwn_t wwn : _macs)
+    {
+        const auto bytes = std::bit_cast<std::array<char, sizeof wwn>>(wwn);
+        const std::uint64_t first = as_number<2>(bytes.data() + 2);
+        const std::uint64_t last = as_number<4>(bytes.data() + 4);
+        use(
+            [=](const hxal_t& ioc)
+            {
+                const bool is_mac = as_number<4>(ioc.mac.mac + 2) == last && as_number<2>(ioc.mac.mac) == first;
+                return is_mac || ioc.pwwn == wwn || ioc.nwwn == wwn;
+            });
+    }
     for (const Name& name : _names)
         use([=](const hxal_t& ioc) { return name.is_in(ioc.serialnum) || name.is_in(ioc.eth_name); });
 }

@@ -27,7 +27,8 @@ public:
     // All instances: nothing is left out.
     Wanted() = default;
 
-    // The instance with the model's keys; all instances when a key is null, empty, no text, or longer than those of any instance.
+    // The instance with the model's keys; all instances when a key is null, empty, no text, longer than those of any instance, or
+    // holds an address of zeros.
     explicit Wanted(const Instance* model);
 
     bool is_all() const { return _keys.empty(); }
@@ -65,15 +66,16 @@ private:
         bool is_in(const char* field) const;
     };
 
-    void append_addresses(const String& key);
-    void append_address(std::size_t digits, std::uint64_t number);
+    // False when there is an address of zeros, which many things have.
+    bool append_numbers(const String& key);
+    bool append_address(std::size_t digits, std::uint64_t number);
 
     // Hands over a function for each address and name in the keys: whether it is one of an IOC.
     template <class Use> void use_tests(Use use) const;
 
     std::vector<String> _keys;
     std::vector<wwn_t> _wwns;
-    std::vector<mac_t> _macs;
+    std::vector<wwn_t> _macs;            // behind two bytes of zeros
     std::vector<std::uint64_t> _numbers; // behind the last underscores
     std::vector<Place> _places;
     std::vector<Name> _names;

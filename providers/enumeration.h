@@ -35,7 +35,8 @@ struct Enumeration
 
 // The row's instances; the provider named `log_source` logs whether there are any. With the model of the one `wanted` instance,
 // what the library's memory shows to be another is not read. What that memory no longer knows is found all the same, by reading
-// everything.
+// everything: one that is not there costs a whole enumeration, after what its keys lead to. Of several with equal keys the first
+// is taken; but one to which the driver has given those keys since the scan comes behind one that had them then.
 Instance_Array instances_of(const Enumeration& row, const Instance* wanted, const char* log_source);
 
 } // namespace zmlr

@@ -26,6 +26,12 @@ std::string first_of(const Instance_Array& instances, const Instance* model)
     return first == instances.end() ? std::string() : describe(*first);
 }
 
+// What two cards share: a WWN that looks like a MAC address, and an interface's name that looks like a place.
+constexpr const char* misleading = R"({"adapters": [
+    {"kind": "cna", "ports": {"pwwn": "0000AABBCCDDEEFF", "eth_name": "interface_of_2_0"}},
+    {"kind": "cna", "ports": {"pwwn": "0000AABBCCDDEEFF", "eth_name": "interface_of_2_0", "fcoe_mac": "AABBCCDDEEFF",
+     "remote_ports": [{"pwwn": "0000AABBCCDDEEFF"}, {"pwwn": "0000000000000000"}]}}]})";
+
 // With the log off, so that walks pass over adapters.
 struct Wanted_One : Inventory_Test
 {
@@ -61,9 +67,9 @@ struct Wanted_One : Inventory_Test
 
 TEST_F(Wanted_One, is_what_the_enumeration_tells)
 {
-    for (const char* scenario : {"fc-hba", "cna", "mixed", "odd", "large"})
+    for (const char* scenario : {"fc-hba", "cna", "mixed", "odd", "large", misleading})
     {
-        hxasim::load(scenario);
+        scenario == misleading ? hxasim::load_text(scenario) : hxasim::load(scenario);
         hxal_adapter_scan();
         for (const Enumeration& row : enumerations)
         {
