@@ -38,10 +38,11 @@ bool tells_no_place(std::string_view name)
     return name.ends_with("CreationClassName") || name == "SystemName" || name == "Vendor" || name == "Version";
 }
 
-// Whether a key is an interface's name or a card's serial number, whatever it looks like.
-bool is_name(const Meta_Class* meta_class, std::string_view name)
+// What a key is, whatever it looks like.
+bool is_serial_number(std::string_view name) { return name == "IdentifyingNumber"; }
+bool is_interface(std::string_view name, const Meta_Class* meta_class)
 {
-    return name == "IdentifyingNumber" || (name == "Name" && meta_class == &ZEMLAR_LANEndpoint::static_meta_class);
+    return name == "Name" && meta_class == &ZEMLAR_LANEndpoint::static_meta_class;
 }
 
 int digit_of(char c)
@@ -115,8 +116,10 @@ Wanted::Wanted(const Instance* model)
         if (tells_no_place(feature->name))
             continue;
         _keys.push_back(*key);
-        if (is_name(model->meta_class, feature->name))
-            _names.emplace_back(*key);
+        if (is_serial_number(feature->name))
+            _serial_numbers.emplace_back(*key);
+        else if (is_interface(feature->name, model->meta_class))
+            _interfaces.emplace_back(*key);
         else if (!append_numbers(*key))
         {
             *this = Wanted();
@@ -222,8 +225,10 @@ template <class Use> void Wanted::use_tests(Use use) const
                 return is_mac || ioc.pwwn == wwn || ioc.nwwn == wwn;
             });
     }
-    for (const Name& name : _names)
-        use([=](const hxal_t& ioc) { return name.is_in(ioc.serialnum) || name.is_in(ioc.eth_name); });
+    for (const Name& name : _serial_numbers)
+        use([=](const hxal_t& ioc) { return name.is_in(ioc.serialnum); });
+    for (const Name& name : _interfaces)
+        use([=](const hxal_t& ioc) { return name.is_in(ioc.eth_name); });
 }
 
 bool Wanted::may_be_of(int adapter, int port, const hxal_t* ethernet, const hxal_t* fc) const

@@ -78,7 +78,8 @@ private:
     std::vector<wwn_t> _macs;            // behind two bytes of zeros
     std::vector<std::uint64_t> _numbers; // behind the last underscores
     std::vector<Place> _places;
-    std::vector<Name> _names;
+    std::vector<Name> _serial_numbers;
+    std::vector<Name> _interfaces;
 };
 
 } // namespace zmlr
