@@ -14,6 +14,8 @@
 #include <memory>
 #include <new>
 #include <optional>
+#include <ranges>
+#include <vector>
 
 namespace zmlr
 {
@@ -98,38 +100,46 @@ std::unique_ptr<std::uint8_t[]> report_luns(const Nexus& nexus, std::size_t size
     return nullptr;
 }
 
-struct Lun_List
+using Lun = std::array<std::uint8_t, lun_entry_size>; // as REPORT LUNS gives it
+
+// The wanted ones of an answer's entries, in room of their own: the answer is larger, and they are kept while each is asked.
+std::vector<Lun> wanted_units(const std::uint8_t* answer, std::size_t count, const Wanted& wanted)
 {
-    std::unique_ptr<std::uint8_t[]> bytes; // null when the target does not tell
-    std::size_t count = 0;                 // entries that are there
+    const auto entry = [answer](std::size_t i) { return Lun_Entry(answer + lun_list_head + i * lun_entry_size, lun_entry_size); };
+    const auto is_wanted = [&](Lun_Entry unit) { return wanted.may_end_with_number(lun_number(unit)); };
+    const auto entries = std::views::iota(std::size_t{0}, count) | std::views::transform(entry);
 
-    Lun_Entry entry(std::size_t i) const { return Lun_Entry(bytes.get() + lun_list_head + i * lun_entry_size, lun_entry_size); }
-};
+    std::vector<Lun> units;
+    units.reserve(static_cast<std::size_t>(std::ranges::count_if(entries, is_wanted)));
+    for (const Lun_Entry unit : entries | std::views::filter(is_wanted))
+        std::ranges::copy(unit, units.emplace_back().begin());
+    return units;
+}
 
-// The units of a target. A target that tells of more than its answer had room for is asked once more; what then does not fit is
-// not there.
-Lun_List list_luns(const Nexus& nexus, int index)
+// The wanted units of a target, none when it does not tell. A target that tells of more than its answer had room for is asked
+// once more; what then does not fit is not there.
+std::vector<Lun> list_luns(const Nexus& nexus, int index, const Wanted& wanted)
 {
     std::size_t size = first_list_size;
     for (bool again = true;; again = false)
     {
         ZMLR_LOG(LL_INFO, "lunInvSize = %u. rPortWwns[%d]=%llx", static_cast<unsigned>(size), index,
                  number_of(nexus.remote_port));
-        Lun_List list{report_luns(nexus, size)};
-        if (!list.bytes)
+        const auto list = report_luns(nexus, size);
+        if (!list)
         {
             ZMLR_LOG(LL_INFO, "Continue with next rport. Reportlun had issue. ");
-            return list;
+            return {};
         }
-        const std::size_t count = lun_count({list.bytes.get(), size});
-        if (!again || count <= lun_room(size))
+        const std::size_t told = lun_count({list.get(), size});
+        if (!again || told <= lun_room(size))
         {
-            list.count = std::min(count, lun_room(size));
-            ZMLR_LOG(LL_INFO, "Number of Luns = %d.", static_cast<int>(list.count));
-            return list;
+            const std::size_t count = std::min(told, lun_room(size));
+            ZMLR_LOG(LL_INFO, "Number of Luns = %d.", static_cast<int>(count));
+            return wanted_units(list.get(), count, wanted);
         }
         ZMLR_LOG(LL_INFO, "More luns reported than initially expected. need to reportLun with more space allocated.");
-        size = std::min(count, max_units) * lun_entry_size + lun_list_head;
+        size = std::min(told, max_units) * lun_entry_size + lun_list_head;
     }
 }
 
@@ -202,13 +212,10 @@ void append_unit(Instance_Array& instances, const _hbaPortInfo& port, const _hba
 void append_units(Instance_Array& instances, const Nexus& nexus, int index, const _hbaPortInfo& port, classId_t id,
                   const Wanted& wanted)
 {
-    const Lun_List luns = list_luns(nexus, index);
-    for (std::size_t i = 0; i < luns.count; i++)
+    for (const Lun& lun : list_luns(nexus, index, wanted))
     {
-        if (!wanted.may_end_with_number(lun_number(luns.entry(i))))
-            continue;
         _hbaLunInfo info;
-        std::ranges::copy(luns.entry(i), info.lun.begin());
+        info.lun = lun;
         ProviderUtil::WWN2str(info.target_wwn, &nexus.remote_port);
         if (read_unit(nexus, info))
             append_unit(instances, port, info, id);
