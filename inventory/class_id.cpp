@@ -8,7 +8,7 @@ namespace zmlr
 namespace
 {
 
-constexpr const char* class_names[] = {
+constinit Fixed_Text<49> class_names[] = {
     "--",
     "ZEMLAR_ComputerSystem",
     "ZEMLAR_PortController",
@@ -51,6 +51,6 @@ static_assert(std::size(class_names) == MAXCLASSID + 1);
 
 } // namespace
 
-const char* class_name(classId_t id) { return id <= MAXCLASSID ? class_names[id] : nullptr; }
+String class_name(classId_t id) { return id <= MAXCLASSID ? String(class_names[id]) : String(); }
 
 } // namespace zmlr

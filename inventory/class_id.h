@@ -1,6 +1,7 @@
 // Class identifiers: the number by which providers ask the managers for the instances of one class, and its name.
 #pragma once
 
+#include "runtime/string.h"
 #include "runtime/types.h"
 
 namespace zmlr
@@ -51,7 +52,7 @@ enum classId_t : uint32
 
 inline constexpr uint32 MAXCLASSID = 36;
 
-// The class's name ("--" for CLASSID_None); null above MAXCLASSID.
-const char* class_name(classId_t id);
+// The class's name, "--" for CLASSID_None, empty above MAXCLASSID. It takes no memory.
+String class_name(classId_t id);
 
 } // namespace zmlr

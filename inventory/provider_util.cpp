@@ -20,13 +20,13 @@ String ProviderUtil::getClassName(classId_t id)
 {
     const Scope_Trace trace(log_source);
     ZMLR_LOG(LL_INFO, "ClassId = %d", static_cast<int>(id));
-    const char* name = class_name(id);
-    if (!name)
+    String name = class_name(id);
+    if (name.empty())
     {
         ZMLR_LOG(LL_INFO, "ClassId is greater than MAXCLASSID");
         return "INVALID CLASS";
     }
-    ZMLR_LOG(LL_INFO, "Class = %s", name);
+    ZMLR_LOG(LL_INFO, "Class = %s", name.c_str());
     return name;
 }
 

@@ -19,6 +19,9 @@ namespace
 
 constexpr const char* log_source = "TargetHelper";
 
+constinit Fixed_Text<50> extent_description("It is a unique identification for a Storage Extent");
+constinit Fixed_Text<50> tape_description("It is a unique identification for a Tape Drive");
+
 // How a name is told by its source: CIM_StorageExtent.NameFormat and NameNamespace.
 struct Name_Kind
 {
@@ -86,7 +89,7 @@ String device_id(const _hbaPortInfo& port, const _hbaLunInfo& lun)
 }
 
 // What disks and tapes have in common.
-template <class T> Ref<T> unit_instance(classId_t id, const _hbaPortInfo& port, const _hbaLunInfo& lun, const char* description)
+template <class T> Ref<T> unit_instance(classId_t id, const _hbaPortInfo& port, const _hbaLunInfo& lun, const String& description)
 {
     const String device = device_id(port, lun);
     Ref<T> unit(T::create());
@@ -97,7 +100,7 @@ template <class T> Ref<T> unit_instance(classId_t id, const _hbaPortInfo& port, 
     unit->ElementName.set(lun_text(lun));
     unit->Name.set(name_of(lun));
     unit->OtherIdentifyingInfo.set({device});
-    unit->IdentifyingDescriptions.set({String(description)});
+    unit->IdentifyingDescriptions.set({description});
     unit->OperationalStatus.set({OPERATIONAL_STATUS_OK});
     return unit;
 }
@@ -107,8 +110,7 @@ template <class T> Ref<T> unit_instance(classId_t id, const _hbaPortInfo& port, 
 Ref<ZEMLAR_StorageExtent> getStorageExtentInstance(const _hbaPortInfo& port, const _hbaLunInfo& lun)
 {
     const Scope_Trace trace(log_source);
-    Ref<ZEMLAR_StorageExtent> extent = unit_instance<ZEMLAR_StorageExtent>(CLASSID_StorageExtent, port, lun,
-                                                                           "It is a unique identification for a Storage Extent");
+    Ref<ZEMLAR_StorageExtent> extent = unit_instance<ZEMLAR_StorageExtent>(CLASSID_StorageExtent, port, lun, extent_description);
     if (const Name_Kind* kind = kind_of(lun))
     {
         extent->NameFormat.set(kind->format);
@@ -123,8 +125,7 @@ Ref<ZEMLAR_StorageExtent> getStorageExtentInstance(const _hbaPortInfo& port, con
 Ref<ZEMLAR_TapeDrive> getTapeDriveInstance(const _hbaPortInfo& port, const _hbaLunInfo& lun)
 {
     const Scope_Trace trace(log_source);
-    Ref<ZEMLAR_TapeDrive> tape =
-        unit_instance<ZEMLAR_TapeDrive>(CLASSID_TapeDrive, port, lun, "It is a unique identification for a Tape Drive");
+    Ref<ZEMLAR_TapeDrive> tape = unit_instance<ZEMLAR_TapeDrive>(CLASSID_TapeDrive, port, lun, tape_description);
     if (!kind_of(lun))
         ZMLR_LOG(LL_WARN, "Default case for lunInfo.idType. Should not have reached here. ");
     ZMLR_LOG(LL_DBG, "returned Instance of TapeDrive. port WWN= %s", port.port_wwn);

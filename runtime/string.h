@@ -20,6 +20,20 @@ struct __String_Rep
     const char* data() const { return reinterpret_cast<const char*>(this + 1); }
 };
 
+// A text that the program knows, of at most `room` characters. Strings of it take no memory: they share it, and whoever changes
+// one has a copy. It must outlive them.
+template <std::size_t room> struct Fixed_Text
+{
+    consteval Fixed_Text(const char* from) : rep{{1}, 0, room}
+    {
+        for (; from[rep.size] != '\0'; rep.size++)
+            text[rep.size] = from[rep.size];
+    }
+
+    __String_Rep rep; // counts one more than there are strings
+    char text[room + 1] = {};
+};
+
 // Copies share one representation (reference counted, safe across threads); a change to a shared one copies it first.
 // A single handle must not be changed by two threads at once. Not-found results are String::npos. Texts given to an
 // operation may be the string's own; a null text counts as empty. A position past the end is an internal-consistency
@@ -36,6 +50,7 @@ public:
     String(String&& x) noexcept;
     String(const char* text);
     String(const char* text, std::size_t size);
+    template <std::size_t room> String(Fixed_Text<room>& text) noexcept : _rep(&text.rep) { Atomic_inc(&_rep->refs); }
     String(const char* s1, std::size_t n1, const char* s2, std::size_t n2);
     String(const char* s1, std::size_t n1, const char* s2, std::size_t n2, const char* s3, std::size_t n3);
     ~String();
