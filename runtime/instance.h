@@ -179,6 +179,8 @@ public:
     }
     void adopt(Instance_Array&& more)
     {
+        if (empty())
+            return static_cast<void>(Array<Instance*>::operator=(std::move(more)));
         reserve(size() + more.size());
         for (Instance*& place : more)
         {
