@@ -21,6 +21,7 @@ constexpr const char* log_source = "AdapterHelper";
 constexpr Walk_Row adapter_walk = {
     .source = log_source,
     .iocs = Iocs::of_card,
+    .ports = Ports::first,
     .count = {LL_INFO, "Number of Adapters: %d"},
     .none = {LL_INFO, "No adapters in the system!"},
     .not_opened = {LL_INFO, "Unable to open handle to Adapter id %d"},

@@ -97,7 +97,7 @@ bool Adapter_Walk::next()
             continue;
         if (_wanted) // the adapters before it are passed over at once
         {
-            _handle = _wanted->first_of(_handle, _row.iocs);
+            _handle = _wanted->first_of(_handle, _row.ports, _row.iocs);
             if (!_handle)
                 return false;
             _index = _handle->id;

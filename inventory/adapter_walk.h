@@ -30,6 +30,7 @@ struct Walk_Row
 {
     const char* source = nullptr;
     Iocs iocs = Iocs::any;
+    Ports ports = Ports::all;
     bool ends_at_unopened = false; // instead of going on with the next adapter
 
     // Lines of a walk over all adapters. Behind each its values.

@@ -98,6 +98,12 @@ template <class Is_Of> bool has_ioc(const hxal_adapter_t& adapter, Iocs iocs, Is
            (iocs != Iocs::fc && first_that<hxal_t>(adapter.ethioc_list, nullptr, is_of));
 }
 
+template <class Is_Of> bool has_port_0(const hxal_t* list, Is_Of is_of)
+{
+    const hxal_t* port_0 = first_that<const hxal_t>(list, nullptr, [](const hxal_t& ioc) { return ioc.id == 0; });
+    return port_0 && is_of(*port_0);
+}
+
 } // namespace
 
 Wanted::Wanted(const Instance* model)
@@ -239,14 +245,22 @@ bool Wanted::may_be_of(int adapter, int port, const hxal_t* ethernet, const hxal
     return may_be;
 }
 
-hxal_adapter_t* Wanted::first_of(hxal_adapter_t* list, Iocs iocs) const
+hxal_adapter_t* Wanted::first_of(hxal_adapter_t* list, Ports ports, Iocs iocs) const
 {
     hxal_adapter_t* first = is_all() ? list : nullptr;
     for (const Place& place : _places)
         first = first_that(
             list, first, [=](const hxal_adapter_t& adapter) { return static_cast<std::uint64_t>(adapter.id) == place.adapter; });
-    use_tests([&](auto is_of)
-              { first = first_that(list, first, [&](const hxal_adapter_t& adapter) { return has_ioc(adapter, iocs, is_of); }); });
+    use_tests(
+        [&](auto is_of)
+        {
+            if (ports == Ports::first)
+                first = first_that(list, first,
+                                   [=](const hxal_adapter_t& adapter)
+                                   { return has_port_0(adapter.fcioc_list, is_of) || has_port_0(adapter.ethioc_list, is_of); });
+            else
+                first = first_that(list, first, [=](const hxal_adapter_t& adapter) { return has_ioc(adapter, iocs, is_of); });
+        });
     return first;
 }
 

@@ -21,6 +21,13 @@ enum class Iocs
     any      // both, whatever the adapter says it is
 };
 
+// Which ports of an adapter are looked at: what belongs to a card is read through its port 0.
+enum class Ports
+{
+    first,
+    all
+};
+
 class Wanted
 {
 public:
@@ -45,7 +52,7 @@ public:
 
     // The first adapter of the list that has such a port with such IOCs; null when there is none. Cheap: it passes over every
     // other adapter of the host.
-    hxal_adapter_t* first_of(hxal_adapter_t* list, Iocs iocs) const;
+    hxal_adapter_t* first_of(hxal_adapter_t* list, Ports ports, Iocs iocs) const;
 
 private:
     struct Place
