@@ -105,8 +105,6 @@ int CMPIInstance_Container::set_value(const char* name, const Value& value, uint
         {
             CMPI_Data data = std::move(kept->data);
             _keys->erase(kept); // it is not needed again
-            if (_keys->empty())
-                *_keys = Kept_Keys();
             return put(name, data);
         }
     }

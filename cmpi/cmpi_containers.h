@@ -9,6 +9,7 @@
 
 #include <cmpift.h>
 
+#include <memory_resource>
 #include <vector>
 
 namespace zmlr
@@ -49,7 +50,7 @@ struct Kept_Key
     const char* name; // the feature's
     CMPI_Data data;
 };
-using Kept_Keys = std::vector<Kept_Key>;
+using Kept_Keys = std::pmr::vector<Kept_Key>;
 
 // A key that is among the kept ones is set as it is there.
 class CMPIInstance_Container : public CMPI_Container

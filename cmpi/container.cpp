@@ -69,14 +69,14 @@ int Container::convert(const Instance* instance, uint32 mask)
     return carry(instance, mask, [](const Meta_Property*) {});
 }
 
-int Container::convert(Ref<Instance> instance)
+int Container::convert_and_end(const Ref<Instance>& instance, uint32 mask)
 {
     if (is_shared(instance.ptr()))
-        return convert(instance.ptr(), 0);
-    return carry(instance.ptr(), 0, [&](const Meta_Property* property) { end_value(instance.ptr(), property); });
+        return convert(instance.ptr(), mask);
+    return carry(instance.ptr(), mask, [&](const Meta_Property* property) { end_value(instance.ptr(), property); });
 }
 
-// Tells which of the properties that take memory of their own are done.
+// Tells which of the properties that take memory of their own are in the container.
 template <class Done> int Container::carry(const Instance* instance, uint32 mask, Done done)
 {
     if (!instance)
@@ -101,7 +101,7 @@ template <class Done> int Container::carry(const Instance* instance, uint32 mask
         }
         if (set_value(feature->name, value, feature->flags) != 0)
             ZMLR_LOG(LL_WARN, "conversion error: %s.%s", record->name, feature->name);
-        if (const Meta_Property* property = to_property(feature); property && takes_memory(property))
+        else if (const Meta_Property* property = to_property(feature); property && takes_memory(property))
             done(property);
     }
     return 0;

@@ -33,9 +33,9 @@ public:
     // Returns 0, or -1 for a null instance.
     int convert(const Instance* instance, uint32 mask);
 
-    // The same with all features, for the last time: unless somebody else holds the instance, each property ends when it is in
-    // the container, so that the whole of both is never in memory.
-    int convert(Ref<Instance> instance);
+    // The same for the last time: unless somebody else holds the instance, each property ends when it is in the container, so
+    // that the whole of both is never in memory. One that has ended is that of a new record, not null.
+    int convert_and_end(const Ref<Instance>& instance, uint32 mask);
 
 protected:
     const Meta_Repository* repository() const { return _repository; }

@@ -3,6 +3,9 @@
 #include "cmpi/cmpi_containers.h"
 #include "runtime/log.h"
 
+#include <array>
+#include <cstddef>
+#include <memory_resource>
 #include <utility>
 #include <vector>
 
@@ -14,15 +17,17 @@ namespace
 
 constexpr const char* log_source = "Converter";
 
-CMPIrc fill_path(const CMPIBroker* broker, const Instance* instance, const char* name_space, CMPI_Ptr<CMPIObjectPath>& path,
-                 Kept_Keys* keys)
+// A path of the class, which `fill` puts the keys into.
+template <class Fill>
+CMPIrc make_path(const CMPIBroker* broker, const Meta_Class* meta_class, const char* name_space, Kept_Keys* keys, Fill fill,
+                 CMPI_Ptr<CMPIObjectPath>& path)
 {
     CMPIStatus status = {CMPI_RC_OK, nullptr};
-    CMPI_Ptr<CMPIObjectPath> made(CMNewObjectPath(broker, name_space, instance->meta_class->name, &status));
+    CMPI_Ptr<CMPIObjectPath> made(CMNewObjectPath(broker, name_space, meta_class->name, &status));
     if (!made || !okay(status))
         return CMPI_RC_ERR_FAILED;
-    CMPIObjectPath_Container container(instance->meta_class->meta_repository, broker, name_space, made.get(), keys);
-    if (container.convert(instance, Flag_Key) != 0)
+    CMPIObjectPath_Container container(meta_class->meta_repository, broker, name_space, made.get(), keys);
+    if (fill(container) != 0)
         return CMPI_RC_ERR_FAILED;
     path = std::move(made);
     return CMPI_RC_OK;
@@ -39,11 +44,11 @@ CMPIrc begin_instance(const CMPIBroker* broker, const Meta_Class* meta_class, co
     return filter ? filter.install(begun.get(), meta_class) : CMPI_RC_OK;
 }
 
-CMPIrc finish_instance(const CMPIBroker* broker, Ref<Instance> instance, const char* name_space, Kept_Keys* keys,
+CMPIrc finish_instance(const CMPIBroker* broker, const Ref<Instance>& instance, const char* name_space, Kept_Keys* keys,
                        CMPI_Ptr<CMPIInstance> begun, CMPI_Ptr<CMPIInstance>& cmpi_instance)
 {
     CMPIInstance_Container container(instance->meta_class->meta_repository, broker, name_space, begun.get(), keys);
-    if (container.convert(std::move(instance)) != 0)
+    if (container.convert_and_end(instance, 0) != 0)
         return CMPI_RC_ERR_FAILED;
     cmpi_instance = std::move(begun);
     return CMPI_RC_OK;
@@ -71,22 +76,27 @@ CMPIrc Property_Filter::install(CMPIInstance* instance, const Meta_Class* meta_c
 CMPIrc make_cmpi_object_path(const CMPIBroker* broker, const Instance* instance, const char* name_space,
                              CMPI_Ptr<CMPIObjectPath>& path)
 {
-    return fill_path(broker, instance, name_space, path, nullptr);
+    const auto keys = [&](Container& container) { return container.convert(instance, Flag_Key); };
+    return make_path(broker, instance->meta_class, name_space, nullptr, keys, path);
 }
 
 CMPIrc make_cmpi_object(const CMPIBroker* broker, Ref<Instance> instance, const char* name_space, const Property_Filter& filter,
                         CMPI_Ptr<CMPIInstance>& cmpi_instance)
 {
-    Kept_Keys keys;
-    keys.reserve(instance->meta_class->num_keys);
+    alignas(Kept_Key) std::array<std::byte, 8 * sizeof(Kept_Key)> room; // more keys than most classes have
+    std::pmr::monotonic_buffer_resource resource(room.data(), room.size());
+    Kept_Keys kept(&resource);
+    kept.reserve(instance->meta_class->num_keys);
+
+    const auto keys = [&](Container& container) { return container.convert_and_end(instance, Flag_Key); };
     CMPI_Ptr<CMPIObjectPath> path;
-    CMPIrc rc = fill_path(broker, instance.ptr(), name_space, path, &keys);
+    CMPIrc rc = make_path(broker, instance->meta_class, name_space, &kept, keys, path);
     CMPI_Ptr<CMPIInstance> begun;
     if (rc == CMPI_RC_OK)
         rc = begin_instance(broker, instance->meta_class, path.get(), filter, begun);
     path.reset(); // the instance has its own
     if (rc == CMPI_RC_OK)
-        rc = finish_instance(broker, std::move(instance), name_space, &keys, std::move(begun), cmpi_instance);
+        rc = finish_instance(broker, instance, name_space, &kept, std::move(begun), cmpi_instance);
     return rc;
 }
 
@@ -100,8 +110,7 @@ CMPIrc make_cmpi_instance(const CMPIBroker* broker, Ref<Instance> instance, cons
     }
     CMPI_Ptr<CMPIInstance> begun;
     const CMPIrc rc = begin_instance(broker, instance->meta_class, path, filter, begun);
-    return rc == CMPI_RC_OK ? finish_instance(broker, std::move(instance), name_space, nullptr, std::move(begun), cmpi_instance)
-                            : rc;
+    return rc == CMPI_RC_OK ? finish_instance(broker, instance, name_space, nullptr, std::move(begun), cmpi_instance) : rc;
 }
 
 namespace

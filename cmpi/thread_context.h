@@ -81,7 +81,7 @@ public:
     CMPI_Thread_Context_Pusher& operator=(const CMPI_Thread_Context_Pusher&) = delete;
 
 private:
-    std::unique_ptr<CMPI_Thread_Context> _context;
+    CMPI_Thread_Context _context;
 };
 
 } // namespace zmlr
