@@ -28,6 +28,7 @@ public:
     {
         bench::Simulated_Host host(bench::two_port_hbas(1));
         wire = host.operations().enumerate_instances("ZEMLAR_FCPort", true, std::nullopt).at(0);
+        properties = wire.properties;
         auto& object = cimserver::make<cimserver::Instance_Object>(wire);
         zmlr::make_cimple_instance(broker(), &zmlr::ZEMLAR_FCPort::static_meta_class,
                                    cimserver::make<cimserver::Path_Object>(wire.path).face(), object.face(), instance);
@@ -36,6 +37,7 @@ public:
     const CMPIBroker* broker() const { return _broker.face(); }
 
     cimserver::Instance wire;
+    std::vector<cimserver::Named_Value> properties; // its
     zmlr::Ref<zmlr::Instance> instance;
 
 private:
@@ -104,7 +106,7 @@ void call_broker(const Port& port)
         with_value(broker, key.value,
                    [&](const CMPIValue* value, CMPIType type) { CMAddKey(path, key.name.string().c_str(), value, type); });
     CMPIInstance* instance = CMNewInstance(broker, path, nullptr);
-    for (const auto& property : port.wire.properties)
+    for (const auto& property : port.properties)
         if (!property.value.null())
             with_value(broker, property.value,
                        [&](const CMPIValue* value, CMPIType type)

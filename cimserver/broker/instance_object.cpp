@@ -87,22 +87,15 @@ void show_named(const Property_Layout& layout, const char** names, std::vector<b
 Instance_Object::Instance_Object(std::shared_ptr<const Property_Layout> layout, Object_Path path_)
     : path(std::move(path_))
     , _layout(std::move(layout))
-    , _values(_layout->size())
+    , _properties(_layout->nulls())
 {
 }
 
 Instance_Object::Instance_Object(const Instance& instance)
     : path(instance.path)
     , _layout(std::make_shared<const Property_Layout>(instance))
+    , _properties(instance.properties)
 {
-    _values.reserve(instance.properties.size());
-    for (const Named_Value& property : instance.properties)
-        _values.push_back(property.value);
-}
-
-Value Instance_Object::value(std::size_t slot) const
-{
-    return _values[slot].null() ? Value{_layout->slots()[slot].type, {}} : _values[slot];
 }
 
 void Instance_Object::set(std::string_view name, Value value)
@@ -113,12 +106,12 @@ void Instance_Object::set(std::string_view name, Value value)
     if (value.type != CMPI_null && value.type != _layout->slots()[*slot].type)
         throw Failure{CMPI_RC_ERR_TYPE_MISMATCH};
     if (visible(*slot))
-        _values[*slot] = std::move(value);
+        _properties.set(*slot, std::move(value));
 }
 
 void Instance_Object::filter(const char** properties, const char** keys)
 {
-    _filter.clear();
+    _filter = {};
     if (!properties)
         return;
 
@@ -132,12 +125,13 @@ void Instance_Object::filter(const char** properties, const char** keys)
 
 Instance Instance_Object::model(const std::vector<bool>* selection) const
 {
-    Instance result{path, {}};
-    result.properties.reserve(_values.size());
-    for (std::size_t slot = 0; slot < _values.size(); ++slot)
+    if (!selection && (*_filter).empty())
+        return {path, _properties};
+    std::vector<Named_Value> shown;
+    for (std::size_t slot = 0; slot < _layout->size(); ++slot)
         if (visible(slot) && (!selection || (*selection)[slot]))
-            result.properties.push_back({_layout->slots()[slot].name, value(slot)});
-    return result;
+            shown.push_back({_layout->slots()[slot].name, value(slot)});
+    return {path, std::move(shown)};
 }
 
 const CMPIInstanceFT Instance_Object::table = {

@@ -62,7 +62,7 @@ public:
     const Class_Entry* class_entry;
 };
 
-// An instance of a class: one value per property of its layout, all null at first.
+// An instance of a class: the properties of its layout, all null at first.
 class Instance_Object : public Handle<CMPIInstance, Instance_Object>
 {
 public:
@@ -75,8 +75,8 @@ public:
     const std::shared_ptr<const Property_Layout>& shared_layout() const { return _layout; }
 
     // Whether the property filter leaves a slot in view.
-    bool visible(std::size_t slot) const { return _filter.empty() || _filter[slot]; }
-    Value value(std::size_t slot) const; // a null value has the property's type
+    bool visible(std::size_t slot) const { return (*_filter).empty() || (*_filter)[slot]; }
+    const Value& value(std::size_t slot) const { return _properties[slot]; } // a null value has the property's type
 
     // Throws NO_SUCH_PROPERTY, or TYPE_MISMATCH unless the value has the property's type (or none). A property that the
     // filter hides stays as it is.
@@ -92,8 +92,8 @@ public:
 
 private:
     std::shared_ptr<const Property_Layout> _layout;
-    std::vector<Value> _values;
-    std::vector<bool> _filter; // empty: no filter
+    Properties _properties;
+    Shared<std::vector<bool>> _filter; // empty: no filter
 };
 
 class Args_Object : public Handle<CMPIArgs, Args_Object>

@@ -124,9 +124,11 @@ Instance read_instance(const Xml_Element& element, const std::string& name_space
     instance.path = {"", name_space, *body.attribute("CLASSNAME"), {}};
     if (named)
         instance.path = read_path(element.children.front(), name_space);
+    std::vector<Named_Value> properties;
     for (const Xml_Element& child : body.children)
         if (child.name != "QUALIFIER")
-            instance.properties.push_back(read_property(child, name_space));
+            properties.push_back(read_property(child, name_space));
+    instance.properties = std::move(properties);
     return instance;
 }
 

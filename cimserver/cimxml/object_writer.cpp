@@ -82,7 +82,7 @@ void write_array(Xml_Writer& writer, const std::vector<Value>& elements, CMPITyp
     writer.end();
 }
 
-void write_property(Xml_Writer& writer, const Named_Value& property, const zmlr::Meta_Class* origins)
+void write_property(Xml_Writer& writer, const Properties::Property& property, const zmlr::Meta_Class* origins)
 {
     const CMPIType type = property.value.type;
     if (!cim_type_name(type) || type == (CMPI_ref | CMPI_ARRAY))
@@ -156,7 +156,7 @@ void write_object_with_path(Xml_Writer& writer, const Instance& instance, const 
 void write_instance(Xml_Writer& writer, const Instance& instance, const zmlr::Meta_Class* origins)
 {
     writer.start("INSTANCE").attribute("CLASSNAME", instance.path.class_name);
-    for (const Named_Value& property : instance.properties)
+    for (const auto& property : instance.properties)
         write_property(writer, property, origins);
     writer.end();
 }

@@ -27,16 +27,16 @@ constexpr std::uint64_t not_suppressed = 2;      // RepeatNotificationPolicy
     throw Cim_Error(code, instance.path.class_name.string() + ": " + why);
 }
 
-Value* value_of(Instance& instance, std::string_view name)
+const Value* value_of(const Instance& instance, std::string_view name)
 {
-    Named_Value* property = find_named(instance.properties, name);
-    return property && !property->value.null() ? &property->value : nullptr;
+    const Value* property = instance.properties.find(name);
+    return property && !property->null() ? property : nullptr;
 }
 
 std::string text_of(const Instance& instance, std::string_view name)
 {
-    const Named_Value* property = find_named(instance.properties, name);
-    const auto* text = property ? property->value.as<Text>() : nullptr;
+    const Value* property = instance.properties.find(name);
+    const auto* text = property ? property->as<Text>() : nullptr;
     return text ? *text : "";
 }
 
@@ -54,7 +54,7 @@ std::size_t text_bytes(const Value& value)
 void check_size(const Instance& instance)
 {
     std::size_t bytes = 0;
-    for (const Named_Value& property : instance.properties)
+    for (const auto& property : instance.properties)
         bytes += text_bytes(property.value);
     if (bytes > max_instance_bytes)
         refuse(instance, "its texts are longer than " + std::to_string(max_instance_bytes) + " bytes");
@@ -64,7 +64,7 @@ void check_size(const Instance& instance)
 void complete(Instance& instance, const std::string& name, std::uint64_t value)
 {
     if (!value_of(instance, name))
-        put(instance.properties, name, {CMPI_uint16, value});
+        instance.properties.put(name, {CMPI_uint16, value});
 }
 
 // The four keys that filters and destinations have.
@@ -86,7 +86,7 @@ void complete_keys(Instance& instance)
         if (value.empty() || value.size() > max_name_bytes)
             refuse(instance, std::string(name) + " has 1 to " + std::to_string(max_name_bytes) + " bytes");
         complete.push_back({name, {CMPI_string, value}});
-        put(instance.properties, name, {CMPI_string, value});
+        instance.properties.put(name, {CMPI_string, value});
     }
     if (!equal_names(text_of(instance, "CreationClassName"), instance.path.class_name))
         refuse(instance, "CreationClassName is another class");
@@ -108,8 +108,8 @@ std::vector<std::string> source_name_spaces(const Instance& filter)
     std::vector<std::string> names;
     if (const std::string one = text_of(filter, "SourceNamespace"); !one.empty())
         names.push_back(one);
-    const Named_Value* several = find_named(filter.properties, "SourceNamespaces");
-    if (const auto* list = several ? several->value.as<std::vector<Value>>() : nullptr)
+    const Value* several = filter.properties.find("SourceNamespaces");
+    if (const auto* list = several ? several->as<std::vector<Value>>() : nullptr)
         for (const Value& element : *list)
             if (const auto* text = element.as<Text>())
                 names.push_back(*text);
@@ -168,7 +168,7 @@ Instance complete_subscription(Instance instance)
         const Named_Value* key = find_named(instance.path.keys, end);
         if (!key || key->value.null())
             refuse(instance, std::string("it needs a ") + end);
-        put(instance.properties, end, key->value);
+        instance.properties.put(end, key->value);
     }
     if (value_of(instance, "SubscriptionDuration"))
         refuse(instance, "it lasts until it is deleted: a SubscriptionDuration is not kept", CIM_ERR_NOT_SUPPORTED);
@@ -176,7 +176,7 @@ Instance complete_subscription(Instance instance)
     allow_only(instance, "RepeatNotificationPolicy", not_suppressed);
     allow_only(instance, "SubscriptionState", enabled);
     if (!value_of(instance, "SubscriptionStartTime"))
-        put(instance.properties, "SubscriptionStartTime", {CMPI_dateTime, now_text()});
+        instance.properties.put("SubscriptionStartTime", {CMPI_dateTime, now_text()});
     return instance;
 }
 

@@ -172,7 +172,7 @@ void Subscription_Store::save(const Stored_Instances& instances) const
     {
         Json& list = json[lists[kind].name] = Json::array();
         for (const Instance& instance : instances[kind])
-            list.push_back(json_of(instance.properties));
+            list.push_back(json_of(std::vector<Named_Value>(instance.properties)));
     }
     write_private_file(_file, json.dump(2, ' ', false, Json::error_handler_t::replace) + "\n");
 }

@@ -29,7 +29,7 @@ void set_reference(Instance& subscription, const char* end, const Object_Path& p
 {
     const Value value{CMPI_ref, path};
     find_named(subscription.path.keys, end)->value = value;
-    find_named(subscription.properties, end)->value = value;
+    subscription.properties.put(end, value);
 }
 
 } // namespace
@@ -100,8 +100,9 @@ bool Subscriptions::in_use(Kind kind, const std::string& id) const
 Provider_Filter Subscriptions::provider_filter(const std::string& filter_id) const
 {
     const Entry& filter = table(Kind::filter).at(filter_id);
-    const Named_Value* query = find_named(filter.instance.properties, "Query");
-    return {query->value.get<Text>(), filter.filter->query.class_name(), {Module_Operations::served_name_space}};
+    return {filter.instance.properties.find("Query")->get<Text>(),
+            filter.filter->query.class_name(),
+            {Module_Operations::served_name_space}};
 }
 
 void Subscriptions::insert(Kind kind, const std::string& id, Entry entry)
@@ -126,7 +127,7 @@ void Subscriptions::update_routes()
     for (const auto& [id, subscription] : table(Kind::subscription))
     {
         const Instance& destination = table(Kind::destination).at(subscription.destination_id).instance;
-        const auto& url = find_named(destination.properties, "Destination")->value.get<Text>();
+        const auto& url = destination.properties.find("Destination")->get<Text>();
         Route& route = by_filter[subscription.filter_id];
         route.filter = table(Kind::filter).at(subscription.filter_id).filter;
         route.urls.push_back(url);

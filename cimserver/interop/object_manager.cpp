@@ -31,12 +31,12 @@ std::vector<Instance> object_managers()
                                                       {"SystemName", text(host_name())},
                                                       {"CreationClassName", text("CIM_ObjectManager")},
                                                       {"Name", text(manager_name())}});
-    instance.properties.push_back({"ElementName", text(product)});
-    instance.properties.push_back({"Description", text(std::string(product) + " version " + version())});
-    instance.properties.push_back({"Started", {CMPI_boolean, true}});
-    instance.properties.push_back({"GatherStatisticalData", {CMPI_boolean, false}});
-    instance.properties.push_back(
-        {"OperationalStatus", {array_of(CMPI_uint16), std::vector<Value>{{CMPI_uint16, std::uint64_t{2}}}}}); // OK
+    instance.properties.put("ElementName", text(product));
+    instance.properties.put("Description", text(std::string(product) + " version " + version()));
+    instance.properties.put("Started", {CMPI_boolean, true});
+    instance.properties.put("GatherStatisticalData", {CMPI_boolean, false});
+    instance.properties.put("OperationalStatus",
+                            {array_of(CMPI_uint16), std::vector<Value>{{CMPI_uint16, std::uint64_t{2}}}}); // OK
     return {instance};
 }
 
@@ -48,8 +48,8 @@ Instance name_space_instance(const std::string& name)
                                                   {"ObjectManagerName", text(manager_name())},
                                                   {"CreationClassName", text("CIM_Namespace")},
                                                   {"Name", text(name)}});
-    instance.properties.push_back({"ClassInfo", {CMPI_uint16, std::uint64_t{11}}});
-    instance.properties.push_back({"ClassType", {CMPI_uint16, std::uint64_t{2}}});
+    instance.properties.put("ClassInfo", {CMPI_uint16, std::uint64_t{11}});
+    instance.properties.put("ClassType", {CMPI_uint16, std::uint64_t{2}});
     return instance;
 }
 

@@ -10,7 +10,7 @@ namespace cimserver
 namespace
 {
 
-bool may_play(const Named_Value& property, const std::string& role) { return role.empty() || equal_names(property.name, role); }
+bool may_play(std::string_view end, const std::string& role) { return role.empty() || equal_names(end, role); }
 
 // A reference without a name space is to an object of the association's.
 std::string identity_of(Object_Path target)
@@ -47,9 +47,9 @@ std::vector<Own_Operations::Reference> Own_Operations::find_references(const Obj
     for (const Class_Entry* entry : concerned_associations(_repository, _repository, named, filter, ends))
         if (const Server_Class* server_class = answering(*entry))
             for (Instance& association : server_class->enumerate())
-                for (const Named_Value& property : association.properties)
+                for (const auto& property : association.properties)
                     if (const auto* reference = property.value.as<Object_Path>();
-                        reference && may_play(property, filter.role) && identity_of(*reference) == source)
+                        reference && may_play(property.name, filter.role) && identity_of(*reference) == source)
                     {
                         std::string near = property.name;
                         found.push_back({*entry, std::move(association), std::move(near)});
@@ -63,10 +63,10 @@ std::vector<Object_Path> Own_Operations::associator_names(const Object_Path& pat
     const Class_Entry* result_class = _repository.find(filter.result_class);
     std::vector<Object_Path> paths;
     for (const Reference& found : find_references(path, filter, Ends::both))
-        for (const Named_Value& property : found.association.properties)
+        for (const auto& property : found.association.properties)
         {
             const auto* reference = property.value.as<Object_Path>();
-            if (!reference || property.name == found.near || !may_play(property, filter.result_role))
+            if (!reference || property.name == found.near || !may_play(property.name, filter.result_role))
                 continue;
             const Class_Entry* far = _repository.find(reference->class_name);
             if (far && (!result_class || Repository::is_a(far->meta_class, result_class->meta_class)))

@@ -89,8 +89,8 @@ Instance Own_Operations::shown(Instance instance, const Class_Entry& entry, cons
     std::vector<Named_Value> all;
     for (const std::string& name : entry.layout->names(properties))
     {
-        Named_Value* found = find_named(instance.properties, name);
-        all.push_back({name, found ? std::move(found->value) : Value{entry.layout->slots()[*entry.layout->find(name)].type, {}}});
+        const Value* found = instance.properties.find(name);
+        all.push_back({name, found ? *found : Value{entry.layout->slots()[*entry.layout->find(name)].type, {}}});
     }
     instance.properties = std::move(all);
     instance.path.name_space = name_space;

@@ -84,8 +84,8 @@ std::optional<bool> evaluate(const Query_Condition& condition, const Instance& i
     case Kind::compare:
         break;
     }
-    const Named_Value* property = find_named(indication.properties, condition.property);
-    const Value value = property ? property->value : Value();
+    const Value* property = indication.properties.find(condition.property);
+    const Value value = property ? *property : Value();
     return condition.kind == Kind::is_null ? std::optional(value.null()) : compare(condition, value);
 }
 
@@ -134,10 +134,13 @@ bool Event_Query::wants(const Instance& indication) const
 
 Instance Event_Query::selected(Instance indication) const
 {
-    if (_query.select)
-        std::erase_if(
-            indication.properties, [&](const Named_Value& property)
-            { return std::ranges::none_of(*_query.select, [&](const auto& name) { return equal_names(name, property.name); }); });
+    if (!_query.select)
+        return indication;
+    std::vector<Named_Value> selected;
+    for (const auto& [name, value] : indication.properties)
+        if (std::ranges::any_of(*_query.select, [&](const auto& wanted) { return equal_names(wanted, name); }))
+            selected.push_back({name, value});
+    indication.properties = std::move(selected);
     return indication;
 }
 

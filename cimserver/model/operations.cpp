@@ -25,8 +25,8 @@ Value Operations::get_property(const Object_Path& path, const std::string& prope
 {
     const Instance instance = get_instance(path, std::vector{property});
     check_property(*get_class(instance.path.class_name), property);
-    const Named_Value* found = find_named(instance.properties, property);
-    return found ? found->value : Value();
+    const Value* found = instance.properties.find(property);
+    return found ? *found : Value();
 }
 
 void Operations::set_property(const Object_Path& path, const std::string& property, const Value& value)

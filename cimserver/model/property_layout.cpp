@@ -24,16 +24,21 @@ Property_Layout::Property_Layout(const zmlr::Meta_Class& meta_class)
 
 Property_Layout::Property_Layout(const Instance& instance)
 {
-    for (const Named_Value& property : instance.properties)
-        _slots.push_back({property.name, property.value.type, find_named(instance.path.keys, property.name) != nullptr});
+    for (const auto& [name, value] : instance.properties)
+        _slots.push_back({name, value.type, find_named(instance.path.keys, name) != nullptr});
     index_slots();
 }
 
 void Property_Layout::index_slots()
 {
+    std::vector<Named_Value> nulls;
     _index.reserve(_slots.size());
     for (std::size_t i = 0; i < _slots.size(); ++i)
+    {
         _index.emplace(_slots[i].name, i);
+        nulls.push_back({_slots[i].name, {_slots[i].type, {}}});
+    }
+    _nulls = std::move(nulls);
 }
 
 std::optional<std::size_t> Property_Layout::find(std::string_view name) const

@@ -1,6 +1,6 @@
 // Property_Layout: the properties of a class in class order, with their types, found by name in constant time.
 //
-// Instances share the layout of their class, so that making one costs a single array of values.
+// Instances share the layout of their class, so that making one costs the values that it has.
 #pragma once
 
 #include "cimserver/model/names.h"
@@ -30,6 +30,7 @@ public:
     Property_Layout& operator=(const Property_Layout&) = delete;
 
     const std::vector<Slot>& slots() const { return _slots; }
+    const Properties::List& nulls() const { return _nulls; } // every slot without a value
     std::size_t size() const { return _slots.size(); }
     std::optional<std::size_t> find(std::string_view name) const;
 
@@ -43,6 +44,7 @@ private:
     void index_slots();
 
     std::vector<Slot> _slots;
+    Properties::List _nulls;
     Name_Map<std::size_t> _index;
 };
 

@@ -18,7 +18,7 @@ std::string not_served(const Class_Entry& entry) { return std::string("no provid
 CMPIInstance* new_instance(const Class_Entry& entry, const Instance& instance)
 {
     auto& object = make<Instance_Object>(entry.layout, instance.path);
-    for (const Named_Value& property : instance.properties)
+    for (const auto& property : instance.properties)
         object.set(property.name, property.value);
     return object.face();
 }

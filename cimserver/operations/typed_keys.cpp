@@ -26,7 +26,8 @@ public:
         std::vector<Named_Value> result;
         for (const zmlr::Meta_Feature* feature : features_of(*entry.meta_class))
             if (zmlr::is_key(feature))
-                result.push_back({feature->name, converted(entry, *feature, path)});
+                result.push_back(
+                    {entry.layout->slots()[*entry.layout->find(feature->name)].name, converted(entry, *feature, path)});
         --_depth;
         return result;
     }

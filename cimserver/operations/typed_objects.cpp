@@ -97,10 +97,10 @@ void add_keys(Instance& instance)
 {
     for (const Named_Value& key : instance.path.keys)
     {
-        const Named_Value* property = find_named(instance.properties, key.name);
+        const Value* property = instance.properties.find(key.name);
         if (!property)
-            instance.properties.push_back(key);
-        else if (path_identity({"", "", "", {*property}}) != path_identity({"", "", "", {key}}))
+            instance.properties.put(key.name, key.value);
+        else if (path_identity({"", "", "", {{key.name, *property}}}) != path_identity({"", "", "", {key}}))
             throw Cim_Error(CIM_ERR_INVALID_PARAMETER, "the key " + key.name.string() + " cannot be changed");
     }
 }

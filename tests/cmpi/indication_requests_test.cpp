@@ -26,7 +26,7 @@ public:
     {
         EXPECT_EQ(indication.path.name_space, name_space) << "one server reads this one, one the other";
         if (++count < 100)
-            alerts.push_back(name_space + ": " + indication.properties.at(1).value.get<cimserver::Text>().string());
+            alerts.push_back(name_space + ": " + indication.properties[1].get<cimserver::Text>().string());
         if (on_delivery)
             on_delivery();
     }

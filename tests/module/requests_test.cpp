@@ -22,7 +22,7 @@ protected:
     {
         std::vector<std::string> ids;
         for (const auto& instance : instances)
-            ids.push_back(find_named(instance.properties, "DeviceID")->value.get<cimserver::Text>());
+            ids.push_back(instance.properties.find("DeviceID")->get<cimserver::Text>());
         return ids;
     }
 };
