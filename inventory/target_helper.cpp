@@ -14,7 +14,6 @@
 #include <memory>
 #include <new>
 #include <optional>
-#include <ranges>
 #include <vector>
 
 namespace zmlr
@@ -106,13 +105,18 @@ using Lun = std::array<std::uint8_t, lun_entry_size>; // as REPORT LUNS gives it
 std::vector<Lun> wanted_units(const std::uint8_t* answer, std::size_t count, const Wanted& wanted)
 {
     const auto entry = [answer](std::size_t i) { return Lun_Entry(answer + lun_list_head + i * lun_entry_size, lun_entry_size); };
-    const auto is_wanted = [&](Lun_Entry unit) { return wanted.may_end_with_number(lun_number(unit)); };
-    const auto entries = std::views::iota(std::size_t{0}, count) | std::views::transform(entry);
+    const auto is_wanted = [&](std::size_t i) { return wanted.may_end_with_number(lun_number(entry(i))); };
 
+    std::size_t kept = 0;
+    for (std::size_t i = 0; i < count; i++)
+        kept += is_wanted(i) ? 1 : 0;
     std::vector<Lun> units;
-    units.reserve(static_cast<std::size_t>(std::ranges::count_if(entries, is_wanted)));
-    for (const Lun_Entry unit : entries | std::views::filter(is_wanted))
-        std::ranges::copy(unit, units.emplace_back().begin());
+    units.reserve(kept);
+    for (std::size_t i = 0; i < count; i++)
+    {
+        if (is_wanted(i))
+            std::ranges::copy(entry(i), units.emplace_back().begin());
+    }
     return units;
 }
 
