@@ -137,9 +137,9 @@ Instance Event_Query::selected(Instance indication) const
     if (!_query.select)
         return indication;
     std::vector<Named_Value> selected;
-    for (const auto& [name, value] : indication.properties)
-        if (std::ranges::any_of(*_query.select, [&](const auto& wanted) { return equal_names(wanted, name); }))
-            selected.push_back({name, value});
+    for (const auto& property : indication.properties)
+        if (std::ranges::any_of(*_query.select, [&](const auto& wanted) { return equal_names(wanted, property.name); }))
+            selected.push_back({property.name, property.value});
     indication.properties = std::move(selected);
     return indication;
 }
