@@ -23,13 +23,17 @@ std::string_view cut(std::string_view text)
 }
 
 // The elements around every answer: CIM, MESSAGE, SIMPLERSP and the response that bears the request's name.
-std::string write_message(const Cimxml_Request& request, const std::function<void(Xml_Writer&)>& content)
+Xml_Writer start_message(const Cimxml_Request& request)
 {
     Xml_Writer writer("<?xml version=\"1.0\" encoding=\"utf-8\"?>\n");
     writer.start("CIM").attribute("CIMVERSION", "2.0").attribute("DTDVERSION", "2.0");
     writer.start("MESSAGE").attribute("ID", request.message_id).attribute("PROTOCOLVERSION", "1.0").start("SIMPLERSP");
     writer.start(request.intrinsic ? "IMETHODRESPONSE" : "METHODRESPONSE").attribute("NAME", request.method);
-    content(writer);
+    return writer;
+}
+
+std::string end_message(Xml_Writer& writer)
+{
     writer.end().end().end().end();
     return writer.take();
 }
@@ -38,41 +42,35 @@ std::string write_message(const Cimxml_Request& request, const std::function<voi
 
 std::string write_success(const Cimxml_Request& request, Answer answer, const std::function<void(Xml_Writer&)>& run)
 {
-    if (answer == Answer::nothing)
-        return write_message(request, run);
-    return write_message(request,
-                         [&](Xml_Writer& writer)
-                         {
-                             writer.start("IRETURNVALUE");
-                             run(writer);
-                             writer.end();
-                         });
+    Xml_Writer writer = start_message(request);
+    if (answer == Answer::value)
+        writer.start("IRETURNVALUE");
+    run(writer);
+    if (answer == Answer::value)
+        writer.end();
+    return end_message(writer);
 }
 
 std::string write_method_result(const Cimxml_Request& request, const Method_Result& result)
 {
-    return write_message(request,
-                         [&](Xml_Writer& writer)
-                         {
-                             if (can_be_sent(result.return_value))
-                             {
-                                 writer.start("RETURNVALUE").attribute("PARAMTYPE", cim_type_name(result.return_value.type));
-                                 write_any_value(writer, result.return_value);
-                                 writer.end();
-                             }
-                             for (const Named_Value& parameter : result.out)
-                                 write_output_parameter(writer, parameter);
-                         });
+    Xml_Writer writer = start_message(request);
+    if (can_be_sent(result.return_value))
+    {
+        writer.start("RETURNVALUE").attribute("PARAMTYPE", cim_type_name(result.return_value.type));
+        write_any_value(writer, result.return_value);
+        writer.end();
+    }
+    for (const Named_Value& parameter : result.out)
+        write_output_parameter(writer, parameter);
+    return end_message(writer);
 }
 
 std::string write_error(const Cimxml_Request& request, const Cim_Error& error)
 {
-    return write_message(request,
-                         [&](Xml_Writer& writer)
-                         {
-                             writer.start("ERROR").attribute("CODE", std::to_string(error.code()));
-                             writer.attribute("DESCRIPTION", cut(error.description())).end();
-                         });
+    Xml_Writer writer = start_message(request);
+    writer.start("ERROR").attribute("CODE", std::to_string(error.code()));
+    writer.attribute("DESCRIPTION", cut(error.description())).end();
+    return end_message(writer);
 }
 
 } // namespace cimserver
