@@ -3,11 +3,11 @@
 #include "cimserver/indications/delivery.h"
 #include "cimserver/model/names.h"
 #include "cimserver/model/server_identity.h"
-#include "cimserver/model/value_text.h"
 #include "cimserver/operations/module_operations.h"
 
 #include <algorithm>
-#include <chrono>
+#include <cstdio>
+#include <ctime>
 
 namespace cimserver
 {
@@ -118,9 +118,14 @@ std::vector<std::string> source_name_spaces(const Instance& filter)
 
 std::string now_text()
 {
-    const auto now = std::chrono::system_clock::now().time_since_epoch();
-    const auto microseconds = std::chrono::duration_cast<std::chrono::microseconds>(now).count();
-    return timestamp_text(static_cast<std::uint64_t>(microseconds));
+    std::timespec now{};
+    std::timespec_get(&now, TIME_UTC);
+    std::tm fields{};
+    gmtime_r(&now.tv_sec, &fields);
+    char text[32] = "";
+    const std::size_t size = std::strftime(text, sizeof text, "%Y%m%d%H%M%S", &fields);
+    std::snprintf(text + size, sizeof text - size, ".%06ld+000", now.tv_nsec / 1000);
+    return text;
 }
 
 } // namespace

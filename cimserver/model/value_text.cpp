@@ -85,23 +85,4 @@ bool is_readable_datetime(std::string_view text)
     return fields->interval || (fields->year >= 1 && date_of(*fields).ok());
 }
 
-std::string timestamp_text(std::uint64_t microseconds)
-{
-    const chrono::sys_time<chrono::microseconds> time{chrono::microseconds(microseconds)};
-    const auto day = chrono::floor<chrono::days>(time);
-    const chrono::year_month_day date(day);
-    const chrono::hh_mm_ss clock(time - day);
-    text::Datetime_Fields fields;
-    fields.year = static_cast<std::uint32_t>(static_cast<int>(date.year()));
-    fields.month = static_cast<unsigned>(date.month());
-    fields.day = static_cast<unsigned>(date.day());
-    fields.hour = static_cast<std::uint32_t>(clock.hours().count());
-    fields.minute = static_cast<std::uint32_t>(clock.minutes().count());
-    fields.second = static_cast<std::uint32_t>(clock.seconds().count());
-    fields.microsecond = static_cast<std::uint32_t>(clock.subseconds().count());
-    char result[text::datetime_size];
-    text::write_datetime(fields, result);
-    return {result, sizeof result};
-}
-
 } // namespace cimserver

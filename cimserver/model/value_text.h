@@ -20,7 +20,4 @@ std::optional<std::string> value_text(const Value& value);
 // an offset below one day, or an interval of days and a time of day.
 bool is_readable_datetime(std::string_view text);
 
-// The number of microseconds since 1970-01-01 as a timestamp in UTC; nothing after the year 9999.
-std::string timestamp_text(std::uint64_t microseconds);
-
 } // namespace cimserver
