@@ -43,14 +43,6 @@ struct Indication_Call
     CMPIObjectPath* path;
 };
 
-// An object of the broker's that outlives the request it is made in.
-CMPISelectExp* make_expression(const std::string& query)
-{
-    const Arena arena;
-    CMPISelectExp* expression = make<Select_Object>(query).face();
-    return expression->ft->clone(expression, nullptr);
-}
-
 } // namespace
 
 Indication_Providers::Indication_Providers(Module& module, Indication_Order order) : _module(module), _order(order) {}
@@ -70,10 +62,10 @@ std::vector<Indication_Providers::Provider*> Indication_Providers::providers_of(
     return providers;
 }
 
-void Indication_Providers::activate_with(Active_Filter& active, Provider& provider, const std::string& name_space)
+void Indication_Providers::activate_with(Active_Filter& active, Provider& provider)
 {
-    Indication_Call call(*provider.entry, name_space, provider.entry->meta_class->name);
-    const CMPISelectExp* expression = active.expression.get();
+    Indication_Call call(*provider.entry, active.filter.name_space, provider.entry->meta_class->name);
+    const CMPISelectExp* expression = active.expression->face();
     const char* class_name = active.filter.class_name.c_str();
     const CMPIIndicationMIFT& calls = *provider.mi->ft;
     if (_order == Indication_Order::sfcb)
@@ -83,20 +75,18 @@ void Indication_Providers::activate_with(Active_Filter& active, Provider& provid
             calls.mustPoll(provider.mi, call.request.context(), expression, class_name, call.path);
     }
     call.run(provider.mi, calls.activateFilter, expression, class_name, call.path, provider.filters == 0);
-    active.activations.push_back({&provider, name_space});
+    active.providers.push_back(&provider);
     ++provider.filters;
 }
 
 Indication_Providers::Active_Filter& Indication_Providers::activate(const std::string& name, const Provider_Filter& filter)
 {
     const auto providers = providers_of(filter.class_name);
-    Active_Filter active{filter, {}, {}};
-    active.expression.reset(make_expression(filter.query));
+    Active_Filter active{filter, std::make_unique<Select_Object>(filter.query), {}};
     try
     {
         for (Provider* provider : providers)
-            for (const std::string& name_space : filter.name_spaces)
-                activate_with(active, *provider, name_space);
+            activate_with(active, *provider);
     }
     catch (...)
     {
@@ -116,8 +106,8 @@ void Indication_Providers::enable(Provider& provider)
 
 void Indication_Providers::enable(Active_Filter& active)
 {
-    for (const Activation& activation : active.activations)
-        enable(*activation.provider);
+    for (Provider* provider : active.providers)
+        enable(*provider);
 }
 
 void Indication_Providers::start(const std::string& name, const Provider_Filter& filter)
@@ -160,26 +150,25 @@ void Indication_Providers::disable(Provider& provider)
     Indication_Call(*provider.entry, "", "").run(provider.mi, provider.mi->ft->disableIndications);
 }
 
-void Indication_Providers::deactivate(const Active_Filter& active, const Activation& activation)
+void Indication_Providers::deactivate(const Active_Filter& active, Provider& provider)
 {
-    Provider& provider = *activation.provider;
     --provider.filters;
     const bool nameless = _order == Indication_Order::sfcb;
-    Indication_Call call(*provider.entry, activation.name_space, nameless ? "" : provider.entry->meta_class->name);
-    call.run(provider.mi, provider.mi->ft->deActivateFilter, active.expression.get(),
+    Indication_Call call(*provider.entry, active.filter.name_space, nameless ? "" : provider.entry->meta_class->name);
+    call.run(provider.mi, provider.mi->ft->deActivateFilter, active.expression->face(),
              nameless ? "" : active.filter.class_name.c_str(), call.path, provider.filters == 0);
 }
 
 // Every step is taken, whatever the ones before it answered.
 void Indication_Providers::undo(const Active_Filter& active)
 {
-    for (auto activation = active.activations.rbegin(); activation != active.activations.rend(); ++activation)
+    for (auto taker = active.providers.rbegin(); taker != active.providers.rend(); ++taker)
     {
-        Provider& provider = *activation->provider;
+        Provider& provider = **taker;
         const bool last = provider.filters == 1;
         if (last && _order == Indication_Order::sfcb)
             attempt([&] { disable(provider); });
-        attempt([&] { deactivate(active, *activation); });
+        attempt([&] { deactivate(active, provider); });
         if (last && _order == Indication_Order::open_pegasus)
             attempt([&] { disable(provider); });
     }

@@ -11,6 +11,7 @@
 #pragma once
 
 #include "cimserver/broker/module.h"
+#include "cimserver/broker/objects.h"
 
 #include <map>
 #include <memory>
@@ -30,8 +31,8 @@ enum class Indication_Order
 struct Provider_Filter
 {
     std::string query;
-    std::string class_name;               // as the query writes it
-    std::vector<std::string> name_spaces; // where indications are wanted from
+    std::string class_name; // as the query writes it
+    std::string name_space; // where indications are wanted from
 };
 
 // Not safe for several threads at once. A call may take as long as the provider likes, and the provider may raise indications
@@ -57,10 +58,6 @@ public:
     void stop_all();
 
 private:
-    struct Release_Expression
-    {
-        void operator()(CMPISelectExp* expression) const { expression->ft->release(expression); }
-    };
     struct Provider
     {
         const Class_Entry* entry;
@@ -68,25 +65,20 @@ private:
         std::size_t filters = 0;
         bool enabled = false;
     };
-    struct Activation // of one filter with one provider in one name space
-    {
-        Provider* provider;
-        std::string name_space;
-    };
     struct Active_Filter
     {
         Provider_Filter filter;
-        std::unique_ptr<CMPISelectExp, Release_Expression> expression; // lives as long as providers may look at it
-        std::vector<Activation> activations;
+        std::unique_ptr<Select_Object> expression; // lives as long as providers may look at it
+        std::vector<Provider*> providers;          // that took it
     };
 
     std::vector<Provider*> providers_of(const std::string& class_name);
     Active_Filter& activate(const std::string& name, const Provider_Filter& filter);
-    void activate_with(Active_Filter& active, Provider& provider, const std::string& name_space);
+    void activate_with(Active_Filter& active, Provider& provider);
     void enable(Active_Filter& active);
     void enable(Provider& provider);
     void disable(Provider& provider);
-    void deactivate(const Active_Filter& active, const Activation& activation);
+    void deactivate(const Active_Filter& active, Provider& provider);
     void undo(const Active_Filter& active);
 
     Module& _module;

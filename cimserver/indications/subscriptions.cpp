@@ -100,9 +100,8 @@ bool Subscriptions::in_use(Kind kind, const std::string& id) const
 Provider_Filter Subscriptions::provider_filter(const std::string& filter_id) const
 {
     const Entry& filter = table(Kind::filter).at(filter_id);
-    return {filter.instance.properties.find("Query")->get<Text>(),
-            filter.filter->query.class_name(),
-            {Module_Operations::served_name_space}};
+    return {filter.instance.properties.find("Query")->get<Text>(), filter.filter->query.class_name(),
+            Module_Operations::served_name_space};
 }
 
 void Subscriptions::insert(Kind kind, const std::string& id, Entry entry)

@@ -143,9 +143,9 @@ protected:
         providers.emplace(module(), order);
     }
 
-    void start(const std::string& name = "filter", const std::vector<std::string>& name_spaces = {"root/zemlar"})
+    void start(const std::string& name = "filter", const std::string& name_space = "root/zemlar")
     {
-        providers->start(name, {"SELECT * FROM CIM_AlertIndication", "CIM_AlertIndication", name_spaces});
+        providers->start(name, {"SELECT * FROM CIM_AlertIndication", "CIM_AlertIndication", name_space});
     }
     bool starts()
     try
@@ -200,11 +200,13 @@ protected:
 TEST_F(Alerts, go_once_to_each_name_space_that_wants_them)
 {
     load("fc-hba");
-    start("a", {"root/x", "root/y"});
-    start("b", {"root/x"});
+    start("a", "root/x");
+    start("b", "root/x");
+    start("c", "root/y");
     raise(1);
     EXPECT_THAT(sink.take(2), ElementsAre("root/x|1", "root/y|1"));
     stop("a");
+    stop("c");
     raise(2);
     raise(3);
     EXPECT_THAT(sink.take(2), ElementsAre("root/x|2", "root/x|3"));
