@@ -27,11 +27,9 @@ bool wants_to_stay(CMPIrc rc) { return rc == CMPI_RC_DO_NOT_UNLOAD || rc == CMPI
 
 } // namespace
 
-void Module::Close_Library::operator()(void* library) const { dlclose(library); }
-
 Module::Library Module::open(const std::string& file)
 {
-    Library library(dlopen(file.c_str(), RTLD_NOW | RTLD_GLOBAL));
+    Library library(dlopen(file.c_str(), RTLD_NOW | RTLD_GLOBAL), dlclose);
     if (!library)
         throw std::runtime_error("cannot load the module: " + last_loader_error());
     return library;

@@ -67,11 +67,7 @@ public:
     };
 
 private:
-    struct Close_Library
-    {
-        void operator()(void* library) const;
-    };
-    using Library = std::unique_ptr<void, Close_Library>;
+    using Library = std::unique_ptr<void, int (*)(void*)>;
 
     // The interfaces of one provider. They share the provider's state in the module, so one at a time is made. The mutex is
     // recursive because a factory may call back into the server.

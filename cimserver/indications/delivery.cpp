@@ -14,11 +14,6 @@ namespace
 
 constexpr std::chrono::milliseconds longest_wait{60'000};
 
-struct Free_Url
-{
-    void operator()(CURLU* url) const { curl_url_cleanup(url); }
-};
-
 bool has_part(CURLU* url, CURLUPart part)
 {
     char* text = nullptr;
@@ -35,7 +30,7 @@ bool is_listener_url(const std::string& url)
     const std::string lower = lower_name(url);
     if (!printable || !(lower.starts_with("http://") || lower.starts_with("https://")))
         return false;
-    const std::unique_ptr<CURLU, Free_Url> parts(curl_url());
+    const std::unique_ptr<CURLU, void (*)(CURLU*)> parts(curl_url(), curl_url_cleanup);
     if (!parts)
         throw std::bad_alloc();
     return curl_url_set(parts.get(), CURLUPART_URL, url.c_str(), 0) == CURLUE_OK && has_part(parts.get(), CURLUPART_HOST) &&

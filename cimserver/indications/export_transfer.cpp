@@ -24,7 +24,7 @@ curl_socket_t open_socket(void*, curlsocktype, curl_sockaddr* address)
 Export_Transfer::Export_Transfer(const std::string& url, std::shared_ptr<const std::string> message,
                                  std::chrono::milliseconds timeout, const std::string& ca_file)
     : _message(std::move(message))
-    , _handle(curl_easy_init())
+    , _handle(curl_easy_init(), curl_easy_cleanup)
 {
     if (!_handle)
         throw std::bad_alloc();

@@ -33,15 +33,6 @@ public:
     std::string problem(CURLcode result) const; // why it was not taken, for people
 
 private:
-    struct Free_Handle
-    {
-        void operator()(CURL* handle) const { curl_easy_cleanup(handle); }
-    };
-    struct Free_List
-    {
-        void operator()(curl_slist* list) const { curl_slist_free_all(list); }
-    };
-
     void set_headers();
     void set_limits(std::chrono::milliseconds timeout, const std::string& ca_file);
     static std::size_t take_answer(char* data, std::size_t size, std::size_t count, void* self) noexcept;
@@ -49,8 +40,8 @@ private:
 
     std::shared_ptr<const std::string> _message;
     std::string _answer;
-    std::unique_ptr<curl_slist, Free_List> _headers;
-    std::unique_ptr<CURL, Free_Handle> _handle;
+    std::unique_ptr<curl_slist, void (*)(curl_slist*)> _headers{nullptr, curl_slist_free_all};
+    std::unique_ptr<CURL, void (*)(CURL*)> _handle;
 };
 
 } // namespace cimserver

@@ -22,16 +22,9 @@ namespace
 constexpr std::size_t max_pem_bytes = std::size_t{1} << 20;
 constexpr unsigned max_chain = 16;
 
-struct Free_Certificate
-{
-    void operator()(gnutls_x509_crt_t certificate) const { gnutls_x509_crt_deinit(certificate); }
-};
-struct Free_Key
-{
-    void operator()(gnutls_x509_privkey_t key) const { gnutls_x509_privkey_deinit(key); }
-};
-using Certificate = std::unique_ptr<std::remove_pointer_t<gnutls_x509_crt_t>, Free_Certificate>;
-using Private_Key = std::unique_ptr<std::remove_pointer_t<gnutls_x509_privkey_t>, Free_Key>;
+template <class Pointer> using Freed = std::unique_ptr<std::remove_pointer_t<Pointer>, void (*)(Pointer)>;
+using Certificate = Freed<gnutls_x509_crt_t>;
+using Private_Key = Freed<gnutls_x509_privkey_t>;
 
 // A certificate is no secret: whoever may read it does not matter.
 std::string read_public_file(const std::string& file)
@@ -57,9 +50,11 @@ Certificate first_certificate(const std::string& text)
     gnutls_x509_crt_t made = nullptr;
     if (gnutls_x509_crt_init(&made) != GNUTLS_E_SUCCESS)
         throw std::bad_alloc();
-    Certificate certificate(made);
+    Certificate certificate(made, gnutls_x509_crt_deinit);
     const gnutls_datum_t pem = datum(text);
-    return gnutls_x509_crt_import(made, &pem, GNUTLS_X509_FMT_PEM) == GNUTLS_E_SUCCESS ? std::move(certificate) : nullptr;
+    if (gnutls_x509_crt_import(made, &pem, GNUTLS_X509_FMT_PEM) != GNUTLS_E_SUCCESS)
+        certificate.reset();
+    return certificate;
 }
 
 Private_Key private_key(const std::string& text)
@@ -67,10 +62,11 @@ Private_Key private_key(const std::string& text)
     gnutls_x509_privkey_t made = nullptr;
     if (gnutls_x509_privkey_init(&made) != GNUTLS_E_SUCCESS)
         throw std::bad_alloc();
-    Private_Key key(made);
+    Private_Key key(made, gnutls_x509_privkey_deinit);
     const gnutls_datum_t pem = datum(text);
-    const int result = gnutls_x509_privkey_import2(made, &pem, GNUTLS_X509_FMT_PEM, nullptr, 0);
-    return result == GNUTLS_E_SUCCESS ? std::move(key) : nullptr;
+    if (gnutls_x509_privkey_import2(made, &pem, GNUTLS_X509_FMT_PEM, nullptr, 0) != GNUTLS_E_SUCCESS)
+        key.reset();
+    return key;
 }
 
 // Both have the same number when they belong together.
@@ -93,11 +89,6 @@ std::string date_text(std::time_t time)
     return text;
 }
 
-struct Free
-{
-    void operator()(void* memory) const { gnutls_free(memory); }
-};
-
 std::mutex shown_mutex;
 std::shared_ptr<const Tls_Identity> shown;
 
@@ -111,8 +102,8 @@ int retrieve(gnutls_session_t, const gnutls_cert_retr_st*, gnutls_pcert_st** cer
     }
     const gnutls_datum_t certificate_pem = datum(identity->certificate);
     const gnutls_datum_t key_pem = datum(identity->key);
-    std::unique_ptr<gnutls_pcert_st, Free> list(
-        static_cast<gnutls_pcert_st*>(gnutls_malloc(max_chain * sizeof(gnutls_pcert_st))));
+    std::unique_ptr<gnutls_pcert_st, gnutls_free_function> list(
+        static_cast<gnutls_pcert_st*>(gnutls_malloc(max_chain * sizeof(gnutls_pcert_st))), gnutls_free);
     *count = max_chain;
     *ocsp_count = 0;
     if (!list || gnutls_pcert_list_import_x509_raw(list.get(), count, &certificate_pem, GNUTLS_X509_FMT_PEM, 0) < 0 ||
