@@ -46,6 +46,12 @@ public:
     {
         return {{path, path.keys}};
     }
+    std::vector<Object_Path> associator_names(const Object_Path& path, const Association_Filter&) override { return {path}; }
+    std::vector<Instance> references(const Object_Path& path, const Association_Filter& filter,
+                                     const Property_List& list) override
+    {
+        return associators(path, filter, list);
+    }
     std::vector<Object_Path> reference_names(const Object_Path& path, const Association_Filter&) override { return {path}; }
     Method_Result invoke_method(const Object_Path&, const std::string& method, const std::vector<Named_Value>& in) override
     {

@@ -1,30 +1,16 @@
 #include "cimserver/model/operations.h"
 
 #include "cimserver/model/meta_search.h"
-#include "cimserver/model/names.h"
 
 namespace cimserver
 {
-namespace
-{
-
-void check_property(const zmlr::Meta_Class& meta_class, const std::string& property)
-{
-    if (!find_value(meta_class, property))
-        throw Cim_Error(CIM_ERR_NO_SUCH_PROPERTY, "class " + std::string(meta_class.name) + " has no property " + property);
-}
-
-} // namespace
-
-void Operations::not_supported(const char* operation)
-{
-    throw Cim_Error(CIM_ERR_NOT_SUPPORTED, std::string("operation not supported: ") + operation);
-}
 
 Value Operations::get_property(const Object_Path& path, const std::string& property)
 {
     const Instance instance = get_instance(path, std::vector{property});
-    check_property(*get_class(instance.path.class_name), property);
+    const zmlr::Meta_Class& meta_class = *get_class(instance.path.class_name);
+    if (!find_value(meta_class, property))
+        throw Cim_Error(CIM_ERR_NO_SUCH_PROPERTY, "class " + std::string(meta_class.name) + " has no property " + property);
     const Value* found = instance.properties.find(property);
     return found ? *found : Value();
 }

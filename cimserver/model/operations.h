@@ -36,8 +36,7 @@ struct Method_Result
     std::vector<Named_Value> out; // the output parameters that the provider gave
 };
 
-// The operations in one name space, whatever name space a path says. One that an implementation does not override is
-// CIM_ERR_NOT_SUPPORTED.
+// The operations in one name space, whatever name space a path says.
 class Operations
 {
 public:
@@ -67,10 +66,10 @@ public:
     // Changes of instances, by the provider of the class. The values of an instance may come untyped, as the keys may; an
     // array may hold texts. They are converted to the types of the class. A value that does not fit is CIM_ERR_INVALID_PARAMETER;
     // a property that the class has not is that too in create_instance, and CIM_ERR_NO_SUCH_PROPERTY in modify_instance.
-    virtual Object_Path create_instance(const Instance&) { not_supported("CreateInstance"); } // the path needs no keys
+    virtual Object_Path create_instance(const Instance& instance) = 0; // the path needs no keys
     // No list: those that the instance holds.
-    virtual void modify_instance(const Instance&, const Property_List&) { not_supported("ModifyInstance"); }
-    virtual void delete_instance(const Object_Path&) { not_supported("DeleteInstance"); }
+    virtual void modify_instance(const Instance& instance, const Property_List& properties) = 0;
+    virtual void delete_instance(const Object_Path& path) = 0;
 
     // Answered through the two operations on whole instances, with their errors. CIM_ERR_NO_SUCH_PROPERTY when the class has
     // no such property; CIM_ERR_TYPE_MISMATCH when the new value is none of its type.
@@ -80,34 +79,19 @@ public:
     // Association traversal, from an instance: the union over every association class that can concern it and that the filter
     // admits, each object once, with the path of its own name space. A class that the filter names must exist:
     // CIM_ERR_INVALID_PARAMETER. An instance that does not exist has no associations.
-    virtual std::vector<Instance> associators(const Object_Path&, const Association_Filter&, const Property_List&)
-    {
-        not_supported("Associators");
-    }
-    virtual std::vector<Object_Path> associator_names(const Object_Path&, const Association_Filter&)
-    {
-        not_supported("AssociatorNames");
-    }
+    virtual std::vector<Instance> associators(const Object_Path& path, const Association_Filter& filter,
+                                              const Property_List& properties) = 0;
+    virtual std::vector<Object_Path> associator_names(const Object_Path& path, const Association_Filter& filter) = 0;
 
     // The same for the associations themselves: only the filter's association class and role count.
-    virtual std::vector<Instance> references(const Object_Path&, const Association_Filter&, const Property_List&)
-    {
-        not_supported("References");
-    }
-    virtual std::vector<Object_Path> reference_names(const Object_Path&, const Association_Filter&)
-    {
-        not_supported("ReferenceNames");
-    }
+    virtual std::vector<Instance> references(const Object_Path& path, const Association_Filter& filter,
+                                             const Property_List& properties) = 0;
+    virtual std::vector<Object_Path> reference_names(const Object_Path& path, const Association_Filter& filter) = 0;
 
     // An extrinsic method of an instance, or with a path without keys of a class. Values as in create_instance; a parameter
     // that the method has not, or takes nothing in, is CIM_ERR_INVALID_PARAMETER.
-    virtual Method_Result invoke_method(const Object_Path&, const std::string&, const std::vector<Named_Value>&)
-    {
-        not_supported("a method call");
-    }
-
-private:
-    [[noreturn]] static void not_supported(const char* operation);
+    virtual Method_Result invoke_method(const Object_Path& path, const std::string& method,
+                                        const std::vector<Named_Value>& in) = 0;
 };
 
 // Who answers what: the one place through which every request goes.
