@@ -7,28 +7,28 @@ namespace cimserver
 namespace
 {
 
-std::size_t visible_slot(const Instance_Object& instance, const char* name)
+std::size_t visible_place(const Instance_Object& instance, const char* name)
 {
-    const auto slot = instance.layout().find(required(name));
-    if (!slot || !instance.visible(*slot))
+    const auto place = instance.layout().find(required(name));
+    if (!place || !instance.visible(*place))
         throw Failure{CMPI_RC_ERR_NO_SUCH_PROPERTY};
-    return *slot;
+    return *place;
 }
 
 CMPICount visible_count(const Instance_Object& instance)
 {
     CMPICount count = 0;
-    for (std::size_t slot = 0; slot < instance.layout().size(); ++slot)
-        count += instance.visible(slot) ? 1U : 0U;
+    for (std::size_t place = 0; place < instance.layout().size(); ++place)
+        count += instance.visible(place) ? 1U : 0U;
     return count;
 }
 
-// The slot of the index-th property in view.
-std::size_t visible_slot(const Instance_Object& instance, CMPICount index)
+// The place of the index-th property in view.
+std::size_t visible_place(const Instance_Object& instance, CMPICount index)
 {
-    for (std::size_t slot = 0; slot < instance.layout().size(); ++slot)
-        if (instance.visible(slot) && index-- == 0)
-            return slot;
+    for (std::size_t place = 0; place < instance.layout().size(); ++place)
+        if (instance.visible(place) && index-- == 0)
+            return place;
     throw Failure{CMPI_RC_ERR_NO_SUCH_PROPERTY};
 }
 
@@ -38,7 +38,7 @@ CMPIData get_property(const CMPIInstance* self, const char* name, CMPIStatus* st
                   [&]
                   {
                       const auto& instance = object<Instance_Object>(self);
-                      return to_cmpi(instance.value(visible_slot(instance, name)));
+                      return to_cmpi(instance.value(visible_place(instance, name)));
                   });
 }
 
@@ -48,10 +48,10 @@ CMPIData get_property_at(const CMPIInstance* self, CMPICount index, CMPIString**
                   [&]
                   {
                       const auto& instance = object<Instance_Object>(self);
-                      const std::size_t slot = visible_slot(instance, index);
+                      const std::size_t place = visible_place(instance, index);
                       if (name)
-                          *name = make<String_Object>(instance.layout().slots()[slot].name).face();
-                      return to_cmpi(instance.value(slot));
+                          *name = make<String_Object>(instance.layout()[place].name).face();
+                      return to_cmpi(instance.value(place));
                   });
 }
 
@@ -78,8 +78,8 @@ CMPIStatus set_property_filter(CMPIInstance* self, const char** properties, cons
 void show_named(const Property_Layout& layout, const char** names, std::vector<bool>& filter)
 {
     for (; names && *names; ++names)
-        if (const auto slot = layout.find(*names))
-            filter[*slot] = true;
+        if (const auto place = layout.find(*names))
+            filter[*place] = true;
 }
 
 } // namespace
@@ -100,13 +100,13 @@ Instance_Object::Instance_Object(const Instance& instance)
 
 void Instance_Object::set(std::string_view name, Value value)
 {
-    const auto slot = _layout->find(name);
-    if (!slot)
+    const auto place = _layout->find(name);
+    if (!place)
         throw Failure{CMPI_RC_ERR_NO_SUCH_PROPERTY};
-    if (value.type != CMPI_null && value.type != _layout->slots()[*slot].type)
+    if (value.type != CMPI_null && value.type != (*_layout)[*place].value.type)
         throw Failure{CMPI_RC_ERR_TYPE_MISMATCH};
-    if (visible(*slot))
-        _properties.set(*slot, std::move(value));
+    if (visible(*place))
+        _properties.set(*place, std::move(value));
 }
 
 void Instance_Object::filter(const char** properties, const char** keys)
@@ -116,8 +116,8 @@ void Instance_Object::filter(const char** properties, const char** keys)
         return;
 
     std::vector<bool> filter(_layout->size());
-    for (std::size_t slot = 0; slot < _layout->size(); ++slot)
-        filter[slot] = _layout->slots()[slot].key;
+    for (std::size_t place = 0; place < _layout->size(); ++place)
+        filter[place] = _layout->is_key(place);
     show_named(*_layout, properties, filter);
     show_named(*_layout, keys, filter);
     _filter = std::move(filter);
@@ -125,12 +125,12 @@ void Instance_Object::filter(const char** properties, const char** keys)
 
 Instance Instance_Object::model(const std::vector<bool>* selection) const
 {
-    if (!selection && (*_filter).empty())
+    if (!selection && !_filter)
         return {path, _properties};
     std::vector<Named_Value> shown;
-    for (std::size_t slot = 0; slot < _layout->size(); ++slot)
-        if (visible(slot) && (!selection || (*selection)[slot]))
-            shown.push_back({_layout->slots()[slot].name, value(slot)});
+    for (std::size_t place = 0; place < _layout->size(); ++place)
+        if (visible(place) && (!selection || (*selection)[place]))
+            shown.push_back({(*_layout)[place].name, value(place)});
     return {path, std::move(shown)};
 }
 

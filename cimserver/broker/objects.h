@@ -74,9 +74,9 @@ public:
     const Property_Layout& layout() const { return *_layout; }
     const std::shared_ptr<const Property_Layout>& shared_layout() const { return _layout; }
 
-    // Whether the property filter leaves a slot in view.
-    bool visible(std::size_t slot) const { return (*_filter).empty() || (*_filter)[slot]; }
-    const Value& value(std::size_t slot) const { return _properties[slot]; } // a null value has the property's type
+    // Whether the property filter leaves a place in view.
+    bool visible(std::size_t place) const { return !_filter || (*_filter)[place]; }
+    const Value& value(std::size_t place) const { return _properties[place]; } // a null value has the property's type
 
     // Throws NO_SUCH_PROPERTY, or TYPE_MISMATCH unless the value has the property's type (or none). A property that the
     // filter hides stays as it is.
@@ -85,7 +85,7 @@ public:
     // From now on only the listed properties and the keys are in view. Null: all properties are.
     void filter(const char** properties, const char** keys);
 
-    // The instance as clients see it: the visible slots, less those that `selection` (unless null) leaves out.
+    // The instance as clients see it: the visible places, less those that `selection` (unless null) leaves out.
     Instance model(const std::vector<bool>* selection = nullptr) const;
 
     Object_Path path;
@@ -93,7 +93,7 @@ public:
 private:
     std::shared_ptr<const Property_Layout> _layout;
     Properties _properties;
-    Shared<std::vector<bool>> _filter; // empty: no filter
+    Shared<std::vector<bool>> _filter; // unless all are in view
 };
 
 class Args_Object : public Handle<CMPIArgs, Args_Object>

@@ -27,8 +27,8 @@ CMPIStatus add_key(CMPIObjectPath* self, const char* name, const CMPIValue* valu
             Value key = from_cmpi(value, type);
             if (key.null() || (key.type & CMPI_ARRAY) != 0)
                 throw Failure{CMPI_RC_ERR_INVALID_PARAMETER};
-            const auto slot = path.class_entry ? path.class_entry->layout->find(required(name)) : std::nullopt;
-            put(path.path.keys, slot ? path.class_entry->layout->slots()[*slot].name : Name(required(name)), std::move(key));
+            const auto place = path.class_entry ? path.class_entry->layout->find(required(name)) : std::nullopt;
+            put(path.path.keys, place ? (*path.class_entry->layout)[*place].name : Name(required(name)), std::move(key));
         });
 }
 

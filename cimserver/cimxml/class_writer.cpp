@@ -7,7 +7,6 @@
 #include "cimserver/model/names.h"
 #include "cimserver/model/value_text.h"
 
-#include <algorithm>
 #include <string>
 
 namespace cimserver
@@ -116,8 +115,7 @@ bool is_selected(const zmlr::Meta_Class& meta_class, unsigned index, const Class
     const zmlr::Meta_Feature& feature = *meta_class.meta_features[index];
     if (selection.local_only && !is_local(meta_class, index))
         return false;
-    return zmlr::is_method(&feature) || !selection.properties ||
-           std::ranges::any_of(*selection.properties, [&](const std::string& name) { return equal_names(name, feature.name); });
+    return zmlr::is_method(&feature) || !selection.properties || is_among(*selection.properties, feature.name);
 }
 
 using Writer_Of_Feature = void (*)(Xml_Writer&, const zmlr::Meta_Class&, unsigned, const Class_Selection&);

@@ -3,8 +3,6 @@
 #include "cimserver/cimxml/object_reader.h"
 #include "cimserver/model/names.h"
 
-#include <algorithm>
-
 namespace cimserver
 {
 namespace
@@ -28,7 +26,7 @@ Parameters::Parameters(const Cimxml_Request& request, std::span<const std::strin
         if (!is_parameter(parameter))
             continue;
         const std::string& name = name_of(parameter);
-        if (std::ranges::none_of(known, [&](std::string_view candidate) { return equal_names(candidate, name); }))
+        if (!is_among(known, name))
             fail("unknown parameter", name);
         if (find(name) != &parameter)
             fail("parameter given twice", name);

@@ -39,10 +39,7 @@ std::optional<Instance> find_instance(const Server_Class& server_class, const Ob
 
 } // namespace
 
-bool Own_Operations::is_name(std::string_view name)
-{
-    return std::ranges::any_of(names, [&](const char* known) { return equal_names(name, known); });
-}
+bool Own_Operations::is_name(std::string_view name) { return is_among(names, name); }
 
 std::vector<Named_Value> Own_Operations::keys_of(const Class_Entry& entry, const Object_Path& path) const
 {
@@ -90,7 +87,7 @@ Instance Own_Operations::shown(Instance instance, const Class_Entry& entry, cons
     for (const std::string& name : entry.layout->names(properties))
     {
         const Value* found = instance.properties.find(name);
-        all.push_back({name, found ? *found : Value{entry.layout->slots()[*entry.layout->find(name)].type, {}}});
+        all.push_back({name, found ? *found : (*entry.layout)[*entry.layout->find(name)].value});
     }
     instance.properties = std::move(all);
     instance.path.name_space = name_space;

@@ -3,8 +3,6 @@
 #include "cimserver/model/names.h"
 #include "cimserver/model/query_tokens.h"
 
-#include <algorithm>
-
 namespace cimserver
 {
 namespace
@@ -89,13 +87,16 @@ std::optional<bool> evaluate(const Query_Condition& condition, const Instance& i
     return condition.kind == Kind::is_null ? std::optional(value.null()) : compare(condition, value);
 }
 
-void check_property(const std::string& name, const Property_Layout& layout, const std::string& class_name)
+// Refuses a property that the class lacks.
+CMPIType type_of(const std::string& name, const Property_Layout& layout, const std::string& class_name)
 {
-    if (!layout.find(name))
+    const auto place = layout.find(name);
+    if (!place)
         refuse_query("class " + class_name + " has no property " + name);
+    return layout[*place].value.type;
 }
 
-void check_types(const Query_Condition& condition, CMPIType type)
+void check_type(const Query_Condition& condition, CMPIType type)
 {
     const bool ordered = condition.relation != Relation::equal && condition.relation != Relation::unequal;
     const bool fits = std::holds_alternative<std::string>(condition.literal) ? type == CMPI_string && !ordered
@@ -111,9 +112,9 @@ void check_condition(const Query_Condition& condition, const Property_Layout& la
         check_condition(part, layout, class_name);
     if (condition.kind != Kind::compare && condition.kind != Kind::is_null)
         return;
-    check_property(condition.property, layout, class_name);
+    const CMPIType type = type_of(condition.property, layout, class_name);
     if (condition.kind == Kind::compare)
-        check_types(condition, layout.slots()[*layout.find(condition.property)].type);
+        check_type(condition, type);
 }
 
 } // namespace
@@ -122,7 +123,7 @@ void Event_Query::check(const Property_Layout& layout) const
 {
     if (_query.select)
         for (const std::string& name : *_query.select)
-            check_property(name, layout, _query.class_name);
+            type_of(name, layout, _query.class_name);
     if (_query.where)
         check_condition(*_query.where, layout, _query.class_name);
 }
@@ -136,10 +137,8 @@ Instance Event_Query::selected(Instance indication) const
 {
     if (!_query.select)
         return indication;
-    std::vector<Named_Value> selected;
-    for (const auto& property : indication.properties)
-        if (std::ranges::any_of(*_query.select, [&](const auto& wanted) { return equal_names(wanted, property.name); }))
-            selected.push_back({property.name, property.value});
+    std::vector<Named_Value> selected = indication.properties;
+    std::erase_if(selected, [&](const Named_Value& property) { return !is_among(*_query.select, property.name); });
     indication.properties = std::move(selected);
     return indication;
 }

@@ -1,6 +1,7 @@
 // CIM names are compared without regard to the case of ASCII letters: the comparison, and a hash that agrees with it.
 #pragma once
 
+#include <algorithm>
 #include <cstddef>
 #include <ranges>
 #include <string>
@@ -23,6 +24,12 @@ struct Name_Equal
 {
     bool operator()(std::string_view a, std::string_view b) const { return equal_names(a, b); }
 };
+
+// Whether a list of texts holds the name.
+template <class List> bool is_among(const List& list, std::string_view name)
+{
+    return std::ranges::any_of(list, [&](std::string_view one) { return equal_names(one, name); });
+}
 
 // Looks up by name; the texts behind the keys must outlive the map.
 template <class T> using Name_Map = std::unordered_map<std::string_view, T, Name_Hash, Name_Equal>;

@@ -5,6 +5,28 @@
 
 namespace cimserver
 {
+namespace
+{
+
+std::vector<Named_Value> nulls_of(const zmlr::Meta_Class& meta_class)
+{
+    std::vector<Named_Value> nulls;
+    for (const zmlr::Meta_Feature* feature : features_of(meta_class))
+        if (!zmlr::is_method(feature))
+            nulls.push_back({feature->name, {cmpi_type(*feature), {}}});
+    return nulls;
+}
+
+std::vector<Named_Value> nulls_of(const Instance& instance)
+{
+    std::vector<Named_Value> nulls = instance.properties;
+    for (Named_Value& property : nulls)
+        property.value.content = {};
+    return nulls;
+}
+
+} // namespace
+
 CMPIType cmpi_type(const zmlr::Meta_Feature& feature)
 {
     if (zmlr::is_reference(&feature))
@@ -14,31 +36,25 @@ CMPIType cmpi_type(const zmlr::Meta_Feature& feature)
     return property->subscript != 0 ? array_of(type) : type;
 }
 
-Property_Layout::Property_Layout(const zmlr::Meta_Class& meta_class)
+Property_Layout::Property_Layout(std::vector<Named_Value> nulls) : _nulls(std::move(nulls)), _keys(_list.size())
+{
+    _index.reserve(size());
+    for (std::size_t place = 0; place < size(); ++place)
+        _index.emplace(_list[place].name, place);
+}
+
+Property_Layout::Property_Layout(const zmlr::Meta_Class& meta_class) : Property_Layout(nulls_of(meta_class))
 {
     for (const zmlr::Meta_Feature* feature : features_of(meta_class))
-        if (!zmlr::is_method(feature))
-            _slots.push_back({feature->name, cmpi_type(*feature), zmlr::is_key(feature)});
-    index_slots();
+        if (zmlr::is_key(feature))
+            _keys[*find(feature->name)] = true;
 }
 
-Property_Layout::Property_Layout(const Instance& instance)
+Property_Layout::Property_Layout(const Instance& instance) : Property_Layout(nulls_of(instance))
 {
-    for (const auto& [name, value] : instance.properties)
-        _slots.push_back({name, value.type, find_named(instance.path.keys, name) != nullptr});
-    index_slots();
-}
-
-void Property_Layout::index_slots()
-{
-    std::vector<Named_Value> nulls;
-    _index.reserve(_slots.size());
-    for (std::size_t i = 0; i < _slots.size(); ++i)
-    {
-        _index.emplace(_slots[i].name, i);
-        nulls.push_back({_slots[i].name, {_slots[i].type, {}}});
-    }
-    _nulls = std::move(nulls);
+    for (const Named_Value& key : instance.path.keys)
+        if (const auto place = find(key.name))
+            _keys[*place] = true;
 }
 
 std::optional<std::size_t> Property_Layout::find(std::string_view name) const
@@ -51,10 +67,10 @@ std::optional<std::size_t> Property_Layout::find(std::string_view name) const
 
 std::vector<bool> Property_Layout::select(const std::vector<std::string>& names) const
 {
-    std::vector<bool> selection(_slots.size());
+    std::vector<bool> selection(size());
     for (const std::string& name : names)
-        if (const auto slot = find(name))
-            selection[*slot] = true;
+        if (const auto place = find(name))
+            selection[*place] = true;
     return selection;
 }
 
@@ -62,9 +78,9 @@ std::vector<std::string> Property_Layout::names(const Property_List& wanted) con
 {
     const std::vector<bool> selected = wanted ? select(*wanted) : std::vector<bool>(size(), true);
     std::vector<std::string> result;
-    for (std::size_t slot = 0; slot < size(); ++slot)
-        if (selected[slot])
-            result.push_back(_slots[slot].name);
+    for (std::size_t place = 0; place < size(); ++place)
+        if (selected[place])
+            result.push_back(_list[place].name);
     return result;
 }
 

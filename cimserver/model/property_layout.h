@@ -9,6 +9,7 @@
 
 #include <cstddef>
 #include <optional>
+#include <span>
 #include <string_view>
 
 namespace cimserver
@@ -17,34 +18,30 @@ namespace cimserver
 class Property_Layout
 {
 public:
-    struct Slot
-    {
-        Name name;
-        CMPIType type;
-        bool key;
-    };
-
     explicit Property_Layout(const zmlr::Meta_Class& meta_class); // its properties and references
     explicit Property_Layout(const Instance& instance);           // for an instance whose class the module does not know
     Property_Layout(const Property_Layout&) = delete;
     Property_Layout& operator=(const Property_Layout&) = delete;
 
-    const std::vector<Slot>& slots() const { return _slots; }
-    const Properties::List& nulls() const { return _nulls; } // every slot without a value
-    std::size_t size() const { return _slots.size(); }
-    std::optional<std::size_t> find(std::string_view name) const;
+    // Each property with a null value of its type: what the instances share.
+    const Properties::List& nulls() const { return _nulls; }
+    const Named_Value& operator[](std::size_t place) const { return _list[place]; }
+    bool is_key(std::size_t place) const { return _keys[place]; }
+    std::size_t size() const { return _list.size(); }
+    std::optional<std::size_t> find(std::string_view name) const; // its place
 
-    // One flag a slot, set for the slots that the list names; names that the layout lacks are passed over.
+    // One flag a place, set for the properties that the list names; names that the layout lacks are passed over.
     std::vector<bool> select(const std::vector<std::string>& names) const;
 
-    // The names of the slots that the list names, of all without a list.
+    // The names of the properties that the list names, of all without a list.
     std::vector<std::string> names(const Property_List& wanted) const;
 
 private:
-    void index_slots();
+    explicit Property_Layout(std::vector<Named_Value> nulls);
 
-    std::vector<Slot> _slots;
-    Properties::List _nulls;
+    const Properties::List _nulls;
+    const std::span<const Named_Value> _list = *_nulls;
+    std::vector<bool> _keys; // one flag a place
     Name_Map<std::size_t> _index;
 };
 

@@ -3,7 +3,6 @@
 #include "cimserver/model/names.h"
 #include "cimserver/model/query_tokens.h"
 
-#include <algorithm>
 #include <charconv>
 #include <string_view>
 
@@ -38,11 +37,6 @@ constexpr Sign signs[] = {
 
 constexpr std::string_view keywords[] = {"SELECT", "FROM", "WHERE", "AND",   "OR",   "NOT",
                                          "IS",     "NULL", "TRUE",  "FALSE", "LIKE", "ISA"};
-
-bool is_keyword(std::string_view word)
-{
-    return std::ranges::any_of(keywords, [&](std::string_view keyword) { return equal_names(keyword, word); });
-}
 
 class Parser
 {
@@ -99,7 +93,7 @@ private:
 
     std::string name()
     {
-        if (now().kind != Query_Token::Kind::word || is_keyword(now().text))
+        if (now().kind != Query_Token::Kind::word || is_among(keywords, now().text))
             unexpected();
         return _tokens[_at++].text;
     }

@@ -41,12 +41,10 @@ void Repository::add(Entry entry)
 
 Repository::Repository(const Repository& whole, std::span<const std::string_view> roots)
 {
-    const auto is_root = [&](const zmlr::Meta_Class* meta_class)
-    { return std::ranges::any_of(roots, [&](std::string_view root) { return equal_names(root, meta_class->name); }); };
     for (const Class_Entry* entry : whole.served())
     {
         const zmlr::Meta_Class* ancestor = entry->meta_class;
-        while (ancestor && !is_root(ancestor))
+        while (ancestor && !is_among(roots, ancestor->name))
             ancestor = ancestor->super_meta_class;
         if (!ancestor)
             continue;

@@ -45,10 +45,13 @@ public:
     Shared() = default;
     Shared(T value) : _block(new Block{std::move(value)}) {}
 
+    explicit operator bool() const { return _block.get(); } // whether it was made of a value
     const T& operator*() const
     {
+        if (const Block* block = _block.get())
+            return block->value;
         static const T default_value{};
-        return _block.get() ? _block.get()->value : default_value;
+        return default_value;
     }
 
 private:

@@ -34,10 +34,10 @@ void Instance_Sink::take_instance(const Instance_Object& instance)
         path.name_space = _name_space;
     if (!path.keys.empty())
         return;
-    const auto& slots = instance.layout().slots();
-    for (std::size_t slot = 0; slot < slots.size(); ++slot)
-        if (slots[slot].key)
-            path.keys.push_back({slots[slot].name, instance.value(slot)});
+    const Property_Layout& layout = instance.layout();
+    for (std::size_t place = 0; place < layout.size(); ++place)
+        if (layout.is_key(place))
+            path.keys.push_back({layout[place].name, instance.value(place)});
 }
 
 void check_status(const Class_Entry& provider, const char* action, const CMPIStatus& status)

@@ -54,7 +54,7 @@ private:
     const std::string _name_space;
     const Property_List _shown;
     std::shared_ptr<const Property_Layout> _layout; // of the last instance
-    std::vector<bool> _flags;                       // of its slots
+    std::vector<bool> _flags;                       // of its places
 };
 
 // Keeps what a method returns.

@@ -26,8 +26,7 @@ public:
         std::vector<Named_Value> result;
         for (const zmlr::Meta_Feature* feature : features_of(*entry.meta_class))
             if (zmlr::is_key(feature))
-                result.push_back(
-                    {entry.layout->slots()[*entry.layout->find(feature->name)].name, converted(entry, *feature, path)});
+                result.push_back({(*entry.layout)[*entry.layout->find(feature->name)].name, converted(entry, *feature, path)});
         --_depth;
         return result;
     }
@@ -54,15 +53,13 @@ private:
 
     static void refuse_unknown_and_repeated(const Class_Entry& entry, const Object_Path& path)
     {
-        std::vector<bool> seen(entry.layout->size());
         for (const Named_Value& key : path.keys)
         {
-            const auto slot = entry.layout->find(key.name);
-            if (!slot || !entry.layout->slots()[*slot].key)
+            const auto place = entry.layout->find(key.name);
+            if (!place || !entry.layout->is_key(*place))
                 refuse(key.name, entry, "there is no such key");
-            if (seen[*slot])
+            if (find_named(path.keys, key.name) != &key)
                 refuse(key.name, entry, "it is given twice");
-            seen[*slot] = true;
         }
     }
 

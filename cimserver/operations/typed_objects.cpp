@@ -8,8 +8,6 @@
 #include "cimserver/model/value_text.h"
 #include "cimserver/operations/typed_keys.h"
 
-#include <unordered_set>
-
 namespace cimserver
 {
 namespace
@@ -38,14 +36,13 @@ public:
     std::vector<Named_Value> properties(const Class_Entry& entry, const std::vector<Named_Value>& given, int unknown_property)
     {
         std::vector<Named_Value> result;
-        std::unordered_set<const zmlr::Meta_Feature*> seen;
         for (const Named_Value& property : given)
         {
             const zmlr::Meta_Feature* feature = find_value(*entry.meta_class, property.name);
             if (!feature)
                 throw Cim_Error(unknown_property,
                                 "class " + std::string(entry.meta_class->name) + " has no property " + property.name.string());
-            if (!seen.insert(feature).second)
+            if (find_named(given, property.name) != &property)
                 throw Type_Error("property given twice: " + property.name.string());
             result.push_back({feature->name, value(*feature, property.value)});
         }
@@ -85,10 +82,10 @@ private:
 std::vector<Named_Value> keys_among(const Class_Entry& entry, const std::vector<Named_Value>& properties)
 {
     std::vector<Named_Value> keys;
-    for (const Property_Layout::Slot& slot : entry.layout->slots())
-        if (const Named_Value* property = slot.key ? find_named(properties, slot.name) : nullptr;
-            property && !property->value.null())
-            keys.push_back(*property);
+    for (std::size_t place = 0; place < entry.layout->size(); ++place)
+        if (const Named_Value* key = entry.layout->is_key(place) ? find_named(properties, (*entry.layout)[place].name) : nullptr;
+            key && !key->value.null())
+            keys.push_back(*key);
     return keys;
 }
 
@@ -128,13 +125,12 @@ std::vector<Named_Value> typed_arguments(const Repository& repository, const zml
     const auto refuse = [&](const std::string& reason, const std::string& parameter)
     { throw Type_Error("method " + std::string(method.name) + ": " + reason + ": " + parameter); };
 
-    std::unordered_set<const zmlr::Meta_Feature*> seen;
     for (const Named_Value& argument : in)
     {
         const zmlr::Meta_Feature* parameter = find_value(method, argument.name);
         if (!parameter || (parameter->flags & zmlr::Flag_In) == 0)
             refuse("it has no such input parameter", argument.name);
-        if (!seen.insert(parameter).second)
+        if (find_named(in, argument.name) != &argument)
             refuse("parameter given twice", argument.name);
     }
 
