@@ -2,12 +2,10 @@
 
 #include "cimserver/cimxml/listener.h"
 #include "cimserver/model/names.h"
+#include "text/integers.h"
 
 #include <netdb.h>
 #include <sys/socket.h>
-
-#include <charconv>
-#include <cstdint>
 
 namespace cimserver
 {
@@ -63,12 +61,9 @@ bool may_be_a_web_page(MHD_Connection* connection)
 
 bool announces_more_than(MHD_Connection* connection, std::size_t limit)
 {
-    const std::string length = header_of(connection, "Content-Length");
-    if (length.empty())
-        return false;
-    std::uint64_t bytes = 0;
-    const auto result = std::from_chars(length.data(), length.data() + length.size(), bytes);
-    return result.ec == std::errc::result_out_of_range || bytes > limit;
+    const std::string length = header_of(connection, MHD_HTTP_HEADER_CONTENT_LENGTH);
+    const auto bytes = text::read_digits(length, 10); // none for a number beyond 64 bits
+    return !length.empty() && (!bytes || *bytes > limit);
 }
 
 MHD_Result reply(MHD_Connection* connection, const Http_Answer& answer)

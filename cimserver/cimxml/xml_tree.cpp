@@ -110,14 +110,11 @@ xmlSAXHandler make_handler()
     return handler;
 }
 
-struct Parser_Deleter
+void free_parser(xmlParserCtxtPtr parser)
 {
-    void operator()(xmlParserCtxtPtr parser) const
-    {
-        xmlFreeDoc(parser->myDoc);
-        xmlFreeParserCtxt(parser);
-    }
-};
+    xmlFreeDoc(parser->myDoc);
+    xmlFreeParserCtxt(parser);
+}
 
 // The parser guesses other encodings from the first bytes. They are all ruled out by one of these.
 bool may_be_utf8(std::string_view document)
@@ -174,7 +171,8 @@ bool parse(Tree_Builder& builder, std::string_view document)
     std::call_once(initialised, xmlInitParser);
 
     xmlSAXHandler handler = make_handler();
-    const std::unique_ptr<xmlParserCtxt, Parser_Deleter> parser(xmlCreatePushParserCtxt(&handler, &builder, nullptr, 0, nullptr));
+    const std::unique_ptr<xmlParserCtxt, void (*)(xmlParserCtxtPtr)> parser(
+        xmlCreatePushParserCtxt(&handler, &builder, nullptr, 0, nullptr), free_parser);
     if (!parser)
         throw std::bad_alloc();
     builder.parser = parser.get();
