@@ -35,22 +35,23 @@ void get_class(Name_Spaces& name_spaces, const Parameters& parameters, Xml_Write
     write_class(writer, *name_spaces.at(parameters.name_space(), class_name).get_class(class_name), selection);
 }
 
+std::vector<const zmlr::Meta_Class*> wanted_classes(Name_Spaces& name_spaces, const Parameters& parameters)
+{
+    const std::string class_name = parameters.optional_class_name("ClassName");
+    const bool deep = parameters.boolean("DeepInheritance", false);
+    return name_spaces.at(parameters.name_space(), class_name).enumerate_classes(class_name, deep);
+}
+
 void enumerate_classes(Name_Spaces& name_spaces, const Parameters& parameters, Xml_Writer& writer)
 {
     const Class_Selection selection = read_class_selection(parameters);
-    const std::string class_name = parameters.optional_class_name("ClassName");
-    const bool deep = parameters.boolean("DeepInheritance", false);
-    for (const zmlr::Meta_Class* meta_class :
-         name_spaces.at(parameters.name_space(), class_name).enumerate_classes(class_name, deep))
+    for (const zmlr::Meta_Class* meta_class : wanted_classes(name_spaces, parameters))
         write_class(writer, *meta_class, selection);
 }
 
 void enumerate_class_names(Name_Spaces& name_spaces, const Parameters& parameters, Xml_Writer& writer)
 {
-    const std::string class_name = parameters.optional_class_name("ClassName");
-    const bool deep = parameters.boolean("DeepInheritance", false);
-    for (const zmlr::Meta_Class* meta_class :
-         name_spaces.at(parameters.name_space(), class_name).enumerate_classes(class_name, deep))
+    for (const zmlr::Meta_Class* meta_class : wanted_classes(name_spaces, parameters))
         writer.start("CLASSNAME").attribute("NAME", meta_class->name).end();
 }
 

@@ -19,9 +19,7 @@ Repository::Repository(const zmlr::Registration* head)
         {
             const zmlr::Meta_Repository* repository = record->meta_class->meta_repository;
             for (zmlr::uint32 i = 0; i < repository->num_meta_classes; ++i)
-                add(std::make_shared<Class_Entry>(
-                    Class_Entry{repository->meta_classes[i]->name, repository->meta_classes[i],
-                                std::make_shared<const Property_Layout>(*repository->meta_classes[i]), nullptr}));
+                add(*repository->meta_classes[i]);
         }
         const auto found = _index.find(record->meta_class->name);
         if (found == _index.end())
@@ -33,10 +31,11 @@ Repository::Repository(const zmlr::Registration* head)
     index_served();
 }
 
-void Repository::add(Entry entry)
+void Repository::add(const zmlr::Meta_Class& meta_class)
 {
-    _index.emplace(entry->meta_class->name, entry.get());
-    _entries.push_back(std::move(entry));
+    auto layout = std::make_shared<const Property_Layout>(meta_class);
+    _entries.push_back(std::make_shared<Class_Entry>(Class_Entry{meta_class.name, &meta_class, std::move(layout), nullptr}));
+    _index.emplace(meta_class.name, _entries.back().get());
 }
 
 Repository::Repository(const Repository& whole, std::span<const std::string_view> roots)

@@ -53,7 +53,7 @@ public:
 private:
     using Entry = std::shared_ptr<Class_Entry>;
 
-    void add(Entry entry);
+    void add(const zmlr::Meta_Class& meta_class);
     void index_served();
     void show(const Repository& whole, const zmlr::Meta_Class* meta_class);
     bool at_top(const zmlr::Meta_Class* meta_class) const;

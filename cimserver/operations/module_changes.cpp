@@ -15,6 +15,13 @@ namespace
 
 std::string not_served(const Class_Entry& entry) { return std::string("no provider serves class ") + entry.meta_class->name; }
 
+CMPIInstanceMI* needed_instance_mi(Module& module, const Class_Entry& entry)
+{
+    if (CMPIInstanceMI* mi = entry.registration ? module.instance_mi(entry) : nullptr)
+        return mi;
+    throw Cim_Error(CIM_ERR_NOT_SUPPORTED, not_served(entry));
+}
+
 CMPIInstance* new_instance(const Class_Entry& entry, const Instance& instance)
 {
     auto& object = make<Instance_Object>(entry.layout, instance.path);
@@ -48,9 +55,7 @@ Object_Path Module_Operations::create_instance(const Instance& instance)
     const Class_Entry& entry = _classes.get(instance.path.class_name);
     Instance typed = typed_instance(_module.repository(), entry, instance, CIM_ERR_INVALID_PARAMETER);
     typed.path.name_space = _name_space;
-    CMPIInstanceMI* mi = entry.registration ? _module.instance_mi(entry) : nullptr;
-    if (!mi)
-        throw Cim_Error(CIM_ERR_NOT_SUPPORTED, not_served(entry));
+    CMPIInstanceMI* mi = needed_instance_mi(_module, entry);
 
     Path_Sink sink(_name_space);
     Provider_Call call(_module, entry, "CreateInstance", typed.path, sink);
@@ -73,9 +78,7 @@ void Module_Operations::modify_instance(const Instance& instance, const Property
         if (!target.provider.layout->find(name))
             throw Cim_Error(CIM_ERR_NO_SUCH_PROPERTY,
                             "class " + std::string(target.provider.meta_class->name) + " has no property " + name);
-    CMPIInstanceMI* mi = _module.instance_mi(target.provider);
-    if (!mi)
-        throw Cim_Error(CIM_ERR_NOT_SUPPORTED, not_served(target.provider));
+    CMPIInstanceMI* mi = needed_instance_mi(_module, target.provider);
 
     Path_Sink sink(_name_space);
     Name_List names(changed);
@@ -87,9 +90,7 @@ void Module_Operations::delete_instance(const Object_Path& path)
 {
     const Module::Use use(_module);
     const Target target = target_of(path);
-    CMPIInstanceMI* mi = _module.instance_mi(target.provider);
-    if (!mi)
-        throw Cim_Error(CIM_ERR_NOT_SUPPORTED, not_served(target.provider));
+    CMPIInstanceMI* mi = needed_instance_mi(_module, target.provider);
 
     Path_Sink sink(_name_space);
     Provider_Call(_module, target.provider, "DeleteInstance", target.path, sink).run(mi, mi->ft->deleteInstance);
