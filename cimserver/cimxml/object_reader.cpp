@@ -120,16 +120,14 @@ Instance read_instance(const Xml_Element& element, const std::string& name_space
     if (body.name != "INSTANCE" || (named && element.children.front().name != "INSTANCENAME"))
         fail("malformed " + element.name);
 
-    Instance instance;
-    instance.path = {"", name_space, *body.attribute("CLASSNAME"), {}};
+    Object_Path path{{}, name_space, *body.attribute("CLASSNAME"), {}};
     if (named)
-        instance.path = read_path(element.children.front(), name_space);
+        path = read_path(element.children.front(), name_space);
     std::vector<Named_Value> properties;
     for (const Xml_Element& child : body.children)
         if (child.name != "QUALIFIER")
             properties.push_back(read_property(child, name_space));
-    instance.properties = std::move(properties);
-    return instance;
+    return {std::move(path), std::move(properties)};
 }
 
 std::string read_name_space(const Xml_Element& element)

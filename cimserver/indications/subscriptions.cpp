@@ -179,18 +179,16 @@ Object_Path Subscriptions::create(Kind kind, Instance instance)
     const std::string filter_id = entry.filter_id;
     const bool starts = kind == Kind::subscription && !in_use(Kind::filter, filter_id);
     insert(kind, id, std::move(entry));
-    bool started = false;
     try
     {
         if (starts)
             _providers.start(filter_id, provider_filter(filter_id));
-        started = starts;
         save();
     }
     catch (...)
     {
-        if (started)
-            _providers.stop(filter_id);
+        if (starts)
+            _providers.stop(filter_id); // does nothing unless it has started
         take(kind, id);
         throw;
     }

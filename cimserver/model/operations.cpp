@@ -17,10 +17,9 @@ Value Operations::get_property(const Object_Path& path, const std::string& prope
 
 void Operations::set_property(const Object_Path& path, const std::string& property, const Value& value)
 {
-    Instance instance{path, {{property, value}}};
     try
     {
-        modify_instance(instance, std::vector{property});
+        modify_instance({path, {{property, value}}}, std::vector{property});
     }
     catch (const Type_Error& error)
     {

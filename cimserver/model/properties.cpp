@@ -8,10 +8,9 @@ namespace cimserver
 
 Properties::operator std::vector<Named_Value>() const
 {
-    std::vector<Named_Value> result;
-    result.reserve(size());
-    for (const auto& [name, value] : *this)
-        result.push_back({name, value});
+    std::vector<Named_Value> result = *_list;
+    for (const Own& own : _own)
+        result[own.place].value = own;
     return result;
 }
 

@@ -60,9 +60,7 @@ Property_Layout::Property_Layout(const Instance& instance) : Property_Layout(nul
 std::optional<std::size_t> Property_Layout::find(std::string_view name) const
 {
     const auto found = _index.find(name);
-    if (found == _index.end())
-        return std::nullopt;
-    return found->second;
+    return found == _index.end() ? std::nullopt : std::optional(found->second);
 }
 
 std::vector<bool> Property_Layout::select(const std::vector<std::string>& names) const
