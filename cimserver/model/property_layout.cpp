@@ -13,7 +13,10 @@ std::vector<Named_Value> nulls_of(const zmlr::Meta_Class& meta_class)
     std::vector<Named_Value> nulls;
     for (const zmlr::Meta_Feature* feature : features_of(meta_class))
         if (!zmlr::is_method(feature))
-            nulls.push_back({feature->name, {cmpi_type(*feature), {}}});
+        {
+            nulls.emplace_back().name = feature->name;
+            nulls.back().value.type = cmpi_type(*feature);
+        }
     return nulls;
 }
 
