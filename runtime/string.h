@@ -28,11 +28,14 @@ template <std::size_t room> struct Fixed_Text
     {
         for (; from[rep.size] != '\0'; rep.size++)
             text[rep.size] = from[rep.size];
+        if (rep.size > room) // no constant: it does not compile
+            throw from;
     }
 
     __String_Rep rep; // counts one more than there are strings
     char text[room + 1] = {};
 };
+static_assert(offsetof(Fixed_Text<1>, text) == sizeof(__String_Rep));
 
 // Copies share one representation (reference counted, safe across threads); a change to a shared one copies it first.
 // A single handle must not be changed by two threads at once. Not-found results are String::npos. Texts given to an
