@@ -2,6 +2,7 @@
 #include "cimserver/broker/objects.h"
 #include "cmpi/cmpi_containers.h"
 #include "cmpi/converter.h"
+#include "schema/TST_Keyed.h"
 #include "tests/cmpi/served_provider.h"
 
 #include <cmpimacs.h>
@@ -292,6 +293,8 @@ TEST_F(Conversion, tells_of_every_call_that_fails)
         if (rc == CMPI_RC_OK)
             rc = make_cmpi_instance(broker.face(), share(sent.ptr()), name_space, path.get(), list, made);
         if (rc == CMPI_RC_OK)
+            rc = make_cmpi_object(broker.face(), share(sent.ptr()), name_space, list, made);
+        if (rc == CMPI_RC_OK)
             rc = make_cmpi_method(broker.face(), name_space, method.ptr(), args.get(), return_value);
         return rc;
     };
@@ -320,6 +323,16 @@ TEST_F(Conversion, tells_of_every_call_that_fails)
         }
     }
     EXPECT_THAT(codes, ElementsAre(CMPI_RC_OK, CMPI_RC_ERR_FAILED, CMPI_RC_ERR_NOT_SUPPORTED)) << "the filter's own code";
+
+    // A key that the path does not take is a property all the same.
+    Ref<TST_Keyed> keyed(TST_Keyed::create());
+    keyed->Name.set("key");
+    keyed->Count.set(7);
+    CMPI_Ptr<CMPIInstance> made;
+    calls_until_failure = 2; // behind the path and the key's text
+    EXPECT_EQ(make_cmpi_object(broker.face(), Ref<Instance>(keyed.steal()), name_space, nullptr, made), CMPI_RC_OK);
+    EXPECT_STREQ(CMGetCharsPtr(CMGetProperty(made.get(), "Name", nullptr).value.string, nullptr), "key");
+    EXPECT_EQ(CMGetProperty(made.get(), "Count", nullptr).value.uint8, 7);
 }
 
 } // namespace

@@ -32,6 +32,10 @@ constexpr const char* misleading = R"({"adapters": [
     {"kind": "cna", "ports": {"pwwn": "0000AABBCCDDEEFF", "eth_name": "interface_of_2_0", "fcoe_mac": "AABBCCDDEEFF",
      "remote_ports": [{"pwwn": "0000AABBCCDDEEFF"}, {"pwwn": "0000000000000000"}]}}]})";
 
+// A card whose FC side nobody drives, with its ports listed the other way round.
+constexpr const char* ethernet_only = R"({"drivers": {"hxa": {"present": false}},
+    "adapters": [{"kind": "cna", "ports": [{"eth_instance": 1}, {"eth_instance": 0}]}]})";
+
 // With the log off, so that walks pass over adapters.
 struct Wanted_One : Inventory_Test
 {
@@ -67,9 +71,9 @@ struct Wanted_One : Inventory_Test
 
 TEST_F(Wanted_One, is_what_the_enumeration_tells)
 {
-    for (const char* scenario : {"fc-hba", "cna", "mixed", "odd", "large", misleading})
+    for (const char* scenario : {"fc-hba", "cna", "mixed", "odd", "large", misleading, ethernet_only})
     {
-        scenario == misleading ? hxasim::load_text(scenario) : hxasim::load(scenario);
+        *scenario == '{' ? hxasim::load_text(scenario) : hxasim::load(scenario);
         hxal_adapter_scan();
         for (const Enumeration& row : enumerations)
         {

@@ -97,14 +97,18 @@ TEST_F(Objects, broken_handles_and_types_that_no_value_has_are_refused)
 
 TEST_F(Objects, clones_are_independent_and_outlive_the_request)
 {
+    const CMPIUint8 number = 7;
     CMPIInstance* clone = nullptr;
     {
         const Request inner;
         CMPIInstance* instance = thing();
+        CMSetProperty(instance, "Uint8Value", &number, CMPI_uint8);
         CMSetProperty(instance, "Caption", "before", CMPI_chars);
         clone = CMClone(instance, nullptr);
         CMSetProperty(instance, "Caption", "after", CMPI_chars);
+        EXPECT_EQ(text(get(instance, "Caption").value.string), "after");
     }
+    EXPECT_EQ(get(clone, "Uint8Value").value.uint8, number);
     EXPECT_EQ(text(get(clone, "Caption").value.string), "before");
     EXPECT_EQ(CMRelease(clone).rc, CMPI_RC_OK);
 }
