@@ -127,6 +127,7 @@ def wrong(**properties):
 
 ERRORS = [
     ("a method for a property", wrong(Join="x"), 12),
+    ("another key", lambda c, p: c.ModifyInstance(changed(p, "Name", "violet", "string")), 4),
     ("unknown property", wrong(Colour="red"), 12),
     ("unknown property in the list", lambda c, p: c.ModifyInstance(CIMInstance("TST_Box", path=p), PropertyList=["Colour"]), 12),
     ("text for a number", wrong(Uint8Value="seven"), 4),
