@@ -104,18 +104,14 @@ using Lun = std::array<std::uint8_t, lun_entry_size>; // as REPORT LUNS gives it
 // The wanted ones of an answer's entries, in room of their own: the answer is larger, and they are kept while each is asked.
 std::vector<Lun> wanted_units(const std::uint8_t* answer, std::size_t count, const Wanted& wanted)
 {
-    const auto entry = [answer](std::size_t i) { return Lun_Entry(answer + lun_list_head + i * lun_entry_size, lun_entry_size); };
-    const auto is_wanted = [&](std::size_t i) { return wanted.may_end_with_number(lun_number(entry(i))); };
-
-    std::size_t kept = 0;
-    for (std::size_t i = 0; i < count; i++)
-        kept += is_wanted(i) ? 1 : 0;
     std::vector<Lun> units;
-    units.reserve(kept);
+    if (wanted.is_all())
+        units.reserve(count);
     for (std::size_t i = 0; i < count; i++)
     {
-        if (is_wanted(i))
-            std::ranges::copy(entry(i), units.emplace_back().begin());
+        const Lun_Entry entry(answer + lun_list_head + i * lun_entry_size, lun_entry_size);
+        if (wanted.may_end_with_number(lun_number(entry)))
+            std::ranges::copy(entry, units.emplace_back().begin());
     }
     return units;
 }
