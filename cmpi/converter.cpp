@@ -17,17 +17,16 @@ namespace
 
 constexpr const char* log_source = "Converter";
 
-// A path of the class, which `fill` puts the keys into.
-template <class Fill>
-CMPIrc make_path(const CMPIBroker* broker, const Meta_Class* meta_class, const char* name_space, Kept_Keys* keys, Fill fill,
-                 CMPI_Ptr<CMPIObjectPath>& path)
+// The keys of an instance that nobody else holds end when they are in the path.
+CMPIrc fill_path(const CMPIBroker* broker, const Ref<Instance>& instance, const char* name_space, CMPI_Ptr<CMPIObjectPath>& path,
+                 Kept_Keys* keys)
 {
     CMPIStatus status = {CMPI_RC_OK, nullptr};
-    CMPI_Ptr<CMPIObjectPath> made(CMNewObjectPath(broker, name_space, meta_class->name, &status));
+    CMPI_Ptr<CMPIObjectPath> made(CMNewObjectPath(broker, name_space, instance->meta_class->name, &status));
     if (!made || !okay(status))
         return CMPI_RC_ERR_FAILED;
-    CMPIObjectPath_Container container(meta_class->meta_repository, broker, name_space, made.get(), keys);
-    if (fill(container) != 0)
+    CMPIObjectPath_Container container(instance->meta_class->meta_repository, broker, name_space, made.get(), keys);
+    if (container.convert_and_end(instance, Flag_Key) != 0)
         return CMPI_RC_ERR_FAILED;
     path = std::move(made);
     return CMPI_RC_OK;
@@ -76,8 +75,7 @@ CMPIrc Property_Filter::install(CMPIInstance* instance, const Meta_Class* meta_c
 CMPIrc make_cmpi_object_path(const CMPIBroker* broker, const Instance* instance, const char* name_space,
                              CMPI_Ptr<CMPIObjectPath>& path)
 {
-    const auto keys = [&](Container& container) { return container.convert(instance, Flag_Key); };
-    return make_path(broker, instance->meta_class, name_space, nullptr, keys, path);
+    return fill_path(broker, share(instance), name_space, path, nullptr);
 }
 
 CMPIrc make_cmpi_object(const CMPIBroker* broker, Ref<Instance> instance, const char* name_space, const Property_Filter& filter,
@@ -88,9 +86,8 @@ CMPIrc make_cmpi_object(const CMPIBroker* broker, Ref<Instance> instance, const 
     Kept_Keys kept(&resource);
     kept.reserve(instance->meta_class->num_keys);
 
-    const auto keys = [&](Container& container) { return container.convert_and_end(instance, Flag_Key); };
     CMPI_Ptr<CMPIObjectPath> path;
-    CMPIrc rc = make_path(broker, instance->meta_class, name_space, &kept, keys, path);
+    CMPIrc rc = fill_path(broker, instance, name_space, path, &kept);
     CMPI_Ptr<CMPIInstance> begun;
     if (rc == CMPI_RC_OK)
         rc = begin_instance(broker, instance->meta_class, path.get(), filter, begun);

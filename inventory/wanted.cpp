@@ -23,6 +23,7 @@ constexpr uint32 longest_key = 512; // longer than any of ours: a client's may b
 // What is compared of a name, and where its last 8 bytes begin.
 constexpr std::size_t compared_size = sizeof(hxal_t::serialnum);
 constexpr std::size_t last_bytes_at = compared_size - sizeof(std::uint64_t);
+static_assert(compared_size <= sizeof(hxal_t::eth_name));
 
 // A property's text; null when it has none.
 const String* text_of(const Instance* model, const Meta_Property* property)

@@ -223,7 +223,8 @@ TEST_F(Conversion, refuses_values_that_are_nothing_to_a_server)
 
 // ---- a server whose calls fail ----
 
-int calls_until_failure; // negative: none fails
+int calls_until_failure;  // negative: none fails
+bool failure_with_object; // what fails answers an object all the same
 
 template <class Table> Table original; // the broker's own
 
@@ -234,18 +235,24 @@ template <class Table, class Result, class... Arguments, Result (*Table::*member
     {
         if (calls_until_failure-- != 0)
             return (original<Table>.*member)(arguments...);
-        (set_status(arguments), ...);
         if constexpr (std::is_same_v<Result, CMPIStatus>)
             return {CMPI_RC_ERR_NOT_SUPPORTED, nullptr};
         else
-            return {};
+        {
+            const Result made = failure_with_object ? (original<Table>.*member)(arguments...) : Result{};
+            return (set_status(arguments) | ...) ? made : Result{}; // who does not ask for the status would take it
+        }
     }
 
-    template <class T> static void set_status(T argument)
+    template <class T> static bool set_status(T argument)
     {
         if constexpr (std::is_same_v<T, CMPIStatus*>)
             if (argument)
+            {
                 *argument = {CMPI_RC_ERR_NOT_SUPPORTED, nullptr};
+                return true;
+            }
+        return false;
     }
 };
 
@@ -300,16 +307,24 @@ TEST_F(Conversion, tells_of_every_call_that_fails)
     };
     const auto whole = to_cmpi(sent.ptr());
     const auto values = to_cmpi(full_thing("all").ptr());
+    const CMPI_Ptr<CMPIArgs> arguments(CMNewArgs(broker.face(), nullptr));
+    CMPI_Data return_value;
+    make_cmpi_method(broker.face(), name_space, method.ptr(), arguments.get(), return_value);
     const CMPIObjectPath* pairs = path("TST_Pair");
     const auto back = [&]
     {
         Ref<Instance> made;
-        const CMPIrc rc = make_cimple_instance(broker.face(), sent->meta_class, pairs, whole.get(), made);
-        return rc == CMPI_RC_OK ? make_cimple_instance(broker.face(), &TST_Thing::static_meta_class, pairs, values.get(), made)
+        CMPIrc rc = make_cimple_instance(broker.face(), sent->meta_class, pairs, whole.get(), made);
+        if (rc == CMPI_RC_OK)
+            rc = make_cimple_instance(broker.face(), &TST_Thing::static_meta_class, pairs, values.get(), made);
+        return rc == CMPI_RC_OK ? make_cimple_method(broker.face(), sent->meta_class, &TST_Disk_Convert_method::static_meta_class,
+                                                     pairs, arguments.get(), made)
                                 : rc;
     };
-    for (const auto& work : {std::function<CMPIrc()>(there), std::function<CMPIrc()>(back)})
+    const std::function<CMPIrc()> ways[] = {there, back};
+    for (const auto& [work, with_object] : {std::pair(ways[0], false), {ways[0], true}, {ways[1], false}, {ways[1], true}})
     {
+        failure_with_object = with_object;
         bool failed = true;
         for (int call = 0; failed; ++call)
         {

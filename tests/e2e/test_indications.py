@@ -244,6 +244,8 @@ def test_what_makes_no_sense_is_refused(serve):
         assert code_of(lambda p=properties: make(interop, "CIM_IndicationSubscription", **{**ends, **p})) == code, properties
     handler.classname = "cim_listenerDestination"
     make(interop, "CIM_IndicationSubscription", **ends)
+    handlers = [subscription["Handler"].classname for subscription in interop.EnumerateInstances("CIM_IndicationSubscription")]
+    assert handlers == ["CIM_ListenerDestinationCIMXML"], "as it is, not as it was named"
     for what in (lambda: make(interop, "CIM_IndicationSubscription", **ends), lambda: make(interop, "CIM_IndicationFilter", Name="f", Query=ALL, QueryLanguage="WQL")):  # fmt: skip
         assert code_of(what) == 11
     for used in (event_filter, handler):

@@ -202,4 +202,5 @@ TEST_F(Helpers, believe_no_number_of_units)
     plug_text(R"({"adapters": [{"kind": "fc-hba", "ports": [{"remote_ports": [{"luns": {"count": 102}}]}]}]})");
     hxasim::inject({.cdb = {0xA0}, .skip = 1, .data = {{2, {0x10}}}}); // 512 units more
     EXPECT_EQ(all(CLASSID_StorageExtent).size(), 102U);
+    EXPECT_THAT(log(), testing::Contains("INFO TargetHelper: Number of Luns = 102."));
 }

@@ -72,6 +72,8 @@ TEST_F(Objects, a_property_filter_hides_all_but_the_listed_properties_and_the_ke
     EXPECT_EQ((CMGetProperty(instance, "Caption", &status), status.rc), CMPI_RC_ERR_NO_SUCH_PROPERTY);
     EXPECT_EQ(CMSetPropertyFilter(instance, nullptr, nullptr).rc, CMPI_RC_OK);
     EXPECT_EQ(get(instance, "Caption").state, CMPI_nullValue) << "what is set while it is hidden is dropped";
+    EXPECT_EQ(CMSetProperty(instance, "Caption", nullptr, CMPI_null).rc, CMPI_RC_OK);
+    EXPECT_EQ(get(instance, "Caption").type, CMPI_string) << "also when it is null";
 }
 
 TEST_F(Objects, broken_handles_and_types_that_no_value_has_are_refused)
